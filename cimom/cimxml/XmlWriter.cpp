@@ -15,7 +15,7 @@ XmlWriter::XmlWriter(Prolog prolog)
     : buffer_(xmlBufferCreate(), &xmlBufferFree),
       writer_(xmlNewTextWriterMemory(buffer_.get(), 0), &xmlFreeTextWriter) {
   if (!buffer_ || !writer_) throw std::bad_alloc();
-  if (prolog == Prolog::Declared) xmlTextWriterStartDocument(writer_.get(), nullptr, "utf-8", nullptr);
+  if (prolog == Prolog::Declared) xmlTextWriterStartDocument(writer_.get(), nullptr, "UTF-8", nullptr);
 }
 
 XmlWriter::Scope::~Scope() { xmlTextWriterEndElement(writer_.writer_.get()); }
