@@ -4,19 +4,15 @@
 #include <cmpift.h>
 
 #include <filesystem>
-#include <functional>
 #include <memory>
 #include <string_view>
 
 #include "cimom/ConfigurationError.h"
+#include "cimom/broker/MessageSink.h"
 #include "cimom/registry/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {
-
-/// Takes a message that a provider logs or traces: its severity (CMPI_SEV_…) or level (CMPI_LEV_…), the component that
-/// sends it and the text. It may be called from several threads at once.
-using MessageSink = std::function<void(int level, std::string_view component, std::string_view text)>;
 
 /// A CIM object manager without a wire: schema, registered providers and a CMPI 2.0 broker, through whose up-call
 /// table (CMPIBrokerFT) every CIM operation goes. Requests may run on several threads at once, each inside a

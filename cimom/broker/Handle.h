@@ -64,7 +64,8 @@ CIMOM_ABI(Error, CMPIError);
 /// strings it is the characters, as providers that read a string's handle directly expect.
 template <class Model>
 struct Handle final : Object, Abi<Model>::Type {
-  explicit Handle(Model contents) : model(std::move(contents)) {
+  explicit Handle(Model contents, bool ownedElsewhere = false) : model(std::move(contents)) {
+    inScope = ownedElsewhere;
     if constexpr (std::is_same_v<Model, Text>) {
       this->hdl = model.characters.data();
     } else {
@@ -75,6 +76,12 @@ struct Handle final : Object, Abi<Model>::Type {
 
   Model model;
 };
+
+/// A CMPI object for the time of a call, on the caller's stack.
+template <class Model>
+Handle<Model> lend(Model model) {
+  return Handle<Model>(std::move(model), true);
+}
 
 /// The model behind a CMPI object.
 /// @throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the object or its handle is null

@@ -16,7 +16,7 @@ class Object {
   Object& operator=(const Object&) = delete;
   virtual ~Object() = default;
 
-  /// Owned by a scope: releasing the object early is harmless and does nothing.
+  /// Owned by a scope or a caller's stack: releasing the object early is harmless and does nothing.
   bool inScope = false;
 };
 

@@ -2,6 +2,7 @@
 #define CIMOM_SCHEMA_MOF_H_
 
 #include <filesystem>
+#include <set>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -22,31 +23,28 @@ struct MofDeclarations {
   std::vector<std::string> namespaces;  ///< of `#pragma namespace`
 };
 
-/// Reads classes, qualifier declarations and the pragmas include, namespace and locale; other pragmas mean nothing
-/// here. Qualifiers and classes of a file are there for the files read after it. A file that is included or named
-/// twice is read once.
+/// Reads classes, qualifier declarations and the pragmas include and namespace; other pragmas mean nothing here.
+/// A qualifier's declaration counts from there on, in later texts and files too. A file is read once, however often
+/// it is named or included.
 class MofReader {
  public:
   MofReader();
 
-  /// A file, or every *.mof under a directory.
-  /// @throws ConfigurationError "FILE:LINE: what was expected"
-  void readPath(const std::filesystem::path& fileOrDirectory);
+  /// A file, or every *.mof under a directory in the order of their names.
+  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  MofDeclarations readPath(const std::filesystem::path& fileOrDirectory);
 
-  /// @param origin what messages call the text
-  /// @throws ConfigurationError "ORIGIN:LINE: what was expected"
-  void readText(std::string_view mof, const std::string& origin);
-
-  const MofDeclarations& declarations() const { return declarations_; }
+  /// @param origin what messages call the text; files that it includes are looked for from the working directory
+  /// @throws ConfigurationError "ORIGIN:LINE: what is wrong"
+  MofDeclarations readText(std::string_view mof, const std::string& origin);
 
  private:
   friend class MofParser;
 
-  void readFile(const std::filesystem::path& file);
+  void readFile(const std::filesystem::path& file, MofDeclarations& declarations);
 
-  MofDeclarations declarations_;
-  Qualifiers qualifierTypes_;  ///< declared qualifiers, with their defaults and flavors
-  std::vector<std::filesystem::path> files_;
+  Qualifiers qualifierTypes_;  ///< the declared qualifiers, with their types, defaults and flavors
+  std::set<std::filesystem::path> files_;
 };
 
 }  // namespace Cimom
