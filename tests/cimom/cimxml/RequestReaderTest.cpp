@@ -226,7 +226,7 @@ INSTANTIATE_TEST_SUITE_P(
                                  "&c;"),
                 400, notWellFormed, "declares entities"},
         Refusal{"TooDeep", nested(200), 400, notWellFormed, "256"}),
-    [](const auto& info) { return info.param.name; });
+    [](const auto& test) { return test.param.name; });
 
 INSTANTIATE_TEST_SUITE_P(
     NotValid, RefusedRequest,
@@ -287,7 +287,7 @@ INSTANTIATE_TEST_SUITE_P(
                 400, notValid, "VALUE"},
         Refusal{"NoProperty", intrinsicCall("M", parameter("P", "<INSTANCE CLASSNAME=\"C\"><B/></INSTANCE>")), 400,
                 notValid, "B"}),
-    [](const auto& info) { return info.param.name; });
+    [](const auto& test) { return test.param.name; });
 
 INSTANTIATE_TEST_SUITE_P(
     NotSupported, RefusedRequest,
@@ -302,7 +302,7 @@ INSTANTIATE_TEST_SUITE_P(
                 "unsupported-dtd-version", "1.0"},
         Refusal{"ProtocolVersion", replaced(good, "PROTOCOLVERSION=\"1.0\"", "PROTOCOLVERSION=\"10.0\""), 501,
                 "unsupported-protocol-version", "10.0"}),
-    [](const auto& info) { return info.param.name; });
+    [](const auto& test) { return test.param.name; });
 
 }  // namespace
 }  // namespace Cimom::CimXml

@@ -74,7 +74,9 @@ TEST(Types, ReadAndWriteScalars) {
     SCOPED_TRACE(std::string(typeName(text.type)) + " \"" + text.text + "\"");
     const auto value = parseScalar(text.type, text.text);
     ASSERT_EQ(value.has_value(), text.canonical != nullptr);
-    if (value) EXPECT_EQ(formatScalar(text.type, *value), text.canonical);
+    if (value) {
+      EXPECT_EQ(formatScalar(text.type, *value), text.canonical);
+    }
   }
 }
 
