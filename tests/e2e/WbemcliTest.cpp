@@ -144,4 +144,21 @@ TEST(WbemcliWithPassword, IsServedWhenItIsRight) {
   EXPECT_NE(ask("").status, 0);
 }
 
+TEST(WbemcliOverTls, IsServed) {
+  const TemporaryDirectory directory;
+  const std::string key = (directory.path() / "key.pem").string();
+  const std::string certificate = (directory.path() / "certificate.pem").string();
+  const Completed made = run({"openssl", "req", "-x509", "-newkey", "rsa:2048", "-nodes", "-subj", "/CN=localhost",
+                              "-keyout", key, "-out", certificate});
+  ASSERT_EQ(made.status, 0) << made.errors;
+  std::vector<std::string> options = Cimomd::probeOptions();
+  options.insert(options.end(), {"--tls-certificate", certificate, "--tls-key", key});
+  const Cimomd cimomd(options);
+  const std::string url = cimomd.url("TEST_Thing");
+  const Completed asked = run({"wbemcli", "ein", "-noverify", "https" + url.substr(4)});
+  EXPECT_EQ(asked.status, 0) << asked.errors;
+  EXPECT_THAT(asked.output, HasSubstr("TEST_Thing.Name=\"thing\",Number=1"));
+  EXPECT_NE(run({"wbemcli", "ein", url}).status, 0);
+}
+
 }  // namespace
