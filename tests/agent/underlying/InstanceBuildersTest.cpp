@@ -48,7 +48,8 @@ NetworkInterface nameless() {
 
 // The one property of that name, of the one endpoint of the interface.
 std::string endpointProperty(const NetworkInterface& interface, const std::string& name) {
-  for (const Property& property : protocolEndpoints(processor({interface})).at(0)) {
+  const Instances endpoints = protocolEndpoints(processor({interface}));
+  for (const Property& property : endpoints.at(0)) {
     if (property.name == name) return textOf(property);
   }
   return "no " + name;
