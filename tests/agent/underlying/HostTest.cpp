@@ -1,14 +1,13 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <net/if.h>
-#include <unistd.h>
 
 #include <algorithm>
-#include <array>
 #include <bit>
 #include <set>
 #include <sstream>
 
+#include "QV/ProviderHelper.h"
 #include "underlying/Host.h"
 
 namespace QV {
@@ -29,9 +28,7 @@ std::map<std::string, std::string> gateways(const std::string& text) {
 
 TEST(Host, hasItsNameAndTheInterfacesOfTheKernel) {
   const ManagementProcessor host = readHost();
-  std::array<char, 256> name{};
-  ::gethostname(name.data(), name.size() - 1);
-  EXPECT_EQ(host.name, name.data());
+  EXPECT_EQ(host.name, getSystemName());
   EXPECT_FALSE(host.dnsServers.empty());
 
   std::set<std::string> names;
