@@ -49,8 +49,9 @@ class WithBroker : public testing::Test {
 
   static std::string characters(const CMPIString* string) { return CMGetCharsPtr(string, nullptr); }
 
- private:
   Cimom::ObjectManager manager_;
+
+ private:
   Cimom::RequestScope scope_{manager_.broker()};
 };
 

@@ -1,6 +1,8 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <ostream>
+#include <string>
 
 #include "QV/ProviderHelper.h"
 #include "agent/helper/BrokerFixture.h"
@@ -133,16 +135,30 @@ TEST_F(MapProperty, leavesNullsAlone) {
   EXPECT_TRUE(CMIsNullValue(read("Text")));
 }
 
-// An integer of any width that fits reaches the target, whose own property is a uint16 or a uint8.
+// A number of any of the integer types, and which of the two target types can hold it.
 struct Number {
   CMPIType type;
+  const char* typeName;
   std::int64_t value;
   bool fitsUint16;
   bool fitsUint8;
 };
 
+void PrintTo(const Number& number, std::ostream* stream) { *stream << number.typeName << ' ' << number.value; }
+
 class MapNumber : public WithBroker, public testing::WithParamInterface<Number> {
  protected:
+  // An instance whose properties of the target's names have the number's type.
+  CMPIInstance* source() {
+    const std::string type = GetParam().typeName;
+    manager_.loadSchemaText("class Source { [key] string Id; " + type + " U16; " + type + " U8; };", "root/test");
+    CMPIInstance* made = CMNewInstance(broker(), path("Source"), nullptr);
+    const CMPIValue value = valueOf(GetParam());
+    for (const char* name : {"U16", "U8"})
+      EXPECT_EQ(CMSetProperty(made, name, &value, GetParam().type).rc, CMPI_RC_OK) << name;
+    return made;
+  }
+
   static CMPIValue valueOf(const Number& number) {
     CMPIValue value{};
     switch (number.type) {
@@ -175,26 +191,21 @@ class MapNumber : public WithBroker, public testing::WithParamInterface<Number> 
 };
 
 TEST_P(MapNumber, reachesTheTargetWhereItFits) {
-  // Given an instance of a class without a schema's types, as object managers hand them out
-  CMPIInstance* source = CMNewInstance(broker(), path("Unknown"), nullptr);
-  ASSERT_NE(source, nullptr);
-  const CMPIValue value = valueOf(GetParam());
-  for (const char* name : {"U16", "U8"}) ASSERT_EQ(CMSetProperty(source, name, &value, GetParam().type).rc, CMPI_RC_OK);
-
-  // When it is mapped into both widths
+  // When a number is mapped into both widths
+  CMPIInstance* from = source();
   CMPIInstance* target = sample();
-  CMPIStatus wide{CMPI_RC_OK, nullptr};
-  CMPIStatus narrow{CMPI_RC_OK, nullptr};
-  mapProperty(instanceData(source), target, "U16", Uint16, &wide);
-  mapProperty(instanceData(source), target, "U8", Uint8, &narrow);
+  CMPIStatus wide{CMPI_RC_ERROR, nullptr};
+  CMPIStatus narrow{CMPI_RC_ERROR, nullptr};
+  mapProperty(instanceData(from), target, "U16", Uint16, &wide);
+  mapProperty(instanceData(from), target, "U8", Uint8, &narrow);
 
   // Then it is there or refused
   const CMPIData wideData = CMGetProperty(target, "U16", nullptr);
   const CMPIData narrowData = CMGetProperty(target, "U8", nullptr);
-  ASSERT_EQ(!CMIsNullValue(wideData), GetParam().fitsUint16);
-  ASSERT_EQ(!CMIsNullValue(narrowData), GetParam().fitsUint8);
   EXPECT_EQ(wide.rc, GetParam().fitsUint16 ? CMPI_RC_OK : CMPI_RC_ERR_TYPE_MISMATCH);
   EXPECT_EQ(narrow.rc, GetParam().fitsUint8 ? CMPI_RC_OK : CMPI_RC_ERR_TYPE_MISMATCH);
+  ASSERT_EQ(!CMIsNullValue(wideData), GetParam().fitsUint16);
+  ASSERT_EQ(!CMIsNullValue(narrowData), GetParam().fitsUint8);
   if (GetParam().fitsUint16) {
     EXPECT_EQ(wideData.value.uint16, GetParam().value);
   }
@@ -203,16 +214,16 @@ TEST_P(MapNumber, reachesTheTargetWhereItFits) {
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Each, MapNumber,
-                         testing::Values(Number{CMPI_uint8, 255, true, true}, Number{CMPI_sint8, 127, true, true},
-                                         Number{CMPI_sint8, -1, false, false}, Number{CMPI_uint16, 255, true, true},
-                                         Number{CMPI_uint16, 256, true, false}, Number{CMPI_sint16, 32767, true, false},
-                                         Number{CMPI_sint16, -1, false, false}, Number{CMPI_uint32, 65535, true, false},
-                                         Number{CMPI_uint32, 65536, false, false}, Number{CMPI_sint32, 0, true, true},
-                                         Number{CMPI_sint32, -1, false, false}, Number{CMPI_uint64, 255, true, true},
-                                         Number{CMPI_uint64, -1, false, false},
-                                         Number{CMPI_sint64, 65536, false, false},
-                                         Number{CMPI_sint64, -65535, false, false}));
+INSTANTIATE_TEST_SUITE_P(
+    Each, MapNumber,
+    testing::Values(Number{CMPI_uint8, "uint8", 255, true, true}, Number{CMPI_sint8, "sint8", 127, true, true},
+                    Number{CMPI_sint8, "sint8", -1, false, false}, Number{CMPI_uint16, "uint16", 255, true, true},
+                    Number{CMPI_uint16, "uint16", 256, true, false}, Number{CMPI_sint16, "sint16", 32767, true, false},
+                    Number{CMPI_sint16, "sint16", -1, false, false}, Number{CMPI_uint32, "uint32", 65535, true, false},
+                    Number{CMPI_uint32, "uint32", 65536, false, false}, Number{CMPI_sint32, "sint32", 0, true, true},
+                    Number{CMPI_sint32, "sint32", -1, false, false}, Number{CMPI_uint64, "uint64", 255, true, true},
+                    Number{CMPI_uint64, "uint64", -1, false, false}, Number{CMPI_sint64, "sint64", 65536, false, false},
+                    Number{CMPI_sint64, "sint64", -65535, false, false}));
 
 }  // namespace
 }  // namespace QV
