@@ -18,7 +18,7 @@ XmlWriter::XmlWriter(Prolog prolog)
   if (prolog == Prolog::Declared) xmlTextWriterStartDocument(writer_.get(), nullptr, "UTF-8", nullptr);
 }
 
-XmlWriter::Scope::~Scope() { xmlTextWriterEndElement(writer_.writer_.get()); }
+XmlWriter::Scope::~Scope() { xmlTextWriterFullEndElement(writer_.writer_.get()); }
 
 XmlWriter::Scope XmlWriter::element(const char* name) {
   xmlTextWriterStartElement(writer_.get(), xmlChars(name));

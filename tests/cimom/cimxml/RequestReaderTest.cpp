@@ -1,9 +1,8 @@
-#include "cimom/cimxml/RequestReader.h"
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include "cimom/cimxml/Errors.h"
+#include "cimom/cimxml/RequestReader.h"
 #include "tests/cimom/cimxml/Messages.h"
 
 namespace Cimom::CimXml {
@@ -68,11 +67,11 @@ TEST(RequestReader, ReadsAnArrayWithItsNulls) {
 }
 
 TEST(RequestReader, ReadsEveryKindOfKey) {
-  const ObjectName name = nameOf(instanceName(
-      "C", keyBinding("S", "text") + keyBinding("B", "TRUE", "VALUETYPE=\"boolean\"") +
-               keyBinding("N", "7", "VALUETYPE=\"numeric\" TYPE=\"uint16\"") + keyBinding("D", "plain", "") +
-               "<KEYBINDING NAME=\"R\"><VALUE.REFERENCE>" + instanceName("Other", keyBinding("K", "1")) +
-               "</VALUE.REFERENCE></KEYBINDING>"));
+  const ObjectName name =
+      nameOf(instanceName("C", keyBinding("S", "text") + keyBinding("B", "TRUE", "VALUETYPE=\"boolean\"") +
+                                   keyBinding("N", "7", "VALUETYPE=\"numeric\" TYPE=\"uint16\"") +
+                                   keyBinding("D", "plain", "") + "<KEYBINDING NAME=\"R\"><VALUE.REFERENCE>" +
+                                   instanceName("Other", keyBinding("K", "1")) + "</VALUE.REFERENCE></KEYBINDING>"));
   ASSERT_EQ(name.keys.size(), 5u);
   EXPECT_EQ(name.keys[0].value.kind, KeyValue::Kind::String);
   EXPECT_EQ(name.keys[0].value.text, "text");
@@ -136,8 +135,9 @@ TEST(RequestReader, ReadsEveryKindOfProperty) {
   const Property array = propertyOf("<PROPERTY.ARRAY NAME=\"A\" TYPE=\"uint8\"><VALUE.ARRAY/></PROPERTY.ARRAY>");
   EXPECT_TRUE(array.isArray);
   EXPECT_TRUE(std::get<Texts>(array.value).empty());
-  const Property reference = propertyOf("<PROPERTY.REFERENCE NAME=\"A\"><VALUE.REFERENCE><CLASSNAME NAME=\"X\"/>"
-                                        "</VALUE.REFERENCE></PROPERTY.REFERENCE>");
+  const Property reference = propertyOf(
+      "<PROPERTY.REFERENCE NAME=\"A\"><VALUE.REFERENCE><CLASSNAME NAME=\"X\"/>"
+      "</VALUE.REFERENCE></PROPERTY.REFERENCE>");
   EXPECT_EQ(reference.type, "reference");
   EXPECT_EQ(std::get<ObjectName>(reference.value).className, "X");
   const Property null = propertyOf("<PROPERTY NAME=\"A\" TYPE=\"uint8\"/>");
@@ -260,9 +260,8 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"NamelessKey",
                 intrinsicCall("M", parameter("P", instanceName("C", "<KEYBINDING><KEYVALUE/></KEYBINDING>"))), 400,
                 notValid, "NAME"},
-        Refusal{"ValuelessKey",
-                intrinsicCall("M", parameter("P", instanceName("C", "<KEYBINDING NAME=\"K\"/>"))), 400, notValid,
-                "KEYBINDING"},
+        Refusal{"ValuelessKey", intrinsicCall("M", parameter("P", instanceName("C", "<KEYBINDING NAME=\"K\"/>"))), 400,
+                notValid, "KEYBINDING"},
         Refusal{"OddKeyType",
                 intrinsicCall("M", parameter("P", instanceName("C", keyBinding("K", "1", "VALUETYPE=\"odd\"")))), 400,
                 notValid, "odd"},
@@ -276,14 +275,16 @@ INSTANTIATE_TEST_SUITE_P(
                                                       "</NAMESPACEPATH><CLASSNAME NAME=\"C\"/></CLASSPATH>")),
                 400, notValid, "NAMESPACEPATH"},
         Refusal{"HalfANamedInstance",
-                intrinsicCall("M", parameter("P", "<VALUE.NAMEDINSTANCE><INSTANCE CLASSNAME=\"C\"/></VALUE.NAMEDINSTANCE>")),
+                intrinsicCall("M",
+                              parameter("P", "<VALUE.NAMEDINSTANCE><INSTANCE CLASSNAME=\"C\"/></VALUE.NAMEDINSTANCE>")),
                 400, notValid, "VALUE.NAMEDINSTANCE"},
         Refusal{"NamelessProperty",
                 intrinsicCall("M", parameter("P", "<INSTANCE CLASSNAME=\"C\"><PROPERTY/></INSTANCE>")), 400, notValid,
                 "NAME"},
         Refusal{"TwoPropertyValues",
-                intrinsicCall("M", parameter("P", "<INSTANCE CLASSNAME=\"C\"><PROPERTY NAME=\"A\" TYPE=\"string\">"
-                                                  "<VALUE/><VALUE/></PROPERTY></INSTANCE>")),
+                intrinsicCall("M", parameter("P",
+                                             "<INSTANCE CLASSNAME=\"C\"><PROPERTY NAME=\"A\" TYPE=\"string\">"
+                                             "<VALUE/><VALUE/></PROPERTY></INSTANCE>")),
                 400, notValid, "VALUE"},
         Refusal{"NoProperty", intrinsicCall("M", parameter("P", "<INSTANCE CLASSNAME=\"C\"><B/></INSTANCE>")), 400,
                 notValid, "B"}),
@@ -291,17 +292,16 @@ INSTANTIATE_TEST_SUITE_P(
 
 INSTANTIATE_TEST_SUITE_P(
     NotSupported, RefusedRequest,
-    testing::Values(
-        Refusal{"SeveralRequests",
-                replaced(replaced(good, "<SIMPLEREQ>", "<MULTIREQ><SIMPLEREQ>"), "</SIMPLEREQ>",
-                         "</SIMPLEREQ></MULTIREQ>"),
-                501, "multiple-requests-unsupported", "one request"},
-        Refusal{"CimVersion", replaced(good, "CIMVERSION=\"2.0\"", "CIMVERSION=\"3.0\""), 501,
-                "unsupported-cim-version", "3.0"},
-        Refusal{"DtdVersion", replaced(good, "DTDVERSION=\"2.0\"", "DTDVERSION=\"1.0\""), 501,
-                "unsupported-dtd-version", "1.0"},
-        Refusal{"ProtocolVersion", replaced(good, "PROTOCOLVERSION=\"1.0\"", "PROTOCOLVERSION=\"10.0\""), 501,
-                "unsupported-protocol-version", "10.0"}),
+    testing::Values(Refusal{"SeveralRequests",
+                            replaced(replaced(good, "<SIMPLEREQ>", "<MULTIREQ><SIMPLEREQ>"), "</SIMPLEREQ>",
+                                     "</SIMPLEREQ></MULTIREQ>"),
+                            501, "multiple-requests-unsupported", "one request"},
+                    Refusal{"CimVersion", replaced(good, "CIMVERSION=\"2.0\"", "CIMVERSION=\"3.0\""), 501,
+                            "unsupported-cim-version", "3.0"},
+                    Refusal{"DtdVersion", replaced(good, "DTDVERSION=\"2.0\"", "DTDVERSION=\"1.0\""), 501,
+                            "unsupported-dtd-version", "1.0"},
+                    Refusal{"ProtocolVersion", replaced(good, "PROTOCOLVERSION=\"1.0\"", "PROTOCOLVERSION=\"10.0\""),
+                            501, "unsupported-protocol-version", "10.0"}),
     [](const auto& test) { return test.param.name; });
 
 }  // namespace

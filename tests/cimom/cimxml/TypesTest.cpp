@@ -1,8 +1,8 @@
-#include "cimom/cimxml/Types.h"
-
 #include <gtest/gtest.h>
 
 #include <vector>
+
+#include "cimom/cimxml/Types.h"
 
 namespace Cimom::CimXml {
 namespace {

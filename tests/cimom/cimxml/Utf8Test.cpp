@@ -1,6 +1,6 @@
-#include "cimom/cimxml/Utf8.h"
-
 #include <gtest/gtest.h>
+
+#include "cimom/cimxml/Utf8.h"
 
 namespace Cimom::CimXml {
 namespace {
@@ -23,14 +23,14 @@ TEST(Utf8, ReplacesControlCharacters) {
 TEST(Utf8, ReplacesEveryByteOfWhatIsNoUtf8) {
   EXPECT_EQ(toXmlText("\xFF"), replacement);
   EXPECT_EQ(toXmlText("a\x80"), std::string("a") + replacement);
-  EXPECT_EQ(toXmlText("\xE2\x82"), std::string(replacement) + replacement);          // cut off
-  EXPECT_EQ(toXmlText("\xC0\xAF"), std::string(replacement) + replacement);          // longer than needed
+  EXPECT_EQ(toXmlText("\xE2\x82"), std::string(replacement) + replacement);  // cut off
+  EXPECT_EQ(toXmlText("\xC0\xAF"), std::string(replacement) + replacement);  // longer than needed
   EXPECT_EQ(toXmlText("\xF8\x88\x80\x80"), std::string(replacement) + replacement + replacement + replacement);
-  EXPECT_EQ(toXmlText("\xE2(x"), std::string(replacement) + "(x");                   // the next character stays
+  EXPECT_EQ(toXmlText("\xE2(x"), std::string(replacement) + "(x");  // the next character stays
 }
 
 TEST(Utf8, ReplacesCodePointsThatAreNoCharacters) {
-  EXPECT_EQ(toXmlText("\xEF\xBF\xBE"), replacement);                                          // U+FFFE
+  EXPECT_EQ(toXmlText("\xEF\xBF\xBE"), replacement);                                           // U+FFFE
   EXPECT_EQ(toXmlText("\xED\xA0\x80"), std::string(replacement) + replacement + replacement);  // a surrogate
   EXPECT_EQ(toXmlText("\xF4\x90\x80\x80").substr(0, 3), replacement);                          // beyond U+10FFFF
 }

@@ -1,8 +1,7 @@
-#include "cimom/cimxml/XmlWriter.h"
-
 #include <gtest/gtest.h>
 
 #include "cimom/cimxml/Document.h"
+#include "cimom/cimxml/XmlWriter.h"
 
 namespace Cimom::CimXml {
 namespace {

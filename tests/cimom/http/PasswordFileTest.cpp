@@ -1,8 +1,7 @@
-#include "cimom/http/PasswordFile.h"
-
 #include <gtest/gtest.h>
 
 #include "cimom/http/Listener.h"
+#include "cimom/http/PasswordFile.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace Cimom::Http {

@@ -1,11 +1,10 @@
-#include "cimom/http/Server.h"
-
 #include <gtest/gtest.h>
 
 #include <chrono>
 #include <future>
 #include <thread>
 
+#include "cimom/http/Server.h"
 #include "tests/cimom/http/HttpClient.h"
 
 namespace Cimom::Http {
