@@ -46,6 +46,8 @@ class ObjectPaths : public WithBroker {
     return of(CMPI_boolean, value);
   }
 
+  CMPIObjectPath* ofNull() const { return of(CMPI_string, CMPIValue{}); }
+
   CMPIObjectPath* ofReference(CMPIObjectPath* reference) const {
     CMPIValue value{};
     value.ref = reference;
@@ -112,6 +114,12 @@ TEST_F(ObjectPaths, tellTheTypesOfValuesApart) {
 TEST_F(ObjectPaths, compareBooleans) {
   EXPECT_TRUE(equal(ofBoolean(true), ofBoolean(true)));
   EXPECT_FALSE(equal(ofBoolean(true), ofBoolean(false)));
+}
+
+TEST_F(ObjectPaths, findNullKeysEqualToEachOtherAndToNothingElse) {
+  EXPECT_TRUE(equal(ofNull(), ofNull()));
+  EXPECT_FALSE(equal(ofNull(), ofText("")));
+  EXPECT_FALSE(equal(ofNull(), ofSigned(0)));
 }
 
 TEST_F(ObjectPaths, compareReferencesByClassAndKeys) {

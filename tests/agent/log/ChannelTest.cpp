@@ -1,24 +1,33 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <syslog.h>
 
-#include <atomic>
-#include <cstdlib>
-#include <new>
+#include <algorithm>
+#include <array>
+#include <cstdarg>
+#include <cstdio>
+#include <limits>
+#include <string>
+#include <utility>
+#include <vector>
 
+#include "agent/support/AllocationCount.h"
 #include "agent/support/TemporaryDirectory.h"
 #include "log/Channel.h"
 
 namespace {
-std::atomic<long> allocations = 0;
-}
+std::vector<std::pair<int, std::string>> sentToSyslog;
+}  // namespace
 
-void* operator new(std::size_t size) {
-  ++allocations;
-  if (void* memory = std::malloc(size)) return memory;
-  throw std::bad_alloc();
+// In place of the C library's: what would go to the machine's syslog, which a test must neither need nor fill.
+extern "C" void syslog(int priority, const char* format, ...) {
+  std::array<char, 1024> text{};
+  va_list arguments;
+  va_start(arguments, format);
+  std::vsnprintf(text.data(), text.size(), format, arguments);
+  va_end(arguments);
+  sentToSyslog.emplace_back(priority, text.data());
 }
-void operator delete(void* memory) noexcept { std::free(memory); }
-void operator delete(void* memory, std::size_t) noexcept { std::free(memory); }
 
 namespace TWLog {
 namespace {
@@ -51,9 +60,9 @@ TEST(Channel, letsNothingPassWhereItIsOff) {
 TEST(Channel, refusesAMessageWithoutAnAllocation) {
   const Channel channel({Destination::Stderr, "", 6000, {{"Tarnwick.SomeOtherComponent", 4000}}});
   const std::string component = "Tarnwick.IPConfigAssignmentSettingProvider";
-  const long before = allocations;
+  const long before = allocationCount();
   const bool passed = channel.passes(component, 4000) || channel.passes(component, 3000);
-  EXPECT_EQ(allocations, before);
+  EXPECT_EQ(allocationCount(), before);
   EXPECT_FALSE(passed);
 }
 
@@ -80,12 +89,45 @@ TEST(Channel, saysOnceThatItsFileCannotBeWritten) {
   Channel channel({Destination::File, directory / "none/log", 0, {}});
   const std::string component = "C";
   const std::string text = "x";
+  sentToSyslog.clear();
   testing::internal::CaptureStderr();
   channel.send({"f", "F", 1, component, 6000, text});
   channel.send({"f", "F", 1, component, 6000, text});
   EXPECT_EQ(testing::internal::GetCapturedStderr(), "management agent: the log file " + (directory / "none/log") +
                                                         " cannot be written: No such file or directory; its messages "
                                                         "go to syslog\n");
+  const std::pair lost(LOG_DAEMON | LOG_ERR, std::string("6000 C f (F:1): x"));
+  EXPECT_THAT(sentToSyslog, testing::ElementsAre(testing::_, lost, lost)) << "the notice, then each message";
+}
+
+TEST(Channel, saysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
+  const TemporaryDirectory directory;
+  Channel channel({Destination::File, directory / "later/log", 0, {}});
+  const std::string component = "C";
+  const std::string text = "x";
+  const Message message{"f", "F", 1, component, 6000, text};
+  testing::internal::CaptureStderr();
+  channel.send(message);
+  std::filesystem::create_directory(directory / "later");
+  channel.send(message);
+  std::filesystem::remove_all(directory / "later");
+  channel.send(message);
+  const std::string notices = testing::internal::GetCapturedStderr();
+  EXPECT_EQ(std::count(notices.begin(), notices.end(), '\n'), 2);
+}
+
+TEST(Channel, tellsSyslogTheSeverity) {
+  Channel channel({Destination::Syslog, "", 0, {}});
+  const std::string component = "C";
+  const std::string text = "100 %s";
+  sentToSyslog.clear();
+  for (const int level : {6000, 5999, 5000, 4999, 4000, 3999}) channel.send({"f", "F", 1, component, level, text});
+  EXPECT_THAT(sentToSyslog, testing::ElementsAre(testing::Pair(LOG_DAEMON | LOG_ERR, "6000 C f (F:1): 100 %s"),
+                                                 testing::Pair(LOG_DAEMON | LOG_WARNING, "5999 C f (F:1): 100 %s"),
+                                                 testing::Pair(LOG_DAEMON | LOG_WARNING, testing::_),
+                                                 testing::Pair(LOG_DAEMON | LOG_INFO, "4999 C f (F:1): 100 %s"),
+                                                 testing::Pair(LOG_DAEMON | LOG_INFO, testing::_),
+                                                 testing::Pair(LOG_DAEMON | LOG_DEBUG, "3999 C f (F:1): 100 %s")));
 }
 
 }  // namespace

@@ -3,6 +3,9 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <cstdio>
+#include <cstdlib>
+#include <exception>
 #include <set>
 
 #include "agent/support/TemporaryDirectory.h"
@@ -108,6 +111,32 @@ TEST(StateFile, keepsItsOwner) {
   ASSERT_EQ(::stat((directory / "state").c_str(), &status), 0);
   EXPECT_EQ(status.st_uid, 1234U);
   EXPECT_EQ(status.st_gid, 4321U);
+}
+
+TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
+  if (::geteuid() != 0) GTEST_SKIP() << "only root can become another user";
+  // Given a file of one user, in a directory in which another may write
+  const TemporaryDirectory directory;
+  writeFile(directory / "state", "old");
+  ASSERT_EQ(::chmod((directory / "state").c_str(), 0664), 0);
+  ASSERT_EQ(::chmod(directory.path().c_str(), 0777), 0);
+
+  // When the other changes it
+  const auto change = [&] {
+    if (::setgid(4321) != 0 || ::setuid(1234) != 0) std::exit(2);
+    try {
+      replace(directory / "state", "new");
+    } catch (const std::exception& error) {
+      std::fputs(error.what(), stderr);
+      std::exit(1);
+    }
+    std::exit(0);
+  };
+  EXPECT_EXIT(change(), testing::ExitedWithCode(0), "");
+
+  // Then the new text counts more than the old owner
+  EXPECT_EQ(readFile(directory / "state"), "new");
+  EXPECT_EQ(modeOf(directory / "state"), 0664U);
 }
 
 TEST(StateFile, behindALinkIsReplacedAndTheLinkStays) {
