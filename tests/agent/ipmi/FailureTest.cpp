@@ -104,7 +104,7 @@ TEST(IpmiFailure, OfASessionThatTheBmcForgotIsNotSeen) {
 TEST(IpmiFailure, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
-  bmc.hook("set", "kill -STOP $PPID");
+  bmc.hook("set", "kill -STOP $SIMULATOR");
   IpmiFixture::takeLog();
 
   EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
@@ -121,7 +121,7 @@ TEST(IpmiFailure, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind
 TEST(IpmiFailure, OfABmcThatDiesInMidChangeLeavesTheOutcomeOpen) {
   SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
-  bmc.hook("set", "kill -KILL $PPID; exit 1");
+  bmc.hook("set", "kill -KILL $SIMULATOR");
 
   EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
   bmc.removeHook("set");
@@ -155,8 +155,7 @@ TEST(IpmiFailure, OfTheNetworkForAMomentEndsInAConfirmedChange) {
   settings["session_timeout"] = "0.4";
   IpmiBackEnd backEnd(parseSettings(settings));
   backEnd.read();
-  // The commit's answer is lost with the session, and the network comes back.
-  bmc.hook("set", "touch \"$(dirname \"$0\")/state/committed\"");
+  // The commit's answer is lost with the session; the network comes back.
   wire.cutAtRequest(9);
   std::jthread healer([&](std::stop_token stop) {
     while (!stop.stop_requested() && bmc.stored("ip_addr") != "192.0.2.77") std::this_thread::yield();
@@ -204,14 +203,13 @@ TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrect
   const SimulatedBmc bmc;
   const IpmiFixture::TemporaryDirectory directory;
   const auto file = directory.path() / "password";
-  constexpr auto ownerOnly = std::filesystem::perms::owner_read | std::filesystem::perms::owner_write;
-  IpmiFixture::writeFile(file, "wrong\n", ownerOnly);
+  IpmiFixture::writeFile(file, "wrong\n", IpmiFixture::ownerOnly);
   auto settings = bmc.settings();
   settings["password_file"] = file;
   IpmiBackEnd backEnd(parseSettings(settings));
   EXPECT_THAT([&] { backEnd.read(); }, refusal("refused the password in " + file.string()));
 
-  IpmiFixture::writeFile(file, "test\n", ownerOnly);
+  IpmiFixture::writeFile(file, "test\n", IpmiFixture::ownerOnly);
 
   EXPECT_NO_THROW(backEnd.read());
 }

@@ -1,7 +1,6 @@
 #include "agent/ipmi/SimulatedBmc.h"
 
 #include <signal.h>
-#include <stdlib.h>
 
 #include <fstream>
 #include <sstream>
@@ -11,8 +10,6 @@ namespace IpmiFixture {
 namespace {
 
 namespace fs = std::filesystem;
-
-constexpr auto ownerOnly = fs::perms::owner_read | fs::perms::owner_write;
 
 std::string readFile(const fs::path& path) {
   std::ostringstream content;
@@ -35,19 +32,6 @@ std::string valueOf(const std::string& text, const std::string& label, char sepa
 }
 
 }  // namespace
-
-TemporaryDirectory::TemporaryDirectory() {
-  std::string path = fs::temp_directory_path() / "ipmi-test-XXXXXX";
-  if (!::mkdtemp(path.data())) throw std::runtime_error("no temporary directory");
-  path_ = path;
-}
-
-TemporaryDirectory::~TemporaryDirectory() { fs::remove_all(path_); }
-
-void writeFile(const fs::path& path, const std::string& content, fs::perms permissions) {
-  std::ofstream(path) << content;
-  fs::permissions(path, permissions);
-}
 
 SimulatedBmc::SimulatedBmc(Personality personality) : personality_(personality) {
   writeFile(directory_.path() / "password", "test\n", ownerOnly);
