@@ -4,6 +4,7 @@
 
 #include <chrono>
 
+#include "agent/ipmi/PrivateFile.h"
 #include "agent/ipmi/RecordedLog.h"
 #include "agent/ipmi/SimulatedBmc.h"
 #include "agent/ipmi/UdpRelay.h"
@@ -201,15 +202,15 @@ INSTANTIATE_TEST_SUITE_P(Reasons, IpmiSessionRefused,
 
 TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrected) {
   const SimulatedBmc bmc;
-  const IpmiFixture::TemporaryDirectory directory;
-  const auto file = directory.path() / "password";
-  IpmiFixture::writeFile(file, "wrong\n", IpmiFixture::ownerOnly);
+  const TemporaryDirectory directory;
+  const std::string file = directory / "password";
+  IpmiFixture::writePrivateFile(file, "wrong\n");
   auto settings = bmc.settings();
   settings["password_file"] = file;
   IpmiBackEnd backEnd(parseSettings(settings));
-  EXPECT_THAT([&] { backEnd.read(); }, refusal("refused the password in " + file.string()));
+  EXPECT_THAT([&] { backEnd.read(); }, refusal("refused the password in " + file));
 
-  IpmiFixture::writeFile(file, "test\n", IpmiFixture::ownerOnly);
+  IpmiFixture::writePrivateFile(file, "test\n");
 
   EXPECT_NO_THROW(backEnd.read());
 }

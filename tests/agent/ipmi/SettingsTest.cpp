@@ -1,7 +1,7 @@
 // The [ipmi] section: defaults, forms, and refusals that name key, value and reason.
 #include <gmock/gmock.h>
 
-#include "agent/ipmi/TemporaryDirectory.h"
+#include "agent/ipmi/PrivateFile.h"
 #include "instrumentation/ipmi/IpmiSettings.h"
 #include "instrumentation/ipmi/SecretFile.h"
 
@@ -9,7 +9,7 @@ namespace {
 
 namespace fs = std::filesystem;
 using IpmiFixture::ownerOnly;
-using IpmiFixture::writeFile;
+using IpmiFixture::writePrivateFile;
 using QV::BackEndSettings;
 using QV::Ipmi::ChannelChoice;
 using QV::Ipmi::IpmiSettings;
@@ -26,7 +26,7 @@ using namespace std::chrono_literals;
 
 class IpmiSettingsTest : public testing::Test {
  protected:
-  void SetUp() override { writeFile(password, "secret\n", ownerOnly); }
+  void SetUp() override { writePrivateFile(password, "secret\n"); }
 
   BackEndSettings lan(const BackEndSettings& more = {}) const {
     BackEndSettings section = {
@@ -35,8 +35,8 @@ class IpmiSettingsTest : public testing::Test {
     return section;
   }
 
-  const IpmiFixture::TemporaryDirectory directory;
-  const fs::path password = directory.path() / "password";
+  const TemporaryDirectory directory;
+  const std::string password = directory / "password";
 };
 
 auto refusal(const std::string& setting, const std::string& reason) {
@@ -69,9 +69,9 @@ TEST_F(IpmiSettingsTest, OfALanConnectionHaveSoundDefaults) {
 }
 
 TEST_F(IpmiSettingsTest, TakeEveryKey) {
-  writeFile(directory.path() / "key", "0x0102fF\n", ownerOnly);
+  writePrivateFile(directory / "key", "0x0102fF\n");
   const IpmiSettings settings = parseSettings(lan({{"port", "9623"},
-                                                   {"k_g_file", directory.path() / "key"},
+                                                   {"k_g_file", directory / "key"},
                                                    {"cipher_suite", "3"},
                                                    {"privilege", "operator"},
                                                    {"workarounds", "opensesspriv, authcap"},
@@ -154,15 +154,15 @@ TEST_F(IpmiSettingsTest, KeepTheKeysOfLanOutOfAnInBandConnection) {
 }
 
 TEST_F(IpmiSettingsTest, RefuseSecretsThatAreTooLongOrMalformed) {
-  writeFile(password, "twenty-one characters\n", ownerOnly);
+  writePrivateFile(password, "twenty-one characters\n");
   EXPECT_THAT([&] { parseSettings(lan()); }, refusal("password_file", "at most 20 bytes"));
 
-  writeFile(password, "secret\n", ownerOnly);
+  writePrivateFile(password, "secret\n");
   for (const char* key : {"0x123", "0xgg", "0x", "0x0 01"}) {
-    writeFile(directory.path() / "key", key, ownerOnly);
+    writePrivateFile(directory / "key", key);
     EXPECT_THAT(
         [&] {
-          parseSettings(lan({{"k_g_file", directory.path() / "key"}}));
+          parseSettings(lan({{"k_g_file", directory / "key"}}));
         },
         refusal("k_g_file", "hexadecimal"))
         << key;
@@ -177,13 +177,13 @@ TEST_F(IpmiSettingsTest, RefuseASecretThatOthersMayTouch) {
 }
 
 TEST_F(IpmiSettingsTest, TakeTheFirstLineOfASecretFileAsItIs) {
-  writeFile(password, " with blanks \r\nsecond line", ownerOnly);
+  writePrivateFile(password, " with blanks \r\nsecond line");
   EXPECT_EQ(readSecretFile(password), " with blanks ");
 }
 
 TEST_F(IpmiSettingsTest, RefuseWhatIsNoSecretFile) {
   EXPECT_THAT([&] { readSecretFile(directory.path()); }, ThrowsMessage<std::runtime_error>(HasSubstr("regular file")));
-  writeFile(password, "\n", ownerOnly);
+  writePrivateFile(password, "\n");
   EXPECT_THAT([&] { readSecretFile(password); }, ThrowsMessage<std::runtime_error>(HasSubstr("is empty")));
 }
 

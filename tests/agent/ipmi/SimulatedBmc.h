@@ -8,7 +8,7 @@
 #include <string>
 
 #include "agent/ipmi/Process.h"
-#include "agent/ipmi/TemporaryDirectory.h"
+#include "agent/support/TemporaryDirectory.h"
 #include "instrumentation/BackEnd.h"
 
 namespace IpmiFixture {
