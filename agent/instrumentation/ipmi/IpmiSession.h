@@ -15,8 +15,8 @@ namespace QV::Ipmi {
 // at most a retransmission time-out more.
 class IpmiSession {
  public:
-  // Opens the session. Over LAN that costs `openingRoundTrips` and ends within the session time-out. Throws NotSent in
-  // words that name the processor and what to do.
+  // Opens the session. Over LAN that costs `openingRoundTrips` and ends within the session time-out and two
+  // retransmission time-outs. Throws NotSent in words that name the processor and what to do.
   explicit IpmiSession(const IpmiSettings& settings);
 
   // Throws ConnectionLost where no answer came within the session time-out; the session is of no use any more then.

@@ -64,10 +64,11 @@ void readLan(SettingReader& reader, IpmiSettings& settings) {
 void readTimes(SettingReader& reader, IpmiSettings& settings) {
   using namespace std::chrono_literals;
   reader.seconds("operation_timeout", settings.operationTimeout, 100ms, 60s);
-  // Short enough that a silent processor is told of in its own words before the operation's time is over.
-  settings.sessionTimeout = settings.operationTimeout * 4 / 5;
+  // libfreeipmi sees that the session time-out is over up to two retransmissions late. These defaults leave the time to
+  // say why no session opens before the operation's own is over.
+  settings.sessionTimeout = settings.operationTimeout * 3 / 5;
   reader.seconds("session_timeout", settings.sessionTimeout, 40ms, settings.operationTimeout);
-  settings.retransmissionTimeout = std::min(settings.retransmissionTimeout, settings.sessionTimeout / 4);
+  settings.retransmissionTimeout = std::min(settings.retransmissionTimeout, settings.sessionTimeout / 6);
   reader.seconds("retransmission_timeout", settings.retransmissionTimeout, 10ms, settings.sessionTimeout / 2);
   reader.seconds("cache", settings.cache, 0ms, 60s);
 }

@@ -45,7 +45,7 @@ struct IpmiSettings {
   Ipv6Choice ipv6 = Ipv6Choice::Static;
 
   std::chrono::milliseconds operationTimeout{5000};
-  std::chrono::milliseconds sessionTimeout{4000};
+  std::chrono::milliseconds sessionTimeout{3000};
   std::chrono::milliseconds retransmissionTimeout{500};
   std::chrono::milliseconds cache{1000};
 };

@@ -85,7 +85,7 @@ void ParameterTransaction::write(const std::vector<ParameterWrite>& writes) {
   } catch (const IpmiError& error) {
     throw IpmiError(error.what() + putBack(writes, written));
   }
-  if (held_.contains(channel_)) commit();
+  commit();
 }
 
 void ParameterTransaction::writeOne(const ParameterWrite& write) {
@@ -95,13 +95,15 @@ void ParameterTransaction::writeOne(const ParameterWrite& write) {
                     CompletionCode::describe(response.completionCode));
 }
 
-// Processors that apply at once have the earlier values again; those that apply on commit hold them for the next one.
+// The commit matters on processors that stage their writes too: what is staged and left would go out with the next
+// client's commit.
 std::string ParameterTransaction::putBack(const std::vector<ParameterWrite>& writes, std::size_t count) noexcept try {
   transport_.beginCleanup();
   while (count-- > 0) {
     const ParameterWrite& write = writes[count];
     if (write.previous) writeOne({write.parameter, *write.previous, write.value});
   }
+  commit();
   return "; nothing was changed";
 } catch (const IpmiError& error) {
   return std::string("; what was written before could not be put back: ") + error.what();
@@ -109,6 +111,7 @@ std::string ParameterTransaction::putBack(const std::vector<ParameterWrite>& wri
 
 // Whether a processor applies on commit, at once or only at the end is its own; reading back tells.
 void ParameterTransaction::commit() {
+  if (!held_.contains(channel_)) return;
   const IpmiResponse response = setProgress(transport_, channel_, SetProgress::CommitWrite, Repetition::Forbidden);
   if (response.completionCode != CompletionCode::done)
     trace(nameOf(channel_) + " does not commit: " + CompletionCode::describe(response.completionCode));

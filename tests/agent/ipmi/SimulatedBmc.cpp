@@ -1,24 +1,16 @@
 #include "agent/ipmi/SimulatedBmc.h"
 
 #include <signal.h>
-#include <stdlib.h>
 
-#include <fstream>
 #include <sstream>
 #include <stdexcept>
+
+#include "agent/ipmi/PrivateFile.h"
 
 namespace IpmiFixture {
 namespace {
 
 namespace fs = std::filesystem;
-
-constexpr auto ownerOnly = fs::perms::owner_read | fs::perms::owner_write;
-
-std::string readFile(const fs::path& path) {
-  std::ostringstream content;
-  content << std::ifstream(path).rdbuf();
-  return content.str();
-}
 
 // The value of "label<blanks>separator<blanks>value".
 std::string valueOf(const std::string& text, const std::string& label, char separator) {
@@ -36,21 +28,8 @@ std::string valueOf(const std::string& text, const std::string& label, char sepa
 
 }  // namespace
 
-TemporaryDirectory::TemporaryDirectory() {
-  std::string path = fs::temp_directory_path() / "ipmi-test-XXXXXX";
-  if (!::mkdtemp(path.data())) throw std::runtime_error("no temporary directory");
-  path_ = path;
-}
-
-TemporaryDirectory::~TemporaryDirectory() { fs::remove_all(path_); }
-
-void writeFile(const fs::path& path, const std::string& content, fs::perms permissions) {
-  std::ofstream(path) << content;
-  fs::permissions(path, permissions);
-}
-
 SimulatedBmc::SimulatedBmc(Personality personality) : personality_(personality) {
-  writeFile(directory_.path() / "password", "test\n", ownerOnly);
+  writePrivateFile(directory_ / "password", "test\n");
   start();
 }
 
@@ -73,7 +52,7 @@ QV::BackEndSettings SimulatedBmc::settings(std::uint16_t port) const {
           {"host", "127.0.0.1"},
           {"port", std::to_string(port != 0 ? port : port_)},
           {"user", "admin"},
-          {"password_file", directory_.path() / "password"},
+          {"password_file", directory_ / "password"},
           {"cipher_suite", "3"},
           {"workarounds", "opensesspriv"},
           {"cache", "0"}};
@@ -91,19 +70,20 @@ std::string SimulatedBmc::witness(const std::string& label) const {
 }
 
 void SimulatedBmc::hook(const std::string& step, const std::string& script) const {
-  const fs::path path = directory_.path() / ("on-" + step);
+  const std::string path = directory_ / ("on-" + step);
   // Renamed into its place: the simulator may be about to run it.
-  writeFile(path.string() + ".new", "#!/bin/sh\n" + script + '\n', fs::perms::owner_all);
-  fs::rename(path.string() + ".new", path);
+  writeFile(path + ".new", "#!/bin/sh\n" + script + '\n');
+  fs::permissions(path + ".new", fs::perms::owner_all);
+  fs::rename(path + ".new", path);
 }
 
-void SimulatedBmc::removeHook(const std::string& step) const { fs::remove(directory_.path() / ("on-" + step)); }
+void SimulatedBmc::removeHook(const std::string& step) const { fs::remove(directory_ / ("on-" + step)); }
 
 std::string SimulatedBmc::stored(const std::string& key) const {
-  return valueOf(readFile(directory_.path() / "lan.state"), key, '=');
+  return valueOf(readFile(directory_ / "lan.state"), key, '=');
 }
 
-pid_t SimulatedBmc::simulator() const { return std::stoi(readFile(directory_.path() / "pid")); }
+pid_t SimulatedBmc::simulator() const { return std::stoi(readFile(directory_ / "pid")); }
 
 void SimulatedBmc::halt() const { ::kill(simulator(), SIGSTOP); }
 void SimulatedBmc::resume() const { ::kill(simulator(), SIGCONT); }

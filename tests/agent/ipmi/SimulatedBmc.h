@@ -4,29 +4,14 @@
 #include <sys/types.h>
 
 #include <cstdint>
-#include <filesystem>
 #include <memory>
 #include <string>
 
 #include "agent/ipmi/Process.h"
+#include "agent/support/TemporaryDirectory.h"
 #include "instrumentation/BackEnd.h"
 
 namespace IpmiFixture {
-
-// A directory of the test's own, gone with it.
-class TemporaryDirectory {
- public:
-  TemporaryDirectory();
-  ~TemporaryDirectory();
-  TemporaryDirectory(const TemporaryDirectory&) = delete;
-  TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
-  const std::filesystem::path& path() const { return path_; }
-
- private:
-  std::filesystem::path path_;
-};
-
-void writeFile(const std::filesystem::path& path, const std::string& content, std::filesystem::perms permissions);
 
 class SimulatedBmc {
  public:
@@ -47,7 +32,7 @@ class SimulatedBmc {
   std::string ipmitool(const std::vector<std::string>& command) const;
 
   // A shell script that runs before the simulator gets, sets or checks a LAN parameter ("get", "set", "check"); where
-  // it fails, so does the simulator's step. $PPID is the simulator. Works with Personality::AppliesOnCommit.
+  // it fails, so does the simulator's step. $SIMULATOR is its process. Works with Personality::AppliesOnCommit.
   void hook(const std::string& step, const std::string& script) const;
   void removeHook(const std::string& step) const;
 
