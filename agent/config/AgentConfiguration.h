@@ -1,0 +1,41 @@
+// The agent's configuration, agent.ini: what every library of the agent reads on its first use.
+#pragma once
+
+#include <istream>
+#include <map>
+#include <string>
+
+namespace QV {
+
+// One of the two message channels, [log] and [trace].
+struct ChannelSettings {
+  enum class Destination { Off, Syslog, Stderr, File };
+
+  Destination destination = Destination::Off;
+  std::string file;                                // absolute; named where the destination is File
+  int threshold = 0;                               // the least level that passes
+  std::map<std::string, int> componentThresholds;  // overrides `threshold` for the components that it names
+};
+
+struct AgentConfiguration {
+  enum class BackEndKind { Simulated, Ipmi };
+
+  std::string systemName;  // empty: the host name
+  ChannelSettings log{ChannelSettings::Destination::Syslog, {}, 6000, {}};
+  ChannelSettings trace{ChannelSettings::Destination::Off, {}, 4000, {}};
+  BackEndKind backEnd = BackEndKind::Simulated;
+  std::string processorName;         // empty: what the processor itself says
+  std::string processorDescription;  // empty: what the processor itself says
+  std::string simulatedState = "/var/lib/compositeipconfig/management-processor.json";
+  std::map<std::string, std::string> ipmi;  // [ipmi] as it stands: its keys are the IPMI back end's
+};
+
+// The configuration that is in force: the file that the environment variable QV_AGENT_INI names, which must be there;
+// without it the installed agent.ini, whose absence means the defaults. Throws std::runtime_error in words that name
+// the file, the line and what is wrong with it.
+AgentConfiguration readAgentConfiguration();
+
+// The configuration that a text in agent.ini's form tells. `fileName` is for the messages.
+AgentConfiguration parseAgentConfiguration(std::istream& text, const std::string& fileName);
+
+}  // namespace QV

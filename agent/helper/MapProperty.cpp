@@ -1,0 +1,40 @@
+#include <cmpimacs.h>
+
+#include <optional>
+
+#include "QV/ProviderHelper.h"
+#include "helper/Conversion.h"
+
+namespace QV {
+namespace {
+
+// The datum under the wanted type, as setProperty takes it: CMPI_chars is itself the pointer, all else is pointed at.
+CMPIStatus set(CMPIInstance* target, const char* name, DataType type, const CMPIData& data) {
+  const auto integer = integerOf(data);
+  const auto text = textOf(data);
+  if (type == String && text) return CMSetProperty(target, name, text->c_str(), CMPI_chars);
+  CMPIValue value{};
+  if (type == Uint16 && integer && integer->fits<CMPIUint16>()) {
+    value.uint16 = static_cast<CMPIUint16>(integer->bits);
+    return CMSetProperty(target, name, &value, CMPI_uint16);
+  }
+  if (type == Uint8 && integer && integer->fits<CMPIUint8>()) {
+    value.uint8 = static_cast<CMPIUint8>(integer->bits);
+    return CMSetProperty(target, name, &value, CMPI_uint8);
+  }
+  return {CMPI_RC_ERR_TYPE_MISMATCH, nullptr};
+}
+
+}  // namespace
+
+void mapProperty(CMPIData source, CMPIInstance* target, const char* name, DataType type, CMPIStatus* status) {
+  if (CMIsNullValue(source) || source.type != CMPI_instance || CMIsNullObject(source.value.inst)) return;
+  if (CMIsNullObject(target) || !name) return;
+  CMPIStatus outcome{CMPI_RC_OK, nullptr};
+  const CMPIData data = CMGetProperty(source.value.inst, name, &outcome);
+  const bool present = outcome.rc == CMPI_RC_OK && !CMIsNullValue(data);
+  if (present) outcome = set(target, name, type, data);
+  if (status) *status = outcome;
+}
+
+}  // namespace QV

@@ -1,0 +1,31 @@
+// A file that is always one whole text, the old or the new one, whatever happens to its writers.
+#pragma once
+
+#include <filesystem>
+#include <functional>
+#include <optional>
+#include <string>
+
+namespace QV {
+
+class StateFile {
+ public:
+  // `path` may be a symbolic link: its target, as it is at each use, is what is read and replaced.
+  explicit StateFile(std::filesystem::path path) : path_(std::move(path)) {}
+
+  const std::filesystem::path& path() const { return path_; }
+
+  // The text; nothing where there is no file. Throws std::runtime_error where it cannot be read.
+  std::optional<std::string> read() const;
+
+  // Replaces the text by what `edit` makes of the current one, alone among all processes (the lock is the file's name
+  // with ".lock" after it); a missing directory is made. What `edit` throws passes through, and the file stays. Returns
+  // when the new text is on the disk; a new file is for its owner and group, an existing one keeps mode and owner.
+  // Throws std::runtime_error where it cannot be written; the file is then the old one.
+  void update(const std::function<std::string(const std::optional<std::string>& current)>& edit) const;
+
+ private:
+  std::filesystem::path path_;
+};
+
+}  // namespace QV

@@ -1,0 +1,67 @@
+#include "TWLog/TWLog.h"
+
+#include <exception>
+#include <utility>
+
+#include "log/Channel.h"
+
+namespace TWLog {
+namespace {
+
+// Both channels as agent.ini has them, read with the first message. A broken file is reported once, and the defaults
+// hold: a provider must not fail for its log's sake.
+struct Channels {
+  explicit Channels(const QV::AgentConfiguration& configuration) : log(configuration.log), trace(configuration.trace) {}
+
+  static Channels& instance() {
+    static Channels channels(configuration());
+    return channels;
+  }
+
+  Channel log;
+  Channel trace;
+
+ private:
+  static QV::AgentConfiguration configuration() {
+    try {
+      return QV::readAgentConfiguration();
+    } catch (const std::exception& error) {
+      notify(std::string(error.what()) + "; logging with the defaults");
+      return {};
+    }
+  }
+};
+
+void sendWherePassed(Channel Channels::*channel, const Message& message) noexcept {
+  try {
+    Channel& chosen = Channels::instance().*channel;
+    if (chosen.passes(message.component, message.level)) chosen.send(message);
+  } catch (const std::exception&) {
+    // Out of memory: the message is lost, the request that it tells of is not.
+  }
+}
+
+}  // namespace
+
+TWMessageBuffer::TWMessageBuffer() = default;
+
+TWMessageBuffer::~TWMessageBuffer() = default;
+
+TWMessageBuffer& TWMessageBuffer::operator<<(const char* text) {
+  if (text) text_ += text;
+  return *this;
+}
+
+std::string str(TWMessageBuffer& buffer) { return std::exchange(buffer.text_, {}); }
+
+void TWLogger::logLevelMessage(const char* function, const char* file, int line, const std::string& component,
+                               int level, char*, int, int, const std::string& message) {
+  sendWherePassed(&Channels::log, {function, file, line, component, level, message});
+}
+
+void TWLogger::traceLevelMessage(const char* function, const char* file, int line, const std::string& component,
+                                 int level, char*, int, int, const std::string& message) {
+  sendWherePassed(&Channels::trace, {function, file, line, component, level, message});
+}
+
+}  // namespace TWLog

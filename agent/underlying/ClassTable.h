@@ -1,0 +1,24 @@
+// The underlying classes: what each is called, what names an instance, what makes its instances.
+#pragma once
+
+#include <array>
+
+#include "underlying/InstanceBuilders.h"
+
+namespace QV {
+
+struct UnderlyingClass {
+  const char* name;
+  std::array<const char*, 5> keys;  // ends with a null, as an object manager takes it
+  Instances (*build)(const System& system);
+  bool ofHostToo;  // whether the host's instances are shown beside the management processor's
+};
+
+// The class of that name, letters without regard to case; null where there is none.
+const UnderlyingClass* findUnderlyingClass(const char* name);
+
+// All instances of a class: those of the management processor, then those of the host where the class shows them.
+// Throws what reading the processor throws.
+Instances readInstances(const UnderlyingClass& underlyingClass);
+
+}  // namespace QV

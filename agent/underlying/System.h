@@ -1,0 +1,16 @@
+// A computer system whose IP configuration the underlying classes show.
+#pragma once
+
+#include <string>
+
+#include "instrumentation/ManagementProcessor.h"
+
+namespace QV {
+
+struct System {
+  std::string creationClassName;  // the CIM class of the system, by which its parts refer to it
+  std::string settingPrefix;      // the first field of its settings' InstanceIDs
+  ManagementProcessor configuration;
+};
+
+}  // namespace QV

@@ -1,0 +1,26 @@
+// How composite instances are read and made, for every row of CompositeClass.h.
+#pragma once
+
+#include <cmpidt.h>
+
+#include <vector>
+
+#include "CompositeClass.h"
+
+namespace QV::IPConfigComposite {
+
+// What the request says about the instances to make; see IPConfigObjectFactory for the meaning of each.
+struct Request {
+  const CMPIBroker* broker;
+  const CMPIObjectPath* ref;
+  const char** properties;
+  bool noFilter;
+  CMPIStatus* status;
+};
+
+// The getAll and the make member of a class.
+int readComposites(const CompositeClass& row, const Request& request, const CMPIContext* ctx, const char* className,
+                   std::vector<CMPIInstance*>& out);
+CMPIInstance* makeComposite(const CompositeClass& row, const Request& request);
+
+}  // namespace QV::IPConfigComposite

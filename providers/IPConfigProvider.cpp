@@ -1,0 +1,25 @@
+// Serves the management processor's computer system.
+#include "InstanceOperations.h"
+#include "ProviderUnit.h"
+
+namespace QV::IPConfigComposite {
+
+namespace {
+
+const CMPIBroker* broker = nullptr;
+const std::string loggerIPConfigProvider = "Tarnwick.IPConfigProvider";
+
+const InstanceUnit unit = {
+    .component = loggerIPConfigProvider,
+    .file = "IPConfigProvider",
+    .getAll = &IPConfigObjectFactory::getAllSPComputerCMPIInstances,
+};
+
+}  // namespace
+
+IPCONFIG_INSTANCE_OPERATIONS(CompositeIPConfig_)
+IPCONFIG_MODIFY_STUB(CompositeIPConfig_)
+
+CMInstanceMIStub(CompositeIPConfig_, CompositeIPConfigProvider, broker, CMNoHook)
+
+}  // namespace QV::IPConfigComposite

@@ -1,0 +1,37 @@
+#include <IPConfigObjectFactory.h>
+#include <gtest/gtest.h>
+
+namespace {
+
+using QV::IPConfigComposite::IPConfigObjectFactory;
+using Tokens = std::vector<std::string>;
+
+Tokens tokensOf(const std::string& text, const std::string& delimiters = ":") {
+  Tokens tokens;
+  IPConfigObjectFactory().Tokenize(text, tokens, delimiters);
+  return tokens;
+}
+
+TEST(Tokenize, SplitsAtEveryDelimiter) { EXPECT_EQ(tokensOf("BMC:eth0:static"), (Tokens{"BMC", "eth0", "static"})); }
+
+TEST(Tokenize, ATextWithoutDelimitersIsOnePiece) { EXPECT_EQ(tokensOf("BMC"), Tokens{"BMC"}); }
+
+TEST(Tokenize, EmptyPiecesVanish) {
+  EXPECT_EQ(tokensOf("BMC::a:"), (Tokens{"BMC", "a"}));
+  EXPECT_EQ(tokensOf(":BMC:a"), (Tokens{"BMC", "a"}));
+  EXPECT_EQ(tokensOf(":::"), Tokens{});
+  EXPECT_EQ(tokensOf(""), Tokens{});
+}
+
+TEST(Tokenize, TheDelimitersAreASetOfCharacters) {
+  EXPECT_EQ(tokensOf("a:b;c", ":;"), (Tokens{"a", "b", "c"}));
+  EXPECT_EQ(tokensOf("a:;b", ":;"), (Tokens{"a", "b"}));
+}
+
+TEST(Tokenize, AppendsToWhatIsThere) {
+  Tokens tokens = {"first"};
+  IPConfigObjectFactory().Tokenize("a:b", tokens, ":");
+  EXPECT_EQ(tokens, (Tokens{"first", "a", "b"}));
+}
+
+}  // namespace

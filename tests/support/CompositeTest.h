@@ -1,0 +1,65 @@
+// The ground that the library's tests stand on: its own objects in front of the embedded object manager's real broker,
+// with the product's schema, scripted underlying instances, and every line, call and result recorded.
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <utility>
+#include <variant>
+#include <vector>
+
+#include "Faults.h"
+#include "RecordingLog.h"
+#include "ScriptedInstrumentation.h"
+#include "cimom/ObjectManager.h"
+#include "cimom/broker/RequestScope.h"
+
+namespace Testing {
+
+inline constexpr const char* requestNameSpace = "root/cimv2";
+
+using PropertyValue = std::variant<std::string, CMPIUint16, CMPIUint8, std::vector<CMPIUint16>>;
+using Properties = std::vector<std::pair<std::string, PropertyValue>>;
+
+class CompositeTest : public ::testing::Test {
+ private:
+  Cimom::RequestScope scope_;
+
+ protected:
+  CompositeTest();
+
+  const CMPIBroker* broker() const { return faults.broker(); }
+  CMPIContext* context() { return scope_.context(); }
+
+  // Adds an instance to what the enumeration of an underlying class answers, and returns it.
+  CMPIInstance* addUnderlying(const std::string& className, const Properties& properties);
+  // An instance of any class in any namespace, made by the real broker.
+  CMPIInstance* makeInstance(const std::string& nameSpace, const std::string& className, const Properties& properties);
+  // A request's object path with string keys.
+  CMPIObjectPath* makePath(const std::string& className,
+                           const std::vector<std::pair<std::string, std::string>>& keys = {});
+
+  // How often a class was enumerated by an up-call.
+  int upCallsFor(const std::string& className) const;
+
+  FaultyBroker faults;
+  CMPIStatus status = {CMPI_RC_OK, nullptr};
+};
+
+// What a test asks of an object that came back; absent and null values read as "(none)".
+std::string text(const CMPIString* string);
+std::string text(const CMPIInstance* instance, const std::string& property);
+std::string key(const CMPIObjectPath* path, const std::string& name);
+const CMPIObjectPath* reference(const CMPIInstance* instance, const std::string& property);
+int number(const CMPIInstance* instance, const std::string& property);  // -1 where there is none
+bool hasProperty(const CMPIInstance* instance, const std::string& property);
+const CMPIObjectPath* pathOf(const CMPIInstance* instance);
+std::string classOf(const CMPIObjectPath* path);
+std::string nameSpaceOf(const CMPIObjectPath* path);
+std::string hostOf(const CMPIObjectPath* path);
+
+// The name that the agent gives the managed system while the tests run.
+std::string systemName();
+
+}  // namespace Testing

@@ -1,0 +1,75 @@
+#include "RecordingLog.h"
+
+#include <TWLog/TWLog.h>
+#include <gtest/gtest.h>
+
+#include <utility>
+
+namespace Testing {
+
+std::vector<LogLine>& logLines() {
+  static std::vector<LogLine> lines;
+  return lines;
+}
+
+std::vector<std::string> messages(Channel channel) {
+  std::vector<std::string> result;
+  for (const LogLine& line : logLines()) {
+    if (line.channel == channel) {
+      result.push_back(line.message);
+    }
+  }
+  return result;
+}
+
+std::vector<std::string> messagesWith(const std::string& prefix) {
+  std::vector<std::string> result;
+  for (const std::string& message : messages()) {
+    if (message.starts_with(prefix)) {
+      result.push_back(message);
+    }
+  }
+  return result;
+}
+
+LogLine lineWith(const std::string& message) {
+  for (const LogLine& line : logLines()) {
+    if (line.channel == Channel::Log && line.message == message) {
+      return line;
+    }
+  }
+  ADD_FAILURE() << "no line in the log says: " << message;
+  return {};
+}
+
+}  // namespace Testing
+
+namespace TWLog {
+
+TWMessageBuffer::TWMessageBuffer() = default;
+TWMessageBuffer::~TWMessageBuffer() = default;
+
+TWMessageBuffer& TWMessageBuffer::operator<<(const char* text) {
+  text_ += text;
+  return *this;
+}
+
+std::string str(TWMessageBuffer& buffer) { return std::exchange(buffer.text_, {}); }
+
+void TWLogger::logLevelMessage(const char* function, const char* file, int line, const std::string& component,
+                               int level, char* text, int first, int second, const std::string& message) {
+  EXPECT_EQ(text, nullptr);
+  EXPECT_EQ(first, 0);
+  EXPECT_EQ(second, 0);
+  Testing::logLines().push_back({Testing::Channel::Log, function, file, line, component, level, message});
+}
+
+void TWLogger::traceLevelMessage(const char* function, const char* file, int line, const std::string& component,
+                                 int level, char* text, int first, int second, const std::string& message) {
+  EXPECT_EQ(text, nullptr);
+  EXPECT_EQ(first, 0);
+  EXPECT_EQ(second, 0);
+  Testing::logLines().push_back({Testing::Channel::Trace, function, file, line, component, level, message});
+}
+
+}  // namespace TWLog

@@ -1,0 +1,33 @@
+// Stands in for the agent's logging library: keeps every line that reaches either channel, in order.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+enum class Channel { Log, Trace };
+
+struct LogLine {
+  Channel channel;
+  std::string function;
+  std::string file;
+  int line;
+  std::string component;
+  int level;
+  std::string message;
+};
+
+// Everything sent since the last clear.
+std::vector<LogLine>& logLines();
+
+// The messages of one channel, in order.
+std::vector<std::string> messages(Channel channel = Channel::Log);
+
+// The messages of the log that begin with a prefix, in order.
+std::vector<std::string> messagesWith(const std::string& prefix);
+
+// The first line of the log with that message; fails the running test and yields an empty line where there is none.
+LogLine lineWith(const std::string& message);
+
+}  // namespace Testing

@@ -1,0 +1,146 @@
+// The trace and log frame: every operation of every provider and every member of the factory reports through it, so
+// that an administrator can follow a request line by line in the agent's log and trace.
+//
+// A line is formatted into one of two static buffers that all callers share without a lock: a line costs no allocation
+// for its text, and threads that trace at the same moment may garble each other's diagnostic text, nothing else.
+#pragma once
+
+#include <TWLog/TWLog.h>
+
+#include <cstdio>
+#include <cstring>
+#include <string>
+
+namespace QV {
+
+enum MessageType : int {
+  EntryMessage = 0,
+  ExitMessage = 1,
+  MethodInvokedMessage = 2,
+  FreeMessage = 3,
+};
+
+// Levels of the agent's log: progress, and failures that the library noticed.
+inline constexpr int progressLevel = 4000;
+inline constexpr int failureLevel = 6000;
+
+namespace TraceDetail {
+
+constexpr std::size_t bufferSize = 512;
+
+inline const char* orEmpty(const char* text) { return text != nullptr ? text : ""; }
+
+}  // namespace TraceDetail
+
+// Formats a line about a function (`text` is its name) or, as FreeMessage, a message (`text` is the message). A type
+// that is none of the four yields the empty text; a line longer than 511 characters is cut. The result is valid until
+// the next call of this overload anywhere in the library.
+inline char* trace(const char* file, const char* text, unsigned int line, MessageType type) {
+  static char messageBuffer[TraceDetail::bufferSize];
+  std::memset(messageBuffer, 0, sizeof messageBuffer);
+  file = TraceDetail::orEmpty(file);
+  text = TraceDetail::orEmpty(text);
+  const int lineNumber = static_cast<int>(line);
+  switch (type) {
+    case EntryMessage:
+      std::snprintf(messageBuffer, sizeof messageBuffer, "ENTERING: %s() in %s [Line: %d]", text, file, lineNumber);
+      break;
+    case ExitMessage:
+      std::snprintf(messageBuffer, sizeof messageBuffer, "EXITING: %s() in %s [Line: %d]", text, file, lineNumber);
+      break;
+    case MethodInvokedMessage:
+      std::snprintf(messageBuffer, sizeof messageBuffer, "METHOD: %s() was invoked in %s [Line: %d]", text, file,
+                    lineNumber);
+      break;
+    case FreeMessage:
+      std::snprintf(messageBuffer, sizeof messageBuffer, "MESSAGE [File: %s, Line: %d]: %s", file, lineNumber, text);
+      break;
+  }
+  return messageBuffer;
+}
+
+// Formats a line about a variable. The result is valid until the next call of this overload anywhere in the library.
+inline char* trace(const char* name, const char* file, unsigned int line, const char* value) {
+  static char messageBuffer[TraceDetail::bufferSize];
+  std::memset(messageBuffer, 0, sizeof messageBuffer);
+  std::snprintf(messageBuffer, sizeof messageBuffer, "VARIABLE: '%s' has Value '%s' at line %d in %s",
+                TraceDetail::orEmpty(name), TraceDetail::orEmpty(value), static_cast<int>(line),
+                TraceDetail::orEmpty(file));
+  return messageBuffer;
+}
+
+namespace TraceDetail {
+
+// Sends a line to the log, then to the trace. It is formatted anew for the second channel: the shared buffer may have
+// been used in between.
+template <typename Format>
+void send(const std::string& component, int level, const char* function, const char* file, unsigned int line,
+          Format format) {
+  TWLog::TWMessageBuffer buffer;
+  const int lineNumber = static_cast<int>(line);
+  buffer << format();
+  TWLog::TWLogger::logLevelMessage(function, file, lineNumber, component, level, nullptr, 0, 0, TWLog::str(buffer));
+  buffer << format();
+  TWLog::TWLogger::traceLevelMessage(function, file, lineNumber, component, level, nullptr, 0, 0, TWLog::str(buffer));
+}
+
+constexpr const char* rule = "==============================================================================";
+static_assert(std::char_traits<char>::length(rule) == 78);
+
+constexpr const char* frameFile = "Trace.h";
+
+}  // namespace TraceDetail
+
+// Opens the frame of a provider operation: the rule, then the operation's ENTERING line. The text names the operation;
+// the location that the logger sees is the frame's own, with the source lines that readers of the log filter on.
+inline void markProviderEntry(const std::string& component, const char* file, const char* function, unsigned int line) {
+  TraceDetail::send(component, progressLevel, "markProviderEntry", TraceDetail::frameFile, 336,
+                    [] { return TraceDetail::rule; });
+  TraceDetail::send(component, progressLevel, "markProviderEntry", TraceDetail::frameFile, 337,
+                    [=] { return trace(file, function, line, EntryMessage); });
+}
+
+// Closes the frame: the operation's EXITING line, then the rule.
+inline void markProviderExit(const std::string& component, const char* file, const char* function, unsigned int line) {
+  TraceDetail::send(component, progressLevel, "markProviderExit", TraceDetail::frameFile, 348,
+                    [=] { return trace(file, function, line, ExitMessage); });
+  TraceDetail::send(component, progressLevel, "markProviderExit", TraceDetail::frameFile, 349,
+                    [] { return TraceDetail::rule; });
+}
+
+// What one function reports under: its unit's component and source file and its own name. The component must outlive
+// the frame. Lines default to the caller's.
+class Frame {
+ public:
+  Frame(const std::string& component, const char* file, const char* function)
+      : component_(component), file_(file), function_(function) {}
+
+  void markEntry(unsigned int line = __builtin_LINE()) const { markProviderEntry(component_, file_, function_, line); }
+  void markExit(unsigned int line = __builtin_LINE()) const { markProviderExit(component_, file_, function_, line); }
+
+  void entering(unsigned int line = __builtin_LINE()) const { message(function_, line, EntryMessage, progressLevel); }
+  void exiting(unsigned int line = __builtin_LINE()) const { message(function_, line, ExitMessage, progressLevel); }
+
+  void progress(const char* text, unsigned int line = __builtin_LINE()) const {
+    message(text, line, FreeMessage, progressLevel);
+  }
+  void failure(const char* text, unsigned int line = __builtin_LINE()) const {
+    message(text, line, FreeMessage, failureLevel);
+  }
+
+  void variable(const char* name, const char* value, unsigned int line = __builtin_LINE()) const {
+    TraceDetail::send(component_, progressLevel, function_, file_, line,
+                      [&] { return trace(name, file_, line, value); });
+  }
+
+ private:
+  void message(const char* text, unsigned int line, MessageType type, int level) const {
+    TraceDetail::send(component_, level, function_, file_, line, [&] { return trace(file_, text, line, type); });
+  }
+
+  const std::string& component_;
+  const char* file_;
+  const char* function_;
+};
+
+}  // namespace QV
