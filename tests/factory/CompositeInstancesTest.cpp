@@ -1,6 +1,8 @@
 // The factory's read pairs, for all six composite classes.
 #include <IPConfigObjectFactory.h>
 
+#include <ostream>
+
 #include "support/Samples.h"
 
 namespace {
@@ -16,6 +18,8 @@ struct Pair {
   GetAll getAll;
   Make make;
 };
+
+void PrintTo(const Pair& pair, std::ostream* stream) { *stream << pair.className; }
 
 #define PAIR(className, getAll, make) \
   { className, &IPConfigObjectFactory::getAll, &IPConfigObjectFactory::make }

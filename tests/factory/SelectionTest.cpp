@@ -1,6 +1,8 @@
 // Which underlying instances belong to the management processor.
 #include <IPConfigObjectFactory.h>
 
+#include <ostream>
+
 #include "support/Samples.h"
 
 namespace {
@@ -63,6 +65,8 @@ struct Identifier {
   const char* text;
   std::size_t asSequence, asSetting;
 };
+
+void PrintTo(const Identifier& identifier, std::ostream* stream) { *stream << identifier.text; }
 
 class IdentifierTest : public SelectionTest, public ::testing::WithParamInterface<Identifier> {};
 

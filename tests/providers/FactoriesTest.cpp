@@ -29,10 +29,11 @@ TEST_P(FactoriesTest, TheInstanceTableCarriesVersionNameAndAllOperations) {
   EXPECT_NE(mi->ft->execQuery, nullptr);
 }
 
-TEST_P(FactoriesTest, TheAssociationTableCarriesVersionNameAndAllOperations) {
-  if (GetParam().createAssociationMI == nullptr) {
-    GTEST_SKIP() << "serves no association";
-  }
+class AssociationFactoriesTest : public FactoriesTest {};
+
+INSTANTIATE_TEST_SUITE_P(Six, AssociationFactoriesTest, ::testing::ValuesIn(associationUnits()), nameOf);
+
+TEST_P(AssociationFactoriesTest, TheAssociationTableCarriesVersionNameAndAllOperations) {
   CMPIAssociationMI* const mi = GetParam().createAssociationMI(broker(), context(), &status);
   ASSERT_NE(mi, nullptr);
   EXPECT_EQ(mi->hdl, nullptr);
@@ -99,10 +100,7 @@ TEST_P(FactoriesTest, CleanupAlwaysAgreesToUnload) {
   EXPECT_TRUE(logLines().empty());
 }
 
-TEST_P(FactoriesTest, TheLastBrokerOfAUnitServesBothOfItsInterfaces) {
-  if (GetParam().createAssociationMI == nullptr) {
-    GTEST_SKIP() << "serves no association";
-  }
+TEST_P(AssociationFactoriesTest, TheLastBrokerOfAUnitServesBothOfItsInterfaces) {
   CMPIInstanceMI* const mi = GetParam().createInstanceMI(faults.real(), context(), &status);
   GetParam().createAssociationMI(broker(), context(), &status);
   RecordingResult result;

@@ -97,22 +97,8 @@ TEST_F(ModifyOperationTest, TheEntryIsFramedTracesBothPathsAndMarksNoExit) {
 TEST_F(ModifyOperationTest, AMissingPropertyIsNotWrittenAndItsCodeIsTheAnswerOnlyWhenReadLast) {
   CMPIInstance* const instance = makeInstance(requestNameSpace, endpointClass, {{"IPv4Address", "192.0.2.7"}});
   // As object managers answer that know no such property.
-  struct Missing {
-    static CMPIData get(const CMPIInstance* asked, const char* name, CMPIStatus* rc) {
-      if (std::string(name) == "SubnetMask") {
-        *rc = {CMPI_RC_ERR_NO_SUCH_PROPERTY, nullptr};
-        return {CMPI_null, CMPI_nullValue | CMPI_notFound, {}};
-      }
-      return table->getProperty(asked, name, rc);
-    }
-    static inline CMPIInstanceFT* table = nullptr;
-  };
-  Missing::table = instance->ft;
-  CMPIInstanceFT altered = *instance->ft;
-  altered.getProperty = Missing::get;
-  instance->ft = &altered;
+  withProperty(instance, "SubnetMask", {CMPI_null, CMPI_nullValue | CMPI_notFound, {}}, CMPI_RC_ERR_NO_SUCH_PROPERTY);
   const CMPIStatus answer = modify(endpointClass, endpointPath("eth0"), instance);
-  instance->ft = Missing::table;
   EXPECT_EQ(answer.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
   EXPECT_EQ(answer.msg, nullptr);
   EXPECT_EQ(result.order, Calls{"done"});

@@ -135,7 +135,7 @@ namespace {
 struct Alteration {
   CMPIInstanceFT table;
   CMPIInstanceFT* original;
-  std::map<std::string, CMPIData> properties;
+  std::map<std::string, std::pair<CMPIData, CMPIrc>> properties;
 };
 
 std::map<const CMPIInstance*, std::unique_ptr<Alteration>>& alterations() {
@@ -158,8 +158,8 @@ CMPIData alteredProperty(const CMPIInstance* instance, const char* name, CMPISta
   if (found == alteration.properties.end()) {
     return alteration.original->getProperty(instance, name, status);
   }
-  set(status, CMPI_RC_OK);
-  return found->second;
+  set(status, found->second.second);
+  return found->second.first;
 }
 
 CMPIObjectPath* noPath(const CMPIInstance*, CMPIStatus* status) {
@@ -169,9 +169,9 @@ CMPIObjectPath* noPath(const CMPIInstance*, CMPIStatus* status) {
 
 }  // namespace
 
-CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data) {
+CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc) {
   Alteration& alteration = alterationOf(instance);
-  alteration.properties[name] = data;
+  alteration.properties[name] = {data, rc};
   alteration.table.getProperty = alteredProperty;
   return instance;
 }
