@@ -27,8 +27,9 @@ class IpmiConnection : public IpmiTransport {
   // The round trips of the operation so far, those that opened sessions included.
   unsigned roundTrips() const { return roundTrips_; }
 
-  // How many sessions were opened so far. What was learned of the processor's build holds while it stays the same.
-  unsigned sessions() const { return sessions_; }
+  // The number of the session that is open, 0 for none. What was learned of the processor's build holds while it stays
+  // the same.
+  unsigned session() const { return session_ ? sessions_ : 0; }
 
   // Ends the session: the processor has few of them. The next request opens another.
   void close() { session_.reset(); }

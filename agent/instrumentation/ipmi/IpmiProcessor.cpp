@@ -20,9 +20,9 @@ void IpmiProcessor::startOperation(Deadline deadline) {
 }
 
 const std::vector<std::uint8_t>& IpmiProcessor::channels() {
-  if (channels_.empty() || channelsOfSession_ != connection_.sessions()) {
+  if (connection_.session() == 0 || channelsOfSession_ != connection_.session()) {
     channels_ = discoverChannels(connection_, settings_.channels);
-    channelsOfSession_ = connection_.sessions();
+    channelsOfSession_ = connection_.session();
   }
   return channels_;
 }
