@@ -19,6 +19,9 @@ class IpmiConnection : public IpmiTransport {
   // From here on requests belong to an operation that ends at the deadline; afterwards they are NotSent.
   void startOperation(Deadline deadline);
 
+  // Makes sure that a session is open. Throws NotSent.
+  void open();
+
   IpmiResponse send(const IpmiRequest& request, Repetition repetition) override;
 
   // The time of its own is the session time-out: enough to open one session and to use it.
@@ -36,7 +39,6 @@ class IpmiConnection : public IpmiTransport {
 
  private:
   void requireTime() const;
-  void openSession();
 
   const IpmiSettings settings_;
   Deadline deadline_{std::chrono::milliseconds{0}};

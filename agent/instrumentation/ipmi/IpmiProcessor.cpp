@@ -16,6 +16,7 @@ constexpr std::chrono::milliseconds readBackPatience{1000};
 
 void IpmiProcessor::startOperation(Deadline deadline) {
   connection_.startOperation(deadline);
+  if (!heldLocks_.empty()) connection_.open();
   for (const std::uint8_t channel : HeldLocks(heldLocks_)) releaseLock(connection_, channel, heldLocks_);
 }
 

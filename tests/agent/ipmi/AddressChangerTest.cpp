@@ -185,6 +185,15 @@ TEST_F(AddressChangerTest, ThatIsRefusedSaysWhatCouldNotBePutBack) {
   expectNoLock();
 }
 
+TEST_F(AddressChangerTest, ThatIsRefusedSaysThatAnEarlierValueIsNotKnown) {
+  bmc.readRefused[LanParameter::IpAddress] = 0x80;
+  bmc.refuses[LanParameter::SubnetMask] = 0xCC;
+
+  EXPECT_THAT([&] { change(bothValues); }, refusal("could not be put back: the earlier IP address is not known"));
+
+  expectNoLock();
+}
+
 TEST_F(AddressChangerTest, SaysThatThePrivilegeIsTooLow) {
   for (const LanParameter parameter : {LanParameter::IpAddress, LanParameter::SubnetMask}) {
     bmc = {};
