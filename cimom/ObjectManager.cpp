@@ -1,0 +1,64 @@
+#include "cimom/ObjectManager.h"
+
+#include "cimom/broker/BrokerCore.h"
+#include "cimom/schema/Mof.h"
+
+namespace Cimom {
+
+struct ObjectManager::Parts {
+  BrokerCore core;
+  MofReader reader;
+
+  void addNamespaces(const ProviderRegistration& registration) {
+    for (const std::string& nameSpace : registration.namespaces) core.classes.addNamespace(nameSpace);
+  }
+};
+
+ObjectManager::ObjectManager() : parts_(std::make_unique<Parts>()) {}
+
+ObjectManager::~ObjectManager() = default;
+
+void ObjectManager::loadSchema(const std::filesystem::path& fileOrDirectory) {
+  parts_->core.classes.add(parts_->reader.readPath(fileOrDirectory));
+}
+
+void ObjectManager::loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin) {
+  parts_->core.classes.add(parts_->reader.readText(mof, std::string(origin)));
+  parts_->core.classes.addNamespace(nameSpace);
+}
+
+void ObjectManager::loadRegistration(const std::filesystem::path& file) {
+  for (const ProviderRegistration& registration : readRegistration(file)) {
+    parts_->core.providers.add(registration);
+    parts_->addNamespaces(registration);
+  }
+}
+
+void ObjectManager::addProviderDirectory(const std::filesystem::path& directory) {
+  parts_->core.providers.addDirectory(directory);
+}
+
+void ObjectManager::addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
+                                AssociationFactory associationFactory) {
+  parts_->core.providers.add(registration, std::move(instanceFactory), std::move(associationFactory));
+  parts_->addNamespaces(registration);
+}
+
+void ObjectManager::checkProviders() {
+  for (const auto& [registration, provider] : parts_->core.providers.entries()) {
+    if (parts_->core.classes.find(registration.className)) continue;
+    throw ConfigurationError((registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") + "class " +
+                             registration.className + " is not in the schema");
+  }
+  parts_->core.providers.load();
+}
+
+void ObjectManager::setLog(MessageSink sink) { parts_->core.log = std::move(sink); }
+
+void ObjectManager::setTrace(MessageSink sink) { parts_->core.trace = std::move(sink); }
+
+const CMPIBroker* ObjectManager::broker() const { return &parts_->core.broker; }
+
+const ClassRepository& ObjectManager::classes() const { return parts_->core.classes; }
+
+}  // namespace Cimom

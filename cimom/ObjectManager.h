@@ -1,0 +1,60 @@
+#ifndef CIMOM_OBJECTMANAGER_H_
+#define CIMOM_OBJECTMANAGER_H_
+
+#include <cmpift.h>
+
+#include <filesystem>
+#include <memory>
+#include <string_view>
+
+#include "cimom/ConfigurationError.h"
+#include "cimom/broker/MessageSink.h"
+#include "cimom/registry/ProviderRegistration.h"
+#include "cimom/schema/ClassRepository.h"
+
+namespace Cimom {
+
+/// A CIM object manager without a wire: schema, registered providers and a CMPI 2.0 broker, through whose up-call
+/// table (CMPIBrokerFT) every CIM operation goes. Requests may run on several threads at once, each inside a
+/// RequestScope, once everything is loaded.
+class ObjectManager {
+ public:
+  ObjectManager();
+  /// Cleans every provider up that was used, then unloads the libraries. No request may be under way.
+  ~ObjectManager();
+
+  /// Reads MOF from a file or from every *.mof under a directory.
+  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  void loadSchema(const std::filesystem::path& fileOrDirectory);
+  /// Reads MOF from a text and makes the namespace known.
+  void loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin = "text");
+
+  /// Reads a registration file (ProviderRegistration.h) and makes its namespaces known.
+  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  void loadRegistration(const std::filesystem::path& file);
+  /// Where libraries are looked for, after the directories added before.
+  void addProviderDirectory(const std::filesystem::path& directory);
+  /// Registers a provider that is linked into this program; a factory of a type that the registration does not name
+  /// may be null.
+  void addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
+                   AssociationFactory associationFactory);
+  /// Loads every registered library now.
+  /// @throws ConfigurationError for a library or a factory that is not there, or a class that the schema lacks
+  void checkProviders();
+
+  /// Where CMLogMessage goes; by default a line on the standard error output.
+  void setLog(MessageSink sink);
+  /// Where CMTraceMessage goes; by default nowhere.
+  void setTrace(MessageSink sink);
+
+  const CMPIBroker* broker() const;
+  const ClassRepository& classes() const;
+
+ private:
+  struct Parts;
+  std::unique_ptr<Parts> parts_;
+};
+
+}  // namespace Cimom
+
+#endif  // CIMOM_OBJECTMANAGER_H_

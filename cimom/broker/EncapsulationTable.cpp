@@ -1,0 +1,238 @@
+#include "cimom/broker/BrokerCore.h"
+#include "cimom/broker/Guard.h"
+#include "cimom/broker/MessageText.h"
+
+namespace Cimom {
+namespace {
+
+/// Makes an object for a broker's caller.
+template <class Operation>
+auto made(const CMPIBroker* broker, CMPIStatus* status, Operation operation) {
+  using Object = std::invoke_result_t<Operation>;
+  return guarded(status, Object{}, [&] {
+    coreOf(broker);
+    return operation();
+  });
+}
+
+CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* status) {
+  return made(broker, status, [&] {
+    const ObjectPath& model = modelOf<ObjectPath>(path);
+    return make(Instance(coreOf(broker).requireClass(model.className), model));
+  });
+}
+
+/// The class need not be known: a path may be made for what another object manager has. A null namespace is none.
+CMPIObjectPath* newObjectPath(const CMPIBroker* broker, const char* nameSpace, const char* className,
+                              CMPIStatus* status) {
+  return made(broker, status, [&] {
+    return make(ObjectPath{{}, nameSpace ? nameSpace : "", required(className, "the class's name"), {}});
+  });
+}
+
+CMPIArgs* newArgs(const CMPIBroker* broker, CMPIStatus* status) {
+  return made(broker, status, [] { return make(Args{}); });
+}
+
+CMPIString* newString(const CMPIBroker* broker, const char* text, CMPIStatus* status) {
+  return made(broker, status, [&] { return make(Text{required(text, "the text")}); });
+}
+
+CMPIArray* newArray(const CMPIBroker* broker, CMPICount count, CMPIType type, CMPIStatus* status) {
+  return made(broker, status, [&] {
+    const Value element = Value::fromCmpi(nullptr, type);
+    if (type == CMPI_null || (type & CMPI_ARRAY)) {
+      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
+                        "no array has elements of the CMPI type " + std::to_string(type));
+    }
+    return make(Array{element.type(), std::vector<Value>(count, element)});
+  });
+}
+
+CMPIDateTime* newDateTime(const CMPIBroker* broker, CMPIStatus* status) {
+  return made(broker, status, [] { return make(DateTime::now()); });
+}
+
+CMPIDateTime* newDateTimeFromBinary(const CMPIBroker* broker, CMPIUint64 microseconds, CMPIBoolean interval,
+                                    CMPIStatus* status) {
+  return made(broker, status, [&] { return make(DateTime{microseconds, interval != 0, 0}); });
+}
+
+CMPIDateTime* newDateTimeFromChars(const CMPIBroker* broker, const char* text, CMPIStatus* status) {
+  return made(broker, status, [&] { return make(DateTime::parse(required(text, "the text"))); });
+}
+
+CMPISelectExp* newSelectExp(const CMPIBroker* broker, const char*, const char*, CMPIArray**, CMPIStatus* status) {
+  return made(broker, status, []() -> CMPISelectExp* {
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no query language");
+  });
+}
+
+CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, const char* className,
+                         CMPIStatus* status) {
+  return made(broker, status, [&] {
+    const ClassDefinition& definition = coreOf(broker).requireClass(modelOf<ObjectPath>(path).className);
+    return static_cast<CMPIBoolean>(definition.isA(required(className, "the class's name")));
+  });
+}
+
+/// What any CMPI object begins with.
+struct AnyObject {
+  const void* hdl;
+  const void* ft;
+};
+
+struct ObjectType {
+  const void* table;
+  const char* name;
+  std::string (*describe)(const void* object);
+};
+
+std::string bareName(const char* name) { return name; }
+
+template <class Model>
+ObjectType typeRow(std::string (*describe)(const void* object)) {
+  return {&Abi<Model>::table, Abi<Model>::name, describe};
+}
+
+template <class Model>
+const Model& modelBehind(const void* object) {
+  return modelOf<Model>(static_cast<const typename Abi<Model>::Type*>(object));
+}
+
+/// The type of an object that a provider knows by its address only. An object tells it by its function table.
+const ObjectType& typeOf(const void* object) {
+  static const ObjectType types[] = {
+      typeRow<Text>([](const void* any) { return std::string(textOf(static_cast<const CMPIString*>(any))); }),
+      typeRow<ObjectPath>([](const void* any) { return modelBehind<ObjectPath>(any).toString(); }),
+      typeRow<Instance>([](const void* any) { return Value::instance(modelBehind<Instance>(any)).toString(); }),
+      typeRow<Array>([](const void* any) { return Value::array(modelBehind<Array>(any)).toString(); }),
+      typeRow<DateTime>([](const void* any) { return modelBehind<DateTime>(any).format(); }),
+      typeRow<Enumeration>([](const void*) { return bareName(Abi<Enumeration>::name); }),
+      typeRow<Args>([](const void*) { return bareName(Abi<Args>::name); }),
+      typeRow<Context>([](const void*) { return bareName(Abi<Context>::name); }),
+      typeRow<Result>([](const void*) { return bareName(Abi<Result>::name); }),
+      typeRow<Error>([](const void* any) { return modelBehind<Error>(any).message.value_or(""); }),
+  };
+  const auto* any = static_cast<const AnyObject*>(object);
+  if (any && any->hdl) {
+    for (const ObjectType& type : types) {
+      if (any->ft == type.table) return type;
+    }
+  }
+  throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "not an object of this broker");
+}
+
+CMPIString* toString(const CMPIBroker* broker, const void* object, CMPIStatus* status) {
+  return made(broker, status, [&] { return make(Text{typeOf(object).describe(object)}); });
+}
+
+CMPIBoolean isOfType(const CMPIBroker* broker, const void* object, const char* type, CMPIStatus* status) {
+  return made(broker, status, [&] {
+    return static_cast<CMPIBoolean>(typeOf(object).name == std::string_view(required(type, "the type")));
+  });
+}
+
+CMPIString* getType(const CMPIBroker* broker, const void* object, CMPIStatus* status) {
+  return made(broker, status, [&] { return make(Text{typeOf(object).name}); });
+}
+
+/// There are no message files: the text that the caller gives is the message, with its arguments put in.
+CMPIString* defaultMessage(const CMPIBroker* broker, const char* text, CMPIStatus* status, CMPICount count,
+                           std::va_list arguments) {
+  return made(broker, status,
+              [&] { return make(Text{messageText(required(text, "the default message"), count, arguments)}); });
+}
+
+CMPIString* getMessage(const CMPIBroker* broker, const char*, const char* text, CMPIStatus* status, CMPICount count,
+                       ...) {
+  std::va_list arguments;
+  va_start(arguments, count);
+  CMPIString* message = defaultMessage(broker, text, status, count, arguments);
+  va_end(arguments);
+  return message;
+}
+
+CMPIString* getMessage2(const CMPIBroker* broker, const char*, const CMPIMsgFileHandle, const char* text,
+                        CMPIStatus* status, CMPICount count, ...) {
+  std::va_list arguments;
+  va_start(arguments, count);
+  CMPIString* message = defaultMessage(broker, text, status, count, arguments);
+  va_end(arguments);
+  return message;
+}
+
+CMPIStatus openMessageFile(const CMPIBroker* broker, const char*, CMPIMsgFileHandle* file) {
+  return guarded([&] {
+    coreOf(broker);
+    if (file) *file = nullptr;
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no message files");
+  });
+}
+
+CMPIStatus closeMessageFile(const CMPIBroker* broker, const CMPIMsgFileHandle) {
+  return openMessageFile(broker, nullptr, nullptr);
+}
+
+/// The text of a message comes as characters or as a string; the characters win where both are there.
+CMPIStatus send(const CMPIBroker* broker, MessageSink BrokerCore::*sink, int level, const char* component,
+                const char* text, const CMPIString* string) {
+  return guarded([&] {
+    const auto& receiver = coreOf(broker).*sink;
+    const char* message = text ? text : textOf(string);
+    if (receiver) receiver(level, component ? component : "", message);
+  });
+}
+
+CMPIStatus logMessage(const CMPIBroker* broker, int severity, const char* id, const char* text,
+                      const CMPIString* string) {
+  return send(broker, &BrokerCore::log, severity, id, text, string);
+}
+
+CMPIStatus trace(const CMPIBroker* broker, int level, const char* component, const char* text,
+                 const CMPIString* string) {
+  return send(broker, &BrokerCore::trace, level, component, text, string);
+}
+
+CMPIError* newCMPIError(const CMPIBroker* broker, const char* owner, const char* id, const char* message,
+                        const CMPIErrorSeverity severity, const CMPIErrorProbableCause cause, const CMPIrc code,
+                        CMPIStatus* status) {
+  return made(broker, status, [&] {
+    Error error;
+    error.owningEntity = required(owner, "the owning entity");
+    error.messageId = required(id, "the message's id");
+    error.message = required(message, "the message");
+    error.severity = severity;
+    error.probableCause = cause;
+    error.statusCode = code;
+    return make(std::move(error));
+  });
+}
+
+}  // namespace
+
+CMPIBrokerEncFT encapsulationTable = {
+    .ftVersion = CMPICurrentVersion,
+    .newInstance = newInstance,
+    .newObjectPath = newObjectPath,
+    .newArgs = newArgs,
+    .newString = newString,
+    .newArray = newArray,
+    .newDateTime = newDateTime,
+    .newDateTimeFromBinary = newDateTimeFromBinary,
+    .newDateTimeFromChars = newDateTimeFromChars,
+    .newSelectExp = newSelectExp,
+    .classPathIsA = classPathIsA,
+    .toString = toString,
+    .isOfType = isOfType,
+    .getType = getType,
+    .getMessage = getMessage,
+    .logMessage = logMessage,
+    .trace = trace,
+    .newCMPIError = newCMPIError,
+    .openMessageFile = openMessageFile,
+    .closeMessageFile = closeMessageFile,
+    .getMessage2 = getMessage2,
+};
+
+}  // namespace Cimom

@@ -1,0 +1,118 @@
+#ifndef CIMOM_BROKER_HANDLE_H_
+#define CIMOM_BROKER_HANDLE_H_
+
+#include <cmpift.h>
+
+#include <memory>
+#include <string>
+#include <type_traits>
+#include <utility>
+
+#include "cimom/broker/Array.h"
+#include "cimom/broker/DateTime.h"
+#include "cimom/broker/Error.h"
+#include "cimom/broker/Instance.h"
+#include "cimom/broker/NamedValues.h"
+#include "cimom/broker/ObjectPath.h"
+#include "cimom/broker/RequestScope.h"
+#include "cimom/broker/Result.h"
+#include "cimom/broker/StatusError.h"
+
+namespace Cimom {
+
+/// The models behind the CMPI objects that are no more than their contents.
+struct Text {
+  std::string characters;
+};
+struct Context {
+  NamedValues entries;
+};
+struct Args {
+  NamedValues arguments;
+};
+struct Enumeration {
+  std::vector<Value> items;
+  std::size_t next = 0;
+};
+
+/// Which CMPI object a model is behind: its struct, its function table and its name.
+template <class Model>
+struct Abi;
+
+#define CIMOM_ABI(MODEL, OBJECT)                 \
+  template <>                                    \
+  struct Abi<MODEL> {                            \
+    using Type = OBJECT;                         \
+    static OBJECT##FT table;                     \
+    static constexpr const char* name = #OBJECT; \
+  }
+
+CIMOM_ABI(Text, CMPIString);
+CIMOM_ABI(ObjectPath, CMPIObjectPath);
+CIMOM_ABI(Instance, CMPIInstance);
+CIMOM_ABI(Array, CMPIArray);
+CIMOM_ABI(Enumeration, CMPIEnumeration);
+CIMOM_ABI(Args, CMPIArgs);
+CIMOM_ABI(DateTime, CMPIDateTime);
+CIMOM_ABI(Context, CMPIContext);
+CIMOM_ABI(Result, CMPIResult);
+CIMOM_ABI(Error, CMPIError);
+
+#undef CIMOM_ABI
+
+/// A CMPI object: the struct that providers see, and the model behind it. The struct's handle is this object, but for
+/// strings it is the characters, as providers that read a string's handle directly expect.
+template <class Model>
+struct Handle final : Object, Abi<Model>::Type {
+  explicit Handle(Model contents, bool ownedElsewhere = false) : model(std::move(contents)) {
+    inScope = ownedElsewhere;
+    if constexpr (std::is_same_v<Model, Text>) {
+      this->hdl = model.characters.data();
+    } else {
+      this->hdl = this;
+    }
+    this->ft = &Abi<Model>::table;
+  }
+
+  Model model;
+};
+
+/// A CMPI object for the time of a call, on the caller's stack.
+template <class Model>
+Handle<Model> lend(Model model) {
+  return Handle<Model>(std::move(model), true);
+}
+
+/// The model behind a CMPI object.
+/// @throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the object or its handle is null
+template <class Model>
+Model& modelOf(const typename Abi<Model>::Type* object) {
+  static_assert(!std::is_same_v<Model, Text>, "textOf reads a string");
+  if (!object || !object->hdl) {
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, std::string("a null ") + Abi<Model>::name);
+  }
+  return static_cast<Handle<Model>*>(object->hdl)->model;
+}
+
+/// The characters of a CMPI string.
+/// @throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the string or its handle is null
+inline const char* textOf(const CMPIString* string) {
+  if (!string || !string->hdl) throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIString");
+  return static_cast<const char*>(string->hdl);
+}
+
+/// Makes a CMPI object, owned by the current request scope where there is one and else by the caller.
+template <class Model>
+typename Abi<Model>::Type* make(Model model) {
+  auto handle = std::make_unique<Handle<Model>>(std::move(model));
+  auto* object = handle.get();
+  if (RequestScope* scope = RequestScope::current()) {
+    scope->adopt(std::move(handle));
+    return object;
+  }
+  return handle.release();
+}
+
+}  // namespace Cimom
+
+#endif  // CIMOM_BROKER_HANDLE_H_

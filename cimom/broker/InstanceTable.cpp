@@ -1,0 +1,91 @@
+#include "cimom/broker/Guard.h"
+
+namespace Cimom {
+namespace {
+
+CMPIValueState stateOf(const PropertyDeclaration& property) {
+  return property.isKey() ? CMPI_keyValue : CMPI_goodValue;
+}
+
+CMPIData getProperty(const CMPIInstance* instance, const char* name, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] {
+    const Instance& model = modelOf<Instance>(instance);
+    const Value* value = model.find(required(name, "the property's name"));
+    if (!value) {
+      throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, model.definition().name + " has no property \"" + name + "\"");
+    }
+    return value->toCmpi(stateOf(*model.definition().findProperty(name)));
+  });
+}
+
+CMPIData getPropertyAt(const CMPIInstance* instance, CMPICount index, CMPIString** name, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] {
+    const Instance& model = modelOf<Instance>(instance);
+    if (index >= model.size()) {
+      throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY,
+                        model.definition().name + " has no property at index " + std::to_string(index));
+    }
+    const PropertyDeclaration& property = model.definition().properties[index];
+    const CMPIData data = model[index].toCmpi(stateOf(property));
+    if (name) *name = make(Text{property.name});
+    return data;
+  });
+}
+
+CMPICount getPropertyCount(const CMPIInstance* instance, CMPIStatus* status) {
+  return guarded(status, CMPICount(0), [&] { return static_cast<CMPICount>(modelOf<Instance>(instance).size()); });
+}
+
+CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
+  return guarded([&] {
+    Instance& model = modelOf<Instance>(instance);
+    model.set(required(name, "the property's name"), Value::fromCmpi(value, type));
+  });
+}
+
+/// The class says where a property comes from; the origin that the caller names adds nothing to it.
+CMPIStatus setPropertyWithOrigin(const CMPIInstance* instance, const char* name, const CMPIValue* value,
+                                 const CMPIType type, const char*) {
+  return setProperty(instance, name, value, type);
+}
+
+CMPIObjectPath* getObjectPath(const CMPIInstance* instance, CMPIStatus* status) {
+  return guarded(status, static_cast<CMPIObjectPath*>(nullptr),
+                 [&] { return make(modelOf<Instance>(instance).path()); });
+}
+
+CMPIStatus setObjectPath(CMPIInstance* instance, const CMPIObjectPath* path) {
+  return guarded([&] {
+    Instance& model = modelOf<Instance>(instance);
+    model.setPath(modelOf<ObjectPath>(path));
+  });
+}
+
+/// The class knows its keys, so that the caller's list of them is not needed.
+CMPIStatus setPropertyFilter(CMPIInstance* instance, const char** properties, const char**) {
+  return guarded([&] {
+    Instance& model = modelOf<Instance>(instance);
+    if (!properties) return;
+    std::vector<std::string> names;
+    for (const char** name = properties; *name; ++name) names.emplace_back(*name);
+    model.setFilter(names);
+  });
+}
+
+}  // namespace
+
+CMPIInstanceFT Abi<Instance>::table = {
+    .ftVersion = CMPICurrentVersion,
+    .release = release<Instance>,
+    .clone = clone<Instance>,
+    .getProperty = getProperty,
+    .getPropertyAt = getPropertyAt,
+    .getPropertyCount = getPropertyCount,
+    .setProperty = setProperty,
+    .getObjectPath = getObjectPath,
+    .setPropertyFilter = setPropertyFilter,
+    .setObjectPath = setObjectPath,
+    .setPropertyWithOrigin = setPropertyWithOrigin,
+};
+
+}  // namespace Cimom

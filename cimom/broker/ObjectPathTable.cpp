@@ -1,0 +1,136 @@
+#include "cimom/broker/BrokerCore.h"
+#include "cimom/broker/Guard.h"
+
+namespace Cimom {
+namespace {
+
+using Member = std::string ObjectPath::*;
+
+template <Member member>
+CMPIStatus setText(CMPIObjectPath* path, const char* text) {
+  return guarded([&] { modelOf<ObjectPath>(path).*member = required(text, "the text"); });
+}
+
+template <Member member>
+CMPIString* getText(const CMPIObjectPath* path, CMPIStatus* status) {
+  return guarded(status, static_cast<CMPIString*>(nullptr),
+                 [&] { return make(Text{modelOf<ObjectPath>(path).*member}); });
+}
+
+CMPIStatus addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, const CMPIType type) {
+  return guarded([&] {
+    ObjectPath& model = modelOf<ObjectPath>(path);
+    model.keys.set(required(name, "the key's name"), Value::fromCmpi(value, type));
+  });
+}
+
+CMPIData getKey(const CMPIObjectPath* path, const char* name, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] { return entryOf(modelOf<ObjectPath>(path).keys, name, CMPI_keyValue); });
+}
+
+CMPIData getKeyAt(const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] { return entryAt(modelOf<ObjectPath>(path).keys, index, name, CMPI_keyValue); });
+}
+
+CMPICount getKeyCount(const CMPIObjectPath* path, CMPIStatus* status) {
+  return guarded(status, CMPICount(0), [&] { return static_cast<CMPICount>(modelOf<ObjectPath>(path).keys.size()); });
+}
+
+CMPIStatus setNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
+  return guarded([&] {
+    ObjectPath& model = modelOf<ObjectPath>(path);
+    model.nameSpace = modelOf<ObjectPath>(source).nameSpace;
+  });
+}
+
+CMPIStatus setHostAndNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
+  return guarded([&] {
+    ObjectPath& model = modelOf<ObjectPath>(path);
+    model.nameSpace = modelOf<ObjectPath>(source).nameSpace;
+    model.host = modelOf<ObjectPath>(source).host;
+  });
+}
+
+/// The path's class, as the broker of the current request knows it.
+const ClassDefinition& classOf(const CMPIObjectPath* path) {
+  const std::string& name = modelOf<ObjectPath>(path).className;
+  const CMPIBroker* broker = RequestScope::currentBroker();
+  if (!broker) throw StatusError(CMPI_RC_ERR_FAILED, "qualifiers can be read within a request only");
+  return coreOf(broker).requireClass(name);
+}
+
+template <class Declaration>
+const Declaration& declared(const Declaration* declaration, CMPIrc code, const char* name) {
+  if (!declaration) throw StatusError(code, std::string("not declared: \"") + name + "\"");
+  return *declaration;
+}
+
+const MethodDeclaration& methodOf(const CMPIObjectPath* path, const char* name) {
+  return declared(classOf(path).findMethod(required(name, "the method's name")), CMPI_RC_ERR_METHOD_NOT_FOUND, name);
+}
+
+/// A qualifier's value; what is not qualified gives a null value with CMPI_RC_ERR_NOT_FOUND.
+CMPIData qualifierOf(const Qualifiers& qualifiers, const char* name) {
+  const Qualifier* qualifier = findQualifier(qualifiers, required(name, "the qualifier's name"));
+  return declared(qualifier, CMPI_RC_ERR_NOT_FOUND, name).value.toCmpi();
+}
+
+CMPIData getClassQualifier(const CMPIObjectPath* path, const char* qualifier, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] { return qualifierOf(classOf(path).qualifiers, qualifier); });
+}
+
+CMPIData getPropertyQualifier(const CMPIObjectPath* path, const char* property, const char* qualifier,
+                              CMPIStatus* status) {
+  return guarded(status, kNoData, [&] {
+    const auto* found = classOf(path).findProperty(required(property, "the property's name"));
+    return qualifierOf(declared(found, CMPI_RC_ERR_NO_SUCH_PROPERTY, property).qualifiers, qualifier);
+  });
+}
+
+CMPIData getMethodQualifier(const CMPIObjectPath* path, const char* method, const char* qualifier, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] { return qualifierOf(methodOf(path, method).qualifiers, qualifier); });
+}
+
+CMPIData getParameterQualifier(const CMPIObjectPath* path, const char* method, const char* parameter,
+                               const char* qualifier, CMPIStatus* status) {
+  return guarded(status, kNoData, [&] {
+    const MethodDeclaration& declaration = methodOf(path, method);
+    required(parameter, "the parameter's name");
+    for (const PropertyDeclaration& one : declaration.parameters) {
+      if (sameName(one.name, parameter)) return qualifierOf(one.qualifiers, qualifier);
+    }
+    throw StatusError(CMPI_RC_ERR_NOT_FOUND, std::string("not declared: \"") + parameter + "\"");
+  });
+}
+
+CMPIString* toString(const CMPIObjectPath* path, CMPIStatus* status) {
+  return guarded(status, static_cast<CMPIString*>(nullptr),
+                 [&] { return make(Text{modelOf<ObjectPath>(path).toString()}); });
+}
+
+}  // namespace
+
+CMPIObjectPathFT Abi<ObjectPath>::table = {
+    .ftVersion = CMPICurrentVersion,
+    .release = release<ObjectPath>,
+    .clone = clone<ObjectPath>,
+    .setNameSpace = setText<&ObjectPath::nameSpace>,
+    .getNameSpace = getText<&ObjectPath::nameSpace>,
+    .setHostname = setText<&ObjectPath::host>,
+    .getHostname = getText<&ObjectPath::host>,
+    .setClassName = setText<&ObjectPath::className>,
+    .getClassName = getText<&ObjectPath::className>,
+    .addKey = addKey,
+    .getKey = getKey,
+    .getKeyAt = getKeyAt,
+    .getKeyCount = getKeyCount,
+    .setNameSpaceFromObjectPath = setNameSpaceFromObjectPath,
+    .setHostAndNameSpaceFromObjectPath = setHostAndNameSpaceFromObjectPath,
+    .getClassQualifier = getClassQualifier,
+    .getPropertyQualifier = getPropertyQualifier,
+    .getMethodQualifier = getMethodQualifier,
+    .getParameterQualifier = getParameterQualifier,
+    .toString = toString,
+};
+
+}  // namespace Cimom

@@ -1,0 +1,100 @@
+#include "cimom/routing/InstanceOperations.h"
+
+#include <algorithm>
+#include <iterator>
+
+namespace Cimom {
+namespace {
+
+using Entry = ProviderRegistry::Entry;
+
+bool servesInstances(const Entry& entry, const Operation& operation) {
+  return entry.registration.instance && entry.serves(operation.path.nameSpace);
+}
+
+/// The provider of exactly the operation's class; null where there is none.
+Provider* providerOf(const Operation& operation) {
+  for (const Entry& entry : operation.core.providers.entries()) {
+    if (servesInstances(entry, operation) && sameName(entry.registration.className, operation.definition.name)) {
+      return entry.provider;
+    }
+  }
+  return nullptr;
+}
+
+Provider& writingProviderOf(const Operation& operation) {
+  if (Provider* provider = providerOf(operation)) return *provider;
+  throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED,
+                    "class " + operation.definition.name + " has no provider in " + operation.path.nameSpace);
+}
+
+/// Calls `call` with the provider and the path of every class at or below the operation's that has a provider.
+template <class Call>
+std::vector<Value> forEachClass(const Operation& operation, Call call) {
+  std::vector<Value> all;
+  for (const Entry& entry : operation.core.providers.entries()) {
+    const ClassDefinition* served = operation.core.classes.find(entry.registration.className);
+    if (!served || !servesInstances(entry, operation) || !served->isA(operation.definition.name)) continue;
+    const auto path = lend(ObjectPath{operation.path.host, operation.path.nameSpace, served->name, {}});
+    std::vector<Value> some = call(*entry.provider, entry.provider->instanceMi(&operation.core.broker), &path);
+    std::ranges::move(some, std::back_inserter(all));
+  }
+  return all;
+}
+
+}  // namespace
+
+std::vector<Value> enumerateInstances(const Operation& operation, const char** properties) {
+  return forEachClass(operation, [&](const Provider& provider, CMPIInstanceMI* mi, const CMPIObjectPath* path) {
+    return callProvider(operation, provider, mi, CMPI_instance, mi->ft->enumerateInstances, path, properties);
+  });
+}
+
+std::vector<Value> enumerateInstanceNames(const Operation& operation) {
+  return forEachClass(operation, [&](const Provider& provider, CMPIInstanceMI* mi, const CMPIObjectPath* path) {
+    return callProvider(operation, provider, mi, CMPI_ref, mi->ft->enumerateInstanceNames, path);
+  });
+}
+
+Value getInstance(const Operation& operation, const char** properties) {
+  if (Provider* provider = providerOf(operation)) {
+    const auto path = lend(operation.path);
+    CMPIInstanceMI* mi = provider->instanceMi(&operation.core.broker);
+    std::vector<Value> found =
+        callProvider(operation, *provider, mi, CMPI_instance, mi->ft->getInstance, &path, properties);
+    if (!found.empty()) return std::move(found.front());
+  }
+  throw StatusError(CMPI_RC_ERR_NOT_FOUND, "no instance " + operation.path.toString());
+}
+
+Value createInstance(const Operation& operation, const Instance& instance) {
+  Provider& provider = writingProviderOf(operation);
+  const auto path = lend(operation.path);
+  const auto created = lend(instance);
+  CMPIInstanceMI* mi = provider.instanceMi(&operation.core.broker);
+  std::vector<Value> paths = callProvider(operation, provider, mi, CMPI_ref, mi->ft->createInstance, &path, &created);
+  return paths.empty() ? Value::reference(instance.path()) : std::move(paths.front());
+}
+
+void modifyInstance(const Operation& operation, const Instance& instance, const char** properties) {
+  Provider& provider = writingProviderOf(operation);
+  ObjectPath complete = operation.path;
+  for (const auto& [name, value] : instance.path().keys) {
+    if (!complete.keys.find(name)) complete.keys.set(name, value);
+  }
+  Instance modified = instance.withoutDefaults();
+  modified.setPath(complete);
+  const auto path = lend(std::move(complete));
+  const auto whole = lend(std::move(modified));
+  CMPIInstanceMI* mi = provider.instanceMi(&operation.core.broker);
+  callProvider(operation, provider, mi, CMPI_null, mi->ft->modifyInstance, &path, &whole, properties);
+}
+
+void deleteInstance(const Operation& operation) {
+  Provider& provider = writingProviderOf(operation);
+  const auto path = lend(operation.path);
+  CMPIInstanceMI* mi = provider.instanceMi(&operation.core.broker);
+  callProvider(operation, provider, mi, CMPI_null, mi->ft->deleteInstance, &path);
+}
+
+}  // namespace Cimom

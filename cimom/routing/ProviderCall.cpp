@@ -1,0 +1,54 @@
+#include "cimom/routing/ProviderCall.h"
+
+namespace Cimom {
+namespace {
+
+/// Far more than any stack of providers needs, and far less than a thread's stack holds.
+constexpr unsigned kDeepest = 32;
+
+thread_local unsigned depth = 0;
+
+const ClassDefinition& classFor(const BrokerCore& core, const ObjectPath& path) {
+  core.requireNamespace(path.nameSpace);
+  return core.requireClass(path.className);
+}
+
+}  // namespace
+
+Operation::Operation(const CMPIBroker* broker, const CMPIContext* callerContext, const CMPIObjectPath* requested)
+    : core(coreOf(broker)),
+      context(modelOf<Context>(callerContext)),
+      path(modelOf<ObjectPath>(requested)),
+      definition(classFor(core, path)) {}
+
+CallDepth::CallDepth() {
+  if (depth == kDeepest) throw StatusError(CMPI_RC_ERR_FAILED, "the providers' calls nest without end");
+  ++depth;
+}
+
+CallDepth::~CallDepth() { --depth; }
+
+Context providerContext(const Operation& operation) {
+  Context context = operation.context;
+  if (!context.entries.find(CMPIInvocationFlags)) context.entries.set(CMPIInvocationFlags, Value::uint32(0));
+  if (!context.entries.find(CMPIInitNameSpace)) {
+    context.entries.set(CMPIInitNameSpace, Value::string(operation.path.nameSpace));
+  }
+  return context;
+}
+
+void completeNamespace(Value& item, const std::string& nameSpace) {
+  if (const ObjectPath* path = item.path(); path && path->nameSpace.empty()) {
+    ObjectPath complete = *path;
+    complete.nameSpace = nameSpace;
+    item = Value::reference(std::move(complete));
+  } else if (const Instance* instance = item.embedded(); instance && instance->path().nameSpace.empty()) {
+    ObjectPath complete = instance->path();
+    complete.nameSpace = nameSpace;
+    Instance moved = *instance;
+    moved.setPath(std::move(complete));
+    item = Value::instance(std::move(moved));
+  }
+}
+
+}  // namespace Cimom

@@ -1,0 +1,52 @@
+#ifndef CIMOM_SCHEMA_MOF_H_
+#define CIMOM_SCHEMA_MOF_H_
+
+#include <filesystem>
+#include <set>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "cimom/schema/ClassDefinition.h"
+
+namespace Cimom {
+
+/// A class as the MOF writes it: its own features only, its superclass by name.
+struct ClassDeclaration {
+  ClassDefinition own;
+  std::string superclassName;
+};
+
+/// What a schema in the Managed Object Format (DSP0004, annex A) declares.
+struct MofDeclarations {
+  std::vector<ClassDeclaration> classes;
+  std::vector<std::string> namespaces;  ///< of `#pragma namespace`
+};
+
+/// Reads classes, qualifier declarations and the pragmas include and namespace; other pragmas mean nothing here.
+/// A qualifier's declaration counts from there on, in later texts and files too. A file is read once, however often
+/// it is named or included.
+class MofReader {
+ public:
+  MofReader();
+
+  /// A file, or every *.mof under a directory in the order of their names.
+  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  MofDeclarations readPath(const std::filesystem::path& fileOrDirectory);
+
+  /// @param origin what messages call the text; files that it includes are looked for from the working directory
+  /// @throws ConfigurationError "ORIGIN:LINE: what is wrong"
+  MofDeclarations readText(std::string_view mof, const std::string& origin);
+
+ private:
+  friend class MofParser;
+
+  void readFile(const std::filesystem::path& file, MofDeclarations& declarations);
+
+  Qualifiers qualifierTypes_;  ///< the declared qualifiers, with their types, defaults and flavors
+  std::set<std::filesystem::path> files_;
+};
+
+}  // namespace Cimom
+
+#endif  // CIMOM_SCHEMA_MOF_H_
