@@ -96,15 +96,6 @@ TEST_P(AssociationBuilderFailureTest, AnInstanceOfTheAssociationCannotBeMade) {
   }
 }
 
-TEST_P(AssociationBuilderFailureTest, ABrokerOutOfMemoryEndsTheReadingOfComputerSystems) {
-  if (model().outer != Testing::Classes::computerSystem) {
-    GTEST_SKIP() << "no end of this association asks for an array";
-  }
-  faults.failNewArray = true;
-  expectOutcome(model().outerFails, 0, 0);
-  EXPECT_EQ(faults.upCalls.size(), 1U);
-}
-
 INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderFailureTest,
                          ::testing::Combine(::testing::ValuesIn(Testing::associationModels()), ::testing::Bool()),
                          [](const auto& parameter) {

@@ -1,13 +1,28 @@
-// What single builders do beside the pairing: the flags of element setting data, the markers of ordered members.
+// What single builders do beside the pairing: the systems that cannot be had, the flags of element setting data, the
+// markers of ordered members.
 #include "AssociationTest.h"
 
 namespace {
 
-using Testing::AssociationModel;
 using Testing::homed;
 using Testing::number;
 using Testing::Strings;
 namespace Classes = Testing::Classes;
+
+class HostedAccessPointBuilderTest : public Testing::AssociationTest {};
+
+TEST_F(HostedAccessPointBuilderTest, ABrokerOutOfMemoryForTheComputerSystemsIsAnEmptySuccess) {
+  for (const char* const className : {Classes::hostedAccessPoint, Classes::remoteHostedAccessPoint}) {
+    attach(Testing::modelOf(className));
+    addEnds({"bmc0"}, {"one"});
+    faults.failNewArray = true;
+    Testing::logLines().clear();
+    std::vector<CMPIInstance*> out;
+    EXPECT_EQ(build(out), 0);
+    EXPECT_TRUE(out.empty());
+    EXPECT_EQ(unitLines(), brokenOff(model().builderName, ""));
+  }
+}
 
 class ElementSettingDataBuilderTest : public Testing::AssociationTest {
  protected:
