@@ -214,14 +214,10 @@ std::string renderPair(const CMPIInstance* instance, const std::string& first, c
   return render(reference(instance, first)) + " -> " + render(reference(instance, second));
 }
 
-namespace {
-
 const CMPIObjectPath* referenceKey(const CMPIObjectPath* path, const std::string& name) {
   const CMPIData data = CMGetKey(path, name.c_str(), nullptr);
   return CMIsNullValue(data) || data.type != CMPI_ref ? nullptr : data.value.ref;
 }
-
-}  // namespace
 
 std::string renderPair(const CMPIObjectPath* path, const std::string& first, const std::string& second) {
   return render(referenceKey(path, first)) + " -> " + render(referenceKey(path, second));

@@ -88,6 +88,9 @@ std::string homed(const std::string& compositeClass, const std::string& name);
 std::string rendered(const std::string& host, const std::string& nameSpace, const std::string& compositeClass,
                      const std::string& name);
 
+// A key that is a reference; null where there is none.
+const CMPIObjectPath* referenceKey(const CMPIObjectPath* path, const std::string& name);
+
 // "first -> second" of the two references of an association instance, or of the two keys of its path.
 std::string renderPair(const CMPIInstance* instance, const std::string& first, const std::string& second);
 std::string renderPair(const CMPIObjectPath* path, const std::string& first, const std::string& second);
