@@ -130,6 +130,20 @@ TEST_P(AssociationInstancesTest, GetInstanceOfNoSuchAssociationIsNoErrorAndAnswe
   EXPECT_EQ(answer.order, (Strings{"done"}));
 }
 
+TEST_P(AssociationInstancesTest, GetInstanceComparesTheNamespaceToo) {
+  addEnds({model().outerNames[0]}, {model().innerNames[0]});
+  const CMPIObjectPath* const path = clientPathOf(0);
+  CMPIObjectPath* const candidate = clientPathOf(0);
+  faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
+    if (className == model().className) {
+      Testing::withPath(instance, candidate);
+    }
+  };
+  EXPECT_EQ(read(Reading::GetInstance, path).order, (Strings{"instance", "done"}));
+  CMSetNameSpace(candidate, "root/other");
+  EXPECT_EQ(read(Reading::GetInstance, path).order, (Strings{"done"}));
+}
+
 TEST_P(AssociationInstancesTest, GetInstanceWithoutKeysIsNoErrorSaysSoAndReadsNothing) {
   addThreeOfEach();
   const Answer answer = read(Reading::GetInstance, classPath());
@@ -247,6 +261,22 @@ TEST_P(AssociationInstancesTest, AnEnumerationThatTheBrokerRefusesAnswersNothing
     EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
     EXPECT_EQ(answer.order, (Strings{"done"}));
   }
+}
+
+class ManyAssociationsTest : public Testing::AssociationTest {};
+
+TEST_F(ManyAssociationsTest, AreCountedInSixteenBits) {
+  attach(Testing::modelOf(Testing::Classes::elementSettingData));
+  addEnds({"eth0", "eth1"}, {"BMC:eth0:static"});
+  std::vector<CMPIInstance*>& sequences =
+      faults.upCallScripts[Testing::underlyingClassOf(Testing::Classes::sequence)].instances;
+  sequences.resize(32769, sequences.front());
+  faults.failNewInstance = [&](const std::string& className, int) {
+    Testing::logLines().clear();
+    return className == model().className;
+  };
+  // Two endpoints with 32769 sequences each make 65538 associations, two more than the count holds.
+  EXPECT_EQ(read(Reading::EnumInstances, makePath(model().className)).order, (Strings{"instance", "instance", "done"}));
 }
 
 INSTANTIATE_TEST_SUITE_P(Six, AssociationInstancesTest, ::testing::ValuesIn(Testing::associationModels()),
