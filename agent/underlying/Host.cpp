@@ -5,7 +5,6 @@
 #include <net/if.h>
 #include <net/route.h>
 #include <netpacket/packet.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <array>
@@ -15,6 +14,8 @@
 #include <fstream>
 #include <memory>
 #include <sstream>
+
+#include "QV/ProviderHelper.h"
 
 namespace QV {
 namespace {
@@ -77,11 +78,6 @@ std::vector<NetworkInterface> readInterfaces() {
   return interfaces;
 }
 
-std::string hostName() {
-  std::array<char, 256> name{};
-  return ::gethostname(name.data(), name.size() - 1) == 0 ? name.data() : "localhost";
-}
-
 }  // namespace
 
 std::vector<std::string> parseResolverConfiguration(std::istream& text) {
@@ -114,7 +110,7 @@ std::map<std::string, std::string> parseDefaultGateways(std::istream& text) {
 ManagementProcessor readHost() {
   std::ifstream resolver("/etc/resolv.conf");
   std::ifstream routes("/proc/net/route");
-  ManagementProcessor host{hostName(), "Host", parseResolverConfiguration(resolver), readInterfaces()};
+  ManagementProcessor host{getSystemName(), "Host", parseResolverConfiguration(resolver), readInterfaces()};
   const auto gateways = parseDefaultGateways(routes);
   for (NetworkInterface& interface : host.interfaces) {
     const auto gateway = gateways.find(*interface.name);

@@ -40,8 +40,11 @@ void setValue(const Setter& set, const char* name, const std::vector<std::uint16
   CMPIArray* array = CMNewArray(broker, static_cast<CMPICount>(numbers.size()), CMPI_uint16, nullptr);
   if (!array) throw std::bad_alloc();
   CMPICount index = 0;
-  for (const std::uint16_t number : numbers) CMSetArrayElementAt(array, index++, &number, CMPI_uint16);
   CMPIValue value{};
+  for (const std::uint16_t number : numbers) {
+    value.uint16 = number;
+    CMSetArrayElementAt(array, index++, &value, CMPI_uint16);
+  }
   value.array = array;
   set(name, &value, CMPI_uint16A);
 }

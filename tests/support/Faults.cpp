@@ -53,7 +53,7 @@ std::string text(const CMPIString* string) {
 struct Alteration {
   CMPIInstanceFT table;
   CMPIInstanceFT* original;
-  std::map<std::string, CMPIData> properties;
+  std::map<std::string, std::pair<CMPIData, CMPIrc>> properties;
   CMPIObjectPath* path = nullptr;
   std::vector<std::string>* calls = nullptr;
 };
@@ -78,8 +78,8 @@ CMPIData alteredProperty(const CMPIInstance* instance, const char* name, CMPISta
   if (found == alteration.properties.end()) {
     return alteration.original->getProperty(instance, name, status);
   }
-  set(status, CMPI_RC_OK);
-  return found->second;
+  set(status, found->second.second);
+  return found->second.first;
 }
 
 CMPIStatus recordedSetProperty(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
@@ -215,9 +215,9 @@ CMPIStatus FaultyBroker::trace(const CMPIBroker*, int level, const char* compone
   return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};  // as a real object manager answers
 }
 
-CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data) {
+CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc) {
   Alteration& alteration = alterationOf(instance);
-  alteration.properties[name] = data;
+  alteration.properties[name] = {data, rc};
   alteration.table.getProperty = alteredProperty;
   return instance;
 }

@@ -81,8 +81,8 @@ class FaultyBroker {
   std::map<std::string, int> newInstanceCalls_;
 };
 
-// The instance, with its table replaced in part: getProperty answers `data` for the name.
-CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data);
+// The instance, with its table replaced in part: getProperty answers `data` with the code `rc` for the name.
+CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
 // The instance, with its table replaced in part: getObjectPath answers `path`.
 CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path);
 // The instance, with its table replaced in part: getObjectPath answers null.

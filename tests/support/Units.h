@@ -3,6 +3,7 @@
 
 #include <cmpift.h>
 
+#include <ostream>
 #include <string>
 #include <vector>
 
@@ -21,6 +22,8 @@ struct Unit {
   CreateAssociationMI* createAssociationMI;  // null for the six that serve no association
   bool acceptsModify;
 };
+
+inline void PrintTo(const Unit& unit, std::ostream* stream) { *stream << unit.file; }
 
 const std::vector<Unit>& instanceUnits();     // the six of the composite classes
 const std::vector<Unit>& associationUnits();  // the six of the associations

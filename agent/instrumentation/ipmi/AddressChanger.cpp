@@ -1,0 +1,68 @@
+#include "instrumentation/ipmi/AddressChanger.h"
+
+#include <thread>
+
+#include "instrumentation/ipmi/Deadline.h"
+#include "instrumentation/ipmi/InterfaceReader.h"
+#include "instrumentation/ipmi/IpmiLog.h"
+
+namespace QV::Ipmi {
+namespace {
+
+constexpr std::chrono::milliseconds betweenLooks{100};
+
+}  // namespace
+
+void AddressChanger::apply(const AddressChange& change) {
+  const AddressSettings earlier = readAddressSettings(transport_, channel_);
+  const AddressSettings wanted = withChange(earlier, change);
+  if (planWrites(earlier, wanted).empty()) {
+    logProgress(interfaceName(channel_) + " has these values already: nothing is written");
+    return;
+  }
+  std::string loss;
+  try {
+    write(earlier, wanted);
+  } catch (const ConnectionLost& lost) {
+    if (!begun_) throw IpmiError(std::string(lost.what()) + "; nothing was changed");
+    loss = lost.what();
+  }
+  const AddressSettings present = readBack(wanted, loss);
+  const std::string difference = describeDifference(present, wanted);
+  if (difference.empty()) return;
+  const std::string outcome = present == earlier ? "; the earlier values hold" : putBack(present, earlier);
+  throw IpmiError("the BMC took the change of " + interfaceName(channel_) + " but does not show it: " + difference +
+                  outcome);
+}
+
+void AddressChanger::write(const AddressSettings& from, const AddressSettings& to) {
+  ParameterTransaction transaction(transport_, channel_, held_);
+  begun_ = true;
+  transaction.write(planWrites(from, to));
+}
+
+AddressSettings AddressChanger::readBack(const AddressSettings& wanted, const std::string& loss) try {
+  const Deadline deadline(patience_);
+  AddressSettings present = readAddressSettings(transport_, channel_);
+  while (!describeDifference(present, wanted).empty() && !deadline.passed()) {
+    std::this_thread::sleep_for(betweenLooks);
+    present = readAddressSettings(transport_, channel_);
+  }
+  return present;
+} catch (const IpmiError& error) {
+  throw IpmiError("the outcome of the change of " + interfaceName(channel_) +
+                  " is unknown: it was sent, but the BMC can no longer be asked (" +
+                  (loss.empty() ? error.what() : loss) +
+                  "). Where the agent reaches it at the address that was changed, set host to the new one");
+}
+
+std::string AddressChanger::putBack(const AddressSettings& present, const AddressSettings& earlier) try {
+  write(present, earlier);
+  const std::string difference = describeDifference(readAddressSettings(transport_, channel_), earlier);
+  return difference.empty() ? "; the earlier values were put back"
+                            : "; the earlier values could not be put back: " + difference;
+} catch (const IpmiError& error) {
+  return std::string("; the earlier values could not be put back: ") + error.what();
+}
+
+}  // namespace QV::Ipmi

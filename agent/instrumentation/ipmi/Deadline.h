@@ -1,0 +1,23 @@
+// The moment by which an operation of the processor has ended, whatever the hardware does.
+#pragma once
+
+#include <chrono>
+#include <compare>
+
+namespace QV::Ipmi {
+
+class Deadline {
+ public:
+  using Clock = std::chrono::steady_clock;
+
+  explicit Deadline(std::chrono::milliseconds budget) : time_(Clock::now() + budget) {}
+
+  Clock::time_point time() const { return time_; }
+  bool passed() const { return Clock::now() >= time_; }
+  auto operator<=>(const Deadline&) const = default;
+
+ private:
+  Clock::time_point time_;
+};
+
+}  // namespace QV::Ipmi

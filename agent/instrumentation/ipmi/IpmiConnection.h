@@ -1,0 +1,47 @@
+// The way to the processor over many operations: holds one session, opens another where it broke, counts what goes over
+// the wire and keeps every operation to its time.
+#pragma once
+
+#include <memory>
+
+#include "instrumentation/ipmi/Deadline.h"
+#include "instrumentation/ipmi/IpmiSession.h"
+#include "instrumentation/ipmi/IpmiSettings.h"
+#include "instrumentation/ipmi/IpmiTransport.h"
+
+namespace QV::Ipmi {
+
+// Not safe to share between threads without a lock.
+class IpmiConnection : public IpmiTransport {
+ public:
+  explicit IpmiConnection(const IpmiSettings& settings) : settings_(settings) {}
+
+  // From here on requests belong to an operation that ends at the deadline; afterwards they are NotSent.
+  void startOperation(Deadline deadline);
+
+  IpmiResponse send(const IpmiRequest& request, Repetition repetition) override;
+
+  // The time of its own is the session time-out: enough to open one session and to use it.
+  void beginCleanup() override;
+
+  // The round trips of the operation so far, those that opened sessions included.
+  unsigned roundTrips() const { return roundTrips_; }
+
+  // How many sessions were opened so far. What was learned of the processor's build holds while it stays the same.
+  unsigned sessions() const { return sessions_; }
+
+  // Ends the session: the processor has few of them. The next request opens another.
+  void close() { session_.reset(); }
+
+ private:
+  void requireTime() const;
+  void openSession();
+
+  const IpmiSettings settings_;
+  Deadline deadline_{std::chrono::milliseconds{0}};
+  std::unique_ptr<IpmiSession> session_;
+  unsigned roundTrips_ = 0;
+  unsigned sessions_ = 0;
+};
+
+}  // namespace QV::Ipmi

@@ -1,0 +1,52 @@
+#include "instrumentation/ipmi/SecretFile.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <stdexcept>
+#include <system_error>
+
+namespace QV::Ipmi {
+namespace {
+
+class Descriptor {
+ public:
+  explicit Descriptor(const std::string& path) : number_(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)) {}
+  ~Descriptor() {
+    if (number_ >= 0) ::close(number_);
+  }
+  Descriptor(const Descriptor&) = delete;
+  Descriptor& operator=(const Descriptor&) = delete;
+  int number() const { return number_; }
+
+ private:
+  int number_;
+};
+
+[[noreturn]] void failWithErrno(const std::string& path) {
+  throw std::runtime_error(path + " cannot be read: " + std::generic_category().message(errno));
+}
+
+}  // namespace
+
+std::string readSecretFile(const std::string& path) {
+  const Descriptor file(path);
+  struct stat status {};
+  if (file.number() < 0 || ::fstat(file.number(), &status) != 0) failWithErrno(path);
+  if (!S_ISREG(status.st_mode)) throw std::runtime_error(path + " is no regular file");
+  if ((status.st_mode & (S_IRWXG | S_IRWXO)) != 0)
+    throw std::runtime_error(path + " is open to others than its owner: chmod 600 it");
+  // No secret of IPMI is longer than a fraction of this.
+  std::array<char, 256> content;
+  const ssize_t length = ::read(file.number(), content.data(), content.size());
+  if (length < 0) failWithErrno(path);
+  const std::string text(content.data(), static_cast<std::size_t>(length));
+  const std::string line = text.substr(0, text.find_first_of("\r\n"));
+  if (line.empty()) throw std::runtime_error(path + " is empty: its first line must hold the secret");
+  return line;
+}
+
+}  // namespace QV::Ipmi

@@ -1,0 +1,114 @@
+#include <signal.h>
+#include <unistd.h>
+
+#include <array>
+#include <cstdlib>
+#include <fstream>
+#include <iostream>
+#include <iterator>
+#include <memory>
+
+#include "cimom/ObjectManager.h"
+#include "cimom/cimxml/Endpoint.h"
+#include "cimom/configuration/CommandLine.h"
+#include "cimom/http/PasswordFile.h"
+#include "cimom/http/Server.h"
+
+namespace {
+
+using namespace Cimom;
+
+constexpr int failure = 1;
+constexpr int usageError = 2;
+
+// The signals that end the program, taken by the main thread alone.
+class EndSignals {
+ public:
+  // Threads that start later inherit the mask, so it is set before any.
+  EndSignals() {
+    sigemptyset(&signals_);
+    sigaddset(&signals_, SIGTERM);
+    sigaddset(&signals_, SIGINT);
+    pthread_sigmask(SIG_BLOCK, &signals_, nullptr);
+    signal(SIGPIPE, SIG_IGN);
+  }
+
+  void wait() const {
+    int received = 0;
+    sigwait(&signals_, &received);
+  }
+
+ private:
+  sigset_t signals_{};
+};
+
+void load(ObjectManager& manager, const Configuration& configuration) {
+  for (const auto& schema : configuration.schemas) manager.loadSchema(schema);
+  for (const auto& registration : configuration.registrations) manager.loadRegistration(registration);
+  for (const auto& directory : configuration.providerDirectories) manager.addProviderDirectory(directory);
+  manager.checkProviders();
+}
+
+std::string contentOf(const std::filesystem::path& file) {
+  if (file.empty()) return {};
+  std::ifstream stream(file, std::ios::binary);
+  std::string content{std::istreambuf_iterator<char>(stream), {}};
+  if (content.empty()) throw Http::ServerError("cannot read " + file.string());
+  return content;
+}
+
+Http::ServerOptions serverOptions(const Configuration& configuration) {
+  Http::ServerOptions options;
+  options.address = configuration.address;
+  options.port = configuration.port;
+  options.maxRequestSize = configuration.maxRequestSize;
+  options.maxConnections = configuration.maxConnections;
+  options.idleTimeout = configuration.idleTimeout;
+  options.tlsCertificate = contentOf(configuration.tlsCertificate);
+  options.tlsKey = contentOf(configuration.tlsKey);
+  if (!configuration.passwordFile.empty()) {
+    options.authenticator = [passwords = std::make_shared<Http::PasswordFile>(configuration.passwordFile)](
+                                const std::string& user, const std::string& password) {
+      return passwords->accepts(user, password);
+    };
+  }
+  return options;
+}
+
+std::string hostName() {
+  std::array<char, 256> name{};
+  return gethostname(name.data(), name.size() - 1) == 0 && name[0] != '\0' ? name.data() : "localhost";
+}
+
+void serve(const Configuration& configuration, const EndSignals& endSignals) {
+  ObjectManager manager;
+  load(manager, configuration);
+  const CimXml::Endpoint endpoint(manager.broker(), manager.classes(), hostName());
+  Http::Server server(serverOptions(configuration),
+                      [&endpoint](const Http::Request& request) { return endpoint.handle(request); });
+  std::cout << "listening on " << server.endpoint() << std::endl;
+  endSignals.wait();
+  if (server.drain(configuration.shutdownTimeout)) return;
+  // A provider that is still at work can neither be cleaned up nor unloaded.
+  std::cerr << "cimomd: requests are still being answered after " << configuration.shutdownTimeout.count()
+            << " s: ending without the providers' cleanup" << std::endl;
+  std::_Exit(failure);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  try {
+    const auto configuration = readCommandLine(argc, argv);
+    if (!configuration) return 0;
+    const EndSignals endSignals;
+    serve(*configuration, endSignals);
+    return 0;
+  } catch (const UsageError& error) {
+    std::cerr << "cimomd: " << error.what() << "\n";
+    return usageError;
+  } catch (const std::exception& error) {
+    std::cerr << "cimomd: " << error.what() << "\n";
+    return failure;
+  }
+}

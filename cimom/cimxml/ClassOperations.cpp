@@ -1,0 +1,56 @@
+#include "cimom/cimxml/ClassOperations.h"
+
+#include "cimom/cimxml/Call.h"
+#include "cimom/cimxml/ClassWriter.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+void requireNamespace(const Call& call) {
+  if (call.manager.classes.hasNamespace(call.request.nameSpace)) return;
+  throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "the namespace " + call.request.nameSpace + " is not known");
+}
+
+const ClassDefinition& requireClass(const Call& call, const std::string& name, CMPIrc whenUnknown) {
+  const ClassDefinition* definition = call.manager.classes.find(name);
+  if (!definition) throw OperationError(whenUnknown, "the class " + name + " is not known");
+  return *definition;
+}
+
+ClassView viewOf(const Parameters& parameters) {
+  return {parameters.flag("LocalOnly", true), parameters.flag("IncludeQualifiers", true),
+          parameters.flag("IncludeClassOrigin", false), filterOf(parameters.propertyList())};
+}
+
+// The classes below the one that the client names, or below the root of all.
+std::vector<const ClassDefinition*> requestedClasses(const Call& call) {
+  requireNamespace(call);
+  const std::string name = call.parameters.className("ClassName");
+  if (!name.empty()) requireClass(call, name, CMPI_RC_ERR_INVALID_CLASS);
+  return call.manager.classes.subclasses(name, call.parameters.flag("DeepInheritance", false));
+}
+
+}  // namespace
+
+void getClass(Call& call) {
+  requireNamespace(call);
+  const auto& definition = requireClass(call, call.parameters.requiredClassName("ClassName"), CMPI_RC_ERR_NOT_FOUND);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ClassWriter(call.xml, viewOf(call.parameters)).write(definition);
+}
+
+void enumerateClasses(Call& call) {
+  const auto classes = requestedClasses(call);
+  ClassWriter writer(call.xml, viewOf(call.parameters));
+  const auto scope = call.xml.element("IRETURNVALUE");
+  for (const ClassDefinition* definition : classes) writer.write(*definition);
+}
+
+void enumerateClassNames(Call& call) {
+  const auto classes = requestedClasses(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  for (const ClassDefinition* definition : classes)
+    const auto name = call.xml.element("CLASSNAME", "NAME", definition->name);
+}
+
+}  // namespace Cimom::CimXml

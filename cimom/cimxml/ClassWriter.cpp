@@ -1,0 +1,92 @@
+#include "cimom/cimxml/ClassWriter.h"
+
+#include <cmpimacs.h>
+
+#include "cimom/broker/Names.h"
+#include "cimom/cimxml/Types.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+const char* truth(bool value) { return value ? "true" : "false"; }
+
+bool isArray(CMPIType type) { return (type & CMPI_ARRAY) != 0; }
+
+const char* propertyElement(const PropertyDeclaration& property) {
+  if (property.isReference()) return "PROPERTY.REFERENCE";
+  return isArray(property.type) ? "PROPERTY.ARRAY" : "PROPERTY";
+}
+
+const char* parameterElement(const PropertyDeclaration& parameter) {
+  if (parameter.isReference()) return isArray(parameter.type) ? "PARAMETER.REFARRAY" : "PARAMETER.REFERENCE";
+  return isArray(parameter.type) ? "PARAMETER.ARRAY" : "PARAMETER";
+}
+
+// TYPE, or the class that a reference refers to; and the size of a fixed array.
+void writeType(XmlWriter& xml, const PropertyDeclaration& declaration) {
+  if (declaration.isReference()) {
+    xml.attribute("REFERENCECLASS", declaration.referenceClass);
+  } else {
+    xml.attribute("TYPE", typeName(declaration.type));
+  }
+  if (declaration.arraySize > 0) xml.attribute("ARRAYSIZE", std::to_string(declaration.arraySize));
+}
+
+}  // namespace
+
+void ClassWriter::write(const ClassDefinition& definition) {
+  const auto scope = xml_.element("CLASS", "NAME", definition.name);
+  if (definition.superclass) xml_.attribute("SUPERCLASS", definition.superclass->name);
+  qualifiers(definition.qualifiers);
+  for (const auto& declaration : definition.properties)
+    if (isShown(definition, declaration.originClass) && view_.properties.includes(declaration.name.c_str()))
+      property(definition, declaration);
+  for (const auto& declaration : definition.methods)
+    if (isShown(definition, declaration.originClass)) method(definition, declaration);
+}
+
+bool ClassWriter::isShown(const ClassDefinition& definition, const std::string& originClass) const {
+  return !view_.localOnly || sameName(definition.name, originClass);
+}
+
+void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
+  if (!view_.includeQualifiers) return;
+  for (const Qualifier& qualifier : qualifiers) {
+    const char* type = typeName(qualifier.value.type());
+    const auto scope = xml_.element("QUALIFIER", "NAME", qualifier.name);
+    if (type) xml_.attribute("TYPE", type);
+    xml_.attribute("OVERRIDABLE", truth(qualifier.overridable));
+    xml_.attribute("TOSUBCLASS", truth(qualifier.toSubclass));
+    xml_.attribute("TRANSLATABLE", truth(qualifier.translatable));
+    values_.value(qualifier.value.toCmpi());
+  }
+}
+
+void ClassWriter::property(const ClassDefinition& definition, const PropertyDeclaration& property) {
+  const auto scope = xml_.element(propertyElement(property), "NAME", property.name);
+  writeType(xml_, property);
+  origin(definition, property.originClass);
+  qualifiers(property.qualifiers);
+  values_.value(property.defaultValue.toCmpi());
+}
+
+void ClassWriter::method(const ClassDefinition& definition, const MethodDeclaration& method) {
+  const auto scope = xml_.element("METHOD", "NAME", method.name);
+  if (const char* type = typeName(method.returnType)) xml_.attribute("TYPE", type);
+  origin(definition, method.originClass);
+  qualifiers(method.qualifiers);
+  for (const auto& declaration : method.parameters) parameter(declaration);
+}
+
+void ClassWriter::parameter(const PropertyDeclaration& parameter) {
+  const auto scope = xml_.element(parameterElement(parameter), "NAME", parameter.name);
+  writeType(xml_, parameter);
+  qualifiers(parameter.qualifiers);
+}
+
+void ClassWriter::origin(const ClassDefinition& definition, const std::string& originClass) {
+  if (view_.includeClassOrigin) xml_.attribute("CLASSORIGIN", originClass);
+  xml_.attribute("PROPAGATED", truth(!sameName(definition.name, originClass)));
+}
+
+}  // namespace Cimom::CimXml

@@ -1,0 +1,40 @@
+#ifndef CIMOM_CIMXML_CLASSWRITER_H_
+#define CIMOM_CIMXML_CLASSWRITER_H_
+
+#include "cimom/cimxml/ObjectWriter.h"
+#include "cimom/schema/ClassDefinition.h"
+
+namespace Cimom::CimXml {
+
+/// What of a class a client wants to see (DSP0200, GetClass).
+struct ClassView {
+  bool localOnly = true;  ///< leaves out what the class inherits
+  bool includeQualifiers = true;
+  bool includeClassOrigin = false;
+  PropertyFilter properties;
+};
+
+/// Writes CLASS. Default values are made in the current request scope.
+class ClassWriter {
+ public:
+  ClassWriter(XmlWriter& xml, ClassView view) : xml_(xml), values_(xml, none_, none_), view_(std::move(view)) {}
+
+  void write(const ClassDefinition& definition);
+
+ private:
+  void qualifiers(const Qualifiers& qualifiers);
+  void property(const ClassDefinition& definition, const PropertyDeclaration& property);
+  void method(const ClassDefinition& definition, const MethodDeclaration& method);
+  void parameter(const PropertyDeclaration& parameter);
+  void origin(const ClassDefinition& definition, const std::string& originClass);
+  bool isShown(const ClassDefinition& definition, const std::string& originClass) const;
+
+  XmlWriter& xml_;
+  const std::string none_;  ///< a schema's default values are in no host and no namespace
+  ObjectWriter values_;
+  ClassView view_;
+};
+
+}  // namespace Cimom::CimXml
+
+#endif  // CIMOM_CIMXML_CLASSWRITER_H_

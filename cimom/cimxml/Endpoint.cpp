@@ -1,0 +1,87 @@
+#include "cimom/cimxml/Endpoint.h"
+
+#include <algorithm>
+#include <array>
+
+#include "cimom/cimxml/Errors.h"
+#include "cimom/cimxml/OperationHeaders.h"
+#include "cimom/cimxml/Operations.h"
+#include "cimom/cimxml/RequestReader.h"
+#include "cimom/cimxml/XmlWriter.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+// What RFC 9110 calls the methods that a server may know and not allow; any other method is not implemented.
+constexpr std::array<std::string_view, 6> otherMethods = {"GET", "HEAD", "PUT", "DELETE", "OPTIONS", "TRACE"};
+
+Http::Response plain(unsigned status, const std::string& text) {
+  Http::Response response{status, {}, text + "\n"};
+  response.headers.add("Content-Type", "text/plain; charset=\"utf-8\"");
+  return response;
+}
+
+Http::Response refusedMethod(const std::string& method) {
+  const bool isKnown = std::find(otherMethods.begin(), otherMethods.end(), method) != otherMethods.end();
+  Http::Response response = plain(isKnown ? 405 : 501, "CIM operations are sent with POST or M-POST, not " + method);
+  response.headers.add("Allow", "POST, M-POST");
+  return response;
+}
+
+// CIM/MESSAGE/SIMPLERSP and the response in it, whose content the function writes.
+template <typename Content>
+std::string responseMessage(const Request& request, Content content) {
+  XmlWriter xml;
+  {
+    const auto root = xml.element("CIM", "CIMVERSION", "2.0");
+    xml.attribute("DTDVERSION", "2.0");
+    const auto message = xml.element("MESSAGE", "ID", request.messageId);
+    xml.attribute("PROTOCOLVERSION", "1.0");
+    const auto simple = xml.element("SIMPLERSP");
+    const auto response =
+        xml.element(request.isIntrinsic ? "IMETHODRESPONSE" : "METHODRESPONSE", "NAME", request.method);
+    content(xml);
+  }
+  return xml.take();
+}
+
+std::string errorMessage(const Request& request, int code, const char* description) {
+  return responseMessage(request, [&](XmlWriter& xml) {
+    const auto error = xml.element("ERROR", "CODE", std::to_string(code));
+    xml.attribute("DESCRIPTION", description);
+  });
+}
+
+}  // namespace
+
+Endpoint::Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std::string host)
+    : broker_(broker), classes_(classes), host_(std::move(host)) {}
+
+Http::Response Endpoint::handle(const Http::Request& request) const {
+  if (request.path != "/cimom" && request.path != "/") return plain(404, "CIM operations are sent to /cimom");
+  if (request.method != "POST" && request.method != "M-POST") return refusedMethod(request.method);
+  try {
+    const OperationHeaders headers(request);
+    const Request message = readRequest(request.body);
+    headers.requireMatch(message);
+    Http::Response response;
+    response.body = respond(message, request.user);
+    response.headers.add("Content-Type", "application/xml; charset=\"utf-8\"");
+    headers.addTo(response.headers);
+    return response;
+  } catch (const TransportError& error) {
+    Http::Response response = plain(error.httpStatus(), error.what());
+    if (!error.cimError().empty()) response.headers.add("CIMError", error.cimError());
+    return response;
+  }
+}
+
+std::string Endpoint::respond(const Request& request, const std::string& user) const {
+  try {
+    return responseMessage(request, [&](XmlWriter& xml) { perform({broker_, classes_, host_, user}, request, xml); });
+  } catch (const OperationError& error) {
+    return errorMessage(request, error.code(), error.what());
+  }
+}
+
+}  // namespace Cimom::CimXml

@@ -1,0 +1,34 @@
+#ifndef CIMOM_CIMXML_ENDPOINT_H_
+#define CIMOM_CIMXML_ENDPOINT_H_
+
+#include <cmpift.h>
+
+#include <string>
+
+#include "cimom/cimxml/Request.h"
+#include "cimom/http/Message.h"
+#include "cimom/schema/ClassRepository.h"
+
+namespace Cimom::CimXml {
+
+/// CIM operations over HTTP (DSP0200 1.4): takes POST and M-POST on /cimom and /. What is no CIM operation is answered
+/// with an HTTP status, the CIMError header that DSP0200 has for it and a line of plain text that tells what is wrong.
+class Endpoint {
+ public:
+  /// @param host stands in paths that name no host
+  Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std::string host);
+
+  /// May be called from several threads at once.
+  Http::Response handle(const Http::Request& request) const;
+
+ private:
+  std::string respond(const Request& request, const std::string& user) const;
+
+  const CMPIBroker* broker_;
+  const ClassRepository& classes_;
+  std::string host_;
+};
+
+}  // namespace Cimom::CimXml
+
+#endif  // CIMOM_CIMXML_ENDPOINT_H_

@@ -1,0 +1,119 @@
+#include "cimom/cimxml/InstanceOperations.h"
+
+#include <algorithm>
+
+#include "cimom/broker/Names.h"
+#include "cimom/cimxml/Call.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+using NameList = std::optional<std::vector<std::string>>;
+
+// Without DeepInheritance a subclass's instance shows what the requested class has, and no more.
+NameList visibleProperties(const Call& call, const std::string& className) {
+  const NameList list = call.parameters.propertyList();
+  const ClassDefinition* definition = call.manager.classes.find(className);
+  if (call.parameters.flag("DeepInheritance", true) || !definition) return list;
+  std::vector<std::string> names;
+  for (const PropertyDeclaration& property : definition->properties) {
+    const auto isProperty = [&property](const std::string& name) { return sameName(name, property.name); };
+    if (!list || std::any_of(list->begin(), list->end(), isProperty)) names.push_back(property.name);
+  }
+  return names;
+}
+
+}  // namespace
+
+void enumerateInstances(Call& call) {
+  const std::string className = call.parameters.requiredClassName("ClassName");
+  const NameList list = call.parameters.propertyList();
+  PropertyNames names(list);
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIEnumeration* result =
+      CBEnumInstances(call.manager.broker, call.context, call.classPath(className), names.get(), &status);
+  ObjectWriter writer = call.writer(filterOf(visibleProperties(call, className)));
+  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.namedInstance(value.inst); });
+}
+
+void enumerateInstanceNames(Call& call) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
+  CMPIEnumeration* result = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  ObjectWriter writer = call.writer();
+  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.instanceName(value.ref); });
+}
+
+void getInstance(Call& call) {
+  const CMPIObjectPath* path = call.objects.path(call.parameters.instanceName("InstanceName"));
+  const NameList list = call.parameters.propertyList();
+  PropertyNames names(list);
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const CMPIInstance* instance = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
+  requireOk(status, instance);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  call.writer(filterOf(list)).instance(instance);
+}
+
+void createInstance(Call& call) {
+  const Instance& given = call.parameters.instance("NewInstance");
+  const CMPIInstance* instance = call.objects.instance(given);
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const CMPIObjectPath* path =
+      CBCreateInstance(call.manager.broker, call.context, call.objects.path(given.path), instance, &status);
+  requireOk(status, path);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  call.writer().instanceName(path);
+}
+
+void modifyInstance(Call& call) {
+  const Instance& given = call.parameters.instance("ModifiedInstance");
+  const CMPIObjectPath* path = call.objects.path(given.path);
+  const CMPIInstance* instance = call.objects.instance(given);
+  const NameList list = call.parameters.propertyList();
+  PropertyNames names(list);
+  requireOk(CBModifyInstance(call.manager.broker, call.context, path, instance, names.get()));
+}
+
+void deleteInstance(Call& call) {
+  const CMPIObjectPath* path = call.objects.path(call.parameters.instanceName("InstanceName"));
+  requireOk(CBDeleteInstance(call.manager.broker, call.context, path));
+}
+
+void getProperty(Call& call) {
+  const CMPIObjectPath* path = call.objects.path(call.parameters.instanceName("InstanceName"));
+  const std::string name = call.parameters.text("PropertyName").value_or("");
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const CMPIData data = CBGetProperty(call.manager.broker, call.context, path, name.c_str(), &status);
+  requireOk(status);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  call.writer().value(data);
+}
+
+void setProperty(Call& call) {
+  const ObjectName& instance = call.parameters.instanceName("InstanceName");
+  Property property;
+  property.name = call.parameters.text("PropertyName").value_or("");
+  if (const Parameter* given = call.parameters.find("NewValue")) {
+    std::visit(
+        [&property](const auto& value) {
+          if constexpr (std::is_constructible_v<Value, decltype(value)>) property.value = value;
+        },
+        given->value);
+  }
+  const auto value = call.objects.propertyValue(instance.className, property);
+  requireOk(CBSetProperty(call.manager.broker, call.context, call.objects.path(instance), property.name.c_str(),
+                          value.pointer(), value.type));
+}
+
+void execQuery(Call& call) {
+  const std::string query = call.parameters.text("Query").value_or("");
+  const std::string language = call.parameters.text("QueryLanguage").value_or("");
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIEnumeration* result =
+      CBExecQuery(call.manager.broker, call.context, call.classPath(""), query.c_str(), language.c_str(), &status);
+  ObjectWriter writer = call.writer();
+  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.objectWithPath(value.inst); });
+}
+
+}  // namespace Cimom::CimXml

@@ -1,0 +1,158 @@
+#include "cimom/cimxml/ObjectBuilder.h"
+
+#include <cmpimacs.h>
+
+#include <array>
+
+#include "cimom/cimxml/Status.h"
+#include "cimom/cimxml/Types.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+constexpr std::array<CMPIType, 3> numberTypes = {CMPI_sint64, CMPI_uint64, CMPI_real64};
+
+CMPIType numberType(const std::string& text) {
+  for (const CMPIType type : numberTypes)
+    if (parseScalar(type, text)) return type;
+  return CMPI_string;
+}
+
+CMPIType claimedType(const KeyValue& key) {
+  if (key.kind == KeyValue::Kind::Reference) return CMPI_ref;
+  if (const auto type = typeOf(key.type)) return *type;
+  switch (key.kind) {
+    case KeyValue::Kind::Boolean:
+      return CMPI_boolean;
+    case KeyValue::Kind::Numeric:
+      return numberType(key.text);
+    default:
+      return CMPI_string;
+  }
+}
+
+// A class with one key may be named by the key's value alone.
+std::string loneKey(const ClassDefinition* definition, const ObjectName& name) {
+  std::string key;
+  for (const auto& property : definition ? definition->properties : std::vector<PropertyDeclaration>()) {
+    if (!property.isKey()) continue;
+    if (!key.empty())
+      throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has more than one key");
+    key = property.name;
+  }
+  if (key.empty()) throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has no key");
+  return key;
+}
+
+}  // namespace
+
+CMPIObjectPath* ObjectBuilder::path(const ObjectName& name) const {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const std::string& nameSpace = name.nameSpace.empty() ? nameSpace_ : name.nameSpace;
+  CMPIObjectPath* path = CMNewObjectPath(broker_, nameSpace.c_str(), name.className.c_str(), &status);
+  requireOk(status, path);
+  if (!name.host.empty()) requireOk(CMSetHostname(path, name.host.c_str()));
+  for (const KeyBinding& key : name.keys) addKey(path, name, key);
+  return path;
+}
+
+void ObjectBuilder::addKey(CMPIObjectPath* path, const ObjectName& name, const KeyBinding& key) const {
+  const ClassDefinition* definition = classes_.find(name.className);
+  const std::string keyName = key.name.empty() ? loneKey(definition, name) : key.name;
+  const PropertyDeclaration* declared = definition ? definition->findProperty(keyName) : nullptr;
+  const TypedValue value = keyValue({keyName, key.value}, declared ? declared->type : claimedType(key.value));
+  requireOk(CMAddKey(path, keyName.c_str(), value.pointer(), value.type));
+}
+
+ObjectBuilder::TypedValue ObjectBuilder::keyValue(const KeyBinding& key, CMPIType type) const {
+  TypedValue typed{{}, type, false};
+  const bool isReference = key.value.kind == KeyValue::Kind::Reference;
+  if (isReference && type == CMPI_ref) {
+    typed.value.ref = path(*key.value.reference);
+  } else if (isReference || type == CMPI_ref) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
+                         "the key " + key.name + (isReference ? " is no reference" : " is a reference"));
+  } else if (!scalar(type, key.value.text, typed.value)) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
+                         "the key " + key.name + " is no " + typeName(type) + ": \"" + key.value.text + "\"");
+  }
+  return typed;
+}
+
+CMPIInstance* ObjectBuilder::instance(const Instance& instance) const {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIInstance* object = CMNewInstance(broker_, path(instance.path), &status);
+  requireOk(status, object);
+  for (const Property& property : instance.properties) {
+    const TypedValue value = propertyValue(instance.path.className, property);
+    requireOk(CMSetProperty(object, property.name.c_str(), value.pointer(), value.type));
+  }
+  return object;
+}
+
+ObjectBuilder::TypedValue ObjectBuilder::propertyValue(const std::string& className, const Property& property) const {
+  const ClassDefinition* definition = classes_.find(className);
+  if (!definition) throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+  const PropertyDeclaration* declared = definition->findProperty(property.name);
+  if (!declared)
+    throw OperationError(CMPI_RC_ERR_NO_SUCH_PROPERTY,
+                         "the class " + definition->name + " has no property " + property.name);
+  return typed(property, declared->type);
+}
+
+ObjectBuilder::TypedValue ObjectBuilder::typed(const Property& property, CMPIType type) const {
+  const CMPIType elementType = type & static_cast<CMPIType>(~CMPI_ARRAY);
+  const bool isArray = elementType != type;
+  const std::string declaredName = std::string(typeName(type)) + (isArray ? "[]" : "");
+  TypedValue typed{{}, type, false};
+  if (!property.type.empty() && (property.type != typeName(type) || property.isArray != isArray))
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "the property " + property.name + " is of type " + declaredName +
+                                                        ", not " + property.type + (property.isArray ? "[]" : ""));
+  if (const auto* text = std::get_if<std::string>(&property.value); text && !isArray && type != CMPI_ref) {
+    if (!scalar(type, *text, typed.value))
+      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH,
+                           "the property " + property.name + " is no " + declaredName + ": \"" + *text + "\"");
+  } else if (const auto* texts = std::get_if<Texts>(&property.value); texts && isArray) {
+    typed.value.array = array(property, *texts, elementType);
+  } else if (const auto* name = std::get_if<ObjectName>(&property.value); name && type == CMPI_ref) {
+    typed.value.ref = path(*name);
+  } else if (std::holds_alternative<std::monostate>(property.value)) {
+    typed.isNull = true;
+  } else {
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "the property " + property.name + " is of type " + declaredName);
+  }
+  return typed;
+}
+
+CMPIArray* ObjectBuilder::array(const Property& property, const Texts& texts, CMPIType elementType) const {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIArray* array = CMNewArray(broker_, static_cast<CMPICount>(texts.size()), elementType, &status);
+  requireOk(status, array);
+  for (CMPICount i = 0; i < texts.size(); ++i) {
+    if (!texts[i]) continue;  // an element is null until it is set
+    CMPIValue value{};
+    if (!scalar(elementType, *texts[i], value))
+      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "element " + std::to_string(i) + " of the property " +
+                                                          property.name + " is no " + typeName(elementType) + ": \"" +
+                                                          *texts[i] + "\"");
+    requireOk(CMSetArrayElementAt(array, i, &value, elementType));
+  }
+  return array;
+}
+
+bool ObjectBuilder::scalar(CMPIType type, const std::string& text, CMPIValue& value) const {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  if (type == CMPI_string) {
+    value.string = CMNewString(broker_, text.c_str(), &status);
+    return status.rc == CMPI_RC_OK;
+  }
+  if (type == CMPI_dateTime) {
+    value.dateTime = CMNewDateTimeFromChars(broker_, text.c_str(), &status);
+    return status.rc == CMPI_RC_OK && value.dateTime;
+  }
+  const auto parsed = parseScalar(type, text);
+  if (parsed) value = *parsed;
+  return parsed.has_value();
+}
+
+}  // namespace Cimom::CimXml

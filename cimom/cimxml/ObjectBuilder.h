@@ -1,0 +1,51 @@
+#ifndef CIMOM_CIMXML_OBJECTBUILDER_H_
+#define CIMOM_CIMXML_OBJECTBUILDER_H_
+
+#include <cmpift.h>
+
+#include <string>
+
+#include "cimom/cimxml/Request.h"
+#include "cimom/schema/ClassRepository.h"
+
+namespace Cimom::CimXml {
+
+/// Makes CMPI objects of what a client sent; the class says which type each key and property has. The objects live in
+/// the current request scope. Errors are OperationErrors that name the key or the property.
+class ObjectBuilder {
+ public:
+  ObjectBuilder(const CMPIBroker* broker, const ClassRepository& classes, const std::string& nameSpace)
+      : broker_(broker), classes_(classes), nameSpace_(nameSpace) {}
+
+  /// A key has its class's type; one that the class does not declare has the type that the client claims, or the one
+  /// that its text looks like.
+  CMPIObjectPath* path(const ObjectName& name) const;
+
+  /// A property that the class does not declare is CIM_ERR_NO_SUCH_PROPERTY, one of another type than the class's
+  /// CIM_ERR_TYPE_MISMATCH. What the client sets to null is null, whatever default the class has.
+  CMPIInstance* instance(const Instance& instance) const;
+
+  /// A property's new value.
+  struct TypedValue {
+    CMPIValue value{};
+    CMPIType type = CMPI_null;
+    bool isNull = true;
+    const CMPIValue* pointer() const { return isNull ? nullptr : &value; }
+  };
+  TypedValue propertyValue(const std::string& className, const Property& property) const;
+
+ private:
+  void addKey(CMPIObjectPath* path, const ObjectName& name, const KeyBinding& key) const;
+  TypedValue keyValue(const KeyBinding& key, CMPIType type) const;
+  TypedValue typed(const Property& property, CMPIType type) const;
+  CMPIArray* array(const Property& property, const Texts& texts, CMPIType elementType) const;
+  bool scalar(CMPIType type, const std::string& text, CMPIValue& value) const;
+
+  const CMPIBroker* broker_;
+  const ClassRepository& classes_;
+  const std::string& nameSpace_;
+};
+
+}  // namespace Cimom::CimXml
+
+#endif  // CIMOM_CIMXML_OBJECTBUILDER_H_

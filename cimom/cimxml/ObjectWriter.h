@@ -1,0 +1,74 @@
+/// Writes CMPI objects as CIM-XML (DSP0201).
+#ifndef CIMOM_CIMXML_OBJECTWRITER_H_
+#define CIMOM_CIMXML_OBJECTWRITER_H_
+
+#include <cmpidt.h>
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "cimom/cimxml/XmlWriter.h"
+
+namespace Cimom::CimXml {
+
+/// Which properties a client wants to see; names without regard to case.
+class PropertyFilter {
+ public:
+  PropertyFilter() = default;  ///< all of them
+  explicit PropertyFilter(std::vector<std::string> names) : names_(std::move(names)) {}
+
+  bool includes(const char* name) const;
+
+ private:
+  std::optional<std::vector<std::string>> names_;
+};
+
+class ObjectWriter {
+ public:
+  /// host and nameSpace stand in a path that names none itself.
+  ObjectWriter(XmlWriter& xml, const std::string& host, const std::string& nameSpace, PropertyFilter filter = {})
+      : xml_(xml), host_(host), nameSpace_(nameSpace), filter_(std::move(filter)) {}
+
+  /// INSTANCENAME; a key that is null has no form in CIM-XML and is left out.
+  void instanceName(const CMPIObjectPath* path);
+
+  /// INSTANCEPATH: with host and namespace.
+  void instancePath(const CMPIObjectPath* path);
+
+  /// OBJECTPATH.
+  void objectPath(const CMPIObjectPath* path);
+
+  /// INSTANCE; a property without a value is an empty element.
+  void instance(const CMPIInstance* instance);
+
+  /// VALUE.NAMEDINSTANCE.
+  void namedInstance(const CMPIInstance* instance);
+
+  /// VALUE.OBJECTWITHPATH.
+  void objectWithPath(const CMPIInstance* instance);
+
+  /// VALUE, VALUE.ARRAY or VALUE.REFERENCE; nothing for a null value.
+  void value(const CMPIData& data);
+
+ private:
+  void keyBinding(const char* name, const CMPIData& data);
+  void nameSpacePath(const CMPIObjectPath* path);
+  void property(const char* name, const CMPIData& data);
+  void reference(const CMPIObjectPath* path);
+  void array(const CMPIData& data);
+  std::string scalar(CMPIType type, const CMPIValue& value) const;
+
+  XmlWriter& xml_;
+  const std::string& host_;
+  const std::string& nameSpace_;
+  PropertyFilter filter_;
+};
+
+/// LOCALNAMESPACEPATH of "root/cimv2".
+void writeLocalNameSpacePath(XmlWriter& xml, std::string_view nameSpace);
+
+}  // namespace Cimom::CimXml
+
+#endif  // CIMOM_CIMXML_OBJECTWRITER_H_

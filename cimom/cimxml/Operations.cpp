@@ -1,0 +1,99 @@
+#include "cimom/cimxml/Operations.h"
+
+#include <algorithm>
+#include <string_view>
+#include <vector>
+
+#include "cimom/broker/Names.h"
+#include "cimom/broker/RequestScope.h"
+#include "cimom/cimxml/AssociationOperations.h"
+#include "cimom/cimxml/Call.h"
+#include "cimom/cimxml/ClassOperations.h"
+#include "cimom/cimxml/InstanceOperations.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+struct Operation {
+  std::string_view name;
+  void (*perform)(Call&);
+  std::vector<std::string_view> parameters;
+};
+
+const std::vector<Operation>& operations() {
+  static const std::vector<Operation> table = {
+      {"EnumerateInstances",
+       enumerateInstances,
+       {"ClassName", "LocalOnly", "DeepInheritance", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+      {"EnumerateInstanceNames", enumerateInstanceNames, {"ClassName"}},
+      {"GetInstance",
+       getInstance,
+       {"InstanceName", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+      {"CreateInstance", createInstance, {"NewInstance"}},
+      {"ModifyInstance", modifyInstance, {"ModifiedInstance", "IncludeQualifiers", "PropertyList"}},
+      {"DeleteInstance", deleteInstance, {"InstanceName"}},
+      {"GetProperty", getProperty, {"InstanceName", "PropertyName"}},
+      {"SetProperty", setProperty, {"InstanceName", "PropertyName", "NewValue"}},
+      {"ExecQuery", execQuery, {"QueryLanguage", "Query"}},
+      {"Associators",
+       associators,
+       {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole", "IncludeQualifiers", "IncludeClassOrigin",
+        "PropertyList"}},
+      {"AssociatorNames", associatorNames, {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole"}},
+      {"References",
+       references,
+       {"ObjectName", "ResultClass", "Role", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+      {"ReferenceNames", referenceNames, {"ObjectName", "ResultClass", "Role"}},
+      {"GetClass", getClass, {"ClassName", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
+      {"EnumerateClasses",
+       enumerateClasses,
+       {"ClassName", "DeepInheritance", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin"}},
+      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}}};
+  return table;
+}
+
+const Operation& findOperation(const std::string& name) {
+  const auto operation = std::find_if(operations().begin(), operations().end(),
+                                      [&name](const Operation& candidate) { return sameName(candidate.name, name); });
+  if (operation == operations().end())
+    throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED, "this server does not offer the operation " + name);
+  return *operation;
+}
+
+void describeCaller(const CMPIContext* context, const OperationContext& manager, const Parameters& parameters) {
+  CMPIValue flags{};
+  flags.uint32 = (parameters.flag("LocalOnly", false) ? CMPI_FLAG_LocalOnly : 0) |
+                 (parameters.flag("DeepInheritance", false) ? CMPI_FLAG_DeepInheritance : 0) |
+                 (parameters.flag("IncludeQualifiers", false) ? CMPI_FLAG_IncludeQualifiers : 0) |
+                 (parameters.flag("IncludeClassOrigin", false) ? CMPI_FLAG_IncludeClassOrigin : 0);
+  requireOk(CMAddContextEntry(context, CMPIInvocationFlags, &flags, CMPI_uint32));
+  if (!manager.user.empty()) requireOk(CMAddContextEntry(context, CMPIPrincipal, manager.user.c_str(), CMPI_chars));
+}
+
+// Providers of methods are not taken, so a class's method is known at most.
+[[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
+  const std::string& className = request.target.className;
+  if (!manager.classes.hasNamespace(request.nameSpace))
+    throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "the namespace " + request.nameSpace + " is not known");
+  const ClassDefinition* definition = manager.classes.find(className);
+  if (!definition) throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+  if (!definition->findMethod(request.method))
+    throw OperationError(CMPI_RC_ERR_METHOD_NOT_FOUND, "the class " + className + " has no method " + request.method);
+  throw OperationError(CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "no provider performs the method " + request.method);
+}
+
+}  // namespace
+
+void perform(const OperationContext& manager, const Request& request, XmlWriter& xml) {
+  if (!request.isIntrinsic) refuseMethod(manager, request);
+  const Operation& operation = findOperation(request.method);
+  const Parameters parameters(request, operation.parameters);
+  RequestScope scope(manager.broker);
+  const CMPIContext* context = scope.context();
+  describeCaller(context, manager, parameters);
+  const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);
+  Call call{manager, request, parameters, context, objects, xml};
+  operation.perform(call);
+}
+
+}  // namespace Cimom::CimXml

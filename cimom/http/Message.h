@@ -1,0 +1,47 @@
+/// The HTTP request and response as the handler of a server sees them.
+#ifndef CIMOM_HTTP_MESSAGE_H_
+#define CIMOM_HTTP_MESSAGE_H_
+
+#include <functional>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+namespace Cimom::Http {
+
+/// Header fields in their order; names are compared without regard to case (RFC 9110, 5.1).
+class Headers {
+ public:
+  void add(std::string name, std::string value) { fields_.emplace_back(std::move(name), std::move(value)); }
+
+  /// The value of the first field of that name, or null.
+  const std::string* find(std::string_view name) const;
+
+  auto begin() const { return fields_.begin(); }
+  auto end() const { return fields_.end(); }
+
+ private:
+  std::vector<std::pair<std::string, std::string>> fields_;
+};
+
+struct Request {
+  std::string method;
+  std::string path;  ///< as sent, without the query
+  Headers headers;
+  std::string body;  ///< complete, decoded from any transfer coding
+  std::string user;  ///< who has authenticated; empty where the server asks nobody
+};
+
+struct Response {
+  unsigned status = 200;
+  Headers headers;
+  std::string body;
+};
+
+/// Answers one request; called from several threads at once. An exception becomes a 500.
+using Handler = std::function<Response(const Request&)>;
+
+}  // namespace Cimom::Http
+
+#endif  // CIMOM_HTTP_MESSAGE_H_

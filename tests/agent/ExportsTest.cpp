@@ -1,0 +1,55 @@
+// What each library of the agent exports: its contract and nothing else, since object managers load providers into one
+// name space.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cstdio>
+#include <memory>
+#include <set>
+#include <sstream>
+#include <string>
+
+namespace {
+
+std::set<std::string> exportsOf(const std::string& library) {
+  const std::string command = "nm -DC --defined-only " + library;
+  const std::unique_ptr<FILE, int (*)(FILE*)> nm(::popen(command.c_str(), "r"), ::pclose);
+  std::string text;
+  for (int character = std::fgetc(nm.get()); character != EOF; character = std::fgetc(nm.get()))
+    text += static_cast<char>(character);
+  std::set<std::string> names;
+  std::istringstream lines(text);
+  std::string address;
+  std::string kind;
+  for (std::string name; lines >> address >> kind && std::getline(lines >> std::ws, name);)
+    names.insert(name.substr(0, name.find_first_of("([")));
+  return names;
+}
+
+TEST(Exports, ofTheLogAreItsContract) {
+  EXPECT_THAT(exportsOf(TWLOG),
+              testing::UnorderedElementsAre("TWLog::TWMessageBuffer::TWMessageBuffer",
+                                            "TWLog::TWMessageBuffer::~TWMessageBuffer",
+                                            "TWLog::TWMessageBuffer::operator<<", "TWLog::str",
+                                            "TWLog::TWLogger::logLevelMessage", "TWLog::TWLogger::traceLevelMessage"));
+}
+
+TEST(Exports, ofTheHelpersAreTheirContract) {
+  EXPECT_THAT(exportsOf(QVHELPER), testing::UnorderedElementsAre("QV::mapProperty", "QV::getSystemName",
+                                                                 "QV::isObjPathsEqual", "QV::textEqual"));
+}
+
+TEST(Exports, ofTheInstrumentationAreItsContractAndTheSharedBackEnd) {
+  EXPECT_THAT(
+      exportsOf(QVINSTRUMENTATION),
+      testing::UnorderedElementsAre("QV::Instrumentation::Instrumentation", "QV::Instrumentation::~Instrumentation",
+                                    "QV::Instrumentation::selectNode", "QV::Instrumentation::operator bool",
+                                    "QV::Instrumentation::getProperty", "QV::Instrumentation::operator++",
+                                    "QV::Instrumentation::setProperty", "QV::sharedBackEnd"));
+}
+
+TEST(Exports, ofTheUnderlyingProviderAreItsFactory) {
+  EXPECT_THAT(exportsOf(UNDERLYING), testing::UnorderedElementsAre("UnderlyingIPConfigProvider_Create_InstanceMI"));
+}
+
+}  // namespace

@@ -1,0 +1,183 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <sstream>
+
+#include "agent/support/TemporaryDirectory.h"
+#include "agent/support/Throws.h"
+#include "config/AgentConfiguration.h"
+
+namespace QV {
+namespace {
+
+using Destination = ChannelSettings::Destination;
+using testing::HasSubstr;
+
+AgentConfiguration parse(const std::string& text) {
+  std::istringstream stream(text);
+  return parseAgentConfiguration(stream, "agent.ini");
+}
+
+std::string complaintAbout(const std::string& text) {
+  return thrownBy([&] { parse(text); });
+}
+
+// Sets QV_AGENT_INI for one test.
+class AgentIniVariable {
+ public:
+  explicit AgentIniVariable(const std::string& value) { ::setenv("QV_AGENT_INI", value.c_str(), 1); }
+  ~AgentIniVariable() { ::unsetenv("QV_AGENT_INI"); }
+};
+
+TEST(AgentConfiguration, anEmptyFileMeansTheDefaults) {
+  const AgentConfiguration configuration = parse("");
+  EXPECT_EQ(configuration.systemName, "");
+  EXPECT_EQ(configuration.log.destination, Destination::Syslog);
+  EXPECT_EQ(configuration.log.threshold, 6000);
+  EXPECT_EQ(configuration.trace.destination, Destination::Off);
+  EXPECT_EQ(configuration.trace.threshold, 4000);
+  EXPECT_EQ(configuration.backEnd, AgentConfiguration::BackEndKind::Simulated);
+  EXPECT_EQ(configuration.simulatedState, "/var/lib/compositeipconfig/management-processor.json");
+  EXPECT_TRUE(configuration.ipmi.empty());
+}
+
+TEST(AgentConfiguration, everyKeyIsTaken) {
+  const AgentConfiguration configuration = parse(
+      "[system]\nname = rack7.example\n"
+      "[log]\ndestination = file\nfile = /l/log\nthreshold = 5000\nthreshold.Tarnwick.IPConfigProvider = 4000\n"
+      "[trace]\ndestination = stderr\nfile = /l/trace\nthreshold = 1\nthreshold.A = 2\nthreshold.B = 0\n"
+      "[processor]\nbackend = ipmi\nname = bmc7\ndescription = the one in rack 7\n"
+      "[simulated]\nstate = /s/state.json\n"
+      "[ipmi]\nhost = 192.0.2.10\nanything = at all\n");
+  EXPECT_EQ(configuration.systemName, "rack7.example");
+  EXPECT_EQ(configuration.log.destination, Destination::File);
+  EXPECT_EQ(configuration.log.file, "/l/log");
+  EXPECT_EQ(configuration.log.threshold, 5000);
+  EXPECT_EQ(configuration.log.componentThresholds, (std::map<std::string, int>{{"Tarnwick.IPConfigProvider", 4000}}));
+  EXPECT_EQ(configuration.trace.destination, Destination::Stderr);
+  EXPECT_EQ(configuration.trace.file, "/l/trace");
+  EXPECT_EQ(configuration.trace.threshold, 1);
+  EXPECT_EQ(configuration.trace.componentThresholds, (std::map<std::string, int>{{"A", 2}, {"B", 0}}));
+  EXPECT_EQ(configuration.backEnd, AgentConfiguration::BackEndKind::Ipmi);
+  EXPECT_EQ(configuration.processorName, "bmc7");
+  EXPECT_EQ(configuration.processorDescription, "the one in rack 7");
+  EXPECT_EQ(configuration.simulatedState, "/s/state.json");
+  EXPECT_EQ(configuration.ipmi, (std::map<std::string, std::string>{{"host", "192.0.2.10"}, {"anything", "at all"}}));
+}
+
+TEST(AgentConfiguration, theSampleIsAFileOfDefaults) {
+  // Given the sample as it is shipped, and the same with every key put into force
+  const std::string sample = readFile(SOURCE_DIR "/agent/agent.ini.sample");
+  std::string inForce;
+  std::istringstream lines(sample);
+  for (std::string line; std::getline(lines, line);) {
+    const bool commentedKey = line.starts_with(';') && line.find(" = ") != std::string::npos && line[1] != ' ';
+    inForce += (commentedKey ? line.substr(1) : line) + '\n';
+  }
+
+  // Then both are accepted, and the keys that the sample shows with a value show the default
+  EXPECT_NO_THROW(parse(sample));
+  const AgentConfiguration shown = parse(inForce);
+  const AgentConfiguration defaults;
+  EXPECT_NE(inForce.find("\nbackend = simulated\n"), std::string::npos);
+  EXPECT_EQ(shown.log.destination, defaults.log.destination);
+  EXPECT_EQ(shown.log.threshold, defaults.log.threshold);
+  EXPECT_EQ(shown.trace.destination, defaults.trace.destination);
+  EXPECT_EQ(shown.trace.threshold, defaults.trace.threshold);
+  EXPECT_EQ(shown.backEnd, defaults.backEnd);
+  EXPECT_EQ(shown.simulatedState, defaults.simulatedState);
+}
+
+struct Fault {
+  const char* text;
+  const char* complaint;
+};
+
+class FaultyAgentIni : public testing::TestWithParam<Fault> {};
+
+TEST_P(FaultyAgentIni, isRefusedWithTheLineAndTheReason) {
+  EXPECT_EQ(complaintAbout(GetParam().text), GetParam().complaint);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Each, FaultyAgentIni,
+    testing::Values(
+        Fault{"name = x\n", "agent.ini:1: the key 'name' stands before any section"},
+        Fault{"[system]\nname = x\n[sytem]\nname = y\n", "agent.ini:4: there is no section [sytem]"},
+        Fault{"\n[system]\nnane = x\n", "agent.ini:3: [system] has no key 'nane'"},
+        Fault{"[system]\nname =\n", "agent.ini:2: [system] name: the value is missing"},
+        Fault{"[log]\nthreshold.=5\n", "agent.ini:2: [log] has no key 'threshold.'"},
+        Fault{"[log]\nthreshold = high\n",
+              "agent.ini:2: [log] threshold: 'high' is not a level: a whole number from 0 on"},
+        Fault{"[log]\nthreshold = -1\n", "agent.ini:2: [log] threshold: '-1' is not a level: a whole number from 0 on"},
+        Fault{"[trace]\nthreshold.A = 99999999999\n",
+              "agent.ini:2: [trace] threshold.A: '99999999999' is not a level: a whole number from 0 on"},
+        Fault{"[log]\ndestination = mail\n",
+              "agent.ini:2: [log] destination: 'mail' is not one of off | syslog | stderr | file"},
+        Fault{"[log]\nfile = log.txt\n", "agent.ini:2: [log] file: 'log.txt' is not an absolute path"},
+        Fault{"[log]\ndestination = file\n", "agent.ini: [log] destination is file, but the key 'file' is missing"},
+        Fault{"[trace]\ndestination = file\n", "agent.ini: [trace] destination is file, but the key 'file' is missing"},
+        Fault{"[processor]\nbackend = magic\n",
+              "agent.ini:2: [processor] backend: 'magic' is not one of simulated | ipmi"},
+        Fault{"[simulated]\nstate = here\n", "agent.ini:2: [simulated] state: 'here' is not an absolute path"},
+        Fault{"[system]\nname = a\nname = b\n", "agent.ini:3: [system] name is given a second time"},
+        Fault{"[system]\njust words\n", "agent.ini:2: neither a [section] nor a key = value"},
+        Fault{"[system\nname = a\n", "agent.ini:1: neither a [section] nor a key = value"}),
+    [](const auto& fault) { return "fault" + std::to_string(fault.index); });
+
+TEST(AgentConfiguration, theFirstOfSeveralFaultsIsReported) {
+  EXPECT_EQ(complaintAbout("[system]\nwords\n[nowhere]\na = b\n"),
+            "agent.ini:2: neither a [section] nor a key = value");
+  EXPECT_EQ(complaintAbout("[nowhere]\na = b\nwords\n"), "agent.ini:2: there is no section [nowhere]");
+}
+
+TEST(AgentConfiguration, anIndentedKeyIsAKeyAndNoContinuation) {
+  const AgentConfiguration configuration = parse("[processor]\n  name = a\n\tdescription = b\n");
+  EXPECT_EQ(configuration.processorName, "a");
+  EXPECT_EQ(configuration.processorDescription, "b");
+}
+
+TEST(AgentConfiguration, commentsBlankLinesAndCarriageReturnsMeanNothing) {
+  const AgentConfiguration configuration = parse("; a\r\n# b\r\n\r\n[processor]\r\nname = a;b ; a comment\r\n");
+  EXPECT_EQ(configuration.processorName, "a;b");
+}
+
+TEST(AgentConfiguration, theLongestLineIsTakenWholeAndALongerOneRefused) {
+  const std::string key = "[system]\nname = ";
+  const std::string longest(198 - 7, 'x');
+  EXPECT_EQ(parse(key + longest + '\n').systemName, longest);
+  EXPECT_EQ(complaintAbout(key + longest + "x\n"), "agent.ini:2: the line is longer than 198 characters");
+}
+
+TEST(AgentConfiguration, aNullCharacterIsRefused) {
+  EXPECT_EQ(complaintAbout(std::string("[system]\nname = a\0b\n", 20)), "agent.ini:2: the line holds a null character");
+}
+
+TEST(AgentConfiguration, theFileThatTheVariableNamesIsRead) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "a.ini", "[system]\nname = chosen\n");
+  const AgentIniVariable variable(directory / "a.ini");
+  EXPECT_EQ(readAgentConfiguration().systemName, "chosen");
+}
+
+TEST(AgentConfiguration, aFileThatTheVariableNamesAndThatIsMissingIsAnError) {
+  const TemporaryDirectory directory;
+  const AgentIniVariable variable(directory / "none.ini");
+  EXPECT_EQ(thrownBy(readAgentConfiguration), directory / "none.ini" + ": cannot be opened: No such file or directory");
+}
+
+TEST(AgentConfiguration, aDirectoryInPlaceOfTheFileIsAnError) {
+  const TemporaryDirectory directory;
+  const AgentIniVariable variable(directory.path().string());
+  EXPECT_THAT(thrownBy(readAgentConfiguration), HasSubstr(directory.path().string() + ": cannot be read"));
+}
+
+TEST(AgentConfiguration, aFaultNamesTheFile) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "a.ini", "[x]\ny = z\n");
+  const AgentIniVariable variable(directory / "a.ini");
+  EXPECT_EQ(thrownBy(readAgentConfiguration), directory / "a.ini" + ":2: there is no section [x]");
+}
+
+}  // namespace
+}  // namespace QV

@@ -1,0 +1,229 @@
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <ostream>
+#include <string>
+
+#include "QV/ProviderHelper.h"
+#include "agent/helper/BrokerFixture.h"
+
+namespace QV {
+namespace {
+
+class MapProperty : public WithBroker {
+ protected:
+  // The target's property after mapping the source's: its status is kept in status_.
+  CMPIData map(const char* name, DataType type) {
+    mapProperty(instanceData(source_), target_, name, type, &status_);
+    return read(name);
+  }
+
+  CMPIData read(const char* name) const { return CMGetProperty(target_, name, nullptr); }
+
+  void set(const char* name, const CMPIValue& value, CMPIType type) {
+    ASSERT_EQ(CMSetProperty(source_, name, &value, type).rc, CMPI_RC_OK) << name;
+  }
+
+  void expectMismatch(const char* name, DataType type) {
+    const bool unset = CMIsNullValue(map(name, type));
+    EXPECT_TRUE(unset) << name << " as " << type;
+    EXPECT_EQ(status_.rc, CMPI_RC_ERR_TYPE_MISMATCH) << name << " as " << type;
+  }
+
+  CMPIInstance* source_ = sample();
+  CMPIInstance* target_ = sample();
+  CMPIStatus status_{CMPI_RC_ERROR, nullptr};
+};
+
+TEST_F(MapProperty, copiesAString) {
+  CMSetProperty(source_, "Text", "größe", CMPI_chars);
+  const CMPIData data = map("Text", String);
+  ASSERT_EQ(data.type, CMPI_string);
+  EXPECT_EQ(characters(data.value.string), "größe");
+  EXPECT_EQ(status_.rc, CMPI_RC_OK);
+}
+
+TEST_F(MapProperty, copiesAnEmptyString) {
+  CMSetProperty(source_, "Text", "", CMPI_chars);
+  const CMPIData data = map("Text", String);
+  ASSERT_FALSE(CMIsNullValue(data));
+  EXPECT_EQ(characters(data.value.string), "");
+}
+
+TEST_F(MapProperty, copiesAUint16AndAUint8) {
+  CMPIValue value{};
+  value.uint16 = 65535;
+  set("U16", value, CMPI_uint16);
+  const CMPIData wide = map("U16", Uint16);
+  EXPECT_EQ(wide.type, CMPI_uint16);
+  EXPECT_EQ(wide.value.uint16, 65535);
+  EXPECT_EQ(status_.rc, CMPI_RC_OK);
+
+  value = {};
+  value.uint8 = 255;
+  set("U8", value, CMPI_uint8);
+  const CMPIData narrow = map("U8", Uint8);
+  EXPECT_EQ(narrow.type, CMPI_uint8);
+  EXPECT_EQ(narrow.value.uint8, 255);
+}
+
+TEST_F(MapProperty, refusesWhatTheTypeCannotRepresent) {
+  CMPIValue value{};
+  value.boolean = 1;
+  set("Truth", value, CMPI_boolean);
+  value = {};
+  value.char16 = 'x';
+  set("Letter", value, CMPI_char16);
+  value = {};
+  value.real64 = 7;
+  set("Double", value, CMPI_real64);
+  value = {};
+  value.uint16 = 256;
+  set("U16", value, CMPI_uint16);
+  CMSetProperty(source_, "Text", "7", CMPI_chars);
+  for (const char* name : {"Truth", "Letter", "Double"}) {
+    expectMismatch(name, Uint16);
+    expectMismatch(name, Uint8);
+    expectMismatch(name, String);
+  }
+  expectMismatch("U16", Uint8);
+  expectMismatch("U16", String);
+  expectMismatch("Text", Uint16);
+  expectMismatch("Text", Uint8);
+}
+
+TEST_F(MapProperty, refusesAnArray) {
+  CMPIValue value{};
+  value.array = CMNewArray(broker(), 1, CMPI_uint16, nullptr);
+  set("Numbers", value, CMPI_uint16A);
+  expectMismatch("Numbers", Uint16);
+}
+
+TEST_F(MapProperty, leavesANullPropertyUnset) {
+  EXPECT_TRUE(CMIsNullValue(map("Text", String)));
+  EXPECT_EQ(status_.rc, CMPI_RC_OK);
+}
+
+TEST_F(MapProperty, tellsThatTheSourceHasNoSuchProperty) {
+  mapProperty(instanceData(source_), target_, "Missing", String, &status_);
+  EXPECT_EQ(status_.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+}
+
+TEST_F(MapProperty, worksWithoutAStatus) {
+  CMSetProperty(source_, "Text", "x", CMPI_chars);
+  mapProperty(instanceData(source_), target_, "Text", String, nullptr);
+  EXPECT_FALSE(CMIsNullValue(read("Text")));
+  mapProperty(instanceData(source_), target_, "Missing", String, nullptr);
+  mapProperty(instanceData(source_), target_, "Text", Uint8, nullptr);
+}
+
+TEST_F(MapProperty, leavesNullsAlone) {
+  CMSetProperty(source_, "Text", "x", CMPI_chars);
+  CMPIInstance emptyHandle{nullptr, source_->ft};
+  CMPIData nullState = instanceData(source_);
+  nullState.state = CMPI_nullValue;
+  CMPIData noInstance{};
+  noInstance.type = CMPI_string;
+  mapProperty(instanceData(nullptr), target_, "Text", String, &status_);
+  mapProperty(instanceData(&emptyHandle), target_, "Text", String, &status_);
+  mapProperty(nullState, target_, "Text", String, &status_);
+  mapProperty(noInstance, target_, "Text", String, &status_);
+  mapProperty(instanceData(source_), nullptr, "Text", String, &status_);
+  mapProperty(instanceData(source_), &emptyHandle, "Text", String, &status_);
+  mapProperty(instanceData(source_), target_, nullptr, String, &status_);
+  EXPECT_EQ(status_.rc, CMPI_RC_ERROR) << "untouched";
+  EXPECT_TRUE(CMIsNullValue(read("Text")));
+}
+
+// A number of any of the integer types, and which of the two target types can hold it.
+struct Number {
+  CMPIType type;
+  const char* typeName;
+  std::int64_t value;
+  bool fitsUint16;
+  bool fitsUint8;
+};
+
+void PrintTo(const Number& number, std::ostream* stream) { *stream << number.typeName << ' ' << number.value; }
+
+class MapNumber : public WithBroker, public testing::WithParamInterface<Number> {
+ protected:
+  // An instance whose properties of the target's names have the number's type.
+  CMPIInstance* source() {
+    const std::string type = GetParam().typeName;
+    manager_.loadSchemaText("class Source { [key] string Id; " + type + " U16; " + type + " U8; };", "root/test");
+    CMPIInstance* made = CMNewInstance(broker(), path("Source"), nullptr);
+    const CMPIValue value = valueOf(GetParam());
+    for (const char* name : {"U16", "U8"})
+      EXPECT_EQ(CMSetProperty(made, name, &value, GetParam().type).rc, CMPI_RC_OK) << name;
+    return made;
+  }
+
+  static CMPIValue valueOf(const Number& number) {
+    CMPIValue value{};
+    switch (number.type) {
+      case CMPI_uint8:
+        value.uint8 = static_cast<CMPIUint8>(number.value);
+        break;
+      case CMPI_sint8:
+        value.sint8 = static_cast<CMPISint8>(number.value);
+        break;
+      case CMPI_uint16:
+        value.uint16 = static_cast<CMPIUint16>(number.value);
+        break;
+      case CMPI_sint16:
+        value.sint16 = static_cast<CMPISint16>(number.value);
+        break;
+      case CMPI_uint32:
+        value.uint32 = static_cast<CMPIUint32>(number.value);
+        break;
+      case CMPI_sint32:
+        value.sint32 = static_cast<CMPISint32>(number.value);
+        break;
+      case CMPI_uint64:
+        value.uint64 = static_cast<CMPIUint64>(number.value);
+        break;
+      default:
+        value.sint64 = number.value;
+    }
+    return value;
+  }
+};
+
+TEST_P(MapNumber, reachesTheTargetWhereItFits) {
+  // When a number is mapped into both widths
+  CMPIInstance* from = source();
+  CMPIInstance* target = sample();
+  CMPIStatus wide{CMPI_RC_ERROR, nullptr};
+  CMPIStatus narrow{CMPI_RC_ERROR, nullptr};
+  mapProperty(instanceData(from), target, "U16", Uint16, &wide);
+  mapProperty(instanceData(from), target, "U8", Uint8, &narrow);
+
+  // Then it is there or refused
+  const CMPIData wideData = CMGetProperty(target, "U16", nullptr);
+  const CMPIData narrowData = CMGetProperty(target, "U8", nullptr);
+  EXPECT_EQ(wide.rc, GetParam().fitsUint16 ? CMPI_RC_OK : CMPI_RC_ERR_TYPE_MISMATCH);
+  EXPECT_EQ(narrow.rc, GetParam().fitsUint8 ? CMPI_RC_OK : CMPI_RC_ERR_TYPE_MISMATCH);
+  ASSERT_EQ(!CMIsNullValue(wideData), GetParam().fitsUint16);
+  ASSERT_EQ(!CMIsNullValue(narrowData), GetParam().fitsUint8);
+  if (GetParam().fitsUint16) {
+    EXPECT_EQ(wideData.value.uint16, GetParam().value);
+  }
+  if (GetParam().fitsUint8) {
+    EXPECT_EQ(narrowData.value.uint8, GetParam().value);
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Each, MapNumber,
+    testing::Values(Number{CMPI_uint8, "uint8", 255, true, true}, Number{CMPI_sint8, "sint8", 127, true, true},
+                    Number{CMPI_sint8, "sint8", -1, false, false}, Number{CMPI_uint16, "uint16", 255, true, true},
+                    Number{CMPI_uint16, "uint16", 256, true, false}, Number{CMPI_sint16, "sint16", 32767, true, false},
+                    Number{CMPI_sint16, "sint16", -1, false, false}, Number{CMPI_uint32, "uint32", 65535, true, false},
+                    Number{CMPI_uint32, "uint32", 65536, false, false}, Number{CMPI_sint32, "sint32", 0, true, true},
+                    Number{CMPI_sint32, "sint32", -1, false, false}, Number{CMPI_uint64, "uint64", 255, true, true},
+                    Number{CMPI_uint64, "uint64", -1, false, false}, Number{CMPI_sint64, "sint64", 65536, false, false},
+                    Number{CMPI_sint64, "sint64", -65535, false, false}));
+
+}  // namespace
+}  // namespace QV

@@ -1,0 +1,238 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "agent/instrumentation/RecordingBackEnd.h"
+#include "agent/support/TemporaryDirectory.h"
+#include "agent/support/Throws.h"
+#include "instrumentation/InterfaceCursor.h"
+#include "instrumentation/simulated/StateText.h"
+
+namespace QV {
+namespace {
+
+using namespace NodeLexicon;
+using testing::ElementsAre;
+using testing::EndsWith;
+using testing::HasSubstr;
+using testing::IsEmpty;
+
+// A cursor on the first of the factory configuration's interfaces: eth0, 192.0.2.10/24; eth1, DHCP.
+class AnInterfaceCursor : public testing::Test {
+ protected:
+  AnInterfaceCursor() { cursor_.select(IpInterfaceNode); }
+
+  std::string get(Properties property) {
+    std::string value = "unread";
+    return cursor_.get(property, value) ? value : "unreadable";
+  }
+
+  void install(const ManagementProcessor& processor) {
+    writeFile(state_, writeState(processor));
+    cursor_.select(IpInterfaceNode);
+  }
+
+  NetworkInterface onProcessor(std::size_t index) { return backEnd_->read().interfaces.at(index); }
+
+  const TemporaryDirectory directory_;
+  const std::string state_ = directory_ / "state.json";
+  const std::shared_ptr<RecordingBackEnd> backEnd_ = std::make_shared<RecordingBackEnd>(state_);
+  InterfaceCursor cursor_{backEnd_};
+};
+
+TEST_F(AnInterfaceCursor, walksTheInterfacesInOrder) {
+  EXPECT_TRUE(cursor_.onNode());
+  EXPECT_EQ(get(NodeName), "eth0");
+  EXPECT_EQ(get(Ipv4Address), "192.0.2.10");
+  EXPECT_EQ(get(Ipv4SubnetMask), "255.255.255.0");
+  cursor_.advance();
+  EXPECT_EQ(get(NodeName), "eth1");
+  cursor_.advance();
+  EXPECT_FALSE(cursor_.onNode());
+}
+
+TEST_F(AnInterfaceCursor, readsAndWritesNothingPastTheEnd) {
+  cursor_.advance();
+  cursor_.advance();
+  cursor_.advance();
+  EXPECT_FALSE(cursor_.onNode());
+  EXPECT_EQ(get(NodeName), "unreadable");
+  EXPECT_FALSE(cursor_.set(Ipv4Address, "192.0.2.99"));
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, standsNowhereBeforeItIsSet) { EXPECT_FALSE(InterfaceCursor(backEnd_).onNode()); }
+
+TEST_F(AnInterfaceCursor, findsNoNodesOfAnotherType) {
+  cursor_.select(static_cast<NodeType>(30));
+  EXPECT_FALSE(cursor_.onNode());
+}
+
+TEST_F(AnInterfaceCursor, startsAgainWhenItIsSetAgain) {
+  cursor_.advance();
+  cursor_.select(IpInterfaceNode);
+  EXPECT_EQ(get(NodeName), "eth0");
+}
+
+TEST_F(AnInterfaceCursor, passesOverANodeWhoseNameCannotBeRead) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces[0].name.reset();
+  install(processor);
+  EXPECT_EQ(get(NodeName), "unreadable");
+  EXPECT_EQ(get(NodeName), "eth1");
+}
+
+TEST_F(AnInterfaceCursor, writesNothingToANodeWithoutAName) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces[0].name.reset();
+  install(processor);
+  EXPECT_FALSE(cursor_.set(Ipv4Address, "192.0.2.99"));
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, staysOnANodeWhoseAddressCannotBeRead) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces[0].ipv4Address.reset();
+  install(processor);
+  EXPECT_EQ(get(Ipv4Address), "unreadable");
+  EXPECT_EQ(get(NodeName), "eth0");
+}
+
+TEST_F(AnInterfaceCursor, knowsNoOtherProperties) {
+  EXPECT_EQ(get(static_cast<Properties>(27)), "unreadable");
+  EXPECT_FALSE(cursor_.set(static_cast<Properties>(27), "x"));
+  EXPECT_FALSE(cursor_.set(NodeName, "eth9"));
+}
+
+TEST_F(AnInterfaceCursor, sendsAddressAndMaskAsOneChange) {
+  EXPECT_TRUE(cursor_.set(Ipv4Address, "198.51.100.7"));
+  EXPECT_THAT(backEnd_->changes, IsEmpty()) << "the mask may follow";
+  EXPECT_TRUE(cursor_.set(Ipv4SubnetMask, "255.255.0.0"));
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 198.51.100.7 255.255.0.0"));
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, testing::SizeIs(1));
+}
+
+TEST_F(AnInterfaceCursor, sendsAnAddressAloneWhenItMovesOn) {
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  cursor_.advance();
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
+}
+
+TEST_F(AnInterfaceCursor, sendsAnAddressAloneWhenItIsSetAgain) {
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  cursor_.select(IpInterfaceNode);
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
+  EXPECT_EQ(get(Ipv4Address), "192.0.2.99");
+}
+
+TEST_F(AnInterfaceCursor, sendsAMaskAlone) {
+  cursor_.set(Ipv4SubnetMask, "255.255.0.0");
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 - 255.255.0.0"));
+}
+
+TEST_F(AnInterfaceCursor, takesTheLastOfSeveralAddresses) {
+  cursor_.set(Ipv4Address, "192.0.2.98");
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
+}
+
+TEST_F(AnInterfaceCursor, makesTheSourceStatic) {
+  cursor_.advance();
+  cursor_.set(Ipv4Address, "198.51.100.99");
+  cursor_.flush();
+  EXPECT_EQ(onProcessor(1).ipv4Origin, AddressOrigin::Static);
+  EXPECT_EQ(onProcessor(1).ipv4Address, "198.51.100.99");
+  EXPECT_EQ(onProcessor(1).ipv4SubnetMask, "255.255.255.0");
+}
+
+TEST_F(AnInterfaceCursor, readsWhatItWrote) {
+  cursor_.set(Ipv4Address, "198.51.100.7");
+  EXPECT_EQ(get(Ipv4Address), "192.0.2.10") << "not sent yet";
+  cursor_.set(Ipv4SubnetMask, "255.255.0.0");
+  EXPECT_EQ(get(Ipv4Address), "198.51.100.7");
+  EXPECT_EQ(get(Ipv4SubnetMask), "255.255.0.0");
+}
+
+TEST_F(AnInterfaceCursor, refusesAnAddressBeforeAnythingIsSent) {
+  EXPECT_EQ(thrownBy([&] { cursor_.set(Ipv4Address, "127.0.0.1"); }),
+            "interface eth0: the IPv4 address '127.0.0.1' is a loopback address; nothing was changed");
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, abandonsTheAddressWithARefusedMask) {
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  EXPECT_EQ(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.0.255.0"); }),
+            "interface eth0: the subnet mask '255.0.255.0' is not contiguous; nothing was changed");
+  cursor_.flush();
+  cursor_.advance();
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, abandonsAnEarlierAddressWithARefusedOne) {
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  EXPECT_THROW(cursor_.set(Ipv4Address, "x"), std::invalid_argument);
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, takesANewChangeAfterARefusedOne) {
+  EXPECT_THROW(cursor_.set(Ipv4Address, "x"), std::invalid_argument);
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
+}
+
+TEST_F(AnInterfaceCursor, refusesTheNetworkAndTheBroadcastAddressOfTheNewMask) {
+  cursor_.set(Ipv4Address, "192.0.3.255");
+  EXPECT_THAT(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.255.254.0"); }), HasSubstr("its broadcast address"));
+  cursor_.set(Ipv4Address, "192.0.2.255");
+  EXPECT_NO_THROW(cursor_.set(Ipv4SubnetMask, "255.255.254.0")) << "a host's under the wider mask";
+}
+
+TEST_F(AnInterfaceCursor, refusesAnAddressAloneThatIsNoHostUnderTheCurrentMask) {
+  cursor_.set(Ipv4Address, "192.0.2.255");
+  EXPECT_THAT(thrownBy([&] { cursor_.flush(); }), EndsWith("its broadcast address; nothing was changed"));
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, refusesAMaskAloneUnderWhichTheCurrentAddressIsNoHost) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces[0].ipv4Address = "192.0.2.8";
+  install(processor);
+  EXPECT_THAT(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.255.255.252"); }), HasSubstr("the network itself"));
+  EXPECT_THAT(backEnd_->changes, IsEmpty());
+}
+
+TEST_F(AnInterfaceCursor, doesNotHoldAnAddressAgainstACurrentMaskThatTellsNothing) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces[0].ipv4Address = "0.0.0.0";
+  processor.interfaces[0].ipv4SubnetMask = "0.0.0.0";
+  install(processor);
+  cursor_.set(Ipv4Address, "192.0.2.255");
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.255 -"));
+}
+
+TEST_F(AnInterfaceCursor, passesOnWhatTheProcessorThrowsAndSendsNothingTwice) {
+  backEnd_->unreachable = true;
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  EXPECT_EQ(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.255.255.0"); }), "the processor does not answer");
+  EXPECT_EQ(get(Ipv4Address), "192.0.2.10");
+  cursor_.flush();
+  EXPECT_THAT(backEnd_->changes, testing::SizeIs(1));
+}
+
+TEST_F(AnInterfaceCursor, staysOnTheNodeWhoseChangeFailed) {
+  backEnd_->unreachable = true;
+  cursor_.set(Ipv4Address, "192.0.2.99");
+  EXPECT_THROW(cursor_.advance(), std::runtime_error);
+  EXPECT_EQ(get(NodeName), "eth0");
+  EXPECT_NO_THROW(cursor_.advance());
+  EXPECT_EQ(get(NodeName), "eth1");
+}
+
+}  // namespace
+}  // namespace QV

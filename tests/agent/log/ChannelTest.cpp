@@ -1,0 +1,134 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+#include <syslog.h>
+
+#include <algorithm>
+#include <array>
+#include <cstdarg>
+#include <cstdio>
+#include <limits>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "agent/support/AllocationCount.h"
+#include "agent/support/TemporaryDirectory.h"
+#include "log/Channel.h"
+
+namespace {
+std::vector<std::pair<int, std::string>> sentToSyslog;
+}  // namespace
+
+// In place of the C library's: what would go to the machine's syslog, which a test must neither need nor fill.
+extern "C" void syslog(int priority, const char* format, ...) {
+  std::array<char, 1024> text{};
+  va_list arguments;
+  va_start(arguments, format);
+  std::vsnprintf(text.data(), text.size(), format, arguments);
+  va_end(arguments);
+  sentToSyslog.emplace_back(priority, text.data());
+}
+
+namespace TWLog {
+namespace {
+
+using QV::ChannelSettings;
+using Destination = ChannelSettings::Destination;
+
+TEST(Channel, letsPassWhatReachesItsThreshold) {
+  const Channel channel({Destination::Stderr, "", 5000, {}});
+  EXPECT_FALSE(channel.passes("C", 4999));
+  EXPECT_TRUE(channel.passes("C", 5000));
+  EXPECT_TRUE(channel.passes("C", 5001));
+}
+
+TEST(Channel, hasAThresholdOfItsOwnForAComponentThatIsNamed) {
+  const Channel channel({Destination::Stderr, "", 5000, {{"chatty", 9000}, {"watched", 1000}}});
+  EXPECT_FALSE(channel.passes("chatty", 6000));
+  EXPECT_TRUE(channel.passes("chatty", 9000));
+  EXPECT_TRUE(channel.passes("watched", 1000));
+  EXPECT_FALSE(channel.passes("watched", 999));
+  EXPECT_FALSE(channel.passes("Watched", 1000)) << "components are told apart by letter case";
+}
+
+TEST(Channel, letsNothingPassWhereItIsOff) {
+  const Channel channel({Destination::Off, "", 0, {{"C", 0}}});
+  EXPECT_FALSE(channel.passes("C", 9000));
+  EXPECT_FALSE(channel.passes("C", std::numeric_limits<int>::max()));
+}
+
+TEST(Channel, refusesAMessageWithoutAnAllocation) {
+  const Channel channel({Destination::Stderr, "", 6000, {{"Tarnwick.SomeOtherComponent", 4000}}});
+  const std::string component = "Tarnwick.IPConfigAssignmentSettingProvider";
+  const long before = allocationCount();
+  const bool passed = channel.passes(component, 4000) || channel.passes(component, 3000);
+  EXPECT_EQ(allocationCount(), before);
+  EXPECT_FALSE(passed);
+}
+
+TEST(Channel, writesALineToItsFile) {
+  const TemporaryDirectory directory;
+  Channel channel({Destination::File, directory / "log", 0, {}});
+  const std::string component = "C";
+  const std::string text = "one\ntwo";
+  channel.send({"f", "F", 1, component, 6000, text});
+  EXPECT_THAT(readFile(directory / "log"), testing::EndsWith(" 6000 C f (F:1): one\\ntwo\n"));
+}
+
+TEST(Channel, writesALineToStderr) {
+  Channel channel({Destination::Stderr, "", 0, {}});
+  const std::string component = "C";
+  const std::string text = "x";
+  testing::internal::CaptureStderr();
+  channel.send({"f", "F", 1, component, 6000, text});
+  EXPECT_EQ(testing::internal::GetCapturedStderr(), "6000 C f (F:1): x\n");
+}
+
+TEST(Channel, saysOnceThatItsFileCannotBeWritten) {
+  const TemporaryDirectory directory;
+  Channel channel({Destination::File, directory / "none/log", 0, {}});
+  const std::string component = "C";
+  const std::string text = "x";
+  sentToSyslog.clear();
+  testing::internal::CaptureStderr();
+  channel.send({"f", "F", 1, component, 6000, text});
+  channel.send({"f", "F", 1, component, 6000, text});
+  EXPECT_EQ(testing::internal::GetCapturedStderr(), "management agent: the log file " + (directory / "none/log") +
+                                                        " cannot be written: No such file or directory; its messages "
+                                                        "go to syslog\n");
+  const std::pair lost(LOG_DAEMON | LOG_ERR, std::string("6000 C f (F:1): x"));
+  EXPECT_THAT(sentToSyslog, testing::ElementsAre(testing::_, lost, lost)) << "the notice, then each message";
+}
+
+TEST(Channel, saysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
+  const TemporaryDirectory directory;
+  Channel channel({Destination::File, directory / "later/log", 0, {}});
+  const std::string component = "C";
+  const std::string text = "x";
+  const Message message{"f", "F", 1, component, 6000, text};
+  testing::internal::CaptureStderr();
+  channel.send(message);
+  std::filesystem::create_directory(directory / "later");
+  channel.send(message);
+  std::filesystem::remove_all(directory / "later");
+  channel.send(message);
+  const std::string notices = testing::internal::GetCapturedStderr();
+  EXPECT_EQ(std::count(notices.begin(), notices.end(), '\n'), 2);
+}
+
+TEST(Channel, tellsSyslogTheSeverity) {
+  Channel channel({Destination::Syslog, "", 0, {}});
+  const std::string component = "C";
+  const std::string text = "100 %s";
+  sentToSyslog.clear();
+  for (const int level : {6000, 5999, 5000, 4999, 4000, 3999}) channel.send({"f", "F", 1, component, level, text});
+  EXPECT_THAT(sentToSyslog, testing::ElementsAre(testing::Pair(LOG_DAEMON | LOG_ERR, "6000 C f (F:1): 100 %s"),
+                                                 testing::Pair(LOG_DAEMON | LOG_WARNING, "5999 C f (F:1): 100 %s"),
+                                                 testing::Pair(LOG_DAEMON | LOG_WARNING, testing::_),
+                                                 testing::Pair(LOG_DAEMON | LOG_INFO, "4999 C f (F:1): 100 %s"),
+                                                 testing::Pair(LOG_DAEMON | LOG_INFO, testing::_),
+                                                 testing::Pair(LOG_DAEMON | LOG_DEBUG, "3999 C f (F:1): 100 %s")));
+}
+
+}  // namespace
+}  // namespace TWLog

@@ -1,0 +1,110 @@
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <sstream>
+#include <thread>
+#include <vector>
+
+#include "agent/support/TemporaryDirectory.h"
+#include "log/LogFile.h"
+
+namespace TWLog {
+namespace {
+
+TEST(LogFile, isMadeForItsOwnerAndGroup) {
+  const TemporaryDirectory directory;
+  LogFile file(directory / "log");
+  EXPECT_EQ(file.append("one\n"), 0);
+  struct stat status {};
+  ASSERT_EQ(::stat((directory / "log").c_str(), &status), 0);
+  EXPECT_EQ(status.st_mode & 0137, 0U) << "no more than rw-r-----";
+  EXPECT_EQ(readFile(directory / "log"), "one\n");
+}
+
+TEST(LogFile, keepsWhatIsThere) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "log", "before\n");
+  LogFile(directory / "log").append("after\n");
+  EXPECT_EQ(readFile(directory / "log"), "before\nafter\n");
+}
+
+TEST(LogFile, followsARotationThatRenamesIt) {
+  const TemporaryDirectory directory;
+  LogFile file(directory / "log");
+  file.append("old\n");
+  std::filesystem::rename(directory / "log", directory / "log.1");
+  file.append("new\n");
+  EXPECT_EQ(readFile(directory / "log.1"), "old\n");
+  EXPECT_EQ(readFile(directory / "log"), "new\n");
+}
+
+TEST(LogFile, followsARotationThatTruncatesIt) {
+  const TemporaryDirectory directory;
+  LogFile file(directory / "log");
+  file.append("old\n");
+  std::filesystem::resize_file(directory / "log", 0);
+  file.append("new\n");
+  EXPECT_EQ(readFile(directory / "log"), "new\n");
+}
+
+TEST(LogFile, tellsWhyItCannotBeOpenedAndTriesAgainWithTheNextLine) {
+  const TemporaryDirectory directory;
+  LogFile file(directory / "later/log");
+  EXPECT_EQ(file.append("lost\n"), ENOENT);
+  std::filesystem::create_directory(directory / "later");
+  EXPECT_EQ(file.append("kept\n"), 0);
+  EXPECT_EQ(readFile(directory / "later/log"), "kept\n");
+}
+
+TEST(LogFile, tellsThatTheDiskIsFull) { EXPECT_EQ(LogFile("/dev/full").append("x\n"), ENOSPC); }
+
+TEST(LogFile, doesNotWaitForTheReaderOfAFifo) {
+  const TemporaryDirectory directory;
+  ASSERT_EQ(::mkfifo((directory / "log").c_str(), 0600), 0);
+  EXPECT_EQ(LogFile(directory / "log").append("x\n"), ENXIO);
+}
+
+TEST(LogFile, isNotInheritedByPrograms) {
+  const TemporaryDirectory directory;
+  LogFile file(directory / "log");
+  file.append("x\n");
+  int open = 0;
+  for (const auto& entry : std::filesystem::directory_iterator("/proc/self/fd")) {
+    std::error_code ignored;
+    if (std::filesystem::read_symlink(entry.path(), ignored) != directory / "log") continue;
+    ++open;
+    EXPECT_NE(::fcntl(std::stoi(entry.path().filename()), F_GETFD) & FD_CLOEXEC, 0);
+  }
+  EXPECT_EQ(open, 1);
+}
+
+TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
+  // Given two writers of one file, as two processes have them, with two threads each
+  const TemporaryDirectory directory;
+  LogFile first(directory / "log");
+  LogFile second(directory / "log");
+  constexpr int lines = 500;
+  const auto write = [&](LogFile& file, char mark) {
+    for (int count = 0; count < lines; ++count) file.append(std::string(200, mark) + '\n');
+  };
+
+  // When all of them write at once
+  {
+    std::vector<std::jthread> threads;
+    threads.emplace_back([&] { write(first, 'a'); });
+    threads.emplace_back([&] { write(first, 'b'); });
+    threads.emplace_back([&] { write(second, 'c'); });
+    threads.emplace_back([&] { write(second, 'd'); });
+  }
+
+  // Then every line is there, and is of one writer
+  std::istringstream text(readFile(directory / "log"));
+  int count = 0;
+  for (std::string line; std::getline(text, line); ++count) ASSERT_EQ(line, std::string(200, line.at(0)));
+  EXPECT_EQ(count, 4 * lines);
+}
+
+}  // namespace
+}  // namespace TWLog

@@ -1,0 +1,50 @@
+#include <gtest/gtest.h>
+
+#include "cimom/cimxml/Document.h"
+#include "cimom/cimxml/XmlWriter.h"
+
+namespace Cimom::CimXml {
+namespace {
+
+TEST(XmlWriter, NestsElementsAsTheirScopesNest) {
+  XmlWriter xml;
+  {
+    const auto outer = xml.element("A", "X", "1");
+    xml.textElement("B", "text");
+    const auto inner = xml.element("C");
+  }
+  EXPECT_EQ(xml.take(), "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<A X=\"1\"><B>text</B><C/></A>");
+}
+
+TEST(XmlWriter, WritesNoPrologWhereNoneIsWanted) {
+  XmlWriter xml(XmlWriter::Prolog::None);
+  xml.textElement("A", "");
+  EXPECT_EQ(xml.take().substr(0, 2), "<A");
+}
+
+TEST(XmlWriter, WritesTextThatReadsBackAsItWas) {
+  const std::string text = "<a b=\"c\">&amp; ]]> 'd' \t\r\n€ \xF0\x9F\x98\x80 end";
+  XmlWriter xml;
+  {
+    const auto element = xml.element("A", "X", text);
+    xml.text(text);
+  }
+  const Document document(xml.take());
+  EXPECT_EQ(document.root().attribute("X"), text);
+  EXPECT_EQ(document.root().text(), text);
+}
+
+TEST(XmlWriter, StaysWellFormedWhateverTheText) {
+  for (int byte = 0; byte < 256; ++byte) {
+    const std::string text = std::string("a") + static_cast<char>(byte) + "b";
+    XmlWriter xml;
+    {
+      const auto element = xml.element("A", "X", text);
+      xml.text(text);
+    }
+    EXPECT_NO_THROW(Document(xml.take())) << byte;
+  }
+}
+
+}  // namespace
+}  // namespace Cimom::CimXml

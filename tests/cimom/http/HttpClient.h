@@ -1,0 +1,42 @@
+#ifndef TESTS_CIMOM_HTTP_HTTPCLIENT_H_
+#define TESTS_CIMOM_HTTP_HTTPCLIENT_H_
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+#include "cimom/http/Message.h"
+
+namespace Testing {
+
+/// A client's end of a connection to 127.0.0.1, byte by byte, so that a test can send what no decent client would.
+/// Waits at most 10 s for anything; what fails throws std::runtime_error.
+class HttpClient {
+ public:
+  explicit HttpClient(std::uint16_t port);
+  ~HttpClient();
+  HttpClient(const HttpClient&) = delete;
+  HttpClient& operator=(const HttpClient&) = delete;
+
+  /// Gives false when the server has closed its end.
+  bool send(std::string_view bytes);
+
+  /// The next response; one with status 100 counts.
+  Cimom::Http::Response receive();
+
+  /// Whether the server closes the connection without another byte.
+  bool isClosed();
+
+  /// POST with a Content-Length, on this connection.
+  Cimom::Http::Response post(const std::string& path, const std::string& body, const std::string& moreHeaders = {});
+
+ private:
+  bool fill();
+
+  int socket_;
+  std::string buffer_;
+};
+
+}  // namespace Testing
+
+#endif  // TESTS_CIMOM_HTTP_HTTPCLIENT_H_

@@ -1,0 +1,105 @@
+// cimomd's command line and configuration file: what it takes, and what it says of what it does not take.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "tests/e2e/support/Cimomd.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::EndsWith;
+using testing::HasSubstr;
+using testing::StartsWith;
+
+class CommandLine : public testing::Test {
+ protected:
+  static Completed cimomd(std::vector<std::string> arguments) {
+    arguments.insert(arguments.begin(), BINARY_DIR "/bin/cimomd");
+    return run(arguments);
+  }
+
+  static void expectRefused(const std::vector<std::string>& arguments, int status, const std::string& mentioned) {
+    const Completed completed = cimomd(arguments);
+    EXPECT_EQ(completed.status, status) << completed.errors;
+    EXPECT_EQ(completed.output, "");
+    EXPECT_THAT(completed.errors, AllOf(StartsWith("cimomd: "), HasSubstr(mentioned), EndsWith("\n")));
+  }
+
+  std::string file(const std::string& content) const { return directory_.write("cimomd.ini", content).string(); }
+
+  TemporaryDirectory directory_;
+};
+
+TEST_F(CommandLine, ShowsHelpWithEveryOption) {
+  const Completed completed = cimomd({"--help"});
+  EXPECT_EQ(completed.status, 0);
+  for (const char* option : {"--config", "--address", "--port", "--schema", "--registration", "--provider-dir",
+                             "--max-request-size", "--max-connections", "--idle-timeout", "--shutdown-timeout",
+                             "--tls-certificate", "--tls-key", "--password-file", "--version"})
+    EXPECT_THAT(completed.output, HasSubstr(option));
+}
+
+TEST_F(CommandLine, ShowsTheVersion) { EXPECT_THAT(cimomd({"--version"}).output, StartsWith("cimomd ")); }
+
+TEST_F(CommandLine, IsRefusedWithStatusTwo) {
+  expectRefused({"--nonsense"}, 2, "--nonsense");
+  expectRefused({"--port"}, 2, "--port");
+  expectRefused({"--port", "65536"}, 2, "--port: \"65536\" is no number from 0 to 65535");
+  expectRefused({"--port", "http"}, 2, "--port: \"http\"");
+  expectRefused({"--port", ""}, 2, "--port");
+  expectRefused({"--port", "1", "--port", "2"}, 2, "--port");
+  expectRefused({"--max-request-size", "1"}, 2, "--max-request-size: \"1\" is no number from 1024");
+  expectRefused({"--idle-timeout", "-1"}, 2, "--idle-timeout");
+  expectRefused({"--tls-key", "key.pem"}, 2, "tls-certificate and tls-key go together");
+  expectRefused({"stray"}, 2, "stray");
+  expectRefused({"--config", "/nowhere/cimomd.ini"}, 2, "/nowhere/cimomd.ini: No such file or directory");
+}
+
+TEST_F(CommandLine, IsRefusedForWhatTheFileSays) {
+  expectRefused({"--config", file("port = 0\nnonsense = 1\n")}, 2, "cimomd.ini:2: unknown key \"nonsense\"");
+  expectRefused({"--config", file("; comment\n\nport = high\n")}, 2, "cimomd.ini:3: port: \"high\" is no number");
+  expectRefused({"--config", file("port = 0\nport = 0\n")}, 2, "cimomd.ini:2: port is given twice");
+  expectRefused({"--config", file("[http]\nport = 0\n")}, 2, "cimomd.ini:2: there is no section [http]");
+  expectRefused({"--config", file("port\n")}, 2, "cimomd.ini:1: is no \"key = value\"");
+  expectRefused({"--config", file("# " + std::string(5000, 'x') + "\n")}, 2, "cimomd.ini:1: the line is longer");
+  expectRefused({"--config", directory_.path().string()}, 2, "is a directory");
+}
+
+TEST_F(CommandLine, FailsWithStatusOneForWhatItIsGiven) {
+  expectRefused({"--port", "0", "--schema", "/nowhere.mof"}, 1, "/nowhere.mof");
+  expectRefused({"--port", "0", "--schema", directory_.write("bad.mof", "class {").string()}, 1, "bad.mof:1");
+  expectRefused({"--port", "0", "--registration", "/nowhere.reg"}, 1, "/nowhere.reg");
+  expectRefused({"--port", "0", "--address", "localhost"}, 1, "localhost");
+  expectRefused({"--port", "0", "--address", "192.0.2.1"}, 1, "192.0.2.1");
+  expectRefused({"--port", "0", "--password-file", "/nowhere"}, 1, "/nowhere");
+  expectRefused({"--port", "0", "--tls-certificate", "/nowhere", "--tls-key", "/nowhere"}, 1, "/nowhere");
+}
+
+TEST_F(CommandLine, FailsForAProviderWithoutALibrary) {
+  auto options = Cimomd::probeOptions();
+  options.back() = directory_.path().string();
+  options.insert(options.end(), {"--port", "0"});
+  expectRefused(options, 1, "cimomprobe");
+}
+
+TEST_F(CommandLine, FailsForAPortThatIsTaken) {
+  const Cimomd first({});
+  expectRefused({"--port", std::to_string(first.port())}, 1, "Address already in use");
+}
+
+TEST_F(CommandLine, TakesItsOptionsFromTheFileRelativeToIt) {
+  directory_.write("probe.mof", "class TEST_Local { };");
+  const Cimomd cimomd({"--config", file("schema = probe.mof\nregistration = " SOURCE_DIR "/tests/e2e/probe/Probe.reg\n"
+                                        "schema = " SOURCE_DIR "/tests/e2e/probe/Probe.mof\n"
+                                        "provider-dir = " BINARY_DIR "/lib ; where the build puts it\n")});
+  const std::string classes = cimomd.wbemcli({"ecn"}, "").output;
+  EXPECT_THAT(classes, AllOf(HasSubstr("TEST_Local"), HasSubstr("TEST_Thing")));
+}
+
+TEST_F(CommandLine, WinsOverTheFile) {
+  // The file's port could not be listened on.
+  EXPECT_NE(Cimomd({"--config", file("port = 1\naddress = 192.0.2.1\n"), "--address", "127.0.0.1"}).port(), 1);
+}
+
+}  // namespace

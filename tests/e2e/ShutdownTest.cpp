@@ -1,0 +1,79 @@
+// How cimomd ends.
+#include <gtest/gtest.h>
+#include <signal.h>
+
+#include <filesystem>
+
+#include "tests/e2e/support/Cimomd.h"
+#include "tests/e2e/support/Poll.h"
+
+namespace {
+
+using namespace Testing;
+using namespace std::chrono_literals;
+
+class Shutdown : public testing::Test {
+ protected:
+  static std::vector<std::string> options(const std::string& timeout) {
+    auto options = Cimomd::probeOptions();
+    options.insert(options.end(), {"--shutdown-timeout", timeout});
+    return options;
+  }
+
+  bool has(const char* name) const { return std::filesystem::exists(directory_.path() / name); }
+  Environment environment() const { return {{"PROBE_DIRECTORY", directory_.path().string()}}; }
+
+  TemporaryDirectory directory_;
+};
+
+TEST_F(Shutdown, CleansTheProvidersUpOnSigterm) {
+  Cimomd cimomd(Cimomd::probeOptions(), environment());
+  ASSERT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
+  EXPECT_FALSE(has("cleaned"));
+  EXPECT_EQ(cimomd.stop(), 0);
+  EXPECT_TRUE(has("cleaned"));
+  EXPECT_EQ(cimomd.process().errors(), "");
+}
+
+TEST_F(Shutdown, EndsOnSigintToo) {
+  Cimomd cimomd(Cimomd::probeOptions());
+  cimomd.process().signal(SIGINT);
+  EXPECT_EQ(cimomd.process().wait(), 0);
+}
+
+TEST_F(Shutdown, WaitsForARequestThatIsBeingAnswered) {
+  Cimomd cimomd(options("30"), environment());
+  Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
+  ASSERT_TRUE(poll([&] { return has("reached"); }));
+  cimomd.process().signal(SIGTERM);
+  // It refuses others once it ends, and still waits for the one.
+  ASSERT_TRUE(poll([&] { return cimomd.wbemcli({"ein"}, "TEST_Thing").status != 0; }));
+  EXPECT_TRUE(cimomd.process().isRunning());
+  EXPECT_FALSE(has("cleaned"));
+  directory_.write("go", "");
+  EXPECT_EQ(cimomd.process().wait(), 0);
+  EXPECT_EQ(client.wait(), 0) << client.errors();
+  EXPECT_TRUE(has("cleaned"));
+}
+
+TEST_F(Shutdown, GivesUpOnARequestThatTakesTooLong) {
+  Cimomd cimomd(options("0"), environment());
+  Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
+  ASSERT_TRUE(poll([&] { return has("reached"); }));
+  EXPECT_EQ(cimomd.stop(), 1);
+  EXPECT_NE(cimomd.process().errors().find("still being answered"), std::string::npos);
+  EXPECT_FALSE(has("cleaned"));
+}
+
+TEST_F(Shutdown, OutlivesAClientThatGoesAway) {
+  Cimomd cimomd(Cimomd::probeOptions(), environment());
+  {
+    Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
+    ASSERT_TRUE(poll([&] { return has("reached"); }));
+  }
+  directory_.write("go", "");
+  EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
+  EXPECT_EQ(cimomd.stop(), 0);
+}
+
+}  // namespace

@@ -1,0 +1,26 @@
+#ifndef TESTS_E2E_PROBE_PROBEOBJECTS_H_
+#define TESTS_E2E_PROBE_PROBEOBJECTS_H_
+
+#include <cmpift.h>
+
+#include <string>
+#include <vector>
+
+namespace Probe {
+
+/// The text that a modified TEST_Thing keeps until the provider is cleaned up.
+std::string text();
+void setText(const std::string& text);
+
+/// The instances of a class in the path's namespace: two things, one part, one link from the first thing to the part,
+/// one numbered; none of any other class.
+std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjectPath* path);
+
+CMPIObjectPath* thingPath(const CMPIBroker* broker, const char* nameSpace, const char* className, CMPIUint16 number);
+
+/// Whether both paths name the same object, class and keys compared as text.
+bool same(const CMPIObjectPath* one, const CMPIObjectPath* other);
+
+}  // namespace Probe
+
+#endif  // TESTS_E2E_PROBE_PROBEOBJECTS_H_

@@ -1,0 +1,57 @@
+#ifndef TESTS_E2E_SUPPORT_PROCESS_H_
+#define TESTS_E2E_SUPPORT_PROCESS_H_
+
+#include <sys/types.h>
+
+#include <chrono>
+#include <filesystem>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "tests/support/TemporaryDirectory.h"
+
+namespace Testing {
+
+using Environment = std::map<std::string, std::string>;
+
+/// A program that runs beside the test and is killed at the latest with this object.
+class Process {
+ public:
+  /// @param command the program, looked for along PATH, and its arguments
+  /// @param environment added to the test's own
+  explicit Process(const std::vector<std::string>& command, const Environment& environment = {});
+  ~Process();
+  Process(const Process&) = delete;
+  Process& operator=(const Process&) = delete;
+
+  void signal(int number) const;
+
+  /// The exit status; 128 and the signal's number where a signal ended it. Throws std::runtime_error when the program
+  /// has not ended by then.
+  int wait(std::chrono::seconds patience = std::chrono::seconds(30));
+  bool isRunning();
+
+  /// What it has written so far.
+  std::string output() const;
+  std::string errors() const;
+
+ private:
+  TemporaryDirectory directory_;
+  std::string name_;
+  pid_t id_ = -1;
+  int status_ = -1;
+};
+
+/// A program that has run to its end.
+struct Completed {
+  int status;
+  std::string output;
+  std::string errors;
+};
+
+Completed run(const std::vector<std::string>& command, const Environment& environment = {});
+
+}  // namespace Testing
+
+#endif  // TESTS_E2E_SUPPORT_PROCESS_H_
