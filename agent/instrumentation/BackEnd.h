@@ -2,11 +2,11 @@
 // and the underlying provider share it within a process.
 #pragma once
 
-#include "ManagementProcessor.h"
-
 #include <map>
 #include <memory>
 #include <string>
+
+#include "ManagementProcessor.h"
 
 namespace QV {
 
