@@ -43,9 +43,9 @@ ObjectPath Instance::path() const {
   for (std::size_t index = 0; index < size(); ++index) {
     const PropertyDeclaration& property = definition_->properties[index];
     const Value& value = (*this)[index];
-    if (property.isKey() && !value.isNull() && !complete.keys.find(property.name)) {
-      complete.keys.set(property.name, value);
-    }
+    if (!property.isKey() || value.isNull()) continue;
+    const Value* given = complete.keys.find(property.name);
+    if (!given || given->isNull()) complete.keys.set(property.name, value);
   }
   return complete;
 }

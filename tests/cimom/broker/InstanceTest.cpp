@@ -129,6 +129,15 @@ TEST_F(InstanceObject, KeepsTheKeysThatItsPathCameWith) {
   EXPECT_EQ(textOf(CMGetKey(kept, "Name", nullptr).value.string), "one");
 }
 
+TEST_F(InstanceObject, FillsAKeyThatItsPathHasAsNull) {
+  CMPIObjectPath* open = path("TST_Processor");
+  CMAddKey(open, "Name", nullptr, CMPI_string);
+  CMPIInstance* instance = CMNewInstance(broker, open, nullptr);
+  CMSetProperty(instance, "Name", "one", CMPI_chars);
+  const CMPIObjectPath* filled = CMGetObjectPath(instance, nullptr);
+  EXPECT_EQ(textOf(CMObjectPathToString(filled, nullptr)), "root/test:TST_Processor.Name=\"one\"");
+}
+
 TEST_F(InstanceObject, TakesANumericKeyOfAnotherWidth) {
   CMPIObjectPath* point = path("TST_Point");
   const CMPISint64 number = 4;
