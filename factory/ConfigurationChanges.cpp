@@ -48,6 +48,7 @@ int writeToNode(const std::string& name, std::string& ipv4Address, std::string& 
 
 }  // namespace
 
+// NOLINTNEXTLINE(performance-unnecessary-value-param): callers hand the three over by value.
 int IPConfigObjectFactory::executeModifyInstance(std::string name, std::string ipv4Address, std::string subnetMask) {
   const Frame frame = factoryFrame(__func__);
   frame.entering(498);

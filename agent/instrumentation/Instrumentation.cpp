@@ -1,7 +1,7 @@
 #include "QV/Instrumentation.h"
 
 #include <exception>
-#include <source_location>
+#include <experimental/source_location>
 
 #include "TWLog/TWLog.h"
 #include "instrumentation/InterfaceCursor.h"
@@ -11,7 +11,7 @@ namespace QV {
 namespace {
 
 // Callers do not keep the text of what is thrown, and a destructor throws nothing: the log is where the reason stays.
-void logFailure(const char* reason, const std::source_location& where) noexcept {
+void logFailure(const char* reason, const std::experimental::source_location& where) noexcept {
   try {
     const std::string component = "Tarnwick.Instrumentation";
     const std::string text = reason;
@@ -26,7 +26,8 @@ void logFailure(const char* reason, const std::source_location& where) noexcept 
 }
 
 template <typename Operation>
-auto logged(const Operation& operation, std::source_location where = std::source_location::current()) {
+auto logged(const Operation& operation,
+            std::experimental::source_location where = std::experimental::source_location::current()) {
   try {
     return operation();
   } catch (const std::exception& error) {
@@ -47,7 +48,7 @@ Instrumentation::~Instrumentation() {
   try {
     state_->cursor.flush();
   } catch (const std::exception& error) {
-    logFailure(error.what(), std::source_location::current());
+    logFailure(error.what(), std::experimental::source_location::current());
   }
   delete state_;
 }

@@ -3,8 +3,8 @@
 #include <cmpimacs.h>
 
 #include <exception>
+#include <experimental/source_location>
 #include <functional>
-#include <source_location>
 #include <stdexcept>
 
 #include "QV/ProviderHelper.h"
@@ -111,7 +111,7 @@ std::string charactersOf(const CMPIString* string) {
 }
 
 CMPIStatus failed(CMPIrc code, const std::string& reason,
-                  const std::source_location& where = std::source_location::current()) {
+                  const std::experimental::source_location& where = std::experimental::source_location::current()) {
   TWLog::TWLogger::logLevelMessage(where.function_name(), "UnderlyingIPConfigProvider", static_cast<int>(where.line()),
                                    "Tarnwick.UnderlyingIPConfigProvider", 6000, nullptr, 0, 0, reason);
   CMPIStatus status{code, nullptr};

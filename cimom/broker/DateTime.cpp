@@ -69,7 +69,7 @@ std::string DateTime::format() const {
     using namespace std::chrono;
     const year_month_day civil{sys_days(std::chrono::days(static_cast<int>(days)))};
     date = static_cast<unsigned long>(static_cast<int>(civil.year())) * 10'000 +
-           static_cast<unsigned>(civil.month()) * 100 + static_cast<unsigned>(civil.day());
+           static_cast<unsigned long>(static_cast<unsigned>(civil.month())) * 100 + static_cast<unsigned>(civil.day());
   }
   char text[64];
   const int length = std::snprintf(

@@ -1,23 +1,22 @@
-#ifndef TESTS_SUPPORT_TEMPORARYDIRECTORY_H_
-#define TESTS_SUPPORT_TEMPORARYDIRECTORY_H_
-
-#include <stdlib.h>
+// A fresh directory for one test, removed with all that is in it, and files in it.
+#pragma once
 
 #include <cerrno>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
 #include <string>
 #include <string_view>
 #include <system_error>
 
 namespace Testing {
 
-/// A fresh directory that goes with everything in it.
 class TemporaryDirectory {
  public:
   TemporaryDirectory() {
-    std::string name = (std::filesystem::temp_directory_path() / "cimom-XXXXXX").string();
-    if (!mkdtemp(name.data())) throw std::system_error(errno, std::generic_category(), "mkdtemp " + name);
+    std::string name = (std::filesystem::temp_directory_path() / "ipconfig-test-XXXXXX").string();
+    if (!::mkdtemp(name.data())) throw std::system_error(errno, std::generic_category(), "mkdtemp " + name);
     path_ = name;
   }
   ~TemporaryDirectory() {
@@ -28,11 +27,13 @@ class TemporaryDirectory {
   TemporaryDirectory& operator=(const TemporaryDirectory&) = delete;
 
   const std::filesystem::path& path() const { return path_; }
+  std::string operator/(const std::string& name) const { return (path_ / name).string(); }
 
-  /// Writes a file in it and gives its path.
-  std::filesystem::path write(std::string_view name, std::string_view content) const {
-    const auto file = path_ / name;
-    std::ofstream(file, std::ios::binary) << content;
+  // Writes a file below the directory and gives its path.
+  std::filesystem::path write(const std::string& name, std::string_view text) const {
+    const std::filesystem::path file = path_ / name;
+    std::filesystem::create_directories(file.parent_path());
+    std::ofstream(file, std::ios::binary | std::ios::trunc) << text;
     return file;
   }
 
@@ -40,6 +41,14 @@ class TemporaryDirectory {
   std::filesystem::path path_;
 };
 
-}  // namespace Testing
+inline void writeFile(const std::string& path, const std::string& text) {
+  std::ofstream(path, std::ios::binary | std::ios::trunc) << text;
+}
 
-#endif  // TESTS_SUPPORT_TEMPORARYDIRECTORY_H_
+// The file's text; empty where there is no file.
+inline std::string readFile(const std::string& path) {
+  std::ifstream file(path, std::ios::binary);
+  return {std::istreambuf_iterator<char>(file), {}};
+}
+
+}  // namespace Testing

@@ -21,12 +21,12 @@ std::string unitOf(std::string_view file) {
   return std::string(file.substr(0, file.find('.')));
 }
 
-void toTrace(const std::string& text, int level, const std::source_location& where) {
+void toTrace(const std::string& text, int level, const std::experimental::source_location& where) {
   TWLog::TWLogger::traceLevelMessage(where.function_name(), unitOf(where.file_name()).c_str(),
                                      static_cast<int>(where.line()), component(), level, nullptr, 0, 0, text);
 }
 
-void toLogAndTrace(const std::string& text, int level, const std::source_location& where) {
+void toLogAndTrace(const std::string& text, int level, const std::experimental::source_location& where) {
   TWLog::TWLogger::logLevelMessage(where.function_name(), unitOf(where.file_name()).c_str(),
                                    static_cast<int>(where.line()), component(), level, nullptr, 0, 0, text);
   toTrace(text, level, where);
@@ -34,8 +34,12 @@ void toLogAndTrace(const std::string& text, int level, const std::source_locatio
 
 }  // namespace
 
-void logFailure(const std::string& text, std::source_location where) { toLogAndTrace(text, failureLevel, where); }
-void logProgress(const std::string& text, std::source_location where) { toLogAndTrace(text, progressLevel, where); }
-void trace(const std::string& text, std::source_location where) { toTrace(text, progressLevel, where); }
+void logFailure(const std::string& text, std::experimental::source_location where) {
+  toLogAndTrace(text, failureLevel, where);
+}
+void logProgress(const std::string& text, std::experimental::source_location where) {
+  toLogAndTrace(text, progressLevel, where);
+}
+void trace(const std::string& text, std::experimental::source_location where) { toTrace(text, progressLevel, where); }
 
 }  // namespace QV::Ipmi

@@ -3,9 +3,9 @@
 
 #include <sstream>
 
-#include "agent/support/TemporaryDirectory.h"
 #include "agent/support/Throws.h"
 #include "config/AgentConfiguration.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
@@ -67,7 +67,7 @@ TEST(AgentConfiguration, everyKeyIsTaken) {
 
 TEST(AgentConfiguration, theSampleIsAFileOfDefaults) {
   // Given the sample as it is shipped, and the same with every key put into force
-  const std::string sample = readFile(SOURCE_DIR "/agent/agent.ini.sample");
+  const std::string sample = Testing::readFile(SOURCE_DIR "/agent/agent.ini.sample");
   std::string inForce;
   std::istringstream lines(sample);
   for (std::string line; std::getline(lines, line);) {
@@ -154,27 +154,27 @@ TEST(AgentConfiguration, aNullCharacterIsRefused) {
 }
 
 TEST(AgentConfiguration, theFileThatTheVariableNamesIsRead) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "a.ini", "[system]\nname = chosen\n");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "a.ini", "[system]\nname = chosen\n");
   const AgentIniVariable variable(directory / "a.ini");
   EXPECT_EQ(readAgentConfiguration().systemName, "chosen");
 }
 
 TEST(AgentConfiguration, aFileThatTheVariableNamesAndThatIsMissingIsAnError) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const AgentIniVariable variable(directory / "none.ini");
   EXPECT_EQ(thrownBy(readAgentConfiguration), directory / "none.ini" + ": cannot be opened: No such file or directory");
 }
 
 TEST(AgentConfiguration, aDirectoryInPlaceOfTheFileIsAnError) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const AgentIniVariable variable(directory.path().string());
   EXPECT_THAT(thrownBy(readAgentConfiguration), HasSubstr(directory.path().string() + ": cannot be read"));
 }
 
 TEST(AgentConfiguration, aFaultNamesTheFile) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "a.ini", "[x]\ny = z\n");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "a.ini", "[x]\ny = z\n");
   const AgentIniVariable variable(directory / "a.ini");
   EXPECT_EQ(thrownBy(readAgentConfiguration), directory / "a.ini" + ":2: there is no section [x]");
 }

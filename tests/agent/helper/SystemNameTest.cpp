@@ -4,15 +4,15 @@
 #include <array>
 
 #include "QV/ProviderHelper.h"
-#include "agent/support/TemporaryDirectory.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
 
 // agent.ini is read once in a process: each case asks in a child.
 void expectSystemName(const std::string& iniText, const std::string& expected) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "agent.ini", iniText);
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "agent.ini", iniText);
   ::setenv("QV_AGENT_INI", (directory / "agent.ini").c_str(), 1);
   EXPECT_EXIT(std::exit(getSystemName() == expected ? 0 : 1), testing::ExitedWithCode(0), "");
   ::unsetenv("QV_AGENT_INI");

@@ -8,8 +8,8 @@
 #include <functional>
 #include <memory>
 
-#include "agent/support/TemporaryDirectory.h"
 #include "instrumentation/BackEnd.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
@@ -24,7 +24,7 @@ class ABackEndChoice : public testing::Test {
   }
   ~ABackEndChoice() override { ::unsetenv("QV_AGENT_INI"); }
 
-  void choose(const std::string& text) const { writeFile(ini_, text + "[log]\ndestination = off\n"); }
+  void choose(const std::string& text) const { Testing::writeFile(ini_, text + "[log]\ndestination = off\n"); }
 
   // In the child: the processor's name and description, else what was thrown.
   static std::string describe(SharedBackEnd* sharedBackEnd) {
@@ -48,7 +48,7 @@ class ABackEndChoice : public testing::Test {
     EXPECT_EXIT(child(), testing::ExitedWithCode(0), pattern);
   }
 
-  const TemporaryDirectory directory_;
+  const Testing::TemporaryDirectory directory_;
   const std::string ini_ = directory_ / "agent.ini";
   const std::string library_ = directory_ / "libqvinstrumentation.so.1";
   const std::string ipmi_ = directory_ / "libqvbmc-ipmi.so";
@@ -77,7 +77,7 @@ TEST_F(ABackEndChoice, passesOnWhyTheIpmiBackEndRefusesItsSettings) {
 }
 
 TEST_F(ABackEndChoice, tellsWhyTheIpmiBackEndCannotBeLoaded) {
-  writeFile(ipmi_, "no library");
+  Testing::writeFile(ipmi_, "no library");
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^the IPMI back end cannot be loaded: .*libqvbmc-ipmi.so: ");
 }

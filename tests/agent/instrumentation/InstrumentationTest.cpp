@@ -23,8 +23,8 @@ class AnInstrumentation : public testing::Test {
  protected:
   void SetUp() override { AgentEnvironment::instance().reset(); }
 
-  static std::string log() { return readFile(AgentEnvironment::instance().log()); }
-  static std::string state() { return readFile(AgentEnvironment::instance().state()); }
+  static std::string log() { return Testing::readFile(AgentEnvironment::instance().log()); }
+  static std::string state() { return Testing::readFile(AgentEnvironment::instance().state()); }
 
   static std::string address() {
     Instrumentation reader;
@@ -79,7 +79,7 @@ TEST_F(AnInstrumentation, logsWhatItCannotThrowAnyMore) {
 }
 
 TEST_F(AnInstrumentation, throwsAndLogsADamagedStateAndLeavesIt) {
-  writeFile(AgentEnvironment::instance().state(), "{");
+  Testing::writeFile(AgentEnvironment::instance().state(), "{");
   Instrumentation instrumentation;
   EXPECT_THAT(thrownBy([&] { instrumentation.selectNode(IpInterfaceNode); }), HasSubstr("processor.json: "));
   EXPECT_THAT(log(), HasSubstr("processor.json: "));

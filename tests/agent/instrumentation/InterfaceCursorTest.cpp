@@ -2,10 +2,10 @@
 #include <gtest/gtest.h>
 
 #include "agent/instrumentation/RecordingBackEnd.h"
-#include "agent/support/TemporaryDirectory.h"
 #include "agent/support/Throws.h"
 #include "instrumentation/InterfaceCursor.h"
 #include "instrumentation/simulated/StateText.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
@@ -27,13 +27,13 @@ class AnInterfaceCursor : public testing::Test {
   }
 
   void install(const ManagementProcessor& processor) {
-    writeFile(state_, writeState(processor));
+    Testing::writeFile(state_, writeState(processor));
     cursor_.select(IpInterfaceNode);
   }
 
   NetworkInterface onProcessor(std::size_t index) { return backEnd_->read().interfaces.at(index); }
 
-  const TemporaryDirectory directory_;
+  const Testing::TemporaryDirectory directory_;
   const std::string state_ = directory_ / "state.json";
   const std::shared_ptr<RecordingBackEnd> backEnd_ = std::make_shared<RecordingBackEnd>(state_);
   InterfaceCursor cursor_{backEnd_};

@@ -2,14 +2,14 @@
 #include <gtest/gtest.h>
 
 #include "agent/instrumentation/RecordingBackEnd.h"
-#include "agent/support/TemporaryDirectory.h"
 #include "instrumentation/NamedProcessor.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
 
 TEST(NamedProcessor, bearsTheGivenNames) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   NamedProcessor processor(std::make_shared<RecordingBackEnd>(directory / "state"), "bmc7", "in rack 7");
   EXPECT_EQ(processor.read().name, "bmc7");
   EXPECT_EQ(processor.read().description, "in rack 7");
@@ -17,13 +17,13 @@ TEST(NamedProcessor, bearsTheGivenNames) {
 }
 
 TEST(NamedProcessor, keepsItsOwnNamesWhereNoneIsGiven) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   NamedProcessor processor(std::make_shared<RecordingBackEnd>(directory / "state"), "", "");
   EXPECT_EQ(processor.read(), factoryConfiguration());
 }
 
 TEST(NamedProcessor, passesChangesOn) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const auto inner = std::make_shared<RecordingBackEnd>(directory / "state");
   NamedProcessor(inner, "a", "b").change("eth1", {"192.0.2.99", {}});
   EXPECT_THAT(inner->changes, testing::ElementsAre("eth1 192.0.2.99 -"));

@@ -17,12 +17,12 @@ using QV::NodeLexicon::Properties;
 class IpmiAgent : public testing::Test {
  protected:
   static void SetUpTestSuite() {
-    directory = std::make_unique<TemporaryDirectory>();
+    directory = std::make_unique<Testing::TemporaryDirectory>();
     bmc = std::make_unique<SimulatedBmc>();
     std::string ini = "[log]\ndestination = file\nfile = " + log() + "\n[trace]\ndestination = file\nfile = " + log() +
                       "\n[processor]\nbackend = ipmi\n[ipmi]\n";
     for (const auto& [key, value] : bmc->settings()) ini += key + " = " + value + '\n';
-    writeFile(*directory / "agent.ini", ini);
+    Testing::writeFile(*directory / "agent.ini", ini);
     ::setenv("QV_AGENT_INI", (*directory / "agent.ini").c_str(), 1);
   }
   static void TearDownTestSuite() {
@@ -36,7 +36,7 @@ class IpmiAgent : public testing::Test {
     return instrumentation.getProperty(property, text) ? text : "(none)";
   }
 
-  static inline std::unique_ptr<TemporaryDirectory> directory;
+  static inline std::unique_ptr<Testing::TemporaryDirectory> directory;
   static inline std::unique_ptr<SimulatedBmc> bmc;
 };
 
@@ -57,8 +57,8 @@ TEST_F(IpmiAgent, ShowsAndChangesTheBmcsInterface) {
   EXPECT_EQ(bmc->witness("IP Address"), "192.0.2.77");
   EXPECT_EQ(bmc->witness("Subnet Mask"), "255.255.255.128");
   EXPECT_EQ(bmc->witness("IP Address Source"), "Static Address");
-  EXPECT_THAT(readFile(log()), testing::HasSubstr("Tarnwick.Ipmi"));
-  EXPECT_THAT(readFile(log()), testing::HasSubstr("round trips"));
+  EXPECT_THAT(Testing::readFile(log()), testing::HasSubstr("Tarnwick.Ipmi"));
+  EXPECT_THAT(Testing::readFile(log()), testing::HasSubstr("round trips"));
   Instrumentation again;
   again.selectNode(IpInterfaceNode);
   EXPECT_EQ(value(again, Properties::Ipv4Address), "192.0.2.77");

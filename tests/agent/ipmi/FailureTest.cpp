@@ -202,7 +202,7 @@ INSTANTIATE_TEST_SUITE_P(Reasons, IpmiSessionRefused,
 
 TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrected) {
   const SimulatedBmc bmc;
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string file = directory / "password";
   IpmiFixture::writePrivateFile(file, "wrong\n");
   auto settings = bmc.settings();

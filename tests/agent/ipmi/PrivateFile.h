@@ -4,7 +4,7 @@
 #include <filesystem>
 #include <string>
 
-#include "agent/support/TemporaryDirectory.h"
+#include "support/TemporaryDirectory.h"
 
 namespace IpmiFixture {
 
@@ -12,7 +12,7 @@ constexpr auto ownerOnly = std::filesystem::perms::owner_read | std::filesystem:
 
 // A file that only its owner can read and write.
 inline void writePrivateFile(const std::string& path, const std::string& text) {
-  writeFile(path, text);
+  Testing::writeFile(path, text);
   std::filesystem::permissions(path, ownerOnly);
 }
 

@@ -35,7 +35,7 @@ class IpmiSettingsTest : public testing::Test {
     return section;
   }
 
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string password = directory / "password";
 };
 

@@ -72,7 +72,7 @@ std::string SimulatedBmc::witness(const std::string& label) const {
 void SimulatedBmc::hook(const std::string& step, const std::string& script) const {
   const std::string path = directory_ / ("on-" + step);
   // Renamed into its place: the simulator may be about to run it.
-  writeFile(path + ".new", "#!/bin/sh\n" + script + '\n');
+  Testing::writeFile(path + ".new", "#!/bin/sh\n" + script + '\n');
   fs::permissions(path + ".new", fs::perms::owner_all);
   fs::rename(path + ".new", path);
 }
@@ -80,10 +80,10 @@ void SimulatedBmc::hook(const std::string& step, const std::string& script) cons
 void SimulatedBmc::removeHook(const std::string& step) const { fs::remove(directory_ / ("on-" + step)); }
 
 std::string SimulatedBmc::stored(const std::string& key) const {
-  return valueOf(readFile(directory_ / "lan.state"), key, '=');
+  return valueOf(Testing::readFile(directory_ / "lan.state"), key, '=');
 }
 
-pid_t SimulatedBmc::simulator() const { return std::stoi(readFile(directory_ / "pid")); }
+pid_t SimulatedBmc::simulator() const { return std::stoi(Testing::readFile(directory_ / "pid")); }
 
 void SimulatedBmc::halt() const { ::kill(simulator(), SIGSTOP); }
 void SimulatedBmc::resume() const { ::kill(simulator(), SIGCONT); }

@@ -8,8 +8,8 @@
 #include <string>
 
 #include "agent/ipmi/Process.h"
-#include "agent/support/TemporaryDirectory.h"
 #include "instrumentation/BackEnd.h"
+#include "support/TemporaryDirectory.h"
 
 namespace IpmiFixture {
 
@@ -49,7 +49,7 @@ class SimulatedBmc {
   void start();
   pid_t simulator() const;
 
-  TemporaryDirectory directory_;
+  Testing::TemporaryDirectory directory_;
   Personality personality_;
   std::uint16_t port_ = 0;
   std::unique_ptr<Process> process_;

@@ -12,8 +12,8 @@
 #include <vector>
 
 #include "agent/support/AllocationCount.h"
-#include "agent/support/TemporaryDirectory.h"
 #include "log/Channel.h"
+#include "support/TemporaryDirectory.h"
 
 namespace {
 std::vector<std::pair<int, std::string>> sentToSyslog;
@@ -67,12 +67,12 @@ TEST(Channel, refusesAMessageWithoutAnAllocation) {
 }
 
 TEST(Channel, writesALineToItsFile) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   Channel channel({Destination::File, directory / "log", 0, {}});
   const std::string component = "C";
   const std::string text = "one\ntwo";
   channel.send({"f", "F", 1, component, 6000, text});
-  EXPECT_THAT(readFile(directory / "log"), testing::EndsWith(" 6000 C f (F:1): one\\ntwo\n"));
+  EXPECT_THAT(Testing::readFile(directory / "log"), testing::EndsWith(" 6000 C f (F:1): one\\ntwo\n"));
 }
 
 TEST(Channel, writesALineToStderr) {
@@ -85,7 +85,7 @@ TEST(Channel, writesALineToStderr) {
 }
 
 TEST(Channel, saysOnceThatItsFileCannotBeWritten) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   Channel channel({Destination::File, directory / "none/log", 0, {}});
   const std::string component = "C";
   const std::string text = "x";
@@ -101,7 +101,7 @@ TEST(Channel, saysOnceThatItsFileCannotBeWritten) {
 }
 
 TEST(Channel, saysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   Channel channel({Destination::File, directory / "later/log", 0, {}});
   const std::string component = "C";
   const std::string text = "x";

@@ -7,67 +7,67 @@
 #include <thread>
 #include <vector>
 
-#include "agent/support/TemporaryDirectory.h"
 #include "log/LogFile.h"
+#include "support/TemporaryDirectory.h"
 
 namespace TWLog {
 namespace {
 
 TEST(LogFile, isMadeForItsOwnerAndGroup) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   LogFile file(directory / "log");
   EXPECT_EQ(file.append("one\n"), 0);
   struct stat status {};
   ASSERT_EQ(::stat((directory / "log").c_str(), &status), 0);
   EXPECT_EQ(status.st_mode & 0137, 0U) << "no more than rw-r-----";
-  EXPECT_EQ(readFile(directory / "log"), "one\n");
+  EXPECT_EQ(Testing::readFile(directory / "log"), "one\n");
 }
 
 TEST(LogFile, keepsWhatIsThere) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "log", "before\n");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "log", "before\n");
   LogFile(directory / "log").append("after\n");
-  EXPECT_EQ(readFile(directory / "log"), "before\nafter\n");
+  EXPECT_EQ(Testing::readFile(directory / "log"), "before\nafter\n");
 }
 
 TEST(LogFile, followsARotationThatRenamesIt) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   LogFile file(directory / "log");
   file.append("old\n");
   std::filesystem::rename(directory / "log", directory / "log.1");
   file.append("new\n");
-  EXPECT_EQ(readFile(directory / "log.1"), "old\n");
-  EXPECT_EQ(readFile(directory / "log"), "new\n");
+  EXPECT_EQ(Testing::readFile(directory / "log.1"), "old\n");
+  EXPECT_EQ(Testing::readFile(directory / "log"), "new\n");
 }
 
 TEST(LogFile, followsARotationThatTruncatesIt) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   LogFile file(directory / "log");
   file.append("old\n");
   std::filesystem::resize_file(directory / "log", 0);
   file.append("new\n");
-  EXPECT_EQ(readFile(directory / "log"), "new\n");
+  EXPECT_EQ(Testing::readFile(directory / "log"), "new\n");
 }
 
 TEST(LogFile, tellsWhyItCannotBeOpenedAndTriesAgainWithTheNextLine) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   LogFile file(directory / "later/log");
   EXPECT_EQ(file.append("lost\n"), ENOENT);
   std::filesystem::create_directory(directory / "later");
   EXPECT_EQ(file.append("kept\n"), 0);
-  EXPECT_EQ(readFile(directory / "later/log"), "kept\n");
+  EXPECT_EQ(Testing::readFile(directory / "later/log"), "kept\n");
 }
 
 TEST(LogFile, tellsThatTheDiskIsFull) { EXPECT_EQ(LogFile("/dev/full").append("x\n"), ENOSPC); }
 
 TEST(LogFile, doesNotWaitForTheReaderOfAFifo) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   ASSERT_EQ(::mkfifo((directory / "log").c_str(), 0600), 0);
   EXPECT_EQ(LogFile(directory / "log").append("x\n"), ENXIO);
 }
 
 TEST(LogFile, isNotInheritedByPrograms) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   LogFile file(directory / "log");
   file.append("x\n");
   int open = 0;
@@ -82,7 +82,7 @@ TEST(LogFile, isNotInheritedByPrograms) {
 
 TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
   // Given two writers of one file, as two processes have them, with two threads each
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   LogFile first(directory / "log");
   LogFile second(directory / "log");
   constexpr int lines = 500;
@@ -100,7 +100,7 @@ TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
   }
 
   // Then every line is there, and is of one writer
-  std::istringstream text(readFile(directory / "log"));
+  std::istringstream text(Testing::readFile(directory / "log"));
   int count = 0;
   for (std::string line; std::getline(text, line); ++count) ASSERT_EQ(line, std::string(200, line.at(0)));
   EXPECT_EQ(count, 4 * lines);

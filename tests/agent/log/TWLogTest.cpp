@@ -10,7 +10,7 @@
 #include <vector>
 
 #include "TWLog/TWLog.h"
-#include "agent/support/TemporaryDirectory.h"
+#include "support/TemporaryDirectory.h"
 
 namespace {
 
@@ -53,10 +53,10 @@ TEST(MessageBuffer, isEmptyOnceItsTextIsTaken) {
 }
 
 TEST(Logger, sendsTheLogAndTheTraceTheirOwnWays) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
-  writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\nthreshold.watched = 4000\n" +
-                     "[trace]\ndestination = file\nfile = " + (directory / "trace") + "\n");
+  Testing::writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\nthreshold.watched = 4000\n" +
+                              "[trace]\ndestination = file\nfile = " + (directory / "trace") + "\n");
   inChildWith(ini, [] {
     log("C", 4000, "no");
     log("C", 6000, "failure");
@@ -64,15 +64,15 @@ TEST(Logger, sendsTheLogAndTheTraceTheirOwnWays) {
     trace("C", 3999, "no");
     trace("C", 4000, "step");
   });
-  EXPECT_THAT(readFile(directory / "log"),
+  EXPECT_THAT(Testing::readFile(directory / "log"),
               testing::MatchesRegex(".* 6000 C f \\(F:1\\): failure\n.* 4000 watched f \\(F:1\\): progress\n"));
-  EXPECT_THAT(readFile(directory / "trace"), testing::MatchesRegex(".* 4000 C f \\(F:1\\): step\n"));
+  EXPECT_THAT(Testing::readFile(directory / "trace"), testing::MatchesRegex(".* 4000 C f \\(F:1\\): step\n"));
 }
 
 TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
-  writeFile(ini, "[log]\ndestination = mail\n");
+  Testing::writeFile(ini, "[log]\ndestination = mail\n");
   ::setenv("QV_AGENT_INI", ini.c_str(), 1);
   const auto report = [] {
     log("C", 6000, "one");
@@ -87,9 +87,9 @@ TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
 }
 
 TEST(Logger, takesMessagesFromSeveralThreads) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
-  writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\n");
+  Testing::writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\n");
   inChildWith(ini, [] {
     std::vector<std::jthread> threads;
     for (int thread = 0; thread < 4; ++thread) {
@@ -98,7 +98,7 @@ TEST(Logger, takesMessagesFromSeveralThreads) {
       });
     }
   });
-  const std::string text = readFile(directory / "log");
+  const std::string text = Testing::readFile(directory / "log");
   EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 1000);
 }
 

@@ -8,7 +8,7 @@
 #include <memory>
 #include <string>
 
-#include "agent/support/TemporaryDirectory.h"
+#include "support/TemporaryDirectory.h"
 
 class AgentEnvironment : public testing::Environment {
  public:
@@ -18,10 +18,10 @@ class AgentEnvironment : public testing::Environment {
   }
 
   void SetUp() override {
-    directory_ = std::make_unique<TemporaryDirectory>();
+    directory_ = std::make_unique<Testing::TemporaryDirectory>();
     const std::string ini = *directory_ / "agent.ini";
-    writeFile(ini, "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " + log() +
-                       "\n[simulated]\nstate = " + state() + "\n");
+    Testing::writeFile(ini, "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " + log() +
+                                "\n[simulated]\nstate = " + state() + "\n");
     ::setenv("QV_AGENT_INI", ini.c_str(), 1);
   }
 
@@ -37,5 +37,5 @@ class AgentEnvironment : public testing::Environment {
   }
 
  private:
-  std::unique_ptr<TemporaryDirectory> directory_;
+  std::unique_ptr<Testing::TemporaryDirectory> directory_;
 };

@@ -142,7 +142,7 @@ class TheUnderlyingProvider : public testing::Test {
 
   std::string message() const { return status_.msg ? CMGetCharsPtr(status_.msg, nullptr) : ""; }
 
-  static std::string log() { return readFile(AgentEnvironment::instance().log()); }
+  static std::string log() { return Testing::readFile(AgentEnvironment::instance().log()); }
 
   Cimom::ObjectManager manager_;
   Cimom::RequestScope scope_{manager_.broker()};
@@ -267,7 +267,7 @@ TEST_F(TheUnderlyingProvider, showsAtOnceWhatTheInstrumentationWrote) {
 }
 
 TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsIt) {
-  writeFile(AgentEnvironment::instance().state(), "{");
+  Testing::writeFile(AgentEnvironment::instance().state(), "{");
   for (const char* className : classNames) {
     if (className == std::string("YRNQV_Stranger")) continue;
     enumerate(className);

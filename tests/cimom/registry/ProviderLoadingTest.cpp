@@ -1,5 +1,5 @@
 #include "tests/cimom/support/BrokerFixture.h"
-#include "tests/cimom/support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace Cimom::Test {
 namespace {
@@ -39,7 +39,7 @@ class ProviderLoading : public testing::Test {
     return result;
   }
 
-  TemporaryDirectory directory;
+  Testing::TemporaryDirectory directory;
   ObjectManager manager;
 };
 

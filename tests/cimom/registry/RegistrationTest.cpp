@@ -2,7 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "cimom/ObjectManager.h"
-#include "tests/cimom/support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace Cimom::Test {
 namespace {
@@ -27,7 +27,7 @@ class Registration : public testing::Test {
     return {};
   }
 
-  TemporaryDirectory directory;
+  Testing::TemporaryDirectory directory;
 };
 
 TEST_F(Registration, AStanzaNamesAClassAndItsProvider) {

@@ -4,7 +4,7 @@
 #include "cimom/ConfigurationError.h"
 #include "cimom/schema/Mof.h"
 #include "tests/cimom/support/ManagedElements.h"
-#include "tests/cimom/support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace Cimom::Test {
 namespace {
@@ -99,7 +99,7 @@ TEST(MofErrors, ATextWithABrokenByteAnywhereIsAcceptedOrRefusedAndNoMore) {
 }
 
 TEST(MofErrors, AFileIsNamedWithItsPath) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const auto read = [](const std::filesystem::path& path) -> std::string {
     try {
       MofReader().readPath(path);

@@ -4,7 +4,7 @@
 #include "cimom/ConfigurationError.h"
 #include "cimom/broker/Array.h"
 #include "cimom/schema/Mof.h"
-#include "tests/cimom/support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace Cimom::Test {
 namespace {
@@ -137,7 +137,7 @@ TEST(Mof, PragmasNameNamespacesAndOthersAreIgnored) {
 }
 
 TEST(MofFiles, ADirectoryIsReadWholeAndInOrder) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   directory.write("b.mof", "class B {};");
   directory.write("a.mof", "class A {};");
   directory.write("deep/c.mof", "class C {};");
@@ -146,7 +146,7 @@ TEST(MofFiles, ADirectoryIsReadWholeAndInOrder) {
 }
 
 TEST(MofFiles, IncludesAreRelativeToTheirFileAndReadOnce) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   directory.write("qualifiers.mof", "Qualifier Tone : uint8 = 1, Scope(any);");
   directory.write("part/a.mof", "#pragma include(\"../qualifiers.mof\")\nclass A { [Tone(2)] string P; };");
   const auto all = directory.write(

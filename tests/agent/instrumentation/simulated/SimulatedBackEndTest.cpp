@@ -4,17 +4,17 @@
 #include <thread>
 #include <vector>
 
-#include "agent/support/TemporaryDirectory.h"
 #include "agent/support/Throws.h"
 #include "instrumentation/simulated/SimulatedBackEnd.h"
 #include "instrumentation/simulated/StateText.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
 
 class ASimulatedProcessor : public testing::Test {
  protected:
-  const TemporaryDirectory directory_;
+  const Testing::TemporaryDirectory directory_;
   const std::string state_ = directory_ / "processor/state.json";
   SimulatedBackEnd processor_{state_};
 };
@@ -23,7 +23,7 @@ TEST_F(ASimulatedProcessor, touchesNothingBeforeItIsUsed) { EXPECT_TRUE(std::fil
 
 TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationOnTheFirstRead) {
   EXPECT_EQ(processor_.read(), factoryConfiguration());
-  EXPECT_EQ(readFile(state_), writeState(factoryConfiguration()));
+  EXPECT_EQ(Testing::readFile(state_), writeState(factoryConfiguration()));
 }
 
 TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationWithTheFirstChange) {
@@ -58,10 +58,10 @@ TEST_F(ASimulatedProcessor, refusesToChangeAnInterfaceThatItDoesNotHave) {
 TEST_F(ASimulatedProcessor, withADamagedStateTellsTheFileAndTheFieldAndLeavesTheFile) {
   processor_.read();
   for (const std::string damage : {"", "{", "{\"name\": 7}", "\0\0"}) {
-    writeFile(state_, damage);
+    Testing::writeFile(state_, damage);
     EXPECT_THAT(thrownBy([&] { processor_.read(); }), testing::StartsWith(state_ + ": "));
     EXPECT_THAT(thrownBy([&] { processor_.change("eth0", {"192.0.2.77", {}}); }), testing::StartsWith(state_ + ": "));
-    EXPECT_EQ(readFile(state_), damage);
+    EXPECT_EQ(Testing::readFile(state_), damage);
   }
 }
 

@@ -8,9 +8,9 @@
 #include <exception>
 #include <set>
 
-#include "agent/support/TemporaryDirectory.h"
 #include "agent/support/Throws.h"
 #include "instrumentation/simulated/StateFile.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
@@ -27,19 +27,19 @@ mode_t modeOf(const std::string& path) {
   return status.st_mode & 07777;
 }
 
-std::set<std::string> namesIn(const TemporaryDirectory& directory) {
+std::set<std::string> namesIn(const Testing::TemporaryDirectory& directory) {
   std::set<std::string> names;
   for (const auto& entry : std::filesystem::directory_iterator(directory.path())) names.insert(entry.path().filename());
   return names;
 }
 
 TEST(StateFile, hasNoTextBeforeItIsWritten) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   EXPECT_EQ(StateFile(directory / "state").read(), std::nullopt);
 }
 
 TEST(StateFile, isReplacedByWhatTheEditMakesOfIt) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const StateFile file(directory / "state");
   file.update([](const auto& current) { return current ? "no" : "one"; });
   file.update([](const auto& current) { return *current + " two"; });
@@ -47,55 +47,55 @@ TEST(StateFile, isReplacedByWhatTheEditMakesOfIt) {
 }
 
 TEST(StateFile, leavesNothingBehindButItsLock) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   replace(directory / "state", "x");
   EXPECT_EQ(namesIn(directory), (std::set<std::string>{"state", "state.lock"}));
 }
 
 TEST(StateFile, makesItsDirectory) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   replace(directory / "a/b/state", "x");
-  EXPECT_EQ(readFile(directory / "a/b/state"), "x");
+  EXPECT_EQ(Testing::readFile(directory / "a/b/state"), "x");
 }
 
 TEST(StateFile, staysAsItIsWhereTheEditThrows) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   replace(directory / "state", "old");
   EXPECT_EQ(thrownBy([&] {
               StateFile(directory / "state").update([](const auto&) -> std::string { throw std::runtime_error("no"); });
             }),
             "no");
-  EXPECT_EQ(readFile(directory / "state"), "old");
+  EXPECT_EQ(Testing::readFile(directory / "state"), "old");
 }
 
 TEST(StateFile, sweepsAwayWhatAKilledWriterLeft) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "state", "old");
-  writeFile(directory / "state.new", "ha");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "state", "old");
+  Testing::writeFile(directory / "state.new", "ha");
   EXPECT_EQ(StateFile(directory / "state").read(), "old");
   replace(directory / "state", "new");
-  EXPECT_EQ(readFile(directory / "state"), "new");
+  EXPECT_EQ(Testing::readFile(directory / "state"), "new");
   EXPECT_EQ(namesIn(directory), (std::set<std::string>{"state", "state.lock"}));
 }
 
 TEST(StateFile, doesNotWriteThroughALinkPlantedUnderItsTemporaryName) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "victim", "mine");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "victim", "mine");
   std::filesystem::create_symlink(directory / "victim", directory / "state.new");
   replace(directory / "state", "new");
-  EXPECT_EQ(readFile(directory / "victim"), "mine");
-  EXPECT_EQ(readFile(directory / "state"), "new");
+  EXPECT_EQ(Testing::readFile(directory / "victim"), "mine");
+  EXPECT_EQ(Testing::readFile(directory / "state"), "new");
 }
 
 TEST(StateFile, isMadeForItsOwnerAndGroup) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   replace(directory / "state", "x");
   EXPECT_EQ(modeOf(directory / "state") & 0137, 0U);
 }
 
 TEST(StateFile, keepsItsMode) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "state", "old");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "state", "old");
   ASSERT_EQ(::chmod((directory / "state").c_str(), 0604), 0);
   replace(directory / "state", "new");
   EXPECT_EQ(modeOf(directory / "state"), 0604U);
@@ -103,8 +103,8 @@ TEST(StateFile, keepsItsMode) {
 
 TEST(StateFile, keepsItsOwner) {
   if (::geteuid() != 0) GTEST_SKIP() << "only root can give files away";
-  const TemporaryDirectory directory;
-  writeFile(directory / "state", "old");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "state", "old");
   ASSERT_EQ(::chown((directory / "state").c_str(), 1234, 4321), 0);
   replace(directory / "state", "new");
   struct stat status {};
@@ -116,8 +116,8 @@ TEST(StateFile, keepsItsOwner) {
 TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
   if (::geteuid() != 0) GTEST_SKIP() << "only root can become another user";
   // Given a file of one user, in a directory in which another may write
-  const TemporaryDirectory directory;
-  writeFile(directory / "state", "old");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "state", "old");
   ASSERT_EQ(::chmod((directory / "state").c_str(), 0664), 0);
   ASSERT_EQ(::chmod(directory.path().c_str(), 0777), 0);
 
@@ -135,47 +135,47 @@ TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
   EXPECT_EXIT(change(), testing::ExitedWithCode(0), "");
 
   // Then the new text counts more than the old owner
-  EXPECT_EQ(readFile(directory / "state"), "new");
+  EXPECT_EQ(Testing::readFile(directory / "state"), "new");
   EXPECT_EQ(modeOf(directory / "state"), 0664U);
 }
 
 TEST(StateFile, behindALinkIsReplacedAndTheLinkStays) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   std::filesystem::create_directory(directory / "real");
-  writeFile(directory / "real/state", "old");
+  Testing::writeFile(directory / "real/state", "old");
   std::filesystem::create_symlink("real/state", directory / "hop");
   std::filesystem::create_symlink(directory / "hop", directory / "link");
   replace(directory / "link", "new");
   EXPECT_TRUE(std::filesystem::is_symlink(directory / "link"));
   EXPECT_TRUE(std::filesystem::is_symlink(directory / "hop"));
-  EXPECT_EQ(readFile(directory / "real/state"), "new");
+  EXPECT_EQ(Testing::readFile(directory / "real/state"), "new");
   EXPECT_EQ(StateFile(directory / "link").read(), "new");
 }
 
 TEST(StateFile, behindALinkToNothingIsMadeThere) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   std::filesystem::create_symlink("later/state", directory / "link");
   EXPECT_EQ(StateFile(directory / "link").read(), std::nullopt);
   replace(directory / "link", "new");
-  EXPECT_EQ(readFile(directory / "later/state"), "new");
+  EXPECT_EQ(Testing::readFile(directory / "later/state"), "new");
 }
 
 TEST(StateFile, behindACircleOfLinksIsAnError) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   std::filesystem::create_symlink("b", directory / "a");
   std::filesystem::create_symlink("a", directory / "b");
   EXPECT_THAT(thrownBy([&] { StateFile(directory / "a").read(); }), HasSubstr("symbolic links"));
 }
 
 TEST(StateFile, thatIsADirectoryIsAnError) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   std::filesystem::create_directory(directory / "state");
   EXPECT_THAT(thrownBy([&] { StateFile(directory / "state").read(); }), HasSubstr("state: cannot be read"));
 }
 
 TEST(StateFile, whoseDirectoryCannotBeMadeIsAnError) {
-  const TemporaryDirectory directory;
-  writeFile(directory / "file", "x");
+  const Testing::TemporaryDirectory directory;
+  Testing::writeFile(directory / "file", "x");
   EXPECT_THAT(thrownBy([&] { replace(directory / "file/state", "x"); }), HasSubstr("file: cannot be created"));
 }
 

@@ -11,8 +11,8 @@
 #include <stdexcept>
 #include <vector>
 
-#include "agent/support/TemporaryDirectory.h"
 #include "instrumentation/simulated/SimulatedBackEnd.h"
+#include "support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
@@ -67,7 +67,7 @@ class Writer {
 };
 
 TEST(StateWriters, thatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string state = directory / "state.json";
   SimulatedBackEnd processor(state);
   processor.change("eth0", {"192.0.2.1", "255.255.255.0"});
@@ -86,7 +86,7 @@ TEST(StateWriters, thatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
     const NetworkInterface interface = processor.read().interfaces.at(0);
     ASSERT_TRUE((interface.ipv4Address == "192.0.2.1" && interface.ipv4SubnetMask == "255.255.255.0") ||
                 (interface.ipv4Address == "192.0.2.2" && interface.ipv4SubnetMask == "255.255.0.0"))
-        << readFile(state);
+        << Testing::readFile(state);
   }
   EXPECT_GT(interrupted, 0) << "no kill met a writer between its first byte and its last step";
 
@@ -97,7 +97,7 @@ TEST(StateWriters, thatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
 }
 
 TEST(StateWriters, thatRunAtOnceLoseNothing) {
-  const TemporaryDirectory directory;
+  const Testing::TemporaryDirectory directory;
   const std::string state = directory / "state.json";
   Writer first(state, "eth0", "192.0.2", 300);
   Writer second(state, "eth1", "198.51.100", 300);
