@@ -9,15 +9,11 @@ namespace {
 
 using namespace Testing;
 using testing::AllOf;
-using testing::Contains;
-using testing::Each;
 using testing::ElementsAre;
 using testing::HasSubstr;
-using testing::IsEmpty;
 using testing::IsSupersetOf;
 using testing::Not;
 using testing::SizeIs;
-using testing::StartsWith;
 
 using Values = std::map<std::string, std::string>;
 
