@@ -66,6 +66,9 @@ class Run {
       return react(builder_.outerNull);
     }
     CMPIObjectPath* const outerPath = pathOf(outer, &status_);
+    if (CMIsNullObject(outerPath)) {
+      return std::nullopt;
+    }
     rehome(outerPath, ref_, &status_);
     std::vector<CMPIInstance*> inners;
     if (!read(builder_.inner, inners)) {
@@ -84,6 +87,9 @@ class Run {
       return react(builder_.innerNull);
     }
     CMPIObjectPath* const innerPath = pathOf(inner, &status_);
+    if (CMIsNullObject(innerPath)) {
+      return std::nullopt;
+    }
     rehome(innerPath, ref_, &status_);
     if (builder_.innerMarker != nullptr && std::strstr(identifierOf(innerPath), builder_.innerMarker) == nullptr) {
       return std::nullopt;
@@ -98,8 +104,8 @@ class Run {
     const CMPIObjectPath* const firstPath = builder_.firstIsOuter ? outerPath : innerPath;
     const CMPIObjectPath* const secondPath = builder_.firstIsOuter ? innerPath : outerPath;
     if (builder_.keysOnPath) {
-      addKey(path, builder_.first, firstPath);
-      addKey(path, builder_.second, secondPath);
+      CMAddKey(path, builder_.first, &firstPath, CMPI_ref);
+      CMAddKey(path, builder_.second, &secondPath, CMPI_ref);
     }
 
     CMPIInstance* const instance = CMNewInstance(broker_, path, nullptr);
@@ -118,12 +124,6 @@ class Run {
     }
     out_.push_back(instance);
     return std::nullopt;
-  }
-
-  void addKey(CMPIObjectPath* path, const char* name, const CMPIObjectPath* end) {
-    if (end != nullptr) {
-      CMAddKey(path, name, &end, CMPI_ref);
-    }
   }
 
   const char* identifierOf(const CMPIObjectPath* path) { return textOf(keyOf(path, "InstanceID", &status_), &status_); }

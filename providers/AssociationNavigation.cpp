@@ -168,6 +168,10 @@ CMPIStatus referenceNames(const AssociationCall& call, const CMPIContext* ctx, c
   }
   return navigation.forEachAssociated(kindWordOf(call.unit, &KindWords::referenceNames),
                                       [&](const CMPIInstance* instance) {
+                                        // A name that lacked the key of one end would name nothing.
+                                        if (navigation.rehomedPathOf(instance) == nullptr) {
+                                          return;
+                                        }
                                         const CMPIInstance* const reference = navigation.makeReference(instance);
                                         if (const CMPIObjectPath* const path = navigation.rehomedPathOf(reference)) {
                                           CMReturnObjectPath(rslt, path);

@@ -20,7 +20,9 @@ CMPIString* getText(const CMPIObjectPath* path, CMPIStatus* status) {
 CMPIStatus addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, const CMPIType type) {
   return guarded([&] {
     ObjectPath& model = modelOf<ObjectPath>(path);
-    model.keys.set(required(name, "the key's name"), Value::fromCmpi(value, type));
+    Value key = Value::fromCmpi(value, type);
+    if (key.isNull()) throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "a key cannot be null");
+    model.keys.set(required(name, "the key's name"), std::move(key));
   });
 }
 

@@ -106,14 +106,4 @@ void setProperty(Call& call) {
                           value.pointer(), value.type));
 }
 
-void execQuery(Call& call) {
-  const std::string query = call.parameters.text("Query").value_or("");
-  const std::string language = call.parameters.text("QueryLanguage").value_or("");
-  CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIEnumeration* result =
-      CBExecQuery(call.manager.broker, call.context, call.classPath(""), query.c_str(), language.c_str(), &status);
-  ObjectWriter writer = call.writer();
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.objectWithPath(value.inst); });
-}
-
 }  // namespace Cimom::CimXml

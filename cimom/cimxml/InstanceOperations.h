@@ -14,7 +14,6 @@ void modifyInstance(Call& call);
 void deleteInstance(Call& call);
 void getProperty(Call& call);
 void setProperty(Call& call);
-void execQuery(Call& call);
 
 }  // namespace Cimom::CimXml
 

@@ -34,7 +34,6 @@ const std::vector<Operation>& operations() {
       {"DeleteInstance", deleteInstance, {"InstanceName"}},
       {"GetProperty", getProperty, {"InstanceName", "PropertyName"}},
       {"SetProperty", setProperty, {"InstanceName", "PropertyName", "NewValue"}},
-      {"ExecQuery", execQuery, {"QueryLanguage", "Query"}},
       {"Associators",
        associators,
        {"ObjectName", "AssocClass", "ResultClass", "Role", "ResultRole", "IncludeQualifiers", "IncludeClassOrigin",

@@ -1,7 +1,6 @@
 #include "cimom/registry/ProviderRegistry.h"
 
 #include <algorithm>
-#include <ranges>
 
 #include "cimom/ConfigurationError.h"
 #include "cimom/broker/Names.h"
@@ -16,7 +15,7 @@ bool ProviderRegistry::Entry::serves(std::string_view nameSpace) const {
 }
 
 ProviderRegistry::~ProviderRegistry() {
-  for (const auto& provider : providers_ | std::views::reverse) provider->cleanUp(broker_);
+  std::for_each(providers_.rbegin(), providers_.rend(), [&](const auto& provider) { provider->cleanUp(broker_); });
 }
 
 void ProviderRegistry::add(const ProviderRegistration& registration) {

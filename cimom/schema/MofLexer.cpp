@@ -183,6 +183,7 @@ MofToken MofLexer::number() {
     ++position_;
   }
   MofToken token;
+  token.kind = Kind::kInteger;
   token.line = line_;
   token.text = text_.substr(start, position_ - start);
 
@@ -212,7 +213,6 @@ MofToken MofLexer::number() {
   if (error != std::errc() || end != digits.data() + digits.size() || (negative && magnitude > lowest)) {
     fail(line_, token.describe() + " is no number of at most 64 bits");
   }
-  token.kind = Kind::kInteger;
   token.value = negative ? Value::sint64(static_cast<CMPISint64>(0 - magnitude)) : Value::uint64(magnitude);
   return token;
 }

@@ -49,6 +49,83 @@ std::string text(const CMPIString* string) {
   return characters == nullptr ? "" : characters;
 }
 
+// What a test has replaced in the table of one instance.
+struct Alteration {
+  CMPIInstanceFT table;
+  CMPIInstanceFT* original;
+  std::map<std::string, std::pair<CMPIData, CMPIrc>> properties;
+  CMPIObjectPath* path = nullptr;
+  std::vector<std::string>* calls = nullptr;
+};
+
+std::map<const CMPIInstance*, std::unique_ptr<Alteration>>& alterations() {
+  static std::map<const CMPIInstance*, std::unique_ptr<Alteration>> all;
+  return all;
+}
+
+Alteration& alterationOf(CMPIInstance* instance) {
+  std::unique_ptr<Alteration>& alteration = alterations()[instance];
+  if (alteration == nullptr || instance->ft != &alteration->table) {
+    alteration = std::make_unique<Alteration>(Alteration{*instance->ft, instance->ft, {}, nullptr, nullptr});
+    instance->ft = &alteration->table;
+  }
+  return *alteration;
+}
+
+CMPIData alteredProperty(const CMPIInstance* instance, const char* name, CMPIStatus* status) {
+  const Alteration& alteration = *alterations().at(instance);
+  const auto found = alteration.properties.find(name);
+  if (found == alteration.properties.end()) {
+    return alteration.original->getProperty(instance, name, status);
+  }
+  set(status, found->second.second);
+  return found->second.first;
+}
+
+CMPIStatus recordedSetProperty(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
+  const Alteration& alteration = *alterations().at(instance);
+  alteration.calls->push_back(std::string("setProperty(") + name + ")");
+  return alteration.original->setProperty(instance, name, value, type);
+}
+
+std::string listed(const char** names) {
+  std::string list;
+  for (; names != nullptr && *names != nullptr; ++names) {
+    list += (list.empty() ? "" : ", ") + std::string(*names);
+  }
+  return list;
+}
+
+CMPIStatus recordedSetPropertyFilter(CMPIInstance* instance, const char** properties, const char** keys) {
+  const Alteration& alteration = *alterations().at(instance);
+  alteration.calls->push_back("setPropertyFilter(" + (properties == nullptr ? "null" : listed(properties)) + "; " +
+                              listed(keys) + ")");
+  return alteration.original->setPropertyFilter(instance, properties, keys);
+}
+
+void recordCalls(CMPIInstance* instance, std::vector<std::string>& calls) {
+  Alteration& alteration = alterationOf(instance);
+  alteration.calls = &calls;
+  alteration.table.setProperty = recordedSetProperty;
+  alteration.table.setPropertyFilter = recordedSetPropertyFilter;
+}
+
+std::string keysOf(const CMPIObjectPath* path) {
+  std::string list;
+  for (CMPICount i = 0; i < CMGetKeyCount(path, nullptr); ++i) {
+    CMPIString* name = nullptr;
+    CMGetKeyAt(path, i, &name, nullptr);
+    list += (list.empty() ? "" : ", ") + text(name);
+  }
+  return list;
+}
+
+CMPIObjectPath* alteredPath(const CMPIInstance* instance, CMPIStatus* status) {
+  CMPIObjectPath* const path = alterations().at(instance)->path;
+  set(status, path == nullptr ? CMPI_RC_ERR_FAILED : CMPI_RC_OK);
+  return path;
+}
+
 }  // namespace
 
 FaultyBroker::FaultyBroker(const CMPIBroker* real)
@@ -95,7 +172,7 @@ CMPIObjectPath* FaultyBroker::newObjectPath(const CMPIBroker*, const char* nameS
   const int call = ++current->newObjectPathCalls_[className];
   if (current->failNewObjectPath && current->failNewObjectPath(className, call)) {
     set(status, CMPI_RC_ERR_FAILED);
-    return nullptr;
+    return current->unmadePath;
   }
   return CMNewObjectPath(current->real_, nameSpace, className, status);
 }
@@ -105,9 +182,18 @@ CMPIInstance* FaultyBroker::newInstance(const CMPIBroker*, const CMPIObjectPath*
   const int call = ++current->newInstanceCalls_[className];
   if (current->failNewInstance && current->failNewInstance(className, call)) {
     set(status, CMPI_RC_ERR_FAILED);
-    return nullptr;
+    return current->unmadeInstance;
   }
-  return CMNewInstance(current->real_, path, status);
+  CMPIInstance* const instance = CMNewInstance(current->real_, path, status);
+  if (instance != nullptr) {
+    std::vector<std::string>& calls = current->instanceCalls[className];
+    calls.push_back("newInstance(" + keysOf(path) + ")");
+    recordCalls(instance, calls);
+    if (current->onNewInstance) {
+      current->onNewInstance(className, call, instance);
+    }
+  }
+  return instance;
 }
 
 CMPIArray* FaultyBroker::newArray(const CMPIBroker*, CMPICount count, CMPIType type, CMPIStatus* status) {
@@ -129,46 +215,6 @@ CMPIStatus FaultyBroker::trace(const CMPIBroker*, int level, const char* compone
   return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};  // as a real object manager answers
 }
 
-namespace {
-
-// What a test has replaced in the table of one instance.
-struct Alteration {
-  CMPIInstanceFT table;
-  CMPIInstanceFT* original;
-  std::map<std::string, std::pair<CMPIData, CMPIrc>> properties;
-};
-
-std::map<const CMPIInstance*, std::unique_ptr<Alteration>>& alterations() {
-  static std::map<const CMPIInstance*, std::unique_ptr<Alteration>> all;
-  return all;
-}
-
-Alteration& alterationOf(CMPIInstance* instance) {
-  std::unique_ptr<Alteration>& alteration = alterations()[instance];
-  if (alteration == nullptr || instance->ft != &alteration->table) {
-    alteration = std::make_unique<Alteration>(Alteration{*instance->ft, instance->ft, {}});
-    instance->ft = &alteration->table;
-  }
-  return *alteration;
-}
-
-CMPIData alteredProperty(const CMPIInstance* instance, const char* name, CMPIStatus* status) {
-  const Alteration& alteration = *alterations().at(instance);
-  const auto found = alteration.properties.find(name);
-  if (found == alteration.properties.end()) {
-    return alteration.original->getProperty(instance, name, status);
-  }
-  set(status, found->second.second);
-  return found->second.first;
-}
-
-CMPIObjectPath* noPath(const CMPIInstance*, CMPIStatus* status) {
-  set(status, CMPI_RC_ERR_FAILED);
-  return nullptr;
-}
-
-}  // namespace
-
 CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc) {
   Alteration& alteration = alterationOf(instance);
   alteration.properties[name] = {data, rc};
@@ -176,14 +222,56 @@ CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPI
   return instance;
 }
 
-CMPIInstance* withoutPath(CMPIInstance* instance) {
-  alterationOf(instance).table.getObjectPath = noPath;
+CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path) {
+  Alteration& alteration = alterationOf(instance);
+  alteration.path = path;
+  alteration.table.getObjectPath = alteredPath;
   return instance;
 }
+
+CMPIInstance* withoutPath(CMPIInstance* instance) { return withPath(instance, nullptr); }
 
 CMPIInstance* withoutHandle() {
   static CMPIInstance instance = {nullptr, nullptr};
   return &instance;
+}
+
+CMPIObjectPath* pathWithoutHandle() {
+  static CMPIObjectPath path = {nullptr, nullptr};
+  return &path;
+}
+
+namespace {
+
+struct KeyAlteration {
+  CMPIObjectPathFT table;
+  CMPIObjectPathFT* original;
+  std::string name;
+  CMPIData data;
+};
+
+std::map<const CMPIObjectPath*, std::unique_ptr<KeyAlteration>>& keyAlterations() {
+  static std::map<const CMPIObjectPath*, std::unique_ptr<KeyAlteration>> all;
+  return all;
+}
+
+CMPIData alteredKey(const CMPIObjectPath* path, const char* name, CMPIStatus* status) {
+  const KeyAlteration& alteration = *keyAlterations().at(path);
+  if (alteration.name != name) {
+    return alteration.original->getKey(path, name, status);
+  }
+  set(status, CMPI_RC_OK);
+  return alteration.data;
+}
+
+}  // namespace
+
+CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data) {
+  auto alteration = std::make_unique<KeyAlteration>(KeyAlteration{*path->ft, path->ft, name, data});
+  alteration->table.getKey = alteredKey;
+  path->ft = &alteration->table;
+  keyAlterations()[path] = std::move(alteration);
+  return path;
 }
 
 namespace {

@@ -55,6 +55,14 @@ class FaultyBroker {
   std::function<bool(const std::string& className, int call)> failNewObjectPath;
   std::function<bool(const std::string& className, int call)> failNewInstance;
   bool failNewArray = false;
+  // What a maker answers that a test makes fail.
+  CMPIObjectPath* unmadePath = nullptr;
+  CMPIInstance* unmadeInstance = nullptr;
+  // Called with every instance that is made, to alter it; asked as the makers are.
+  std::function<void(const std::string& className, int call, CMPIInstance* instance)> onNewInstance;
+  // By class, what was done with the instances that were made, in order: "newInstance(keys of the path)",
+  // "setPropertyFilter(list or null; keys)", "setProperty(name)".
+  std::map<std::string, std::vector<std::string>> instanceCalls;
 
  private:
   static CMPIEnumeration* enumerateInstances(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char**,
@@ -75,10 +83,16 @@ class FaultyBroker {
 
 // The instance, with its table replaced in part: getProperty answers `data` with the code `rc` for the name.
 CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
+// The instance, with its table replaced in part: getObjectPath answers `path`.
+CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path);
 // The instance, with its table replaced in part: getObjectPath answers null.
 CMPIInstance* withoutPath(CMPIInstance* instance);
 // An instance whose handle is null.
 CMPIInstance* withoutHandle();
+// A path whose handle is null.
+CMPIObjectPath* pathWithoutHandle();
+// The path, with its table replaced in part: getKey answers `data` for the name.
+CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data);
 
 // Keeps what a provider delivers.
 class RecordingResult {

@@ -24,7 +24,7 @@ void AddressChanger::apply(const AddressChange& change) {
   try {
     write(earlier, wanted);
   } catch (const ConnectionLost& lost) {
-    if (!begun_) throw IpmiError(std::string(lost.what()) + "; nothing was changed");
+    if (!begun_) throw;
     loss = lost.what();
   }
   const AddressSettings present = readBack(wanted, loss);

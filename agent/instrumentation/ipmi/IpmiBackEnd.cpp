@@ -17,6 +17,14 @@ auto logged(const std::string& what, Operation operation) try {
   throw;
 }
 
+void changeOrSayNothingWasChanged(IpmiProcessor& processor, Deadline deadline, const std::string& interfaceName,
+                                  const AddressChange& change, std::atomic<bool>& begun) try {
+  processor.change(deadline, interfaceName, change, begun);
+} catch (const IpmiError& error) {
+  if (begun) throw;
+  throw IpmiError(std::string(error.what()) + "; nothing was changed");
+}
+
 std::string describe(const std::string& name, const AddressChange& change) {
   std::string text = "change of " + name;
   if (change.ipv4Address) text += " to IP address " + *change.ipv4Address;
@@ -52,7 +60,7 @@ void IpmiBackEnd::change(const std::string& interfaceName, const AddressChange& 
   const auto begun = std::make_shared<std::atomic<bool>>(false);
   try {
     thread_.run(deadline, [processor = processor_, deadline, what, interfaceName, change, begun] {
-      logged(what, [&] { processor->change(deadline, interfaceName, change, *begun); });
+      logged(what, [&] { changeOrSayNothingWasChanged(*processor, deadline, interfaceName, change, *begun); });
       logProgress(what + ": done and confirmed");
     });
   } catch (const Overdue&) {

@@ -18,7 +18,8 @@ void IpmiConnection::requireTime() const {
   if (deadline_.passed()) throw NotSent(nameOf(settings_) + " was too slow: operation_timeout is over");
 }
 
-void IpmiConnection::openSession() {
+void IpmiConnection::open() {
+  if (session_) return;
   requireTime();
   roundTrips_ += IpmiSession::openingRoundTrips(settings_);
   session_ = std::make_unique<IpmiSession>(settings_);
@@ -27,7 +28,7 @@ void IpmiConnection::openSession() {
 
 IpmiResponse IpmiConnection::send(const IpmiRequest& request, Repetition repetition) {
   const bool held = session_ != nullptr;
-  if (!held) openSession();
+  open();
   requireTime();
   try {
     ++roundTrips_;

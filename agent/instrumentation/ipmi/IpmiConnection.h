@@ -19,6 +19,9 @@ class IpmiConnection : public IpmiTransport {
   // From here on requests belong to an operation that ends at the deadline; afterwards they are NotSent.
   void startOperation(Deadline deadline);
 
+  // Makes sure that a session is open. Throws NotSent.
+  void open();
+
   IpmiResponse send(const IpmiRequest& request, Repetition repetition) override;
 
   // The time of its own is the session time-out: enough to open one session and to use it.
@@ -27,15 +30,15 @@ class IpmiConnection : public IpmiTransport {
   // The round trips of the operation so far, those that opened sessions included.
   unsigned roundTrips() const { return roundTrips_; }
 
-  // How many sessions were opened so far. What was learned of the processor's build holds while it stays the same.
-  unsigned sessions() const { return sessions_; }
+  // The number of the session that is open, 0 for none. What was learned of the processor's build holds while it stays
+  // the same.
+  unsigned session() const { return session_ ? sessions_ : 0; }
 
   // Ends the session: the processor has few of them. The next request opens another.
   void close() { session_.reset(); }
 
  private:
   void requireTime() const;
-  void openSession();
 
   const IpmiSettings settings_;
   Deadline deadline_{std::chrono::milliseconds{0}};

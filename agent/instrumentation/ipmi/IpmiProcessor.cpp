@@ -16,13 +16,14 @@ constexpr std::chrono::milliseconds readBackPatience{1000};
 
 void IpmiProcessor::startOperation(Deadline deadline) {
   connection_.startOperation(deadline);
+  if (!heldLocks_.empty()) connection_.open();
   for (const std::uint8_t channel : HeldLocks(heldLocks_)) releaseLock(connection_, channel, heldLocks_);
 }
 
 const std::vector<std::uint8_t>& IpmiProcessor::channels() {
-  if (channels_.empty() || channelsOfSession_ != connection_.sessions()) {
+  if (connection_.session() == 0 || channelsOfSession_ != connection_.session()) {
     channels_ = discoverChannels(connection_, settings_.channels);
-    channelsOfSession_ = connection_.sessions();
+    channelsOfSession_ = connection_.session();
   }
   return channels_;
 }

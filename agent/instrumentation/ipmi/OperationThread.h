@@ -6,8 +6,12 @@
 #include <functional>
 #include <future>
 #include <memory>
+#include <optional>
 #include <stdexcept>
+#include <string>
+#include <type_traits>
 #include <utility>
+#include <variant>
 
 #include "instrumentation/ipmi/Deadline.h"
 
@@ -37,16 +41,35 @@ class OperationThread {
   OperationThread(const OperationThread&) = delete;
   OperationThread& operator=(const OperationThread&) = delete;
 
-  // Runs the operation and gives what it gives, or throws what it throws. Throws Overdue at the deadline, waiting for
-  // earlier operations included.
+  // Runs the operation and gives what it gives; throws std::runtime_error with the text of what it throws. Throws
+  // Overdue at the deadline, waiting for earlier operations included.
   template <typename Operation>
   auto run(Deadline deadline, Operation operation) {
     using Result = std::invoke_result_t<Operation>;
-    const auto task = std::make_shared<std::packaged_task<Result()>>(std::move(operation));
-    std::future<Result> result = task->get_future();
+    constexpr bool givesNothing = std::is_void_v<Result>;
+    // A failure crosses as text, so that no exception object is shared between the threads.
+    struct Outcome {
+      std::optional<std::conditional_t<givesNothing, std::monostate, Result>> value;
+      std::string failure;
+    };
+    const auto task = std::make_shared<std::packaged_task<Outcome()>>([operation = std::move(operation)]() -> Outcome {
+      try {
+        if constexpr (givesNothing) {
+          operation();
+          return {std::monostate{}, {}};
+        } else {
+          return {operation(), {}};
+        }
+      } catch (const std::exception& error) {
+        return {std::nullopt, error.what()};
+      }
+    });
+    std::future<Outcome> result = task->get_future();
     const auto number = enqueue([task] { (*task)(); });
     if (result.wait_until(deadline.time()) != std::future_status::ready) throw Overdue(!withdraw(number));
-    return result.get();
+    Outcome outcome = result.get();
+    if (!outcome.value) throw std::runtime_error(outcome.failure);
+    if constexpr (!givesNothing) return std::move(*outcome.value);
   }
 
   static constexpr std::chrono::seconds longestEnd{2};

@@ -97,11 +97,12 @@ void ParameterTransaction::writeOne(const ParameterWrite& write) {
 
 // The commit matters on processors that stage their writes too: what is staged and left would go out with the next
 // client's commit.
-std::string ParameterTransaction::putBack(const std::vector<ParameterWrite>& writes, std::size_t count) noexcept try {
+std::string ParameterTransaction::putBack(const std::vector<ParameterWrite>& writes, std::size_t count) try {
   transport_.beginCleanup();
   while (count-- > 0) {
     const ParameterWrite& write = writes[count];
-    if (write.previous) writeOne({write.parameter, *write.previous, write.value});
+    if (!write.previous) throw IpmiError("the earlier " + Ipmi::describe(write.parameter) + " is not known");
+    writeOne({write.parameter, *write.previous, write.value});
   }
   commit();
   return "; nothing was changed";

@@ -37,7 +37,7 @@ class ParameterTransaction {
  private:
   void take();
   void writeOne(const ParameterWrite& write);
-  std::string putBack(const std::vector<ParameterWrite>& writes, std::size_t count) noexcept;
+  std::string putBack(const std::vector<ParameterWrite>& writes, std::size_t count);
   void commit();
 
   IpmiTransport& transport_;

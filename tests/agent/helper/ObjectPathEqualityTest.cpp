@@ -46,13 +46,27 @@ class ObjectPaths : public WithBroker {
     return of(CMPI_boolean, value);
   }
 
-  CMPIObjectPath* ofNull() const { return of(CMPI_string, CMPIValue{}); }
+  // A path with a null key, as some object managers make them; this broker refuses to, so its answer is replaced.
+  CMPIObjectPath* ofNull() const {
+    CMPIObjectPath* made = ofText("replaced");
+    static CMPIObjectPathFT table = *made->ft;
+    table.getKeyAt = [](const CMPIObjectPath* asked, CMPICount index, CMPIString** name, CMPIStatus* status) {
+      CMPIData data = realTable->getKeyAt(asked, index, name, status);
+      data.state |= CMPI_nullValue;
+      return data;
+    };
+    realTable = made->ft;
+    made->ft = &table;
+    return made;
+  }
 
   CMPIObjectPath* ofReference(CMPIObjectPath* reference) const {
     CMPIValue value{};
     value.ref = reference;
     return of(CMPI_ref, value);
   }
+
+  static inline CMPIObjectPathFT* realTable = nullptr;
 
   static bool equal(const CMPIObjectPath* a, const CMPIObjectPath* b, bool flag = false) {
     const bool result = isObjPathsEqual(a, b, flag);

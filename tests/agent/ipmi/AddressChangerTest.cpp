@@ -185,6 +185,15 @@ TEST_F(AddressChangerTest, ThatIsRefusedSaysWhatCouldNotBePutBack) {
   expectNoLock();
 }
 
+TEST_F(AddressChangerTest, ThatIsRefusedSaysThatAnEarlierValueIsNotKnown) {
+  bmc.readRefused[LanParameter::IpAddress] = 0x80;
+  bmc.refuses[LanParameter::SubnetMask] = 0xCC;
+
+  EXPECT_THAT([&] { change(bothValues); }, refusal("could not be put back: the earlier IP address is not known"));
+
+  expectNoLock();
+}
+
 TEST_F(AddressChangerTest, SaysThatThePrivilegeIsTooLow) {
   for (const LanParameter parameter : {LanParameter::IpAddress, LanParameter::SubnetMask}) {
     bmc = {};
@@ -277,7 +286,7 @@ TEST_F(AddressChangerTest, ChangesNothingWhereTheConnectionBreaksWithTheLock) {
     if (number == lockRequest) throw ConnectionLost("session timeout");
   };
 
-  EXPECT_THAT([&] { change(bothValues); }, refusal("session timeout", "nothing was changed"));
+  EXPECT_THAT([&] { change(bothValues); }, refusal("session timeout"));
 
   EXPECT_FALSE(begun);
   expectNoLock();

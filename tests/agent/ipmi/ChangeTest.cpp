@@ -1,6 +1,10 @@
 // Changing the address of a real RMCP+ server, with ipmitool as the witness.
 #include <gmock/gmock.h>
 
+#include <atomic>
+#include <future>
+#include <vector>
+
 #include "agent/ipmi/RecordedLog.h"
 #include "agent/ipmi/SimulatedBmc.h"
 #include "instrumentation/ipmi/IpmiBackEnd.h"
@@ -59,6 +63,31 @@ INSTANTIATE_TEST_SUITE_P(Personalities, IpmiChange,
                            return personality.param == SimulatedBmc::Personality::AppliesOnCommit ? "OnCommit"
                                                                                                   : "AtOnce";
                          });
+
+TEST(IpmiChangeAmongReaders, IsSeenAsAWholeOrNotAtAll) {
+  const SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(bmc.settings()));
+  std::vector<std::future<int>> readers;
+  std::atomic<bool> ended = false;
+  for (int reader = 0; reader < 3; ++reader)
+    readers.push_back(std::async(std::launch::async, [&] {
+      int mixed = 0;
+      while (!ended) {
+        const auto interface = backEnd.read().interfaces.at(0);
+        const bool changed = interface.ipv4Address == "192.0.2.77";
+        mixed += changed != (interface.ipv4SubnetMask == "255.255.255.128");
+      }
+      return mixed;
+    }));
+
+  backEnd.change("lan1", bothValues);
+  backEnd.change("lan1", {"192.0.2.10", "255.255.255.0"});
+  backEnd.change("lan1", bothValues);
+
+  ended = true;
+  for (auto& reader : readers) EXPECT_EQ(reader.get(), 0);
+  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, "192.0.2.77");
+}
 
 TEST(IpmiChangeRefused, ForAnInterfaceThatIsNotThere) {
   const SimulatedBmc bmc;

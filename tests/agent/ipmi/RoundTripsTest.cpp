@@ -2,6 +2,8 @@
 #include <gmock/gmock.h>
 
 #include <algorithm>
+#include <chrono>
+#include <thread>
 
 #include "agent/ipmi/RecordedLog.h"
 #include "agent/ipmi/SimulatedBmc.h"
@@ -84,6 +86,25 @@ TEST(IpmiRoundTrips, IncludeTheOneThatGivesTheSessionBack) {
     wire.reset();
   }
   EXPECT_EQ(wire.requests(), 1u);
+}
+
+// A BMC has few sessions; one that is merely left takes a place of them for a minute.
+TEST(IpmiRoundTrips, IncludeTheOneThatGivesAnIdleSessionBack) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  auto settings = bmc.settings(wire.port());
+  settings["session_timeout"] = "0.4";
+  IpmiBackEnd backEnd(parseSettings(settings));
+  backEnd.read();
+  wire.reset();
+
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+  while (wire.requests() == 0 && std::chrono::steady_clock::now() < deadline) std::this_thread::yield();
+  EXPECT_EQ(wire.requests(), 1u);
+
+  wire.reset();
+  backEnd.read();
+  EXPECT_EQ(wire.requests(), 12u);
 }
 
 }  // namespace

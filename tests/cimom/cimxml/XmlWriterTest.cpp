@@ -13,7 +13,7 @@ TEST(XmlWriter, NestsElementsAsTheirScopesNest) {
     xml.textElement("B", "text");
     const auto inner = xml.element("C");
   }
-  EXPECT_EQ(xml.take(), "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<A X=\"1\"><B>text</B><C/></A>");
+  EXPECT_EQ(xml.take(), "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<A X=\"1\"><B>text</B><C></C></A>");
 }
 
 TEST(XmlWriter, WritesNoPrologWhereNoneIsWanted) {

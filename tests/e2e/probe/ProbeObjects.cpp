@@ -25,12 +25,17 @@ void setNumber(CMPIInstance* instance, const char* name, Number CMPIValue::*memb
   CMSetProperty(instance, name, &value, type);
 }
 
-void setArrays(const CMPIBroker* broker, CMPIInstance* instance) {
+// With a null element where `withNull` says so, which older clients cannot read.
+void setTexts(const CMPIBroker* broker, CMPIInstance* instance, bool withNull) {
   CMPIValue texts{};
   texts.array = CMNewArray(broker, 3, CMPI_string, nullptr);
   CMSetArrayElementAt(texts.array, 0, "one", CMPI_chars);
-  CMSetArrayElementAt(texts.array, 2, "", CMPI_chars);  // the second stays null
+  if (!withNull) CMSetArrayElementAt(texts.array, 1, "two", CMPI_chars);
+  CMSetArrayElementAt(texts.array, 2, "", CMPI_chars);
   CMSetProperty(instance, "Texts", &texts, CMPI_stringA);
+}
+
+void setNumbers(const CMPIBroker* broker, CMPIInstance* instance) {
   CMPIValue numbers{};
   numbers.array = CMNewArray(broker, 2, CMPI_uint16, nullptr);
   for (CMPICount i = 0; i < 2; ++i) {
@@ -59,7 +64,8 @@ CMPIInstance* thing(const CMPIBroker* broker, const char* nameSpace, const char*
   CMPIDateTime* moment = CMNewDateTimeFromChars(broker, "20260102030405.000000+060", nullptr);
   CMSetProperty(instance, "Moment", &moment, CMPI_dateTime);
   CMSetProperty(instance, "Text", text().c_str(), CMPI_chars);
-  setArrays(broker, instance);
+  setTexts(broker, instance, false);
+  setNumbers(broker, instance);
   return instance;
 }
 
@@ -76,8 +82,25 @@ CMPIInstance* link(const CMPIBroker* broker, const char* nameSpace) {
 CMPIInstance* numbered(const CMPIBroker* broker, const char* nameSpace) {
   CMPIInstance* instance = CMNewInstance(broker, CMNewObjectPath(broker, nameSpace, "TEST_Numbered", nullptr), nullptr);
   setNumber(instance, "Id", &CMPIValue::sint32, CMPISint32{-7}, CMPI_sint32);
+  setTexts(broker, instance, true);
   CMSetProperty(instance, "Text", "control \x01 and \xFF", CMPI_chars);
   return instance;
+}
+
+bool sameValue(const CMPIData& one, const CMPIData& other) {
+  if (one.type != other.type) return false;
+  switch (one.type) {
+    case CMPI_ref:
+      return same(one.value.ref, other.value.ref);
+    case CMPI_string:
+      return chars(one.value.string) == chars(other.value.string);
+    case CMPI_uint16:
+      return one.value.uint16 == other.value.uint16;
+    case CMPI_sint32:
+      return one.value.sint32 == other.value.sint32;
+    default:
+      return false;
+  }
 }
 
 }  // namespace
@@ -114,7 +137,15 @@ std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjec
 }
 
 bool same(const CMPIObjectPath* one, const CMPIObjectPath* other) {
-  return chars(CMObjectPathToString(one, nullptr)) == chars(CMObjectPathToString(other, nullptr));
+  const std::string className = chars(CMGetClassName(one, nullptr));
+  const CMPICount count = CMGetKeyCount(one, nullptr);
+  if (strcasecmp(className.c_str(), chars(CMGetClassName(other, nullptr)).c_str()) != 0) return false;
+  for (CMPICount i = 0; i < count; ++i) {
+    CMPIString* name = nullptr;
+    const CMPIData key = CMGetKeyAt(one, i, &name, nullptr);
+    if (!sameValue(key, CMGetKey(other, chars(name).c_str(), nullptr))) return false;
+  }
+  return count == CMGetKeyCount(other, nullptr);
 }
 
 }  // namespace Probe

@@ -18,7 +18,7 @@ std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjec
 
 CMPIObjectPath* thingPath(const CMPIBroker* broker, const char* nameSpace, const char* className, CMPIUint16 number);
 
-/// Whether both paths name the same object, class and keys compared as text.
+/// Whether both paths name the same object; hosts and namespaces do not count.
 bool same(const CMPIObjectPath* one, const CMPIObjectPath* other);
 
 }  // namespace Probe

@@ -1,0 +1,106 @@
+#include "tests/cimom/support/BrokerFixture.h"
+
+namespace Cimom::Test {
+namespace {
+
+class PathObject : public BrokerFixture {};
+
+TEST_F(PathObject, MayBeOfAClassThatNobodyKnows) {
+  const CMPIObjectPath* unknown = CMNewObjectPath(broker, "root/far", "Far_Class", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_OK);
+  EXPECT_EQ(textOf(CMGetClassName(unknown, nullptr)), "Far_Class");
+  EXPECT_EQ(textOf(CMGetNameSpace(unknown, nullptr)), "root/far");
+  EXPECT_EQ(textOf(CMGetHostname(unknown, &status)), "");
+  EXPECT_EQ(status.rc, CMPI_RC_OK);
+}
+
+TEST_F(PathObject, ChangesItsParts) {
+  CMPIObjectPath* one = path("TST_Processor");
+  CMPIObjectPath* other = CMNewObjectPath(broker, "root/other", "TST_Other", nullptr);
+  EXPECT_EQ(CMSetHostname(other, "host").rc, CMPI_RC_OK);
+  EXPECT_EQ(CMSetClassName(one, "TST_New").rc, CMPI_RC_OK);
+  EXPECT_EQ(CMSetNameSpaceFromObjectPath(one, other).rc, CMPI_RC_OK);
+  EXPECT_EQ(textOf(CMObjectPathToString(one, nullptr)), "root/other:TST_New");
+  EXPECT_EQ(CMSetHostAndNameSpaceFromObjectPath(one, other).rc, CMPI_RC_OK);
+  EXPECT_EQ(textOf(CMObjectPathToString(one, nullptr)), "//host/root/other:TST_New");
+}
+
+TEST_F(PathObject, FindsKeysWithoutRegardToCaseAndReplacesThem) {
+  CMPIObjectPath* one = path("TST_Processor");
+  CMAddKey(one, "Name", "first", CMPI_chars);
+  CMAddKey(one, "NAME", "second", CMPI_chars);
+  EXPECT_EQ(CMGetKeyCount(one, nullptr), 1u);
+  const CMPIData key = CMGetKey(one, "name", &status);
+  EXPECT_EQ(key.type, CMPI_string);
+  EXPECT_TRUE(CMIsKeyValue(key));
+  EXPECT_EQ(textOf(key.value.string), "second");
+  CMPIString* name = nullptr;
+  CMGetKeyAt(one, 0, &name, &status);
+  EXPECT_EQ(textOf(name), "Name");
+}
+
+TEST_F(PathObject, ReportsAKeyThatIsNotThere) {
+  const CMPIObjectPath* one = path("TST_Processor");
+  EXPECT_TRUE(CMIsNullValue(CMGetKey(one, "Name", &status)));
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+  CMGetKeyAt(one, 0, nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+}
+
+TEST_F(PathObject, TakesNoNullForAKey) {
+  CMPIObjectPath* one = path("TST_Processor");
+  CMPIString* nothing = nullptr;
+  EXPECT_EQ(CMAddKey(one, "Name", &nothing, CMPI_string).rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_EQ(CMGetKeyCount(one, nullptr), 0u);
+}
+
+TEST_F(PathObject, IsWrittenAsAnUntypedUri) {
+  CMPIObjectPath* inner = path("TST_Point");
+  const CMPIUint16 number = 4;
+  CMAddKey(inner, "Number", &number, CMPI_uint16);
+  CMPIObjectPath* one = path("TST_Processor");
+  const CMPIBoolean yes = true;
+  const CMPISint32 negative = -5;
+  CMAddKey(one, "Text", "say \"a\\b\"", CMPI_chars);
+  CMAddKey(one, "Flag", &yes, CMPI_boolean);
+  CMAddKey(one, "Offset", &negative, CMPI_sint32);
+  CMAddKey(one, "Point", &inner, CMPI_ref);
+  EXPECT_EQ(textOf(CMObjectPathToString(one, nullptr)),
+            R"(root/test:TST_Processor.Text="say \"a\\b\"",Flag=TRUE,Offset=-5,Point="root/test:TST_Point.Number=4")");
+}
+
+TEST_F(PathObject, ReadsTheQualifiersOfItsClass) {
+  const CMPIObjectPath* one = path("TST_Processor");
+  const auto textQualifier = [&](const CMPIData& data) { return textOf(data.value.string); };
+  EXPECT_EQ(textQualifier(CMGetClassQualifier(one, "description", &status)), "A system");
+  EXPECT_EQ(textQualifier(CMGetPropertyQualifier(one, "Caption", "Description", &status)), "What people call it");
+  EXPECT_TRUE(CMGetPropertyQualifier(one, "Name", "Key", &status).value.boolean);
+  EXPECT_EQ(textQualifier(CMGetMethodQualifier(one, "Reset", "Description", &status)), "Returns 0");
+  EXPECT_EQ(textQualifier(CMGetParameterQualifier(one, "Reset", "Force", "Description", &status)), "How");
+  EXPECT_EQ(status.rc, CMPI_RC_OK);
+}
+
+TEST_F(PathObject, ReportsWhatIsNotQualifiedOrDeclared) {
+  const CMPIObjectPath* one = path("TST_Processor");
+  CMGetClassQualifier(one, "Abstract", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND) << "Abstract is not inherited";
+  CMGetPropertyQualifier(one, "Undeclared", "Key", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+  CMGetMethodQualifier(one, "Undeclared", "Key", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_METHOD_NOT_FOUND);
+  CMGetParameterQualifier(one, "Reset", "Undeclared", "Key", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
+  CMGetClassQualifier(path("TST_Nothing"), "Key", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
+}
+
+TEST_F(PathObject, KnowsItsSuperclasses) {
+  EXPECT_TRUE(CMClassPathIsA(broker, path("TST_Processor"), "cim_element", &status));
+  EXPECT_FALSE(CMClassPathIsA(broker, path("TST_Processor"), "CIM_Point", &status));
+  EXPECT_EQ(status.rc, CMPI_RC_OK);
+  CMClassPathIsA(broker, path("TST_Nothing"), "CIM_Point", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
+}
+
+}  // namespace
+}  // namespace Cimom::Test

@@ -1,0 +1,80 @@
+// The schema as clients read it.
+#include "tests/cimom/cimxml/EndpointTest.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::HasSubstr;
+using testing::Not;
+
+class ClassOperations : public EndpointTest {
+ protected:
+  std::string getClass(const std::string& name, const std::string& options = {}) const {
+    return returned("GetClass", className(name) + options);
+  }
+};
+
+std::string flag(const std::string& name, const std::string& value) {
+  return parameter(name, "<VALUE>" + value + "</VALUE>");
+}
+
+const std::string everything = flag("LocalOnly", "FALSE");
+
+TEST_F(ClassOperations, GetClassShowsEveryTypeOfProperty) {
+  const std::string thing = getClass("test_thing", flag("IncludeQualifiers", "FALSE"));
+  EXPECT_THAT(
+      thing,
+      AllOf(
+          HasSubstr("<CLASS NAME=\"TEST_Thing\">"),
+          HasSubstr("<PROPERTY NAME=\"U64\" TYPE=\"uint64\" PROPAGATED=\"false\"></PROPERTY>"),
+          HasSubstr("<PROPERTY NAME=\"WithDefault\" TYPE=\"uint16\" PROPAGATED=\"false\"><VALUE>5</VALUE></PROPERTY>"),
+          HasSubstr("<PROPERTY.ARRAY NAME=\"Numbers\" TYPE=\"uint16\" ARRAYSIZE=\"3\" PROPAGATED=\"false\">"),
+          Not(HasSubstr("<QUALIFIER"))));
+  EXPECT_THAT(getClass("TEST_Link"), HasSubstr("<PROPERTY.REFERENCE NAME=\"Whole\" REFERENCECLASS=\"TEST_Thing\""));
+}
+
+TEST_F(ClassOperations, GetClassShowsQualifiersWithTheirFlavors) {
+  EXPECT_THAT(
+      getClass("TEST_Thing"),
+      AllOf(HasSubstr("<QUALIFIER NAME=\"Description\" TYPE=\"string\" OVERRIDABLE=\"true\" TOSUBCLASS=\"true\" "
+                      "TRANSLATABLE=\"true\"><VALUE>A thing</VALUE></QUALIFIER>"),
+            HasSubstr("<QUALIFIER NAME=\"Key\" TYPE=\"boolean\" OVERRIDABLE=\"false\" TOSUBCLASS=\"true\" "
+                      "TRANSLATABLE=\"false\"><VALUE>TRUE</VALUE></QUALIFIER>"),
+            HasSubstr("<VALUE.ARRAY><VALUE>a</VALUE><VALUE>b</VALUE></VALUE.ARRAY>")));
+}
+
+TEST_F(ClassOperations, GetClassShowsMethodsWithTheirParameters) {
+  EXPECT_THAT(getClass("TEST_Thing"),
+              AllOf(HasSubstr("<METHOD NAME=\"Reset\" TYPE=\"uint32\""),
+                    HasSubstr("<PARAMETER NAME=\"Force\" TYPE=\"boolean\">"),
+                    HasSubstr("<PARAMETER.ARRAY NAME=\"Names\" TYPE=\"string\">"),
+                    HasSubstr("<PARAMETER.REFERENCE NAME=\"Other\" REFERENCECLASS=\"TEST_Thing\">")));
+}
+
+TEST_F(ClassOperations, GetClassShowsWhatIsInheritedOnlyWhenAsked) {
+  EXPECT_THAT(getClass("TEST_Part"), AllOf(HasSubstr("<CLASS NAME=\"TEST_Part\" SUPERCLASS=\"TEST_Thing\">"),
+                                           HasSubstr("NAME=\"Extra\""), Not(HasSubstr("NAME=\"U64\""))));
+  EXPECT_THAT(getClass("TEST_Part", everything + flag("IncludeClassOrigin", "TRUE")),
+              AllOf(HasSubstr("NAME=\"U64\" TYPE=\"uint64\" CLASSORIGIN=\"TEST_Thing\" PROPAGATED=\"true\""),
+                    HasSubstr("NAME=\"Extra\" TYPE=\"string\" CLASSORIGIN=\"TEST_Part\" PROPAGATED=\"false\"")));
+}
+
+TEST_F(ClassOperations, APropertyListTrimsTheClass) {
+  EXPECT_THAT(
+      getClass("TEST_Part", everything + parameter("PropertyList", "<VALUE.ARRAY><VALUE>u64</VALUE></VALUE.ARRAY>")),
+      AllOf(HasSubstr("NAME=\"U64\""), Not(HasSubstr("NAME=\"Extra\""))));
+}
+
+TEST_F(ClassOperations, EnumeratesTheClassesBelow) {
+  const std::string all = flag("DeepInheritance", "TRUE");
+  EXPECT_THAT(returned("EnumerateClassNames", ""),
+              AllOf(HasSubstr("<CLASSNAME NAME=\"TEST_Thing\">"), Not(HasSubstr("TEST_Part"))));
+  EXPECT_THAT(returned("EnumerateClassNames", all), HasSubstr("<CLASSNAME NAME=\"TEST_Part\">"));
+  EXPECT_EQ(returned("EnumerateClassNames", className("TEST_Thing")),
+            "<IRETURNVALUE><CLASSNAME NAME=\"TEST_Part\"></CLASSNAME></IRETURNVALUE>");
+  EXPECT_THAT(returned("EnumerateClasses", className("TEST_Thing")), HasSubstr("<CLASS NAME=\"TEST_Part\""));
+  EXPECT_EQ(returned("EnumerateClassNames", className("TEST_Part")), "<IRETURNVALUE></IRETURNVALUE>");
+}
+
+}  // namespace

@@ -1,0 +1,277 @@
+// The intrinsic methods, against the probe provider.
+#include <cmpidt.h>
+
+#include "tests/cimom/cimxml/EndpointTest.h"
+#include "tests/e2e/probe/ProbeObjects.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::HasSubstr;
+using testing::MatchesRegex;
+using testing::Not;
+using testing::StartsWith;
+
+using Operations = EndpointTest;
+
+std::string propertyList(const std::vector<std::string>& names) {
+  std::string values;
+  for (const auto& name : names) values += "<VALUE>" + name + "</VALUE>";
+  return parameter("PropertyList", "<VALUE.ARRAY>" + values + "</VALUE.ARRAY>");
+}
+
+std::string value(const std::string& text) { return "<VALUE>" + text + "</VALUE>"; }
+
+std::string property(const std::string& name, const std::string& type, const std::string& text) {
+  return "<PROPERTY NAME=\"" + name + "\" TYPE=\"" + type + "\">" + value(text) + "</PROPERTY>";
+}
+
+std::string modified(const std::string& name, const std::string& properties) {
+  return parameter("ModifiedInstance", "<VALUE.NAMEDINSTANCE>" + name + "<INSTANCE CLASSNAME=\"TEST_Thing\">" +
+                                           properties + "</INSTANCE></VALUE.NAMEDINSTANCE>");
+}
+
+int count(const std::string& text, const std::string& part) {
+  int found = 0;
+  for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) ++found;
+  return found;
+}
+
+const std::string instanceOne = parameter("InstanceName", thingName());
+const std::string objectOne = parameter("ObjectName", thingName());
+
+constexpr const char* keysOfOne =
+    "<KEYBINDING NAME=\"Name\"><KEYVALUE VALUETYPE=\"string\" TYPE=\"string\">thing</KEYVALUE></KEYBINDING>"
+    "<KEYBINDING NAME=\"Number\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint16\">1</KEYVALUE></KEYBINDING>";
+
+TEST_F(Operations, EnumerateInstancesNamesEveryInstance) {
+  const std::string result = returned("EnumerateInstances", className("TEST_Thing"));
+  EXPECT_EQ(count(result, "<VALUE.NAMEDINSTANCE>"), 3);
+  EXPECT_THAT(result, HasSubstr("<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME=\"TEST_Thing\">" +
+                                std::string(keysOfOne) + "</INSTANCENAME><INSTANCE CLASSNAME=\"TEST_Thing\">"));
+}
+
+TEST_F(Operations, AnInstanceShowsEveryTypeOfProperty) {
+  const std::string result = returned("GetInstance", instanceOne);
+  for (const std::string& expected :
+       {property("Flag", "boolean", "TRUE"), property("Letter", "char16", "\xE2\x82\xAC"),
+        property("U64", "uint64", "18446744073709551615"), property("S8", "sint8", "-128"),
+        property("R32", "real32", "1.5"), property("Moment", "datetime", "20260102030405.000000+060"),
+        property("Text", "string", "&lt;plain&gt; &amp; &quot;quoted&quot; \xE2\x82\xAC"),
+        property("WithDefault", "uint16", "5"), std::string("<PROPERTY NAME=\"Unset\" TYPE=\"string\"></PROPERTY>"),
+        "<PROPERTY.ARRAY NAME=\"Numbers\" TYPE=\"uint16\"><VALUE.ARRAY>" + value("14") + value("15") +
+            "</VALUE.ARRAY></PROPERTY.ARRAY>"})
+    EXPECT_THAT(result, HasSubstr(expected));
+  EXPECT_THAT(result, StartsWith("<IRETURNVALUE><INSTANCE CLASSNAME=\"TEST_Thing\">"));
+}
+
+TEST_F(Operations, AnArrayKeepsItsNulls) {
+  EXPECT_THAT(returned("EnumerateInstances", className("TEST_Numbered")),
+              HasSubstr("<VALUE.ARRAY>" + value("one") + "<VALUE.NULL></VALUE.NULL>" + value("") + "</VALUE.ARRAY>"));
+}
+
+TEST_F(Operations, AReferenceIsAFullPath) {
+  const std::string result = returned("EnumerateInstances", className("TEST_Link"));
+  const std::string path =
+      "<VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH><HOST>server</HOST>" + nameSpacePath() + "</NAMESPACEPATH>";
+  std::string expected = path;
+  for (auto at = expected.find("/>"); at != std::string::npos; at = expected.find("/>"))
+    expected.replace(at, 2, "></NAMESPACE>");
+  EXPECT_THAT(result, HasSubstr("<KEYBINDING NAME=\"Whole\">" + expected));
+  EXPECT_THAT(result, HasSubstr("<PROPERTY.REFERENCE NAME=\"Whole\">" + expected));
+}
+
+TEST_F(Operations, EnumerateInstanceNamesNamesOnly) {
+  const std::string result = returned("EnumerateInstanceNames", className("test_thing"));
+  EXPECT_EQ(count(result, "<INSTANCENAME "), 3);
+  EXPECT_THAT(result, Not(HasSubstr("<INSTANCE ")));
+}
+
+TEST_F(Operations, APropertyListTrimsThePropertiesAndKeepsTheKeys) {
+  const std::string result =
+      returned("EnumerateInstances", className("TEST_Thing") + propertyList({"flag", "Nothing"}));
+  EXPECT_EQ(count(result, "<PROPERTY"), 3);
+  EXPECT_THAT(result, AllOf(HasSubstr("NAME=\"Flag\""), HasSubstr(keysOfOne)));
+  EXPECT_EQ(count(returned("GetInstance", instanceOne + propertyList({})), "<PROPERTY"), 0);
+}
+
+TEST_F(Operations, ShallowInheritanceHidesWhatASubclassAdds) {
+  const std::string shallow = parameter("DeepInheritance", value("FALSE"));
+  EXPECT_THAT(returned("EnumerateInstances", className("TEST_Thing")), HasSubstr("NAME=\"Extra\""));
+  EXPECT_THAT(returned("EnumerateInstances", className("TEST_Thing") + shallow),
+              AllOf(Not(HasSubstr("NAME=\"Extra\"")), HasSubstr("NAME=\"Flag\"")));
+  EXPECT_EQ(count(returned("EnumerateInstances", className("TEST_Thing") + shallow + propertyList({"Extra", "U8"})),
+                  "<PROPERTY"),
+            3);
+}
+
+TEST_F(Operations, ModifyInstanceReachesTheProvider) {
+  EXPECT_EQ(returned("ModifyInstance", modified(thingName(), property("Text", "string", " changed "))), "");
+  EXPECT_EQ(Probe::text(), "changed");
+  EXPECT_EQ(returned("ModifyInstance", modified(thingName(), "<PROPERTY NAME=\"Text\" TYPE=\"string\"/>")), "");
+  EXPECT_EQ(Probe::text(), "null");
+}
+
+TEST_F(Operations, ModifyInstanceTakesEveryTypeOfProperty) {
+  const std::string properties =
+      property("Flag", "boolean", "false") + property("Letter", "char16", "x") + property("R64", "real64", "1e3") +
+      property("Moment", "datetime", "20260102030405.000000+060") + property("S64", "sint64", "-1") +
+      "<PROPERTY.ARRAY NAME=\"Texts\" TYPE=\"string\"><VALUE.ARRAY>" + value("a") +
+      "<VALUE.NULL/></VALUE.ARRAY></PROPERTY.ARRAY>" + "<PROPERTY.ARRAY NAME=\"Numbers\" TYPE=\"uint16\"/>";
+  EXPECT_EQ(returned("ModifyInstance", modified(thingName(), properties)), "");
+}
+
+TEST_F(Operations, ModifyInstanceNamesWhatDoesNotFitTheClass) {
+  struct Case {
+    std::string property;
+    const char* expected;
+  };
+  const std::vector<Case> cases = {
+      {property("Nothing", "string", "x"), "12: the class TEST_Thing has no property Nothing"},
+      {property("U8", "uint16", "1"), "13: the property U8 is of type uint8, not uint16"},
+      {property("U8", "uint8", "256"), "13: the property U8 is no uint8: \"256\""},
+      {property("Flag", "boolean", "maybe"), "13: the property Flag is no boolean: \"maybe\""},
+      {property("Moment", "datetime", "today"), "13: the property Moment is no datetime: \"today\""},
+      {"<PROPERTY.ARRAY NAME=\"U8\" TYPE=\"uint8\"/>", "13: the property U8 is of type uint8, not uint8[]"},
+      {property("Numbers", "uint16", "1"), "13: the property Numbers is of type uint16[], not uint16"},
+      {"<PROPERTY NAME=\"Numbers\">" + value("1") + "</PROPERTY>", "13: the property Numbers is of type uint16[]"},
+      {"<PROPERTY.ARRAY NAME=\"Numbers\" TYPE=\"uint16\"><VALUE.ARRAY>" + value("1") + value("x") +
+           "</VALUE.ARRAY></PROPERTY.ARRAY>",
+       "13: element 1 of the property Numbers is no uint16: \"x\""}};
+  for (const Case& refused : cases)
+    EXPECT_EQ(failed("ModifyInstance", modified(thingName(), refused.property)), refused.expected);
+}
+
+TEST_F(Operations, KeysTakeTheTypeOfTheirClass) {
+  const auto get = [this](const std::string& name) { return returned("GetInstance", parameter("InstanceName", name)); };
+  const std::string name = keyBinding("name", "thing");
+  for (const char* attributes :
+       {"VALUETYPE=\"numeric\"", "VALUETYPE=\"numeric\" TYPE=\"uint64\"", "", "TYPE=\"string\""})
+    EXPECT_THAT(get(instanceName("test_thing", name + keyBinding("number", "1", attributes))), HasSubstr("<INSTANCE "));
+  EXPECT_THAT(get(instanceName("TEST_Numbered", "<KEYVALUE VALUETYPE=\"numeric\">-7</KEYVALUE>")),
+              HasSubstr("<INSTANCE "));
+}
+
+TEST_F(Operations, AKeyThatDoesNotFitItsClassIsNamed) {
+  const auto get = [this](const std::string& name) { return failed("GetInstance", parameter("InstanceName", name)); };
+  EXPECT_EQ(get(thingName("x")), "4: the key Number is no uint16: \"x\"");
+  EXPECT_EQ(get(thingName("65536")), "4: the key Number is no uint16: \"65536\"");
+  EXPECT_EQ(get(instanceName("TEST_Thing", "<KEYVALUE>1</KEYVALUE>")), "4: the class TEST_Thing has more than one key");
+  EXPECT_EQ(get(instanceName("TEST_Nowhere", "<KEYVALUE>1</KEYVALUE>")), "4: the class TEST_Nowhere has no key");
+  EXPECT_EQ(get(instanceName("TEST_Link", keyBinding("Whole", "x"))), "4: the key Whole is a reference");
+  EXPECT_EQ(get(instanceName("TEST_Thing", "<KEYBINDING NAME=\"Name\"><VALUE.REFERENCE>" + thingName() +
+                                               "</VALUE.REFERENCE></KEYBINDING>")),
+            "4: the key Name is no reference");
+}
+
+TEST_F(Operations, AKeyThatNoClassDeclaresReachesTheBroker) {
+  for (const char* attributes : {"VALUETYPE=\"numeric\"", "VALUETYPE=\"boolean\"", "VALUETYPE=\"string\""})
+    for (const char* text : {"TRUE", "18446744073709551615", "-1", "0.5", "text"})
+      EXPECT_THAT(failed("GetInstance",
+                         parameter("InstanceName", instanceName("TEST_Nowhere", keyBinding("K", text, attributes)))),
+                  testing::AnyOf(StartsWith("5: "), HasSubstr("4: the key K is no boolean")));
+}
+
+TEST_F(Operations, AnInstanceIsFoundByItsReferenceKeys) {
+  const std::string names = returned("EnumerateInstanceNames", className("TEST_Link"));
+  const auto begin = names.find("<INSTANCENAME CLASSNAME=\"TEST_Link\">");
+  const auto end = names.find("</IRETURNVALUE>");
+  EXPECT_THAT(returned("GetInstance", parameter("InstanceName", names.substr(begin, end - begin))),
+              HasSubstr(property("Strength", "uint16", "9")));
+}
+
+TEST_F(Operations, CreateInstanceReturnsItsName) {
+  const std::string instance = "<INSTANCE CLASSNAME=\"TEST_Thing\">" + property("Name", "string", "thing") +
+                               property("Number", "uint16", "1") + "</INSTANCE>";
+  EXPECT_EQ(returned("CreateInstance", parameter("NewInstance", instance)),
+            "<IRETURNVALUE><INSTANCENAME CLASSNAME=\"TEST_Thing\">" + std::string(keysOfOne) +
+                "</INSTANCENAME></IRETURNVALUE>");
+}
+
+TEST_F(Operations, DeleteInstanceReturnsNothing) { EXPECT_EQ(returned("DeleteInstance", instanceOne), ""); }
+
+TEST_F(Operations, AssociatorsHaveFullPaths) {
+  EXPECT_THAT(returned("Associators", objectOne),
+              StartsWith("<IRETURNVALUE><VALUE.OBJECTWITHPATH><INSTANCEPATH><NAMESPACEPATH><HOST>server</HOST>"));
+  EXPECT_THAT(returned("AssociatorNames", objectOne),
+              AllOf(StartsWith("<IRETURNVALUE><OBJECTPATH><INSTANCEPATH><NAMESPACEPATH>"),
+                    HasSubstr("<INSTANCENAME CLASSNAME=\"TEST_Part\">")));
+  EXPECT_THAT(returned("References", objectOne + propertyList({"Strength"})),
+              AllOf(HasSubstr(property("Strength", "uint16", "9")), Not(HasSubstr("<PROPERTY.REFERENCE"))));
+  EXPECT_THAT(returned("ReferenceNames", objectOne),
+              AllOf(StartsWith("<IRETURNVALUE><OBJECTPATH>"), HasSubstr("CLASSNAME=\"TEST_Link\"")));
+}
+
+TEST_F(Operations, AssociationsOfAClassAreNotOffered) {
+  EXPECT_THAT(failed("Associators", parameter("ObjectName", "<CLASSNAME NAME=\"TEST_Thing\"/>")), StartsWith("7: "));
+}
+
+TEST_F(Operations, TheProvidersErrorReachesTheClient) {
+  EXPECT_EQ(failed("EnumerateInstances", className("TEST_Failing")), "2: out of <order>");
+}
+
+TEST_F(Operations, AnInstanceThatIsNotThereIsNotFound) {
+  EXPECT_THAT(failed("GetInstance", parameter("InstanceName", thingName("9"))), StartsWith("6: "));
+}
+
+TEST_F(Operations, WhatIsNotKnownIsToldApart) {
+  EXPECT_THAT(failed("EnumerateInstances", className("TEST_Nowhere")), StartsWith("5: "));
+  EXPECT_EQ(failed("GetClass", className("TEST_Nowhere")), "6: the class TEST_Nowhere is not known");
+  EXPECT_EQ(failed("EnumerateClassNames", className("TEST_Nowhere")), "5: the class TEST_Nowhere is not known");
+  EXPECT_EQ(failed("Frobnicate", ""), "7: this server does not offer the operation Frobnicate");
+  for (const char* method : {"CreateClass", "ModifyClass", "DeleteClass", "ExecQuery", "GetQualifier"})
+    EXPECT_EQ(failed(method, ""), std::string("7: this server does not offer the operation ") + method);
+  EXPECT_EQ(returned("EnumerateInstances", className("TEST_Unserved")), "<IRETURNVALUE></IRETURNVALUE>");
+}
+
+TEST_F(Operations, ParametersAreCheckedByNameAndKind) {
+  const std::string thing = className("TEST_Thing");
+  EXPECT_EQ(failed("EnumerateInstances", ""), "4: the parameter ClassName is missing");
+  EXPECT_EQ(failed("EnumerateInstances", parameter("ClassName", "")), "4: the parameter ClassName is missing");
+  EXPECT_EQ(failed("EnumerateInstances", thing + thing), "4: the parameter ClassName is given twice");
+  EXPECT_EQ(failed("EnumerateInstances", thing + parameter("Odd", "")), "4: the parameter Odd is not known");
+  EXPECT_EQ(failed("EnumerateInstances", parameter("ClassName", value("x"))),
+            "4: the parameter ClassName is no name of a class");
+  EXPECT_EQ(failed("EnumerateInstances", parameter("ClassName", thingName())),
+            "4: the parameter ClassName is no name of a class");
+  EXPECT_EQ(failed("EnumerateInstances", thing + parameter("DeepInheritance", value("maybe"))),
+            "4: the parameter DeepInheritance is neither TRUE nor FALSE");
+  EXPECT_EQ(failed("EnumerateInstances", thing + parameter("PropertyList", value("x"))),
+            "4: the parameter PropertyList is no list of names");
+  EXPECT_EQ(failed("GetInstance", ""), "4: the parameter InstanceName is missing");
+  EXPECT_EQ(failed("GetInstance", parameter("InstanceName", value("x"))),
+            "4: the parameter InstanceName is no name of an instance");
+  EXPECT_EQ(failed("ModifyInstance", ""), "4: the parameter ModifiedInstance is missing");
+  EXPECT_EQ(failed("ModifyInstance", parameter("ModifiedInstance", thingName())),
+            "4: the parameter ModifiedInstance is no instance");
+}
+
+TEST_F(Operations, GetPropertyAndSetPropertyGoToTheBroker) {
+  EXPECT_THAT(returned("GetProperty", instanceOne + parameter("PropertyName", value("U8"))), HasSubstr(value("255")));
+  EXPECT_THAT(failed("GetProperty", instanceOne + parameter("PropertyName", value("Nothing"))), StartsWith("12: "));
+  EXPECT_EQ(returned("SetProperty",
+                     instanceOne + parameter("PropertyName", value("Text")) + parameter("NewValue", value("set"))),
+            "");
+  EXPECT_EQ(Probe::text(), "set");
+}
+
+TEST_F(Operations, AMethodOfAClassIsToldApart) {
+  const auto call = [this](const std::string& method, const std::string& klass, const std::string& nameSpace) {
+    Cimom::Http::Request sent =
+        request(method, messageOf("<METHODCALL NAME=\"" + method + "\"><LOCALCLASSPATH>" + nameSpacePath(nameSpace) +
+                                  "<CLASSNAME NAME=\"" + klass + "\"/></LOCALCLASSPATH></METHODCALL>"));
+    sent.headers = {};
+    sent.headers.add("CIMOperation", "MethodCall");
+    sent.headers.add("CIMMethod", method);
+    sent.headers.add("CIMObject", "root/" + nameSpace + ":" + klass);
+    return endpoint_.handle(sent).body;
+  };
+  EXPECT_THAT(call("Reset", "TEST_Part", "test"),
+              AllOf(HasSubstr("<METHODRESPONSE NAME=\"Reset\">"), HasSubstr("<ERROR CODE=\"16\"")));
+  EXPECT_THAT(call("Nothing", "TEST_Part", "test"), HasSubstr("<ERROR CODE=\"17\""));
+  EXPECT_THAT(call("Reset", "TEST_Nowhere", "test"), HasSubstr("<ERROR CODE=\"5\""));
+  EXPECT_THAT(call("Reset", "TEST_Part", "nowhere"), HasSubstr("<ERROR CODE=\"3\""));
+}
+
+}  // namespace

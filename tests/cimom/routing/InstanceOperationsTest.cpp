@@ -1,0 +1,258 @@
+#include "tests/cimom/support/BrokerFixture.h"
+
+namespace Cimom::Test {
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::SizeIs;
+
+class InstanceOperations : public BrokerFixture {
+ protected:
+  InstanceOperations() { probe->serve(manager, "TST_Processor", kNamespace); }
+
+  /// A provider that returns systems of these names, of the class that it is asked for.
+  ProbeProvider::Answer returning(std::vector<std::string> names) {
+    return
+        [this, names](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* asked, const CMPIInstance*) {
+          const std::string className = textOf(CMGetClassName(asked, nullptr));
+          for (const std::string& name : names) CMReturnInstance(result, system(name.c_str(), className.c_str()));
+          return kOk;
+        };
+  }
+
+  CMPIContext* context() { return request.context(); }
+
+  std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
+};
+
+TEST_F(InstanceOperations, AnUnknownNamespaceIsRefused) {
+  EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor", "root/nowhere"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_NAMESPACE);
+  EXPECT_THAT(textOf(status.msg), HasSubstr("root/nowhere"));
+}
+
+TEST_F(InstanceOperations, AnUnknownClassIsRefused) {
+  EXPECT_EQ(CBEnumInstanceNames(broker, context(), path("TST_Nothing"), &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
+  EXPECT_THAT(textOf(status.msg), HasSubstr("TST_Nothing"));
+}
+
+TEST_F(InstanceOperations, AClassWithoutAProviderHasNoInstances) {
+  CMPIEnumeration* found = CBEnumInstances(broker, context(), path("CIM_Point"), nullptr, &status);
+
+  ASSERT_NE(found, nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_OK);
+  EXPECT_FALSE(CMHasNext(found, nullptr));
+}
+
+TEST_F(InstanceOperations, AClassHasAProviderInItsRegisteredNamespacesOnly) {
+  std::shared_ptr<ProbeProvider> other = std::make_shared<ProbeProvider>();
+  ObjectManager second;
+  second.loadSchemaText(kSchema, "root/a");
+  other->serve(second, "TST_Processor", "root/b");
+  const RequestScope scope(second.broker());
+  CMPIContext* here = RequestScope::current()->context();
+  const auto* inA = CMNewObjectPath(second.broker(), "root/a", "TST_Processor", nullptr);
+  const auto* inB = CMNewObjectPath(second.broker(), "/ROOT/B/", "TST_Processor", nullptr);
+
+  EXPECT_NE(CBEnumInstances(second.broker(), here, inA, nullptr, &status), nullptr);
+  EXPECT_THAT(other->calls, IsEmpty());
+  EXPECT_NE(CBEnumInstances(second.broker(), here, inB, nullptr, &status), nullptr);
+  EXPECT_THAT(other->calls, SizeIs(1));
+}
+
+TEST_F(InstanceOperations, EnumerationOfASuperclassCallsEachRegisteredSubclassWithItsName) {
+  std::shared_ptr<ProbeProvider> other = std::make_shared<ProbeProvider>();
+  other->serve(manager, "TST_Other", kNamespace);
+  probe->answer = returning({"one", "two"});
+  other->answer = returning({"three"});
+  const char* properties[] = {"Name", nullptr};
+
+  CMPIEnumeration* found = CBEnumInstances(broker, context(), path("CIM_Element"), properties, &status);
+
+  EXPECT_EQ(status.rc, CMPI_RC_OK);
+  EXPECT_THAT(pathsOf(found), ElementsAre("root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"",
+                                          "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"two\"",
+                                          "root/test:TST_Other.CreationClassName=\"TST_Other\",Name=\"three\""));
+  ASSERT_THAT(probe->calls, SizeIs(1));
+  EXPECT_EQ(probe->calls[0].path, "root/test:TST_Processor");
+  EXPECT_THAT(probe->calls[0].properties, ElementsAre("Name"));
+  ASSERT_THAT(other->calls, SizeIs(1));
+  EXPECT_EQ(other->calls[0].path, "root/test:TST_Other");
+}
+
+TEST_F(InstanceOperations, NamesAreThePathsThatTheProviderReturns) {
+  probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMPIObjectPath* homeless = systemPath("one");
+    CMSetNameSpace(homeless, "");
+    CMReturnObjectPath(result, homeless);
+    return kOk;
+  };
+
+  CMPIEnumeration* found = CBEnumInstanceNames(broker, context(), path("tst_processor"), &status);
+
+  EXPECT_THAT(pathsOf(found), ElementsAre("root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\""));
+}
+
+TEST_F(InstanceOperations, WhatWasReturnedDoesNotChangeWithTheProvidersObject) {
+  probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMPIInstance* reused = system("one");
+    CMSetProperty(reused, "Caption", "first", CMPI_chars);
+    CMReturnInstance(result, reused);
+    CMSetProperty(reused, "Caption", "second", CMPI_chars);
+    CMReturnInstance(result, reused);
+    return kOk;
+  };
+
+  CMPIEnumeration* found = CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status);
+
+  for (const char* expected : {"first", "second"}) {
+    const CMPIData item = CMGetNext(found, nullptr);
+    EXPECT_EQ(textOf(CMGetProperty(item.value.inst, "Caption", nullptr).value.string), expected);
+  }
+}
+
+TEST_F(InstanceOperations, AFailureAfterSomeResultsIsAllThatTheCallerGets) {
+  probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*,
+                         const CMPIInstance*) -> CMPIStatus {
+    CMReturnInstance(result, system("one"));
+    CMReturnWithChars(broker, CMPI_RC_ERR_ACCESS_DENIED, "not for you");
+  };
+
+  EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+  EXPECT_EQ(textOf(status.msg), "not for you");
+}
+
+TEST_F(InstanceOperations, AnErrorObjectThatTheProviderReturnsFailsTheOperation) {
+  probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMReturnError(result, broker->eft->newCMPIError(broker, "owner", "ID1", "disk gone", CMPIErrorSeverityUnknown,
+                                                    CMPIErrorProbableCauseUnknown, CMPI_RC_ERR_ACCESS_DENIED, nullptr));
+    return kOk;
+  };
+
+  EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
+  EXPECT_EQ(textOf(status.msg), "disk gone");
+}
+
+TEST_F(InstanceOperations, GetInstanceGivesTheFirstThatIsReturned) {
+  probe->answer = returning({"one", "two"});
+
+  const CMPIInstance* found = CBGetInstance(broker, context(), systemPath("two"), nullptr, &status);
+
+  ASSERT_NE(found, nullptr);
+  EXPECT_EQ(textOf(CMGetProperty(found, "Name", nullptr).value.string), "one");
+  EXPECT_EQ(probe->calls[0].path, "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"two\"");
+}
+
+TEST_F(InstanceOperations, GetInstanceThatReturnsNothingFindsNothing) {
+  EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
+  EXPECT_THAT(textOf(status.msg), HasSubstr("Name=\"one\""));
+}
+
+TEST_F(InstanceOperations, GetInstanceOfAClassWithoutAProviderFindsNothing) {
+  EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one", "CIM_System"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
+  EXPECT_THAT(probe->calls, IsEmpty());
+}
+
+TEST_F(InstanceOperations, ModifyInstanceHandsOverTheWholeInstanceWithoutDefaults) {
+  CMPIInstance* sent = CMNewInstance(broker, path("TST_Processor"), nullptr);
+  CMSetProperty(sent, "CreationClassName", "TST_Processor", CMPI_chars);
+  CMSetProperty(sent, "Name", "one", CMPI_chars);
+  CMSetProperty(sent, "Caption", "new", CMPI_chars);
+  probe->answer = [&](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
+    EXPECT_EQ(textOf(CMGetProperty(instance, "Caption", nullptr).value.string), "new");
+    const CMPIData unsent = CMGetProperty(instance, "EnabledState", &status);
+    EXPECT_TRUE(CMIsNullValue(unsent)) << "a class default is nothing that the client sent";
+    EXPECT_EQ(status.rc, CMPI_RC_OK);
+    CMGetProperty(instance, "Undeclared", &status);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+    EXPECT_EQ(CMGetKeyCount(CMGetObjectPath(instance, nullptr), nullptr), 2u);
+    return kOk;
+  };
+
+  const CMPIStatus modified = CBModifyInstance(broker, context(), path("TST_Processor"), sent, nullptr);
+
+  EXPECT_EQ(modified.rc, CMPI_RC_OK);
+  ASSERT_THAT(probe->calls, SizeIs(1));
+  EXPECT_EQ(probe->calls[0].path, "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"");
+  EXPECT_FALSE(probe->calls[0].hasProperties);
+}
+
+TEST_F(InstanceOperations, ModifyInstancePassesThePropertyListOn) {
+  const char* properties[] = {"Caption", "Vendor", nullptr};
+  CBModifyInstance(broker, context(), systemPath("one"), system("one"), properties);
+  ASSERT_THAT(probe->calls, SizeIs(1));
+  EXPECT_THAT(probe->calls[0].properties, ElementsAre("Caption", "Vendor"));
+}
+
+TEST_F(InstanceOperations, ModifyInstanceRefusesAnInstanceOfAnotherClass) {
+  probe->serve(manager, "TST_Other", kNamespace);
+  const CMPIStatus refused =
+      CBModifyInstance(broker, context(), systemPath("one"), system("one", "TST_Other"), nullptr);
+  EXPECT_EQ(refused.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_THAT(probe->calls, IsEmpty());
+}
+
+TEST_F(InstanceOperations, WritingToAClassWithoutAProviderIsNotSupported) {
+  CMPIObjectPath* orphan = systemPath("one", "TST_Other");
+  CMPIInstance* instance = system("one", "TST_Other");
+  EXPECT_EQ(CBModifyInstance(broker, context(), orphan, instance, nullptr).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  EXPECT_EQ(CBDeleteInstance(broker, context(), orphan).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  EXPECT_EQ(CBCreateInstance(broker, context(), orphan, instance, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+}
+
+TEST_F(InstanceOperations, CreateInstanceGivesTheProvidersPathElseTheInstances) {
+  const CMPIObjectPath* own = CBCreateInstance(broker, context(), path("TST_Processor"), system("one"), &status);
+  EXPECT_EQ(textOf(CMObjectPathToString(own, nullptr)),
+            "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"");
+  probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMReturnObjectPath(result, systemPath("given"));
+    return kOk;
+  };
+  const CMPIObjectPath* given = CBCreateInstance(broker, context(), path("TST_Processor"), system("one"), &status);
+  EXPECT_THAT(textOf(CMObjectPathToString(given, nullptr)), HasSubstr("Name=\"given\""));
+}
+
+TEST_F(InstanceOperations, DeleteInstanceReachesTheProvider) {
+  EXPECT_EQ(CBDeleteInstance(broker, context(), systemPath("one")).rc, CMPI_RC_OK);
+  ASSERT_THAT(probe->calls, SizeIs(1));
+  EXPECT_EQ(probe->calls[0].operation, "deleteInstance");
+}
+
+TEST_F(InstanceOperations, PropertyCallsAreInstanceCallsOfOneProperty) {
+  probe->answer = returning({"one"});
+  EXPECT_EQ(textOf(CBGetProperty(broker, context(), systemPath("one"), "name", &status).value.string), "one");
+  EXPECT_THAT(probe->calls[0].properties, ElementsAre("Name"));
+  CBGetProperty(broker, context(), systemPath("one"), "Undeclared", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+
+  probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
+    EXPECT_EQ(textOf(CMGetProperty(instance, "Caption", nullptr).value.string), "set");
+    return kOk;
+  };
+  const CMPIStatus set = broker->bft->setProperty(broker, context(), systemPath("one"), "Caption",
+                                                  reinterpret_cast<const CMPIValue*>("set"), CMPI_chars);
+  EXPECT_EQ(set.rc, CMPI_RC_OK);
+  EXPECT_EQ(probe->calls.back().operation, "modifyInstance");
+  EXPECT_THAT(probe->calls.back().properties, ElementsAre("Caption"));
+}
+
+TEST_F(InstanceOperations, QueriesMethodsAndIndicationsAreHonestlyRefused) {
+  EXPECT_EQ(CBExecQuery(broker, context(), path("TST_Processor"), "select * from x", "WQL", &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  CBInvokeMethod(broker, context(), systemPath("one"), "reset", nullptr, nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_METHOD_NOT_AVAILABLE);
+  CBInvokeMethod(broker, context(), systemPath("one"), "Explode", nullptr, nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_METHOD_NOT_FOUND);
+  EXPECT_EQ(CBDeliverIndication(broker, context(), kNamespace, system("one")).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+}
+
+}  // namespace
+}  // namespace Cimom::Test

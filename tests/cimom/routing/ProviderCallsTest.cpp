@@ -1,0 +1,169 @@
+#include <stdexcept>
+
+#include "tests/cimom/support/BrokerFixture.h"
+
+namespace Cimom::Test {
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::SizeIs;
+
+class ProviderCalls : public BrokerFixture {
+ protected:
+  ProviderCalls() { probe->serve(manager, "TST_Processor", kNamespace); }
+
+  CMPIContext* context() { return request.context(); }
+
+  std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
+};
+
+TEST_F(ProviderCalls, AnEmptySlotOfAProviderIsNotSupported) {
+  static CMPIInstanceMIFT empty = {CMPICurrentVersion,
+                                   CMPICurrentVersion,
+                                   "instanceEmpty",
+                                   nullptr,
+                                   nullptr,
+                                   nullptr,
+                                   nullptr,
+                                   nullptr,
+                                   nullptr,
+                                   nullptr,
+                                   nullptr};
+  static CMPIInstanceMI mi = {&empty, &empty};
+  manager.addProvider(
+      {"TST_Other", "empty", "", true, false, {kNamespace}, ""},
+      [](const CMPIBroker*, const CMPIContext*, CMPIStatus*) { return &mi; }, nullptr);
+  EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one", "TST_Other"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+}
+
+TEST_F(ProviderCalls, TheProviderGetsTheRequestsContext) {
+  CMAddContextEntry(context(), CMPIPrincipal, "alice", CMPI_chars);
+  probe->answer = [&](const CMPIContext* given, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) {
+    EXPECT_EQ(textOf(CMGetContextEntry(given, CMPIPrincipal, nullptr).value.string), "alice");
+    EXPECT_EQ(textOf(CMGetContextEntry(given, CMPIInitNameSpace, nullptr).value.string), kNamespace);
+    const CMPIData flags = CMGetContextEntry(given, CMPIInvocationFlags, &status);
+    EXPECT_EQ(flags.type, CMPI_uint32);
+    EXPECT_EQ(flags.value.uint32, 0u);
+    return kOk;
+  };
+  CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status);
+  EXPECT_THAT(probe->calls, SizeIs(1));
+  EXPECT_EQ(CMGetContextEntryCount(context(), nullptr), 1u) << "the caller's context stays its own";
+}
+
+TEST_F(ProviderCalls, AProviderReachesAnotherThroughUpCalls) {
+  std::shared_ptr<ProbeProvider> lower = std::make_shared<ProbeProvider>();
+  lower->serve(manager, "TST_Other", "root/lower");
+  lower->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMReturnInstance(result, system("low", "TST_Other"));
+    return kOk;
+  };
+  probe->answer = [&](const CMPIContext* given, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMPIEnumeration* found = CBEnumInstances(probe->broker, given, path("TST_Other", "root/lower"), nullptr, nullptr);
+    while (CMHasNext(found, nullptr)) {
+      const CMPIInstance* one = CMGetNext(found, nullptr).value.inst;
+      const CMPIData below = CMGetProperty(one, "Name", nullptr);
+      CMReturnInstance(result, system(CMGetCharsPtr(below.value.string, nullptr)));
+    }
+    return kOk;
+  };
+  EXPECT_THAT(pathsOf(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status)),
+              ElementsAre("root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"low\""));
+}
+
+TEST_F(ProviderCalls, UpCallsWithoutEndAreCutOff) {
+  probe->answer = [&](const CMPIContext* given, const CMPIResult*, const CMPIObjectPath* asked, const CMPIInstance*) {
+    CMPIStatus inner = kOk;
+    CBEnumInstances(probe->broker, given, asked, nullptr, &inner);
+    return inner;
+  };
+  EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+  EXPECT_THAT(textOf(status.msg), HasSubstr("without end"));
+}
+
+TEST_F(ProviderCalls, AFailingFactoryIsReportedAndTriedAgain) {
+  int tries = 0;
+  manager.addProvider(
+      {"TST_Other", "late", "", true, false, {kNamespace}, ""},
+      [&](const CMPIBroker*, const CMPIContext*, CMPIStatus*) -> CMPIInstanceMI* {
+        ++tries;
+        return nullptr;
+      },
+      nullptr);
+  for (int expected = 1; expected <= 2; ++expected) {
+    EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one", "TST_Other"), nullptr, &status), nullptr);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    EXPECT_THAT(textOf(status.msg), HasSubstr("late_Create_InstanceMI"));
+    EXPECT_EQ(tries, expected);
+  }
+}
+
+TEST_F(ProviderCalls, AnExceptionOfTheProviderFailsTheRequestOnly) {
+  probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) -> CMPIStatus {
+    throw std::out_of_range("vector::_M_range_check");
+  };
+  EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+  EXPECT_THAT(textOf(status.msg), HasSubstr("vector::_M_range_check"));
+
+  probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) -> CMPIStatus {
+    throw 7;
+  };
+  EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one"), nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+}
+
+TEST_F(ProviderCalls, NullsReturnedToTheResultAreRefusedAndLoseNothing) {
+  CMPIStatus instanceStatus = kOk;
+  CMPIStatus pathStatus = kOk;
+  probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    instanceStatus = CMReturnInstance(result, nullptr);
+    CMReturnInstance(result, system("one"));
+    pathStatus = CMReturnObjectPath(result, systemPath("one"));
+    return kOk;
+  };
+
+  CMPIEnumeration* found = CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status);
+
+  EXPECT_EQ(instanceStatus.rc, CMPI_RC_ERR_INVALID_HANDLE);
+  EXPECT_EQ(pathStatus.rc, CMPI_RC_ERR_NOT_SUPPORTED) << "a path where instances are asked for";
+  EXPECT_THAT(pathsOf(found), SizeIs(1));
+}
+
+TEST_F(ProviderCalls, ReturnDoneMakesNoDifferenceHoweverOftenItIsCalled) {
+  for (int times = 0; times < 3; ++times) {
+    probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+      CMReturnInstance(result, system("one"));
+      for (int time = 0; time < times; ++time) EXPECT_EQ(CMReturnDone(result).rc, CMPI_RC_OK);
+      return kOk;
+    };
+    EXPECT_THAT(pathsOf(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status)), SizeIs(1));
+  }
+}
+
+TEST(ProviderLife, TheFactoryIsCalledOnceAndCleanupOncePerInterface) {
+  std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
+  {
+    ObjectManager manager;
+    manager.loadSchemaText(kSchema, kNamespace);
+    probe->serve(manager, "TST_Hosted", kNamespace, true);
+    EXPECT_EQ(probe->factoryCalls, 0) << "providers are made when they are needed";
+    const RequestScope scope(manager.broker());
+    const auto* path = CMNewObjectPath(manager.broker(), kNamespace, "TST_Hosted", nullptr);
+    const auto* source = CMNewObjectPath(manager.broker(), kNamespace, "CIM_System", nullptr);
+    for (int round = 0; round < 3; ++round) {
+      CBEnumInstances(manager.broker(), RequestScope::current()->context(), path, nullptr, nullptr);
+      CBReferenceNames(manager.broker(), RequestScope::current()->context(), source, nullptr, nullptr, nullptr);
+    }
+    EXPECT_EQ(probe->calls.size(), 6u);
+    EXPECT_EQ(probe->factoryCalls, 2);
+    EXPECT_EQ(probe->cleanups, 0);
+  }
+  EXPECT_EQ(probe->cleanups, 2);
+}
+
+}  // namespace
+}  // namespace Cimom::Test

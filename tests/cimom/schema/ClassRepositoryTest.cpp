@@ -1,0 +1,143 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "cimom/ConfigurationError.h"
+#include "cimom/schema/ClassRepository.h"
+#include "tests/cimom/support/ManagedElements.h"
+
+namespace Cimom::Test {
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+void load(ClassRepository& repository, std::string_view mof) { repository.add(MofReader().readText(mof, "text")); }
+
+std::string complaint(ClassRepository& repository, std::string_view mof) {
+  try {
+    load(repository, mof);
+  } catch (const ConfigurationError& error) {
+    return error.what();
+  }
+  return {};
+}
+
+std::vector<std::string> namesOf(const std::vector<const ClassDefinition*>& classes) {
+  std::vector<std::string> names;
+  for (const ClassDefinition* one : classes) names.push_back(one->name);
+  return names;
+}
+
+std::vector<std::string> propertiesOf(const ClassDefinition& definition) {
+  std::vector<std::string> names;
+  for (const auto& property : definition.properties) names.push_back(property.name);
+  return names;
+}
+
+class Repository : public testing::Test {
+ protected:
+  ClassRepository repository;
+};
+
+TEST_F(Repository, FindsClassesWithoutRegardToCase) {
+  load(repository, kSchema);
+  ASSERT_NE(repository.find("tst_PROCESSOR"), nullptr);
+  EXPECT_EQ(repository.find("tst_PROCESSOR")->name, "TST_Processor");
+  EXPECT_EQ(repository.find("TST_Nothing"), nullptr);
+}
+
+TEST_F(Repository, InheritsPropertiesKeysAndMethods) {
+  load(repository, kSchema);
+  const ClassDefinition& processor = *repository.find("TST_Processor");
+  EXPECT_EQ(processor.properties.front().name, "Caption");
+  EXPECT_EQ(processor.properties.back().name, "Vendor");
+  EXPECT_EQ(processor.findProperty("caption")->originClass, "CIM_Element");
+  EXPECT_TRUE(processor.findProperty("Name")->isKey());
+  EXPECT_FALSE(processor.findProperty("Vendor")->isKey());
+  EXPECT_NE(processor.findMethod("reset"), nullptr);
+  EXPECT_TRUE(processor.isA("CIM_ELEMENT"));
+  EXPECT_FALSE(repository.find("CIM_Element")->isA("TST_Processor"));
+}
+
+TEST_F(Repository, InheritsQualifiersButTheRestrictedOnes) {
+  load(repository, kSchema);
+  EXPECT_TRUE(repository.find("TST_Hosted")->isAssociation());
+  EXPECT_TRUE(isQualified(repository.find("CIM_Element")->qualifiers, "Abstract"));
+  EXPECT_FALSE(isQualified(repository.find("CIM_System")->qualifiers, "Abstract"));
+  EXPECT_EQ(findQualifier(repository.find("CIM_System")->qualifiers, "Version"), nullptr);
+  EXPECT_EQ(findQualifier(repository.find("TST_Processor")->qualifiers, "Description")->value.toString(),
+            "\"A system\"");
+}
+
+TEST_F(Repository, AnOverridingPropertyTakesThePlaceAndTheQualifiersOfTheOther) {
+  load(repository, R"(
+      class Base { [Key, Description("base")] string Id = "b"; uint8 Other; string Kept = "k"; };
+      class Derived : Base { [Description("derived")] string ID = "d"; string kept; uint8 Own; };)");
+  const ClassDefinition& derived = *repository.find("Derived");
+  EXPECT_THAT(propertiesOf(derived), ElementsAre("ID", "Other", "kept", "Own"));
+  EXPECT_TRUE(derived.findProperty("id")->isKey());
+  EXPECT_EQ(derived.findProperty("id")->originClass, "Base");
+  EXPECT_EQ(derived.findProperty("id")->defaultValue.toString(), "\"d\"");
+  EXPECT_EQ(derived.findProperty("Kept")->defaultValue.toString(), "\"k\"") << "no default of its own";
+  EXPECT_EQ(findQualifier(derived.findProperty("id")->qualifiers, "Description")->value.toString(), "\"derived\"");
+}
+
+TEST_F(Repository, AReferenceMayBeNarrowedToASubclass) {
+  load(repository,
+       std::string(kSchema) + "[Association] class TST_Own : CIM_Hosted { TST_Processor REF Antecedent; };");
+  const PropertyDeclaration& narrowed = *repository.find("TST_Own")->findProperty("Antecedent");
+  EXPECT_EQ(narrowed.referenceClass, "TST_Processor");
+  EXPECT_TRUE(narrowed.isKey());
+}
+
+TEST_F(Repository, TheOrderOfDeclarationsDoesNotMatter) {
+  load(repository, "class C : B {}; class B : A {}; class A { string P; };");
+  EXPECT_THAT(propertiesOf(*repository.find("C")), ElementsAre("P"));
+}
+
+TEST_F(Repository, ClassesMayDeriveFromThoseLoadedBefore) {
+  load(repository, "class A { string P; };");
+  load(repository, "class B : a {};");
+  EXPECT_EQ(repository.find("B")->superclass, repository.find("A"));
+}
+
+TEST_F(Repository, ListsSubclasses) {
+  load(repository, kSchema);
+  EXPECT_THAT(namesOf(repository.subclasses("cim_element", false)), ElementsAre("CIM_Point", "CIM_System"));
+  EXPECT_THAT(namesOf(repository.subclasses("CIM_Element", true)),
+              ElementsAre("CIM_Point", "CIM_System", "TST_Other", "TST_Point", "TST_Processor"));
+  EXPECT_THAT(namesOf(repository.subclasses("", false)), ElementsAre("CIM_Element", "CIM_Hosted", "TST_Peers"));
+  EXPECT_EQ(repository.subclasses("", true).size(), repository.all().size());
+  EXPECT_THAT(namesOf(repository.subclasses("TST_Other", true)), ElementsAre());
+}
+
+TEST_F(Repository, KnowsTheNamespacesThatSomebodyNamed) {
+  repository.addNamespace("/root/a/");
+  repository.addNamespace("");
+  load(repository, "#pragma namespace(\"root/b\")");
+  EXPECT_TRUE(repository.hasNamespace("ROOT/A"));
+  EXPECT_TRUE(repository.hasNamespace("root/b"));
+  EXPECT_FALSE(repository.hasNamespace(""));
+  EXPECT_FALSE(repository.hasNamespace("root"));
+  EXPECT_THAT(repository.namespaces(), ElementsAre("root/a", "root/b"));
+}
+
+TEST_F(Repository, RefusesWhatCannotBeResolvedAndAddsNothing) {
+  load(repository, "class Known {};");
+  EXPECT_EQ(complaint(repository, "class New {};\nclass known {};"),
+            "text:2: class known is there already, declared at text:1");
+  EXPECT_EQ(complaint(repository, "class New {};\nclass NEW {};"),
+            "text:2: class NEW is there already, declared at text:1");
+  EXPECT_EQ(complaint(repository, "class New {};\nclass B : Missing {};"),
+            "text:2: class B has the superclass Missing, which is not declared anywhere");
+  EXPECT_THAT(complaint(repository, "class New {}; class A : B {}; class B : A {};"),
+              HasSubstr("is its own superclass"));
+  EXPECT_THAT(complaint(repository, "class Self : Self {};"), HasSubstr("is its own superclass"));
+  EXPECT_EQ(complaint(repository, "class New { string P; };\nclass B : New { uint8 P; };"),
+            "text:2: class B makes the string P of New a uint8");
+  EXPECT_EQ(repository.find("New"), nullptr);
+  EXPECT_THAT(namesOf(repository.all()), ElementsAre("Known"));
+}
+
+}  // namespace
+}  // namespace Cimom::Test

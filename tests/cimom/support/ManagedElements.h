@@ -1,0 +1,69 @@
+#ifndef TESTS_CIMOM_SUPPORT_MANAGEDELEMENTS_H_
+#define TESTS_CIMOM_SUPPORT_MANAGEDELEMENTS_H_
+
+namespace Cimom::Test {
+
+/// A small schema with what a real one has: an inheritance of three levels, keys, defaults, every kind of property, and
+/// associations.
+inline constexpr const char* kSchema = R"MOF(
+Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride, ToSubclass);
+Qualifier Association : boolean = false, Scope(association), Flavor(DisableOverride, ToSubclass);
+Qualifier Description : string = null, Scope(any), Flavor(EnableOverride, ToSubclass, Translatable);
+
+[Abstract, Version("2.1"), Description("The root")]
+class CIM_Element {
+  [Description("What people call it")] string Caption = "none";
+  [Description("Returns 0")] uint32 Reset([IN, Description("How")] boolean Force);
+};
+
+[Description("A system")]
+class CIM_System : CIM_Element {
+  [Key] string CreationClassName;
+  [Key] string Name;
+  uint16 EnabledState = 5;
+  uint8 Small;
+  uint64 Large;
+  sint32 Offset;
+  boolean Ready;
+  real64 Load;
+  datetime Installed;
+  uint16 Dedicated[];
+  string Notes[];
+};
+
+class TST_Processor : CIM_System {
+  string Vendor = "nobody";
+};
+
+class TST_Other : CIM_System {
+};
+
+class CIM_Point : CIM_Element {
+  [Key] uint16 Number;
+};
+
+class TST_Point : CIM_Point {
+};
+
+[Association]
+class CIM_Hosted {
+  [Key] CIM_System REF Antecedent;
+  [Key] CIM_Point REF Dependent;
+};
+
+[Association]
+class TST_Hosted : CIM_Hosted {
+};
+
+[Association]
+class TST_Peers {
+  [Key] CIM_Point REF Left;
+  [Key] CIM_Point REF Right;
+};
+)MOF";
+
+inline constexpr const char* kNamespace = "root/test";
+
+}  // namespace Cimom::Test
+
+#endif  // TESTS_CIMOM_SUPPORT_MANAGEDELEMENTS_H_

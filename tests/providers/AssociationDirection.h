@@ -1,0 +1,42 @@
+// The fixture of the association operations: an association seen from one of its ends, with three instances at the far
+// end that belong to the source.
+#pragma once
+
+#include <tuple>
+
+#include "AssociationTest.h"
+
+namespace Testing {
+
+// The association, and whether the far end is end A.
+using Direction = std::tuple<AssociationModel, bool>;
+
+class AssociationDirectionTest : public AssociationTest, public ::testing::WithParamInterface<Direction> {
+ protected:
+  AssociationDirectionTest();
+
+  bool farIsA() const { return std::get<1>(GetParam()); }
+  const std::string& farClass() const { return farIsA() ? model().endA : model().endB; }
+  const std::string& sourceClass() const { return farIsA() ? model().endB : model().endA; }
+  const std::string& referenceToFar() const { return farIsA() ? model().referenceToA : model().referenceToB; }
+  const std::string& referenceToSource() const { return farIsA() ? model().referenceToB : model().referenceToA; }
+  std::string sourceName() const;
+
+  // The source object's path as a client sends it, with the far end filled by `farNames`.
+  CMPIObjectPath* source();
+
+  Strings homedFarNames() const;
+  // "source -> far" for every far name, the source as the client sent it.
+  Strings sourceTiedToFarNames() const;
+
+  Strings farNames;
+};
+
+}  // namespace Testing
+
+#define INSTANTIATE_DIRECTIONS(test)                                                                            \
+  INSTANTIATE_TEST_SUITE_P(                                                                                     \
+      Twelve, test, ::testing::Combine(::testing::ValuesIn(Testing::associationModels()), ::testing::Bool()),   \
+      [](const auto& parameter) {                                                                               \
+        return std::get<0>(parameter.param).className + (std::get<1>(parameter.param) ? "_toEndA" : "_toEndB"); \
+      })

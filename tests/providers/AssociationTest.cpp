@@ -1,0 +1,226 @@
+#include "AssociationTest.h"
+
+#include <regex>
+#include <stdexcept>
+
+namespace Testing {
+
+namespace {
+
+const std::string rule(78, '=');
+constexpr const char* clientHost = "client.example";
+
+struct Composite {
+  std::string compositeClass;
+  std::string underlyingClass;
+  const char* key;
+  Properties properties;  // besides the key, that make it belong to the processor
+};
+
+const Composite& compositeOf(const std::string& compositeClass) {
+  static const Properties owned = {{"SystemCreationClassName", "YRNQV_SPComputerSystem"}, {"SystemName", "bmc0"}};
+  static const std::vector<Composite> composites = {
+      {Classes::computerSystem, "YRNQV_SPComputerSystem", "Name", {}},
+      {Classes::endpoint, "YRNQV_IPProtocolEndpoint", "Name", owned},
+      {Classes::remoteAccessPoint, "YRNQV_IPRemoteServiceAccessPoint", "Name", owned},
+      {Classes::sequence, "YRNQV_IPAssignmentSettingData", "InstanceID", {}},
+      {Classes::staticSetting, "YRNQV_StaticIPAssignmentSettingData", "InstanceID", {}},
+      {Classes::dhcpSetting, "YRNQV_DHCPSettingData", "InstanceID", {}},
+  };
+  for (const Composite& composite : composites) {
+    if (composite.compositeClass == compositeClass) {
+      return composite;
+    }
+  }
+  throw std::invalid_argument("no composite class is called " + compositeClass);
+}
+
+}  // namespace
+
+std::string nameOf(Navigation navigation) {
+  switch (navigation) {
+    case Navigation::Associators:
+      return "Associators";
+    case Navigation::AssociatorNames:
+      return "AssociatorNames";
+    case Navigation::References:
+      return "References";
+    case Navigation::ReferenceNames:
+      return "ReferenceNames";
+  }
+  return {};
+}
+
+std::string nameOf(Reading reading) {
+  switch (reading) {
+    case Reading::GetInstance:
+      return "GetInstance";
+    case Reading::EnumInstances:
+      return "EnumInstances";
+    case Reading::EnumInstanceNames:
+      return "EnumInstanceNames";
+  }
+  return {};
+}
+
+void AssociationTest::attach(const AssociationModel& model) {
+  model_ = &model;
+  unit_ = &unitOf(model.className);
+  instances_ = unit_->createInstanceMI(broker(), context(), &status);
+  associations_ = unit_->createAssociationMI(broker(), context(), &status);
+}
+
+CMPIInstance* AssociationTest::add(const std::string& compositeClass, const std::string& name) {
+  const Composite& composite = compositeOf(compositeClass);
+  Properties properties = composite.properties;
+  properties.emplace_back(composite.key, name);
+  return addUnderlying(composite.underlyingClass, properties);
+}
+
+void AssociationTest::add(const std::string& compositeClass, const Strings& names) {
+  for (const std::string& name : names) {
+    add(compositeClass, name);
+  }
+}
+
+void AssociationTest::addEnds(const Strings& outerNames, const Strings& innerNames) {
+  add(model().outer, outerNames);
+  add(model().inner, innerNames);
+}
+
+CMPIObjectPath* AssociationTest::clientPath(const std::string& compositeClass, const std::string& name) {
+  CMPIObjectPath* const path = makePath(compositeClass, {{keyOf(compositeClass), name}});
+  CMSetHostname(path, clientHost);
+  return path;
+}
+
+Answer AssociationTest::navigate(Navigation navigation, const CMPIObjectPath* source) {
+  return navigate(navigation, source, model().className.c_str());
+}
+
+Answer AssociationTest::navigate(Navigation navigation, const CMPIObjectPath* source, const char* associationClass) {
+  // What the operations do not consult names what does not exist.
+  constexpr const char* ignored = "NoSuchThing";
+  const char* properties[] = {ignored, nullptr};
+  const CMPIAssociationMIFT& table = *associations_->ft;
+  RecordingResult result;
+  CMPIStatus outcome = {CMPI_RC_ERR_FAILED, nullptr};
+  switch (navigation) {
+    case Navigation::Associators:
+      outcome = table.associators(associations_, context(), result.result(), source, associationClass, ignored, ignored,
+                                  ignored, properties);
+      break;
+    case Navigation::AssociatorNames:
+      outcome = table.associatorNames(associations_, context(), result.result(), source, associationClass, ignored,
+                                      ignored, ignored);
+      break;
+    case Navigation::References:
+      outcome = table.references(associations_, context(), result.result(), source, ignored, ignored, properties);
+      break;
+    case Navigation::ReferenceNames:
+      outcome = table.referenceNames(associations_, context(), result.result(), source, ignored, ignored);
+      break;
+  }
+  return {outcome, result.instances, result.paths, result.order};
+}
+
+Answer AssociationTest::read(Reading reading, const CMPIObjectPath* path, const char** properties) {
+  const CMPIInstanceMIFT& table = *instances_->ft;
+  RecordingResult result;
+  CMPIStatus outcome = {CMPI_RC_ERR_FAILED, nullptr};
+  switch (reading) {
+    case Reading::GetInstance:
+      outcome = table.getInstance(instances_, context(), result.result(), path, properties);
+      break;
+    case Reading::EnumInstances:
+      outcome = table.enumerateInstances(instances_, context(), result.result(), path, properties);
+      break;
+    case Reading::EnumInstanceNames:
+      outcome = table.enumerateInstanceNames(instances_, context(), result.result(), path);
+      break;
+  }
+  return {outcome, result.instances, result.paths, result.order};
+}
+
+int AssociationTest::build(std::vector<CMPIInstance*>& out, const char** properties) {
+  return model().build(makePath(model().className), properties, context(), out);
+}
+
+Strings AssociationTest::unitLines() const {
+  static const std::regex lineNumber("(\\[|, )Line: [0-9]+");
+  Strings lines;
+  for (const LogLine& line : logLines()) {
+    if (line.channel == Channel::Log && line.component == unit().component) {
+      lines.push_back(std::regex_replace(line.message, lineNumber, "$1Line: N"));
+    }
+  }
+  return lines;
+}
+
+Strings AssociationTest::framed(const std::string& function) const {
+  const std::string text = function + "() in " + unit().file + " [Line: N]";
+  return {rule, "ENTERING: " + text, "EXITING: " + text, rule};
+}
+
+Strings AssociationTest::brokenOff(const std::string& function, const std::string& message) const {
+  Strings lines = framed(function);
+  lines.resize(2);
+  if (!message.empty()) {
+    lines.push_back(messageLine(message));
+  }
+  return lines;
+}
+
+std::string AssociationTest::messageLine(const std::string& message) const {
+  return "MESSAGE [File: " + unit().file + ", Line: N]: " + message;
+}
+
+Strings AssociationTest::underlyingCalls() const {
+  Strings classes;
+  for (const UpCall& call : faults.upCalls) {
+    classes.push_back(call.className);
+    EXPECT_EQ(call.nameSpace, "root/yrnse");
+    EXPECT_FALSE(call.hasPropertyList);
+  }
+  return classes;
+}
+
+void AssociationTest::spoil(const std::string& compositeClass, int number, CMPIInstance* unusable) {
+  faults.unmadeInstance = unusable;
+  faults.failNewInstance = [=](const std::string& className, int call) {
+    return className == compositeClass && call == number;
+  };
+}
+
+std::string underlyingClassOf(const std::string& compositeClass) { return compositeOf(compositeClass).underlyingClass; }
+
+const char* keyOf(const std::string& compositeClass) { return compositeOf(compositeClass).key; }
+
+std::string rendered(const std::string& host, const std::string& nameSpace, const std::string& compositeClass,
+                     const std::string& name) {
+  return "//" + host + "/" + nameSpace + ":" + compositeClass + "=" + name;
+}
+
+std::string render(const CMPIObjectPath* path) {
+  return path == nullptr ? text(static_cast<const CMPIString*>(nullptr))
+                         : rendered(hostOf(path), nameSpaceOf(path), classOf(path), key(path, keyOf(classOf(path))));
+}
+
+std::string homed(const std::string& compositeClass, const std::string& name) {
+  return rendered(systemName(), requestNameSpace, compositeClass, name);
+}
+
+std::string renderPair(const CMPIInstance* instance, const std::string& first, const std::string& second) {
+  return render(reference(instance, first)) + " -> " + render(reference(instance, second));
+}
+
+const CMPIObjectPath* referenceKey(const CMPIObjectPath* path, const std::string& name) {
+  const CMPIData data = CMGetKey(path, name.c_str(), nullptr);
+  return CMIsNullValue(data) || data.type != CMPI_ref ? nullptr : data.value.ref;
+}
+
+std::string renderPair(const CMPIObjectPath* path, const std::string& first, const std::string& second) {
+  return render(referenceKey(path, first)) + " -> " + render(referenceKey(path, second));
+}
+
+}  // namespace Testing

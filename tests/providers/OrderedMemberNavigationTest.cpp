@@ -1,0 +1,131 @@
+// How the association operations of the two ordered members decide by "InstanceID" what belongs together.
+#include "AssociationTest.h"
+
+namespace {
+
+using Testing::Answer;
+using Testing::Navigation;
+using Testing::navigations;
+using Testing::Strings;
+namespace Classes = Testing::Classes;
+
+struct Parameter {
+  const char* className;
+  Navigation navigation;
+  std::string kindWord;
+};
+
+class OrderedMemberNavigationTest : public Testing::AssociationTest, public ::testing::WithParamInterface<Parameter> {
+ protected:
+  OrderedMemberNavigationTest() { attach(Testing::modelOf(GetParam().className)); }
+
+  const std::string& settingClass() const { return model().endB; }
+  static std::string othersWord() { return GetParam().kindWord == "static" ? "dhcp" : "static"; }
+
+  // The identifiers of what the operation associates with the source, in order.
+  Strings associated(const CMPIObjectPath* source) {
+    Testing::logLines().clear();
+    const Answer answer = navigate(GetParam().navigation, source);
+    EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
+    EXPECT_EQ(unitLines(), framed(unit().prefix + nameOf(GetParam().navigation)));
+    const bool fromSequence = Testing::classOf(source) == Classes::sequence;
+    Strings identifiers;
+    for (const CMPIInstance* const instance : answer.instances) {
+      identifiers.push_back(
+          Testing::key(GetParam().navigation == Navigation::Associators
+                           ? Testing::pathOf(instance)
+                           : Testing::reference(instance, fromSequence ? "PartComponent" : "GroupComponent"),
+                       "InstanceID"));
+    }
+    for (const CMPIObjectPath* const path : answer.paths) {
+      identifiers.push_back(
+          Testing::key(GetParam().navigation == Navigation::AssociatorNames
+                           ? path
+                           : Testing::referenceKey(path, fromSequence ? "PartComponent" : "GroupComponent"),
+                       "InstanceID"));
+    }
+    return identifiers;
+  }
+  Strings sequencesOf(const std::string& setting) { return associated(clientPath(settingClass(), setting)); }
+  Strings settingsOf(const std::string& sequence) { return associated(clientPath(Classes::sequence, sequence)); }
+};
+
+TEST_P(OrderedMemberNavigationTest, ASettingBelongsToTheSequencesThatContainItAndTheKindWord) {
+  add(Classes::sequence, Strings{"BMC:eth0:" + othersWord(), "BMC:eth0:" + GetParam().kindWord,
+                                 "BMC:eth1:" + GetParam().kindWord, "BMC:eth0:none"});
+  EXPECT_EQ(sequencesOf("BMC:eth0"), (Strings{"BMC:eth0:" + GetParam().kindWord}));
+  EXPECT_EQ(sequencesOf("BMC:eth2"), Strings{});
+}
+
+TEST_P(OrderedMemberNavigationTest, SettingAndKindWordCountAnywhereInTheSequence) {
+  add(Classes::sequence, Strings{"BMC:eth10:x" + GetParam().kindWord + "y", "BMC:" + GetParam().kindWord + ":eth1"});
+  EXPECT_EQ(sequencesOf("BMC:eth1"), (Strings{"BMC:eth10:x" + GetParam().kindWord + "y"}));
+  EXPECT_EQ(sequencesOf("eth1"),
+            (Strings{"BMC:eth10:x" + GetParam().kindWord + "y", "BMC:" + GetParam().kindWord + ":eth1"}));
+}
+
+TEST_P(OrderedMemberNavigationTest, ContainmentHasRegardToCase) {
+  add(Classes::sequence, Strings{"BMC:eth0:STATIC", "BMC:eth0:DHCP", "BMC:ETH0:" + GetParam().kindWord});
+  EXPECT_EQ(sequencesOf("BMC:eth0"), Strings{});
+  add(settingClass(), Strings{"BMC:ETH0"});
+  EXPECT_EQ(settingsOf("BMC:eth0:" + GetParam().kindWord), Strings{});
+}
+
+TEST_P(OrderedMemberNavigationTest, ASequenceHasTheSettingsThatItContainsWhateverItsKind) {
+  add(settingClass(), Strings{"BMC:eth0", "BMC:eth1", "BMC:eth"});
+  for (const char* const kind : {"static", "dhcp", "none"}) {
+    EXPECT_EQ(settingsOf(std::string("BMC:eth0:") + kind), (Strings{"BMC:eth0", "BMC:eth"}));
+  }
+}
+
+TEST_P(OrderedMemberNavigationTest, ASourceWithoutReadableIdentifierCountsAsEmpty) {
+  add(Classes::sequence, Strings{"BMC:eth0:" + othersWord(), "BMC:eth1:" + GetParam().kindWord});
+  add(settingClass(), Strings{"BMC:eth0"});
+  CMPIData wrongType = {CMPI_uint16, CMPI_keyValue, {}};
+  wrongType.value.uint16 = 7;
+  const CMPIData nullValue = {CMPI_string, CMPI_keyValue | CMPI_nullValue, {}};
+  const CMPIData nullString = {CMPI_string, CMPI_keyValue, {}};
+  const auto sources = [&](const std::string& className) {
+    return std::vector<const CMPIObjectPath*>{makePath(className), makePath(className, {{"InstanceID", ""}}),
+                                              Testing::withKey(makePath(className), "InstanceID", wrongType),
+                                              Testing::withKey(makePath(className), "InstanceID", nullValue),
+                                              Testing::withKey(makePath(className), "InstanceID", nullString)};
+  };
+  for (const CMPIObjectPath* const source : sources(settingClass())) {
+    EXPECT_EQ(associated(source), (Strings{"BMC:eth1:" + GetParam().kindWord})) << "the empty text is in every text";
+  }
+  for (const CMPIObjectPath* const source : sources(Classes::sequence)) {
+    EXPECT_EQ(associated(source), Strings{});
+  }
+}
+
+TEST_P(OrderedMemberNavigationTest, AFarInstanceWithoutReadableIdentifierIsSkipped) {
+  const CMPIData nullValue = {CMPI_string, CMPI_goodValue | CMPI_nullValue, {}};
+  const CMPIData nullString = {CMPI_string, CMPI_goodValue, {}};
+  CMPIData wrongType = {CMPI_uint16, CMPI_goodValue, {}};
+  wrongType.value.uint16 = 7;
+  add(Classes::sequence, Strings{"BMC:eth0:" + GetParam().kindWord});
+  add(settingClass(), Strings{"BMC:eth0"});
+  for (const CMPIData& identifier : {nullValue, nullString, wrongType}) {
+    faults.onNewInstance = [&](const std::string&, int, CMPIInstance* instance) {
+      Testing::withProperty(instance, "InstanceID", identifier);
+    };
+    EXPECT_EQ(sequencesOf(""), Strings{});
+    EXPECT_EQ(settingsOf("BMC:eth0:" + GetParam().kindWord), Strings{});
+  }
+}
+
+// The word that each operation looks for. Of the eight, one asks for the other kind's word.
+INSTANTIATE_TEST_SUITE_P(
+    Eight, OrderedMemberNavigationTest,
+    ::testing::Values(Parameter{Classes::staticOrderedMember, Navigation::Associators, "static"},
+                      Parameter{Classes::staticOrderedMember, Navigation::AssociatorNames, "static"},
+                      Parameter{Classes::staticOrderedMember, Navigation::References, "static"},
+                      Parameter{Classes::staticOrderedMember, Navigation::ReferenceNames, "static"},
+                      Parameter{Classes::dhcpOrderedMember, Navigation::Associators, "dhcp"},
+                      Parameter{Classes::dhcpOrderedMember, Navigation::AssociatorNames, "dhcp"},
+                      Parameter{Classes::dhcpOrderedMember, Navigation::References, "dhcp"},
+                      Parameter{Classes::dhcpOrderedMember, Navigation::ReferenceNames, "static"}),
+    [](const auto& parameter) { return parameter.param.className + ("_" + nameOf(parameter.param.navigation)); });
+
+}  // namespace
