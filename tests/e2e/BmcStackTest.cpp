@@ -19,15 +19,13 @@ using Personality = IpmiFixture::SimulatedBmc::Personality;
 using testing::AllOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
-using testing::StartsWith;
 
-constexpr auto operationTimeout = 2s;
+constexpr std::chrono::seconds operationTimeout = 2s;
 // What starting wbemcli and carrying its request takes on a machine that is busy with other tests.
 constexpr auto margin = 3s;
 
 std::string sectionFor(const QV::BackEndSettings& settings) {
-  std::string text = "[processor]\nbackend = ipmi\n[ipmi]\noperation_timeout = " +
-                     std::to_string(std::chrono::seconds(operationTimeout).count()) + "\n";
+  std::string text = "[processor]\nbackend = ipmi\n[ipmi]\n";
   for (const auto& [key, value] : settings) text += key + " = " + value + '\n';
   return text;
 }
@@ -43,7 +41,10 @@ class BmcStack : public testing::Test {
     startObjectManager(bmc_->settings());
   }
 
-  void startObjectManager(const QV::BackEndSettings& settings) { stack_.emplace(sectionFor(settings)); }
+  void startObjectManager(QV::BackEndSettings settings) {
+    settings.try_emplace("operation_timeout", std::to_string(operationTimeout.count()));
+    stack_.emplace(sectionFor(settings));
+  }
 
   // A read and a write end in time, with the reason; and others are served meanwhile and afterwards.
   void expectFailure(const std::string& reason) const {
@@ -143,13 +144,30 @@ TEST_F(BmcStack, OutlivesABmcThatStalls) {
 }
 
 TEST_F(BmcStack, ServesOthersWhileABmcStalls) {
-  start();
+  bmc_.emplace();
+  QV::BackEndSettings settings = bmc_->settings();
+  settings["operation_timeout"] = "4";
+  startObjectManager(settings);
   bmc_->halt();
   Process waiting({"wbemcli", "ei", stack_->url("YRNx_MgmtHwComputerSystem")});
   expectServing();
+  EXPECT_TRUE(waiting.isRunning());
   EXPECT_NE(waiting.wait(), 0);
   EXPECT_THAT(waiting.errors(), HasSubstr("127.0.0.1:" + std::to_string(bmc_->port())));
   bmc_->resume();
+}
+
+TEST_F(BmcStack, SaysInTheLogThatTheOutcomeOfAChangeIsUnknown) {
+  start();
+  bmc_->hook("set", "kill -STOP $SIMULATOR");
+  const auto begin = std::chrono::steady_clock::now();
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  EXPECT_LT(std::chrono::steady_clock::now() - begin, 2 * operationTimeout + margin);
+  EXPECT_THAT(stack_->log(), AllOf(HasSubstr("192.0.2.77"), HasSubstr("unknown")));
+  expectServing();
+  bmc_->removeHook("set");
+  bmc_->resume();
+  expectAnswering();
 }
 
 TEST_F(BmcStack, OutlivesABmcThatEndsAndStartsAgain) {
