@@ -13,7 +13,6 @@ using testing::Contains;
 using testing::ElementsAre;
 using testing::EndsWith;
 using testing::HasSubstr;
-using testing::IsEmpty;
 
 class CompositeLog : public testing::Test {
  protected:
@@ -75,9 +74,9 @@ TEST_F(CompositeLog, NamesThePartThatFailsAtLevel6000) {
 TEST_F(CompositeLog, ShowsLineFeedsOfAClientAsEscapes) {
   const CompositeStack stack(processor(), 6000);
   stack.modify(endpoint("eth0"), "IPv4Address=1\n2026 6000 Forged forged (forged:1): line");
-  for (const std::string& line : linesOf(stack.log()))
-    EXPECT_THAT(line, testing::Not(HasSubstr("2026 6000 Forged forged (forged:1): line'\n")));
   EXPECT_THAT(having(stack.log(), "Forged"), Contains(HasSubstr("'1\\n2026 6000 Forged")));
+  for (const std::string& line : linesOf(stack.log()))
+    EXPECT_THAT(line, testing::ContainsRegex("^20[0-9-]+T[0-9:.]+Z "));
 }
 
 }  // namespace

@@ -105,9 +105,25 @@ TEST_F(RawRequest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
   EXPECT_EQ(contentOf(directory_.path() / "processor.json"), before);
 }
 
-TEST_F(RawRequest, WithAnUndeclaredPropertyIsAnswered) {
-  modifyStatic("eth0", property("Undeclared", "1"));
+TEST_F(RawRequest, WithAnUndeclaredPropertyIsRefusedWhole) {
+  EXPECT_THAT(modifyStatic("eth0", property("IPv4Address", "192.0.2.77") + property("Undeclared", "1")),
+              AllOf(HasSubstr("<ERROR CODE=\"12\""), HasSubstr("Undeclared")));
   EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+}
+
+TEST_F(RawRequest, WithoutAUsableValueChangesNothing) {
+  stack_.names("ein", "YRNx_MgmtHwComputerSystem");
+  const std::string before = contentOf(directory_.path() / "processor.json");
+  for (const std::string& value :
+       {std::string("<PROPERTY NAME=\"IPv4Address\" TYPE=\"string\"></PROPERTY>"), property("IPv4Address", ""),
+        std::string("<PROPERTY NAME=\"IPv4Address\" TYPE=\"uint16\"><VALUE>7</VALUE></PROPERTY>"),
+        std::string("<PROPERTY.ARRAY NAME=\"IPv4Address\" TYPE=\"string\"><VALUE.ARRAY><VALUE>192.0.2.77</VALUE>"
+                    "</VALUE.ARRAY></PROPERTY.ARRAY>"),
+        property("IPv4Address", std::string(100'000, '1')), property("IPv4Address", "192.0.2.77&#x202e;")}) {
+    modifyStatic("eth0", value);
+    EXPECT_EQ(contentOf(directory_.path() / "processor.json"), before) << value.substr(0, 100);
+    EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  }
 }
 
 TEST_F(CompositeServer, DoesNotStartWithoutTheLibraryOfAProvider) {

@@ -1,26 +1,19 @@
 // The product as it leaves the build: what the library exports and needs, the tools, and the demonstration.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <unistd.h>
 
 #include <filesystem>
-#include <fstream>
-#include <map>
 #include <set>
 #include <sstream>
 
 #include "tests/e2e/support/CompositeStack.h"
-#include "tests/e2e/support/Poll.h"
 
 namespace {
 
 using namespace Testing;
 using testing::AllOf;
 using testing::ContainsRegex;
-using testing::ElementsAre;
 using testing::HasSubstr;
-using testing::IsEmpty;
-using testing::MatchesRegex;
 using testing::Not;
 using testing::SizeIs;
 using testing::StartsWith;
