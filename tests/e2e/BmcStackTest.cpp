@@ -47,7 +47,8 @@ class BmcStack : public testing::Test {
     stack_.emplace(sectionFor(settings));
   }
 
-  // A read and a write end in time, with the reason; and others are served meanwhile and afterwards.
+  // A read ends in time with an error that holds the reason, which the log holds too; other requests are served after
+  // it.
   void expectFailure(const std::string& reason) const {
     const auto begin = std::chrono::steady_clock::now();
     const std::string read = stack_->failure("ei", "YRNx_MgmtHwIPProtocolEndPoint");

@@ -153,6 +153,8 @@ TEST_F(CompositeAssociation, AnswersThroughEveryAssociationWhereNoneIsNamed) {
     SCOPED_TRACE(source);
     EXPECT_THAT(stack_.names("ain", source), UnorderedElementsAreArray(far));
     EXPECT_THAT(stack_.instances("ai", source), SizeIs(far.size()));
+    EXPECT_THAT(stack_.names("rin", source), SizeIs(far.size()));
+    EXPECT_THAT(stack_.instances("ri", source), SizeIs(far.size()));
   }
 }
 
