@@ -1,0 +1,230 @@
+// The whole product on a BMC that answers real IPMI over RMCP+; ipmitool is the witness of what the BMC itself holds.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <chrono>
+#include <future>
+#include <optional>
+
+#include "tests/agent/ipmi/PrivateFile.h"
+#include "tests/agent/ipmi/SimulatedBmc.h"
+#include "tests/e2e/support/CompositeObjects.h"
+#include "tests/e2e/support/CompositeStack.h"
+
+namespace {
+
+using namespace Testing;
+using namespace std::chrono_literals;
+using IpmiFixture::SimulatedBmc;
+using Personality = IpmiFixture::SimulatedBmc::Personality;
+using testing::AllOf;
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+constexpr std::chrono::seconds operationTimeout = 2s;
+// What starting wbemcli and carrying its request takes on a machine that is busy with other tests.
+constexpr auto margin = 3s;
+
+std::string sectionFor(const QV::BackEndSettings& settings) {
+  std::string text = "[processor]\nbackend = ipmi\n[ipmi]\n";
+  for (const auto& [key, value] : settings) text += key + " = " + value + '\n';
+  return text;
+}
+
+std::string witnessedAddress(const SimulatedBmc& bmc) {
+  return bmc.witness("IP Address") + '/' + bmc.witness("Subnet Mask") + ' ' + bmc.witness("IP Address Source");
+}
+
+class BmcStack : public testing::Test {
+ protected:
+  void start(Personality personality = Personality::AppliesOnCommit) {
+    bmc_.emplace(personality);
+    startObjectManager(bmc_->settings());
+  }
+
+  void startObjectManager(QV::BackEndSettings settings) {
+    settings.try_emplace("operation_timeout", std::to_string(operationTimeout.count()));
+    stack_.emplace(sectionFor(settings));
+  }
+
+  // A read ends in time with an error that holds the reason, which the log holds too; other requests are served after
+  // it.
+  void expectFailure(const std::string& reason) const {
+    const auto begin = std::chrono::steady_clock::now();
+    const std::string read = stack_->failure("ei", "YRNx_MgmtHwIPProtocolEndPoint");
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, operationTimeout + margin);
+    EXPECT_THAT(read, AllOf(HasSubstr("(1) CIM_ERR_FAILED"), HasSubstr(reason)));
+    EXPECT_THAT(stack_->log(), HasSubstr(reason));
+    expectServing();
+  }
+
+  void expectServing() const {
+    EXPECT_EQ(stack_->wbemcli("ecn", "").status, 0);
+    EXPECT_THAT(stack_->failure("ei", "YRNx_MgmtHwNothing"), HasSubstr("CIM_ERR_INVALID_CLASS"));
+  }
+
+  void expectAnswering() const {
+    EXPECT_EQ(stack_->get(endpoint("lan1")).at("IPv4Address"), quoted(bmc_->witness("IP Address")));
+  }
+
+  std::optional<SimulatedBmc> bmc_;
+  std::optional<CompositeStack> stack_;
+};
+
+TEST_F(BmcStack, ShowsWhatTheBmcHolds) {
+  start();
+  EXPECT_EQ(stack_->names("ein", "YRNx_MgmtHwIPProtocolEndPoint"), std::vector{endpoint("lan1")});
+  const auto shown = stack_->get(endpoint("lan1"));
+  EXPECT_EQ(shown.at("IPv4Address"), quoted(bmc_->witness("IP Address")));
+  EXPECT_EQ(shown.at("IPv4Address"), quoted("192.0.2.10"));
+  EXPECT_EQ(shown.at("SubnetMask"), quoted(bmc_->witness("Subnet Mask")));
+  EXPECT_EQ(shown.at("AddressOrigin"), "4");
+  EXPECT_EQ(bmc_->witness("IP Address Source"), "DHCP Address");
+  EXPECT_EQ(stack_->get(remoteAccessPoint("Gateway:lan1")).at("AccessInfo"),
+            quoted(bmc_->witness("Default Gateway IP")));
+  EXPECT_THAT(stack_->names("ain -ac YRNx_MgmtHwClientAccess", endpoint("lan1")),
+              ElementsAre(remoteAccessPoint("Gateway:lan1")));
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.10/255.255.255.0 DHCP Address");
+}
+
+TEST_F(BmcStack, ShowsWhatOthersChange) {
+  start();
+  bmc_->ipmitool({"lan", "set", "1", "ipsrc", "static"});
+  bmc_->ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.33"});
+  const auto shown = stack_->get(endpoint("lan1"));
+  EXPECT_EQ(shown.at("IPv4Address"), quoted("192.0.2.33"));
+  EXPECT_EQ(shown.at("AddressOrigin"), "3");
+}
+
+TEST_F(BmcStack, ChangesAnEndpointOnABmcThatAppliesOnCommit) {
+  start();
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77,SubnetMask=255.255.255.128");
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.77/255.255.255.128 Static Address");
+  expectAnswering();
+}
+
+TEST_F(BmcStack, ChangesStaticSettingsOnABmcThatAppliesOnCommit) {
+  start();
+  stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.78");
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.78/255.255.255.0 Static Address");
+}
+
+TEST_F(BmcStack, ChangesAnEndpointOnABmcThatAppliesAtOnce) {
+  start(Personality::AppliesAtOnce);
+  EXPECT_EQ(bmc_->witness("IP Address"), "0.0.0.0");
+  stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.77,SubnetMask=255.255.255.128");
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.77/255.255.255.128 Static Address");
+  expectAnswering();
+}
+
+TEST_F(BmcStack, IsChangedByTwoObjectManagersOneAfterTheOther) {
+  start();
+  const CompositeStack other(sectionFor(bmc_->settings()));
+  auto first = std::async(std::launch::async, [&] { stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.77"); });
+  other.modify(staticSetting("lan1"), "IPv4Address=192.0.2.78");
+  first.get();
+  // One of them may have found the BMC busy and said so; the BMC holds what another has written whole.
+  const bool firstDone = stack_->log().empty();
+  const bool otherDone = other.log().empty();
+  EXPECT_TRUE(firstDone || otherDone) << stack_->log() << other.log();
+  const std::string address = bmc_->witness("IP Address");
+  if (firstDone != otherDone)
+    EXPECT_EQ(address, firstDone ? "192.0.2.77" : "192.0.2.78");
+  else
+    EXPECT_THAT(address, testing::AnyOf("192.0.2.77", "192.0.2.78"));
+  stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.79");
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.79/255.255.255.0 Static Address");
+}
+
+TEST_F(BmcStack, SendsNothingOfAChangeThatNoInterfaceCanHave) {
+  start();
+  stack_->modify(endpoint("lan1"), "IPv4Address=127.0.0.1");
+  stack_->modify(endpoint("lan1"), "SubnetMask=255.0.255.0");
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.10/255.255.255.0 DHCP Address");
+  EXPECT_THAT(stack_->log(), AllOf(HasSubstr("127.0.0.1"), HasSubstr("255.0.255.0")));
+}
+
+TEST_F(BmcStack, SaysInTheLogThatTheBmcRefusedAChange) {
+  start();
+  bmc_->hook("check", "exit 1");
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.10/255.255.255.0 DHCP Address");
+  EXPECT_THAT(stack_->log(), AllOf(HasSubstr(" 6000 "), HasSubstr("192.0.2.77"), HasSubstr("lan1")));
+  bmc_->removeHook("check");
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  EXPECT_EQ(bmc_->witness("IP Address"), "192.0.2.77");
+}
+
+TEST_F(BmcStack, OutlivesABmcThatStalls) {
+  start();
+  expectAnswering();
+  bmc_->halt();
+  expectFailure("127.0.0.1:" + std::to_string(bmc_->port()));
+  bmc_->resume();
+  expectAnswering();
+}
+
+TEST_F(BmcStack, ServesOthersWhileABmcStalls) {
+  bmc_.emplace();
+  QV::BackEndSettings settings = bmc_->settings();
+  settings["operation_timeout"] = "4";
+  startObjectManager(settings);
+  bmc_->halt();
+  Process waiting({"wbemcli", "ei", stack_->url("YRNx_MgmtHwComputerSystem")});
+  expectServing();
+  EXPECT_TRUE(waiting.isRunning());
+  EXPECT_NE(waiting.wait(), 0);
+  EXPECT_THAT(waiting.errors(), HasSubstr("127.0.0.1:" + std::to_string(bmc_->port())));
+  bmc_->resume();
+}
+
+TEST_F(BmcStack, SaysInTheLogThatTheOutcomeOfAChangeIsUnknown) {
+  start();
+  bmc_->hook("set", "kill -STOP $SIMULATOR");
+  const auto begin = std::chrono::steady_clock::now();
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  EXPECT_LT(std::chrono::steady_clock::now() - begin, 2 * operationTimeout + margin);
+  EXPECT_THAT(stack_->log(), AllOf(HasSubstr("192.0.2.77"), HasSubstr("unknown")));
+  expectServing();
+  bmc_->removeHook("set");
+  bmc_->resume();
+  expectAnswering();
+}
+
+TEST_F(BmcStack, OutlivesABmcThatEndsAndStartsAgain) {
+  start();
+  expectAnswering();
+  bmc_->kill();
+  expectFailure("127.0.0.1:" + std::to_string(bmc_->port()));
+  bmc_->restart();
+  expectAnswering();
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  EXPECT_EQ(bmc_->witness("IP Address"), "192.0.2.77");
+}
+
+TEST_F(BmcStack, SaysThatThePasswordIsRefused) {
+  bmc_.emplace();
+  const Testing::TemporaryDirectory secrets;
+  QV::BackEndSettings settings = bmc_->settings();
+  settings["password_file"] = (secrets.path() / "password").string();
+  IpmiFixture::writePrivateFile(settings["password_file"], "wrong\n");
+  startObjectManager(settings);
+  expectFailure("password");
+}
+
+TEST_F(BmcStack, SaysThatNobodyAnswersAtAPort) {
+  bmc_.emplace();
+  startObjectManager(bmc_->settings());
+  bmc_->kill();
+  expectFailure("127.0.0.1:" + std::to_string(bmc_->port()));
+}
+
+TEST_F(BmcStack, SaysWhatIsWrongWithItsSettings) {
+  bmc_.emplace();
+  QV::BackEndSettings settings = bmc_->settings();
+  settings["cipher_suite"] = "0";
+  startObjectManager(settings);
+  expectFailure("cipher_suite");
+}
+
+}  // namespace

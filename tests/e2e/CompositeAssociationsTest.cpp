@@ -1,0 +1,325 @@
+// The six association classes of a simulated management processor in its factory state, walked with wbemcli from each
+// end of each.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <set>
+
+#include "tests/e2e/support/CompositeObjects.h"
+#include "tests/e2e/support/CompositeStack.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::Contains;
+using testing::Each;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsEmpty;
+using testing::Key;
+using testing::Not;
+using testing::SizeIs;
+using testing::StartsWith;
+using testing::UnorderedElementsAreArray;
+
+using Objects = std::vector<std::string>;
+
+constexpr const char* hosted = "YRNx_MgmtHwIPHostedAccessPoint";
+constexpr const char* remoteHosted = "YRNx_MgmtHwIPRemoteHostedAccessPoint";
+constexpr const char* clientAccess = "YRNx_MgmtHwClientAccess";
+constexpr const char* elementSetting = "YRNx_MgmtHwIPElementSettingData";
+constexpr const char* staticMember = "YRNx_MgmtHwStaticIPOrderedMemberOfCollection";
+constexpr const char* dhcpMember = "YRNx_MgmtHwDHCPOrderedMemberOfCollection";
+
+Objects systems() { return {computerSystem()}; }
+Objects endpoints() { return {endpoint("eth0"), endpoint("eth1")}; }
+Objects accessPoints() {
+  return {remoteAccessPoint("Gateway:eth0"), remoteAccessPoint("DNS:1"), remoteAccessPoint("DNS:2")};
+}
+Objects sequences() {
+  return {sequence("eth0:static"), sequence("eth0:dhcp"), sequence("eth1:static"), sequence("eth1:dhcp")};
+}
+
+// What one end sees through one association: the far ends that Associators, AssociatorNames and References answer, and
+// those that ReferenceNames answers, which are the same except where said otherwise.
+struct View {
+  const char* association;
+  std::string source;
+  Objects far;
+  Objects referenceNames = far;
+};
+
+std::vector<View> views() {
+  std::vector<View> all = {
+      {hosted, computerSystem(), endpoints()},
+      {remoteHosted, computerSystem(), accessPoints()},
+      // A setting finds the sequence of its own kind.
+      {staticMember, staticSetting("eth0"), {sequence("eth0:static")}},
+      {staticMember, staticSetting("eth1"), {sequence("eth1:static")}},
+      // ReferenceNames of the DHCP association answers a setting the static sequence, its other operations the DHCP
+      // one.
+      {dhcpMember, dhcpSetting("eth0"), {sequence("eth0:dhcp")}, {sequence("eth0:static")}},
+      {dhcpMember, dhcpSetting("eth1"), {sequence("eth1:dhcp")}, {sequence("eth1:static")}},
+  };
+  for (const std::string& asked : endpoints()) {
+    all.push_back({hosted, asked, systems()});
+    all.push_back({clientAccess, asked, accessPoints()});
+    all.push_back({elementSetting, asked, sequences()});
+  }
+  for (const std::string& asked : accessPoints()) {
+    all.push_back({remoteHosted, asked, systems()});
+    all.push_back({clientAccess, asked, endpoints()});
+  }
+  // A sequence answers the settings of its interface, of either kind.
+  for (const char* interface : {"eth0", "eth1"}) {
+    for (const char* kind : {"static", "dhcp"}) {
+      const std::string asked = sequence(std::string(interface) + ':' + kind);
+      all.push_back({elementSetting, asked, endpoints()});
+      all.push_back({staticMember, asked, {staticSetting(interface)}});
+      all.push_back({dhcpMember, asked, {dhcpSetting(interface)}});
+    }
+  }
+  return all;
+}
+
+// A reference as wbemcli prints it, without host and namespace: "managed.example/root/cimv2Class.keys".
+std::string referenceOf(const std::string& printed) {
+  const std::string nameSpace = "root/cimv2";
+  return printed.substr(printed.find(nameSpace) + nameSpace.size());
+}
+
+// The ends of an association, by the names of its references: "Class.First=a,Second=b".
+using Ends = std::map<std::string, std::string>;
+
+class CompositeAssociation : public testing::Test {
+ protected:
+  // From the values of an instance: those that hold a path.
+  static Ends endsOf(const Printed& instance) {
+    Ends ends;
+    for (const auto& [name, value] : instance.values)
+      if (value.find("root/cimv2") != std::string::npos) ends[name] = referenceOf(value);
+    return ends;
+  }
+
+  // "Class.First=host/root/cimv2Class.keys,Second=host/root/cimv2Class.keys" as a client passes it on to wbemcli, which
+  // does not take the references in the form in which it prints them.
+  static std::string asArgument(const std::string& printed) {
+    std::string argument = printed;
+    for (std::size_t at; (at = argument.find("managed.example/root/cimv2")) != std::string::npos;)
+      argument.erase(at, std::string("managed.example/root/cimv2").size());
+    return argument;
+  }
+
+  static std::string scoped(const char* operation, const char* option, const std::string& className) {
+    return std::string(operation) + ' ' + option + ' ' + className;
+  }
+
+  TemporaryDirectory directory_;
+  CompositeStack stack_{simulatedProcessor(directory_.path() / "processor.json")};
+};
+
+TEST_F(CompositeAssociation, AnswersTheFarEndsOfEachEnd) {
+  for (const View& view : views()) {
+    SCOPED_TRACE(std::string(view.association) + " from " + view.source);
+    EXPECT_EQ(stack_.names(scoped("ain", "-ac", view.association), view.source), view.far);
+    Objects found;
+    for (const Printed& instance : stack_.instances(scoped("ai", "-ac", view.association), view.source))
+      found.push_back(objectOf(instance.path));
+    EXPECT_EQ(found, view.far);
+  }
+}
+
+TEST_F(CompositeAssociation, NamesTheManagedSystemAsTheHostOfWhatItAnswers) {
+  for (const View& view : views())
+    EXPECT_THAT(stack_.paths(scoped("ain", "-ac", view.association), view.source),
+                AllOf(Not(IsEmpty()), Each(StartsWith("managed.example/root/cimv2:"))));
+}
+
+TEST_F(CompositeAssociation, AnswersWholeInstances) {
+  for (const Printed& found : stack_.instances("ai", computerSystem()))
+    EXPECT_EQ(found.values, stack_.get(objectOf(found.path)));
+  for (const Printed& found : stack_.instances("ai", sequence("eth1:dhcp")))
+    EXPECT_EQ(found.values, stack_.get(objectOf(found.path)));
+}
+
+TEST_F(CompositeAssociation, AnswersThroughEveryAssociationWhereNoneIsNamed) {
+  std::map<std::string, Objects> everything;
+  for (const View& view : views()) {
+    Objects& far = everything[view.source];
+    far.insert(far.end(), view.far.begin(), view.far.end());
+  }
+  for (const auto& [source, far] : everything) {
+    SCOPED_TRACE(source);
+    EXPECT_THAT(stack_.names("ain", source), UnorderedElementsAreArray(far));
+    EXPECT_THAT(stack_.instances("ai", source), SizeIs(far.size()));
+    EXPECT_THAT(stack_.names("rin", source), SizeIs(far.size()));
+    EXPECT_THAT(stack_.instances("ri", source), SizeIs(far.size()));
+  }
+}
+
+TEST_F(CompositeAssociation, ReferencesBothEnds) {
+  for (const View& view : views()) {
+    SCOPED_TRACE(std::string(view.association) + " from " + view.source);
+    const auto found = stack_.instances(scoped("ri", "-arc", view.association), view.source);
+    ASSERT_THAT(found, SizeIs(view.far.size()));
+    const bool members = view.association == staticMember || view.association == dhcpMember;
+    for (std::size_t i = 0; i < found.size(); ++i) {
+      const Ends ends = endsOf(found[i]);
+      ASSERT_THAT(ends, ElementsAre(Key(members ? "GroupComponent" : "Antecedent"),
+                                    Key(members ? "PartComponent" : "Dependent")));
+      const std::set<std::string> both = {ends.begin()->second, ends.rbegin()->second};
+      EXPECT_EQ(both, (std::set<std::string>{view.source, view.far[i]}));
+    }
+  }
+}
+
+TEST_F(CompositeAssociation, ReferencesEndsByTheNamesOfTheirRoles) {
+  const auto ends = [&](const char* association, const std::string& source) {
+    return endsOf(stack_.instances(scoped("ri", "-arc", association), source).front());
+  };
+  EXPECT_EQ(ends(hosted, endpoint("eth1")), (Ends{{"Antecedent", computerSystem()}, {"Dependent", endpoint("eth1")}}));
+  EXPECT_EQ(ends(remoteHosted, remoteAccessPoint("DNS:1")),
+            (Ends{{"Antecedent", computerSystem()}, {"Dependent", remoteAccessPoint("DNS:1")}}));
+  EXPECT_EQ(ends(clientAccess, endpoint("eth1")),
+            (Ends{{"Antecedent", remoteAccessPoint("Gateway:eth0")}, {"Dependent", endpoint("eth1")}}));
+  EXPECT_EQ(ends(elementSetting, endpoint("eth1")),
+            (Ends{{"Antecedent", sequence("eth0:static")}, {"Dependent", endpoint("eth1")}}));
+  EXPECT_EQ(ends(staticMember, sequence("eth1:dhcp")),
+            (Ends{{"GroupComponent", sequence("eth1:dhcp")}, {"PartComponent", staticSetting("eth1")}}));
+  EXPECT_EQ(ends(dhcpMember, dhcpSetting("eth1")),
+            (Ends{{"GroupComponent", sequence("eth1:dhcp")}, {"PartComponent", dhcpSetting("eth1")}}));
+}
+
+TEST_F(CompositeAssociation, NamesItsReferencesByBothEnds) {
+  for (const View& view : views()) {
+    SCOPED_TRACE(std::string(view.association) + " from " + view.source);
+    const Objects names = stack_.names(scoped("rin", "-arc", view.association), view.source);
+    ASSERT_THAT(names, SizeIs(view.referenceNames.size()));
+    for (std::size_t i = 0; i < names.size(); ++i) {
+      EXPECT_THAT(names[i], StartsWith(std::string(view.association) + '.'));
+      // The keys of this one are references that its References does not set, so its names have none.
+      if (view.association == elementSetting) continue;
+      EXPECT_THAT(names[i], AllOf(HasSubstr(view.source), HasSubstr(view.referenceNames[i])));
+    }
+  }
+}
+
+// An association class and the pairs that its enumeration answers, in order.
+struct Enumeration {
+  const char* association;
+  const char* first;
+  const char* second;
+  std::vector<std::pair<std::string, std::string>> pairs;
+};
+
+void PrintTo(const Enumeration& row, std::ostream* stream) { *stream << row.association; }
+
+std::vector<std::pair<std::string, std::string>> product(const Objects& outer, const Objects& inner) {
+  std::vector<std::pair<std::string, std::string>> pairs;
+  for (const std::string& first : outer)
+    for (const std::string& second : inner) pairs.emplace_back(first, second);
+  return pairs;
+}
+
+std::vector<std::pair<std::string, std::string>> swapped(std::vector<std::pair<std::string, std::string>> pairs) {
+  for (auto& [first, second] : pairs) std::swap(first, second);
+  return pairs;
+}
+
+// Every setting of a kind is paired with every sequence of that kind, whichever interface they belong to.
+std::vector<Enumeration> enumerations() {
+  return {
+      {hosted, "Antecedent", "Dependent", product(systems(), endpoints())},
+      {remoteHosted, "Antecedent", "Dependent", product(systems(), accessPoints())},
+      {clientAccess, "Antecedent", "Dependent", swapped(product(endpoints(), accessPoints()))},
+      {elementSetting, "ManagedElement", "SettingData", product(endpoints(), sequences())},
+      {staticMember, "GroupComponent", "PartComponent",
+       swapped(product({staticSetting("eth0"), staticSetting("eth1")},
+                       {sequence("eth0:static"), sequence("eth1:static")}))},
+      {dhcpMember, "GroupComponent", "PartComponent",
+       swapped(product({dhcpSetting("eth0"), dhcpSetting("eth1")}, {sequence("eth0:dhcp"), sequence("eth1:dhcp")}))},
+  };
+}
+
+class CompositeAssociationClass : public CompositeAssociation, public testing::WithParamInterface<Enumeration> {
+ protected:
+  static std::string pathOf(const std::pair<std::string, std::string>& ends) {
+    const Enumeration& row = GetParam();
+    return std::string(row.association) + '.' + row.first + "=managed.example/root/cimv2" + ends.first + ',' +
+           row.second + "=managed.example/root/cimv2" + ends.second;
+  }
+
+  static void expectEnds(const Printed& instance, const std::pair<std::string, std::string>& ends) {
+    EXPECT_EQ(endsOf(instance), (Ends{{GetParam().first, ends.first}, {GetParam().second, ends.second}}));
+  }
+};
+
+TEST_P(CompositeAssociationClass, EnumeratesItsPairs) {
+  const auto found = stack_.instances("ei", GetParam().association);
+  const auto& pairs = GetParam().pairs;
+  ASSERT_THAT(found, SizeIs(pairs.size()));
+  for (std::size_t i = 0; i < pairs.size(); ++i) {
+    EXPECT_EQ(objectOf(found[i].path), pathOf(pairs[i]));
+    expectEnds(found[i], pairs[i]);
+  }
+}
+
+TEST_P(CompositeAssociationClass, EnumeratesItsNames) {
+  Objects expected;
+  for (const auto& pair : GetParam().pairs) expected.push_back(pathOf(pair));
+  EXPECT_EQ(stack_.names("ein", GetParam().association), expected);
+}
+
+TEST_P(CompositeAssociationClass, GetsEachInstanceByTheNameThatItEnumerated) {
+  const Objects names = stack_.names("ein", GetParam().association);
+  ASSERT_THAT(names, SizeIs(GetParam().pairs.size()));
+  for (std::size_t i = 0; i < names.size(); ++i) {
+    const auto found = stack_.instances("gi", asArgument(names[i]));
+    ASSERT_THAT(found, SizeIs(1));
+    expectEnds(found.front(), GetParam().pairs[i]);
+  }
+}
+
+TEST_P(CompositeAssociationClass, DoesNotFindAPairThatIsNone) {
+  std::string strange = asArgument(stack_.names("ein", GetParam().association).front());
+  strange.replace(strange.find("\"BMC"), 4, "\"Strange");
+  EXPECT_THAT(stack_.failure("gi", strange), HasSubstr("(6) CIM_ERR_NOT_FOUND"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Every, CompositeAssociationClass, testing::ValuesIn(enumerations()),
+                         [](const auto& row) { return row.param.association; });
+
+TEST_F(CompositeAssociation, OfSequencesToEndpointsSaysHowTheyRelate) {
+  for (const Printed& instance : stack_.instances("ei", elementSetting)) {
+    EXPECT_EQ(instance.values.at("IsDefault"), "2");
+    EXPECT_EQ(instance.values.at("IsCurrent"), "2");
+    EXPECT_EQ(instance.values.at("IsNext"), "3");
+  }
+  for (const Printed& instance : stack_.instances(scoped("ri", "-arc", elementSetting), endpoint("eth0")))
+    EXPECT_THAT(instance.values, Not(Contains(Key("IsNext"))));
+}
+
+TEST_F(CompositeAssociation, AnswersForItsSuperclass) {
+  EXPECT_THAT(stack_.names("ein", "CIM_HostedAccessPoint"), SizeIs(5));
+  EXPECT_THAT(stack_.names("ain -ac CIM_HostedAccessPoint", computerSystem()), SizeIs(5));
+  EXPECT_THAT(stack_.names("ain -ac CIM_Component", sequence("eth0:dhcp")),
+              ElementsAre(staticSetting("eth0"), dhcpSetting("eth0")));
+}
+
+TEST_F(CompositeAssociation, IsFoundInAnyLetterCase) {
+  EXPECT_EQ(stack_.names("ain -ac yrnx_mgmthwiphostedaccesspoint", endpoint("eth0")), systems());
+}
+
+TEST_F(CompositeAssociation, AnswersNothingForAnObjectThatHasNoPartInIt) {
+  EXPECT_THAT(stack_.names(scoped("ain", "-ac", staticMember), endpoint("eth0")), IsEmpty());
+  EXPECT_THAT(stack_.names(scoped("rin", "-arc", hosted), dhcpSetting("eth0")), IsEmpty());
+  EXPECT_THAT(stack_.names(scoped("ain", "-ac", staticMember), staticSetting("eth9")), IsEmpty());
+}
+
+TEST_F(CompositeAssociation, OfAnUnknownClassIsAnError) {
+  EXPECT_THAT(stack_.failure("ain -ac YRNx_MgmtHwNothing", endpoint("eth0")),
+              HasSubstr("(4) CIM_ERR_INVALID_PARAMETER: no association class \"YRNx_MgmtHwNothing\""));
+}
+
+}  // namespace

@@ -1,0 +1,223 @@
+// The six composite classes of a simulated management processor in its factory state, read with wbemcli.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "tests/e2e/support/CompositeObjects.h"
+#include "tests/e2e/support/CompositeStack.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::IsSupersetOf;
+using testing::Not;
+using testing::SizeIs;
+
+using Values = std::map<std::string, std::string>;
+
+// A class, the objects that it has, and what each of them shows. Values that the schema gives by default show too.
+struct ClassCase {
+  std::string className;
+  std::vector<std::string> objects;
+  std::vector<Values> values;
+};
+
+void PrintTo(const ClassCase& row, std::ostream* stream) { *stream << row.className; }
+
+Values endpointValues(const std::string& name, const Values& more) {
+  Values values = {{"Name", quoted(name)},
+                   {"ElementName", quoted("BMC IP endpoint " + name)},
+                   {"SystemCreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
+                   {"SystemName", R"("BMC")"},
+                   {"CreationClassName", R"("YRNx_MgmtHwIPProtocolEndPoint")"},
+                   {"NameFormat", R"("Interface name")"},
+                   {"SubnetMask", R"("255.255.255.0")"},
+                   {"AddressType", "1"},
+                   {"EnabledState", "2"},
+                   {"RequestedState", "12"},
+                   {"EnabledDefault", "2"}};
+  values.insert(more.begin(), more.end());
+  return values;
+}
+
+Values accessPointValues(const std::string& name, const std::string& info, const std::string& context,
+                         const std::string& format) {
+  return {{"Name", quoted(name)},       {"SystemCreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
+          {"SystemName", R"("BMC")"},   {"CreationClassName", R"("YRNx_RemoteAccessPoint")"},
+          {"AccessInfo", quoted(info)}, {"AccessContext", context},
+          {"InfoFormat", format},       {"EnabledState", "5"},
+          {"RequestedState", "12"},     {"EnabledDefault", "2"}};
+}
+
+Values settingValues(const std::string& id, const std::string& elementName, const std::string& origin) {
+  return {{"InstanceID", quoted("BMC:" + id)}, {"ElementName", quoted(elementName)}, {"AddressOrigin", origin}};
+}
+
+Values dhcpValues(const std::string& interface) {
+  Values values = settingValues(interface, "DHCP settings of " + interface, "4");
+  values["Caption"] = R"("DNS Configuration Setting")";
+  return values;
+}
+
+std::vector<ClassCase> classCases() {
+  return {
+      {"YRNx_MgmtHwComputerSystem",
+       {computerSystem()},
+       {{{"Name", R"("BMC")"},
+         {"CreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
+         {"Description", R"("Simulated management processor")"},
+         {"NameFormat", R"("Other")"},
+         {"Dedicated", "14,28"},
+         {"Index", "1"},
+         {"EnabledState", "5"},
+         {"RequestedState", "12"},
+         {"EnabledDefault", "2"}}}},
+      {"YRNx_MgmtHwIPProtocolEndPoint",
+       {endpoint("eth0"), endpoint("eth1")},
+       {endpointValues("eth0", {{"IPv4Address", R"("192.0.2.10")"},
+                                {"IPv6Address", R"("2001:db8::10")"},
+                                {"PrefixLength", "64"},
+                                {"ProtocolIFType", "4098"},
+                                {"IPVersionSupport", "3"},
+                                {"AddressOrigin", "3"}}),
+        endpointValues("eth1", {{"IPv4Address", R"("198.51.100.23")"},
+                                {"ProtocolIFType", "4096"},
+                                {"IPVersionSupport", "1"},
+                                {"AddressOrigin", "4"}})}},
+      {"YRNx_MgmtHwIPAssignmentSettingSequence",
+       {sequence("eth0:static"), sequence("eth0:dhcp"), sequence("eth1:static"), sequence("eth1:dhcp")},
+       {settingValues("eth0:static", "Static addresses of eth0", "3"),
+        settingValues("eth0:dhcp", "DHCP addresses of eth0", "4"),
+        settingValues("eth1:static", "Static addresses of eth1", "3"),
+        settingValues("eth1:dhcp", "DHCP addresses of eth1", "4")}},
+      {"YRNx_MgmtHwStaticIPAssignmentSettingData",
+       {staticSetting("eth0"), staticSetting("eth1")},
+       {settingValues("eth0", "Static settings of eth0", "3"), settingValues("eth1", "Static settings of eth1", "3")}},
+      {"YRNx_MgmtHwDHCPAssignmentSettingData",
+       {dhcpSetting("eth0"), dhcpSetting("eth1")},
+       {dhcpValues("eth0"), dhcpValues("eth1")}},
+      {"YRNx_MgmtHwRemoteServiceAccessPoint",
+       {remoteAccessPoint("Gateway:eth0"), remoteAccessPoint("DNS:1"), remoteAccessPoint("DNS:2")},
+       {accessPointValues("Gateway:eth0", "192.0.2.1", "2", "3"), accessPointValues("DNS:1", "192.0.2.53", "3", "3"),
+        accessPointValues("DNS:2", "2001:db8::53", "3", "4")}},
+  };
+}
+
+class Composite {
+ public:
+  TemporaryDirectory directory;
+  CompositeStack stack{simulatedProcessor(directory.path() / "processor.json")};
+};
+
+class CompositeClass : public testing::TestWithParam<ClassCase> {
+ protected:
+  Composite composite_;
+  const CompositeStack& stack_ = composite_.stack;
+};
+
+TEST_P(CompositeClass, EnumeratesItsInstancesWithEveryValue) {
+  const std::vector<Printed> found = stack_.instances("ei", GetParam().className);
+  ASSERT_THAT(found, SizeIs(GetParam().objects.size()));
+  for (std::size_t i = 0; i < found.size(); ++i) {
+    EXPECT_EQ(withoutHost(found[i].path), "root/cimv2:" + GetParam().objects[i]);
+    EXPECT_EQ(found[i].values, GetParam().values[i]);
+  }
+}
+
+TEST_P(CompositeClass, EnumeratesItsNamesInTheRequestsNamespace) {
+  std::vector<std::string> expected;
+  for (const std::string& object : GetParam().objects) expected.push_back("root/cimv2:" + object);
+  std::vector<std::string> found = stack_.paths("ein", GetParam().className);
+  for (std::string& path : found) path = withoutHost(path);
+  EXPECT_EQ(found, expected);
+}
+
+TEST_P(CompositeClass, GetsEachInstanceByTheNameThatItEnumerated) {
+  const std::vector<std::string> names = stack_.names("ein", GetParam().className);
+  ASSERT_THAT(names, SizeIs(GetParam().values.size()));
+  for (std::size_t i = 0; i < names.size(); ++i) EXPECT_EQ(stack_.get(names[i]), GetParam().values[i]);
+}
+
+TEST_P(CompositeClass, IsFoundInAnyLetterCase) {
+  std::string shouted = GetParam().className;
+  for (char& letter : shouted) letter = static_cast<char>(std::toupper(static_cast<unsigned char>(letter)));
+  EXPECT_EQ(stack_.names("ein", shouted), GetParam().objects);
+  EXPECT_THAT(stack_.instances("ei", shouted), SizeIs(GetParam().objects.size()));
+}
+
+TEST_P(CompositeClass, RefusesKeysThatMatchNothing) {
+  std::string strange = GetParam().objects.front();
+  strange.replace(strange.find('"'), 1, "\"strange");
+  EXPECT_THAT(stack_.failure("gi", strange), HasSubstr("(6) CIM_ERR_NOT_FOUND"));
+}
+
+TEST_P(CompositeClass, KeepsEveryPropertyThatAnEnumerationNamesInAPropertyList) {
+  const Values& all = GetParam().values.front();
+  for (const auto& [name, value] : all) {
+    const std::vector<Printed> found = stack_.instances("ei", GetParam().className, name);
+    ASSERT_THAT(found, SizeIs(GetParam().objects.size()));
+    EXPECT_THAT(found.front().names, ElementsAre(name));
+    EXPECT_EQ(found.front().values, (Values{{name, value}}));
+    EXPECT_EQ(objectOf(found.front().path), GetParam().objects.front());
+  }
+}
+
+INSTANTIATE_TEST_SUITE_P(Every, CompositeClass, testing::ValuesIn(classCases()),
+                         [](const auto& row) { return row.param.className; });
+
+class CompositeInstances : public testing::Test {
+ protected:
+  std::string namesUnder(const std::string& underlyingClass) const {
+    return stack_.wbemcli("ein", underlyingClass, {}, "root/yrnse").output;
+  }
+
+  Composite composite_;
+  const CompositeStack& stack_ = composite_.stack;
+};
+
+TEST_F(CompositeInstances, LeaveOutWhatBelongsToTheHost) {
+  // Every machine has a loopback interface, which the underlying provider tells of as the host's.
+  EXPECT_THAT(namesUnder("YRNQV_IPProtocolEndpoint"),
+              AllOf(HasSubstr(R"(SystemCreationClassName="YRNQV_ComputerSystem",SystemName="managed.example")"),
+                    HasSubstr(R"(Name="lo")")));
+  for (const char* settingClass : {"YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData"})
+    EXPECT_THAT(namesUnder(settingClass), AllOf(HasSubstr(R"("Host:lo")"), HasSubstr(R"("BMC:eth0")")));
+  EXPECT_THAT(namesUnder("YRNQV_IPAssignmentSettingData"), HasSubstr(R"("Host:lo:static")"));
+  EXPECT_THAT(namesUnder("YRNQV_IPRemoteServiceAccessPoint"),
+              HasSubstr(R"(SystemCreationClassName="YRNQV_ComputerSystem",SystemName="managed.example")"));
+
+  for (const ClassCase& row : classCases())
+    for (const std::string& name : stack_.names("ein", row.className))
+      EXPECT_THAT(name, AllOf(Not(HasSubstr("\"lo\"")), Not(HasSubstr("Host:")), Not(HasSubstr("managed.example"))));
+}
+
+TEST_F(CompositeInstances, ShowWithSeveralPropertiesWhatWasAskedInAnyLetterCase) {
+  const auto found = stack_.instances("gi", endpoint("eth0"), "ipv4address,SUBNETMASK,ElementName");
+  ASSERT_THAT(found, SizeIs(1));
+  EXPECT_EQ(found[0].values, (Values{{"IPv4Address", R"("192.0.2.10")"},
+                                     {"SubnetMask", R"("255.255.255.0")"},
+                                     {"ElementName", R"("BMC IP endpoint eth0")"}}));
+}
+
+TEST_F(CompositeInstances, AnswerForTheirSuperclasses) {
+  std::vector<std::string> accessPoints = {endpoint("eth0"), endpoint("eth1"), remoteAccessPoint("Gateway:eth0"),
+                                           remoteAccessPoint("DNS:1"), remoteAccessPoint("DNS:2")};
+  EXPECT_THAT(stack_.names("ein", "CIM_ServiceAccessPoint"), testing::UnorderedElementsAreArray(accessPoints));
+  EXPECT_THAT(stack_.instances("ei", "CIM_ServiceAccessPoint"), SizeIs(5));
+  EXPECT_THAT(stack_.names("ein", "CIM_ComputerSystem"), ElementsAre(computerSystem()));
+  EXPECT_THAT(stack_.names("ein", "CIM_SettingData"), SizeIs(8));
+  accessPoints.push_back(computerSystem());
+  EXPECT_THAT(stack_.names("ein", "CIM_ManagedElement"), IsSupersetOf(accessPoints));
+}
+
+TEST_F(CompositeInstances, AreNotInAnUnknownClassOrNamespace) {
+  EXPECT_THAT(stack_.failure("ei", "YRNx_MgmtHwNothing"), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
+  EXPECT_THAT(stack_.failure("ein", "YRNx_MgmtHwNothing"), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
+  EXPECT_THAT(stack_.failure("ei", "YRNx_MgmtHwComputerSystem", {}, "root/nowhere"),
+              HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
+  EXPECT_EQ(stack_.names("ein", "YRNx_MgmtHwComputerSystem"), std::vector{computerSystem()});
+}
+
+}  // namespace

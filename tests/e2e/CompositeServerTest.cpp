@@ -1,0 +1,178 @@
+// cimomd with the composite where something is missing, and what only a hand-made request can ask.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <future>
+
+#include "tests/cimom/http/HttpClient.h"
+#include "tests/e2e/support/CompositeObjects.h"
+#include "tests/e2e/support/CompositeStack.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::HasSubstr;
+using testing::Not;
+using testing::SizeIs;
+
+class CompositeServer : public testing::Test {
+ protected:
+  std::string processor() const { return simulatedProcessor(directory_.path() / "processor.json"); }
+
+  TemporaryDirectory directory_;
+};
+
+class RawRequest : public CompositeServer {
+ protected:
+  // A GetInstance, ModifyInstance and the like, whose parameters are given as they stand in the message.
+  std::string call(const std::string& method, const std::string& parameters) {
+    HttpClient client(stack_.cimomd().port());
+    return client
+        .post("/cimom",
+              "<?xml version=\"1.0\"?><CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE ID=\"1\" "
+              "PROTOCOLVERSION=\"1.0\"><SIMPLEREQ><IMETHODCALL NAME=\"" +
+                  method +
+                  "\"><LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"cimv2\"/></LOCALNAMESPACEPATH>" +
+                  parameters + "</IMETHODCALL></SIMPLEREQ></MESSAGE></CIM>",
+              "Content-Type: application/xml; charset=\"utf-8\"\r\nCIMOperation: MethodCall\r\nCIMMethod: " + method +
+                  "\r\nCIMObject: root%2Fcimv2\r\n")
+        .body;
+  }
+
+  static std::string parameter(const std::string& name, const std::string& value) {
+    return "<IPARAMVALUE NAME=\"" + name + "\">" + value + "</IPARAMVALUE>";
+  }
+
+  static std::string instanceName(const std::string& className, const std::string& keys) {
+    return "<INSTANCENAME CLASSNAME=\"" + className + "\">" + keys + "</INSTANCENAME>";
+  }
+
+  static std::string key(const std::string& name, const std::string& value) {
+    return "<KEYBINDING NAME=\"" + name + "\"><KEYVALUE VALUETYPE=\"string\">" + value + "</KEYVALUE></KEYBINDING>";
+  }
+
+  static std::string property(const std::string& name, const std::string& value) {
+    return "<PROPERTY NAME=\"" + name + "\" TYPE=\"string\"><VALUE>" + value + "</VALUE></PROPERTY>";
+  }
+
+  // ModifyInstance of eth0's static settings, without what a client that reads first would send back.
+  std::string modifyStatic(const std::string& interface, const std::string& properties) {
+    const std::string className = "YRNx_MgmtHwStaticIPAssignmentSettingData";
+    return call(
+        "ModifyInstance",
+        parameter("ModifiedInstance",
+                  "<VALUE.NAMEDINSTANCE>" + instanceName(className, key("InstanceID", "BMC:" + interface)) +
+                      "<INSTANCE CLASSNAME=\"" + className + "\">" + properties + "</INSTANCE></VALUE.NAMEDINSTANCE>"));
+  }
+
+  CompositeStack stack_{processor()};
+};
+
+TEST_F(RawRequest, ToGetAnInstanceWithoutKeysFailsAsTheProviderSays) {
+  for (const char* className : {"YRNx_MgmtHwComputerSystem", "YRNx_MgmtHwIPProtocolEndPoint",
+                                "YRNx_MgmtHwIPAssignmentSettingSequence", "YRNx_MgmtHwStaticIPAssignmentSettingData",
+                                "YRNx_MgmtHwDHCPAssignmentSettingData", "YRNx_MgmtHwRemoteServiceAccessPoint"})
+    EXPECT_THAT(call("GetInstance", parameter("InstanceName", instanceName(className, ""))),
+                AllOf(HasSubstr("<ERROR CODE=\"1\""), HasSubstr("At least one key should be passed")))
+        << className;
+  // An association's provider finds nothing, and says why in the log.
+  EXPECT_THAT(call("GetInstance", parameter("InstanceName", instanceName("YRNx_MgmtHwClientAccess", ""))),
+              HasSubstr("<ERROR CODE=\"6\""));
+  EXPECT_THAT(stack_.log(), HasSubstr("At least one key should be passed"));
+}
+
+TEST_F(RawRequest, WithSomeOfTheKeysFindsNothing) {
+  EXPECT_THAT(call("GetInstance",
+                   parameter("InstanceName", instanceName("YRNx_MgmtHwIPProtocolEndPoint", key("Name", "eth0")))),
+              HasSubstr("<ERROR CODE=\"6\""));
+}
+
+TEST_F(RawRequest, ToModifyOneValueNeedsNoOther) {
+  EXPECT_THAT(modifyStatic("eth0", property("SubnetMask", "255.255.0.0")), Not(HasSubstr("<ERROR")));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("SubnetMask"), quoted("255.255.0.0"));
+  EXPECT_THAT(modifyStatic("eth0", property("IPv4Address", "192.0.2.77")), Not(HasSubstr("<ERROR")));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.77"));
+}
+
+TEST_F(RawRequest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
+  stack_.names("ein", "YRNx_MgmtHwComputerSystem");
+  const std::string before = contentOf(directory_.path() / "processor.json");
+  EXPECT_THAT(modifyStatic("eth9", property("IPv4Address", "192.0.2.77")), Not(HasSubstr("<ERROR")));
+  EXPECT_THAT(modifyStatic("eth0:static", property("IPv4Address", "192.0.2.77")), Not(HasSubstr("<ERROR")));
+  EXPECT_EQ(contentOf(directory_.path() / "processor.json"), before);
+}
+
+TEST_F(RawRequest, WithAnUndeclaredPropertyIsRefusedWhole) {
+  EXPECT_THAT(modifyStatic("eth0", property("IPv4Address", "192.0.2.77") + property("Undeclared", "1")),
+              AllOf(HasSubstr("<ERROR CODE=\"12\""), HasSubstr("Undeclared")));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+}
+
+TEST_F(RawRequest, WithoutAUsableValueChangesNothing) {
+  stack_.names("ein", "YRNx_MgmtHwComputerSystem");
+  const std::string before = contentOf(directory_.path() / "processor.json");
+  for (const std::string& value :
+       {std::string("<PROPERTY NAME=\"IPv4Address\" TYPE=\"string\"></PROPERTY>"), property("IPv4Address", ""),
+        std::string("<PROPERTY NAME=\"IPv4Address\" TYPE=\"uint16\"><VALUE>7</VALUE></PROPERTY>"),
+        std::string("<PROPERTY.ARRAY NAME=\"IPv4Address\" TYPE=\"string\"><VALUE.ARRAY><VALUE>192.0.2.77</VALUE>"
+                    "</VALUE.ARRAY></PROPERTY.ARRAY>"),
+        property("IPv4Address", std::string(100'000, '1')), property("IPv4Address", "192.0.2.77&#x202e;")}) {
+    modifyStatic("eth0", value);
+    EXPECT_EQ(contentOf(directory_.path() / "processor.json"), before) << value.substr(0, 100);
+    EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  }
+}
+
+TEST_F(CompositeServer, DoesNotStartWithoutTheLibraryOfAProvider) {
+  for (const char* missing : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
+    const TemporaryDirectory providers;
+    for (const char* present : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"})
+      if (std::string(present) != missing)
+        std::filesystem::create_symlink(std::string(BINARY_DIR "/lib/") + present, providers.path() / present);
+    std::vector<std::string> options = CompositeStack::options();
+    options.back() = providers.path().string();
+    options.insert(options.begin(), BINARY_DIR "/bin/cimomd");
+    const Completed completed = run(options);
+    EXPECT_NE(completed.status, 0);
+    EXPECT_THAT(completed.errors, HasSubstr(missing));
+  }
+}
+
+TEST_F(CompositeServer, AnswersAnErrorWhereNoUnderlyingProviderIsRegistered) {
+  const Cimomd cimomd({"--schema", SOURCE_DIR "/schema", "--registration", BINARY_DIR "/share/CompositeIPConfig.reg",
+                       "--provider-dir", BINARY_DIR "/lib"},
+                      {{"QV_AGENT_INI", directory_.write("agent.ini", "[log]\ndestination = off\n").string()}});
+  const Completed completed = run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
+  EXPECT_NE(completed.status, 0);
+  EXPECT_THAT(completed.errors, HasSubstr("CIM_ERR_INVALID_NAMESPACE"));
+}
+
+TEST_F(CompositeServer, SaysWhatIsWrongWithTheAgentsConfiguration) {
+  const auto ini = directory_.write("agent.ini", "[log]\ndestination = nowhere\n");
+  const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
+  const Completed completed = run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
+  EXPECT_NE(completed.status, 0);
+  EXPECT_THAT(completed.errors, HasSubstr("agent.ini:2"));
+}
+
+TEST_F(CompositeServer, AnswersManyClientsAtOnceAlike) {
+  const CompositeStack stack(processor());
+  const std::vector<std::string> expected = stack.paths("ein", "YRNx_MgmtHwClientAccess");
+  ASSERT_THAT(expected, SizeIs(6));
+  std::vector<std::future<std::vector<std::string>>> clients;
+  for (int i = 0; i < 16; ++i)
+    clients.push_back(std::async(std::launch::async, [&] { return stack.paths("ein", "YRNx_MgmtHwClientAccess"); }));
+  for (auto& client : clients) EXPECT_EQ(client.get(), expected);
+}
+
+TEST_F(CompositeServer, EndsCleanlyAfterRequests) {
+  CompositeStack stack(processor());
+  stack.instances("ei", "YRNx_MgmtHwIPElementSettingData");
+  EXPECT_EQ(stack.cimomd().stop(), 0);
+  EXPECT_EQ(stack.cimomd().process().errors(), "");
+}
+
+}  // namespace

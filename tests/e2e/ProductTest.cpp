@@ -1,0 +1,138 @@
+// The product as it leaves the build: what the library exports and needs, the tools, and the demonstration.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <set>
+#include <sstream>
+
+#include "tests/e2e/support/CompositeStack.h"
+
+namespace {
+
+using namespace Testing;
+using testing::AllOf;
+using testing::ContainsRegex;
+using testing::HasSubstr;
+using testing::Not;
+using testing::SizeIs;
+using testing::StartsWith;
+
+constexpr const char* library = BINARY_DIR "/lib/libcompositeipconfigprovider.so.1";
+
+TEST(CompositeLibrary, ExportsExactlyItsEighteenFactories) {
+  std::set<std::string> found;
+  for (const std::string& line : linesOf(run({"nm", "-D", "--defined-only", library}).output)) {
+    EXPECT_THAT(line, ContainsRegex(" T "));
+    found.insert(line.substr(line.rfind(' ') + 1));
+  }
+  std::set<std::string> expected;
+  for (const char* provider : {"CompositeIPConfigProvider", "IPProtocolendptProvider",
+                               "IPConfigAssignmentSettingProvider", "IPConfigStaticAssnSettingDataProvider",
+                               "IPConfigDHCPAssnSettingDataProvider", "IPRemoteServiceAccessPointProvider"})
+    expected.insert(std::string(provider) + "_Create_InstanceMI");
+  for (const char* provider : {"IPProtocolHostedAccessPointProvider", "IPRemoteHostedAccessPointProvider",
+                               "IPConfigClientAccessProvider", "IPConfigElementSettingDataProvider",
+                               "IPConfigStaticOrderedMembetOfCollProvider", "IPConfigDHCPOrderedMembetOfCollProvider"})
+    for (const char* kind : {"Instance", "Association"})
+      expected.insert(std::string(provider) + "_Create_" + kind + "MI");
+  EXPECT_EQ(found, expected);
+  EXPECT_THAT(expected, SizeIs(18));
+}
+
+TEST(CompositeLibrary, IsNamedAsObjectManagersAndLoadersFindIt) {
+  EXPECT_THAT(run({"readelf", "-d", library}).output, HasSubstr("Library soname: [libcompositeipconfigprovider.so.1]"));
+  EXPECT_EQ(std::filesystem::canonical(BINARY_DIR "/lib/libcompositeipconfigprovider.so"),
+            std::filesystem::canonical(library));
+}
+
+TEST(CompositeLibrary, NeedsTheAgentAndNothingOfIpmi) {
+  const std::string everything = run({"ldd", library}).output;
+  EXPECT_THAT(everything, AllOf(HasSubstr("libqvhelper.so.1"), HasSubstr("libqvinstrumentation.so.1"),
+                                HasSubstr("libtwlog.so.1"), Not(HasSubstr("freeipmi")), Not(HasSubstr("not found"))));
+}
+
+class Registration : public testing::Test {
+ protected:
+  static Completed registration(std::vector<std::string> arguments) {
+    arguments.insert(arguments.begin(), SOURCE_DIR "/tools/registration");
+    return run(arguments);
+  }
+
+  static std::string table(const char* name) { return std::string(SOURCE_DIR "/schema/") + name + ".registration"; }
+
+  static std::size_t count(const std::string& text, const std::string& part) {
+    std::size_t found = 0;
+    for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) ++found;
+    return found;
+  }
+
+  void expectRefused(const std::string& line, const std::string& reason) const {
+    const std::string file = directory_.write("bad.registration", "# fine\n" + line + "\n").string();
+    for (const char* form : {"sfcb", "pegasus"}) {
+      const Completed completed = registration({form, file});
+      EXPECT_EQ(completed.status, 1) << line;
+      EXPECT_THAT(completed.errors, AllOf(StartsWith(file + ":2: "), HasSubstr(reason)));
+    }
+  }
+
+  TemporaryDirectory directory_;
+};
+
+TEST_F(Registration, WritesAStanzaForEachClass) {
+  const Completed completed = registration({"sfcb", table("CompositeIPConfig"), table("UnderlyingIPConfig")});
+  ASSERT_EQ(completed.status, 0) << completed.errors;
+  EXPECT_EQ(count(completed.output, "   type: instance\n   namespace: root/cimv2\n#\n"), 6U);
+  EXPECT_EQ(count(completed.output, "   type: instance association\n   namespace: root/cimv2\n#\n"), 6U);
+  EXPECT_EQ(count(completed.output, "   type: instance\n   namespace: root/yrnse\n#\n"), 6U);
+  EXPECT_EQ(count(completed.output, "   location: compositeipconfigprovider\n"), 12U);
+  EXPECT_THAT(completed.output, HasSubstr("[YRNx_MgmtHwDHCPOrderedMemberOfCollection]\n"
+                                          "   provider: IPConfigDHCPOrderedMembetOfCollProvider\n"
+                                          "   location: compositeipconfigprovider\n"
+                                          "   type: instance association\n"));
+}
+
+TEST_F(Registration, WritesTheInstancesThatOpenPegasusWants) {
+  const Completed completed = registration({"pegasus", table("CompositeIPConfig"), table("UnderlyingIPConfig")});
+  ASSERT_EQ(completed.status, 0) << completed.errors;
+  EXPECT_EQ(count(completed.output, "instance of PG_ProviderModule {"), 2U);
+  EXPECT_EQ(count(completed.output, "instance of PG_Provider {"), 13U);
+  EXPECT_EQ(count(completed.output, "instance of PG_ProviderCapabilities {"), 18U);
+  EXPECT_EQ(count(completed.output, "ProviderType = { 2 };"), 12U);
+  EXPECT_EQ(count(completed.output, "ProviderType = { 2, 3 };"), 6U);
+  EXPECT_EQ(count(completed.output, "Namespaces = { \"root/yrnse\" };"), 6U);
+}
+
+TEST_F(Registration, NamesEveryFactoryOfTheLibraryAndNoOther) {
+  std::set<std::string> registered;
+  std::istringstream lines(contentOf(table("CompositeIPConfig")));
+  for (std::string line; std::getline(lines, line);) {
+    std::istringstream words(line.substr(0, line.find('#')));
+    std::string className, nameSpace, provider, location;
+    if (!(words >> className >> nameSpace >> provider >> location)) continue;
+    for (std::string kind; words >> kind;)
+      registered.insert(provider + (kind == "instance" ? "_Create_InstanceMI" : "_Create_AssociationMI"));
+  }
+  std::set<std::string> exported;
+  for (const std::string& line : linesOf(run({"nm", "-D", "--defined-only", library}).output))
+    exported.insert(line.substr(line.rfind(' ') + 1));
+  EXPECT_EQ(registered, exported);
+}
+
+TEST_F(Registration, RefusesATableOfAnotherShape) {
+  expectRefused("Class root/cimv2 Provider", "expected class, namespace, provider, library and at least one kind");
+  expectRefused("Class root/cimv2 Provider library", "at least one kind");
+  expectRefused("Class root/cimv2 Provider library method", "unknown kind \"method\"");
+  expectRefused("Class root/cimv2 Provider library instance indication", "unknown kind \"indication\"");
+}
+
+TEST_F(Registration, ShowsHowItIsUsed) {
+  EXPECT_EQ(registration({}).status, 2);
+  EXPECT_EQ(registration({"sfcb"}).status, 2);
+  const Completed completed = registration({"other", table("CompositeIPConfig")});
+  EXPECT_EQ(completed.status, 2);
+  EXPECT_THAT(completed.errors, HasSubstr("registration sfcb TABLE..."));
+  EXPECT_NE(registration({"sfcb", "/nowhere"}).status, 0);
+}
+
+}  // namespace

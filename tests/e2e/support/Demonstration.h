@@ -1,0 +1,35 @@
+#ifndef TESTS_E2E_SUPPORT_DEMONSTRATION_H_
+#define TESTS_E2E_SUPPORT_DEMONSTRATION_H_
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "tests/e2e/support/Process.h"
+#include "tests/support/TemporaryDirectory.h"
+
+namespace Testing {
+
+/// tools/demonstrate in a build directory of its own, which lends it the built files.
+class Demonstration : public testing::Test {
+ protected:
+  Demonstration();
+
+  Completed demonstrate(std::vector<std::string> arguments) const;
+
+  /// That what it started has ended and what it wrote outside the build directory is gone.
+  void expectNothingLeft() const;
+
+  const std::filesystem::path& build() const { return directory_.path(); }
+
+ private:
+  std::filesystem::path temporary() const { return build() / "temporary"; }
+
+  TemporaryDirectory directory_;
+};
+
+}  // namespace Testing
+
+#endif  // TESTS_E2E_SUPPORT_DEMONSTRATION_H_
