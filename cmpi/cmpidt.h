@@ -305,11 +305,43 @@ typedef enum _CMPIPredOp {
   CMPI_PredOp_NotLike = 10
 } CMPIPredOp;
 
-/* The enumerations of CIM_Error travel as plain integers of an enumeration's size; their values are CIM_Error's. */
-typedef enum _CMPIErrorType { CMPIErrorTypeUnknown = 0, CMPIErrorTypeOther = 1 } CMPIErrorType;
-typedef enum _CMPIErrorSeverity { CMPIErrorSeverityUnknown = 0 } CMPIErrorSeverity;
-typedef enum _CMPIErrorProbableCause { CMPIErrorProbableCauseUnknown = 0 } CMPIErrorProbableCause;
-typedef enum _CMPIErrorSrcFormat { CMPIErrorSrcFormatUnknown = 0 } CMPIErrorSrcFormat;
+/* The value maps of CIM_Error. */
+typedef enum _CMPIErrorType {
+  CMPIErrorTypeUnknown = 0,
+  CMPIErrorTypeOther = 1,
+  CMPIErrorTypeCommunications = 2,
+  CMPIErrorTypeQualityOfService = 3,
+  CMPIErrorTypeSoftware = 4,
+  CMPIErrorTypeHardware = 5,
+  CMPIErrorTypeEnvironmental = 6,
+  CMPIErrorTypeSecurity = 7,
+  CMPIErrorTypeOversubscription = 8,
+  CMPIErrorTypeUnavailableResource = 9,
+  CMPIErrorTypeUnsupportedOperation = 10
+} CMPIErrorType;
+
+typedef enum _CMPIErrorSeverity {
+  CMPIErrorSeverityUnknown = 0,
+  CMPIErrorSeverityOther = 1,
+  CMPIErrorSeverityInformation = 2,
+  CMPIErrorSeverityDegradedWarning = 3,
+  CMPIErrorSeverityMinor = 4,
+  CMPIErrorSeverityMajor = 5,
+  CMPIErrorSeverityCritical = 6,
+  CMPIErrorSeverityFatalNonRecoverable = 7
+} CMPIErrorSeverity;
+
+/* Any number of the value map of CIM_Error.ProbableCause. */
+typedef enum _CMPIErrorProbableCause {
+  CMPIErrorProbableCauseUnknown = 0,
+  CMPIErrorProbableCauseLast = 130
+} CMPIErrorProbableCause;
+
+typedef enum _CMPIErrorSrcFormat {
+  CMPIErrorSrcFormatUnknown = 0,
+  CMPIErrorSrcFormatOther = 1,
+  CMPIErrorSrcFormatObjectHandle = 2
+} CMPIErrorSrcFormat;
 
 #ifdef __cplusplus
 }
