@@ -112,9 +112,6 @@ class Navigation {
   const End* farEnd_ = nullptr;
 };
 
-// ReferenceNames shares the text of References.
-constexpr const char* noReferenceTarget = "Object Path is NULL in References.";
-
 const char* kindWordOf(const AssociationUnit& unit, const char* KindWords::*operation) {
   return unit.kindWords == nullptr ? nullptr : unit.kindWords->*operation;
 }
@@ -145,38 +142,45 @@ CMPIStatus associatorNames(const AssociationCall& call, const CMPIContext* ctx, 
                                       });
 }
 
-CMPIStatus references(const AssociationCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
-                      const CMPIObjectPath* op) {
+namespace {
+
+// The walk that References and ReferenceNames share: both resolve with the unit's own association class.
+template <typename Visit>
+CMPIStatus forEachReferenced(const AssociationCall& call, const CMPIContext* ctx, const CMPIObjectPath* op,
+                             const char* KindWords::*operation, Visit visit) {
   Navigation navigation(call, ctx, op);
   const bool resolved = navigation.resolve(call.unit.associationClass, nullptr);
   navigation.makeAssociationPath();
   if (!resolved) {
-    return navigation.fail(noReferenceTarget);
+    return navigation.fail("Object Path is NULL in References.");
   }
-  return navigation.forEachAssociated(kindWordOf(call.unit, &KindWords::references), [&](const CMPIInstance* instance) {
-    CMReturnInstance(rslt, navigation.makeReference(instance));
-  });
+  return navigation.forEachAssociated(kindWordOf(call.unit, operation),
+                                      [&](const CMPIInstance* instance) { visit(navigation, instance); });
+}
+
+}  // namespace
+
+CMPIStatus references(const AssociationCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
+                      const CMPIObjectPath* op) {
+  return forEachReferenced(call, ctx, op, &KindWords::references,
+                           [&](Navigation& navigation, const CMPIInstance* instance) {
+                             CMReturnInstance(rslt, navigation.makeReference(instance));
+                           });
 }
 
 CMPIStatus referenceNames(const AssociationCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
                           const CMPIObjectPath* op) {
-  Navigation navigation(call, ctx, op);
-  const bool resolved = navigation.resolve(call.unit.associationClass, nullptr);
-  navigation.makeAssociationPath();
-  if (!resolved) {
-    return navigation.fail(noReferenceTarget);
-  }
-  return navigation.forEachAssociated(kindWordOf(call.unit, &KindWords::referenceNames),
-                                      [&](const CMPIInstance* instance) {
-                                        // A name that lacked the key of one end would name nothing.
-                                        if (navigation.rehomedPathOf(instance) == nullptr) {
-                                          return;
-                                        }
-                                        const CMPIInstance* const reference = navigation.makeReference(instance);
-                                        if (const CMPIObjectPath* const path = navigation.rehomedPathOf(reference)) {
-                                          CMReturnObjectPath(rslt, path);
-                                        }
-                                      });
+  return forEachReferenced(call, ctx, op, &KindWords::referenceNames,
+                           [&](Navigation& navigation, const CMPIInstance* instance) {
+                             // A name that lacked the key of one end would name nothing.
+                             if (navigation.rehomedPathOf(instance) == nullptr) {
+                               return;
+                             }
+                             const CMPIInstance* const reference = navigation.makeReference(instance);
+                             if (const CMPIObjectPath* const path = navigation.rehomedPathOf(reference)) {
+                               CMReturnObjectPath(rslt, path);
+                             }
+                           });
 }
 
 }  // namespace QV::IPConfigComposite
