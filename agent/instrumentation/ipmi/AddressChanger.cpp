@@ -11,6 +11,13 @@ namespace {
 
 constexpr std::chrono::milliseconds betweenLooks{100};
 
+// Whether the address is one that was neither there nor written by us: another client's, whose change must stand. A
+// processor that mangles what it applies shows none.
+bool isAnothers(const AddressSettings& present, const AddressSettings& earlier, const AddressSettings& wanted) {
+  return present.address && *present.address != Ipv4Octets{} && present.address != earlier.address &&
+         present.address != wanted.address;
+}
+
 }  // namespace
 
 void AddressChanger::apply(const AddressChange& change) {
@@ -30,7 +37,10 @@ void AddressChanger::apply(const AddressChange& change) {
   const AddressSettings present = readBack(wanted, loss);
   const std::string difference = describeDifference(present, wanted);
   if (difference.empty()) return;
-  const std::string outcome = present == earlier ? "; the earlier values hold" : putBack(present, earlier);
+  const std::string outcome = present == earlier ? "; the earlier values hold"
+                              : isAnothers(present, earlier, wanted)
+                                  ? "; another client has changed it meanwhile, and its values hold"
+                                  : putBack(present, earlier);
   throw IpmiError("the BMC took the change of " + interfaceName(channel_) + " but does not show it: " + difference +
                   outcome);
 }

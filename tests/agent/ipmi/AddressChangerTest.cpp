@@ -233,6 +233,19 @@ TEST_F(AddressChangerTest, PutsTheEarlierValuesBackWhereTheBmcAppliesAPart) {
   expectNoLock();
 }
 
+TEST_F(AddressChangerTest, LeavesAnAddressThatAnotherClientWroteMeanwhile) {
+  const ParameterData anothers{192, 0, 2, 78};
+  bmc.beforeRequest = [&](unsigned number) {
+    if (number > firstWrite + 2) bmc.values[LanParameter::IpAddress] = anothers;
+  };
+
+  EXPECT_THAT([&] { change(bothValues); },
+              refusal("IP address is 192.0.2.78, not 192.0.2.77", "another client has changed it meanwhile"));
+
+  EXPECT_EQ(bmc.values.at(LanParameter::IpAddress), anothers);
+  expectNoLock();
+}
+
 TEST_F(AddressChangerTest, GivesTheLockBackWhereItsTimeEnds) {
   bmc.applies = ScriptedBmc::Applies::AtOnce;
   bmc.beforeRequest = [&](unsigned number) {
