@@ -200,4 +200,24 @@ TEST_P(CompositeInstancesTest, WronglyTypedUnderlyingPropertiesCountAsUnset) {
   EXPECT_FALSE(hasProperty(out[0], "Description"));
 }
 
+class ComputerSystemsTest : public CompositeTest {};
+
+TEST_F(ComputerSystemsTest, ThoseReadBeforeTheBrokerRanOutOfMemoryStay) {
+  for (const char* const name : {"sp1", "sp2", "sp3"}) {
+    addUnderlying("YRNQV_SPComputerSystem", {{"Name", name}});
+  }
+  faults.failNewInstance = [&](const std::string&, int call) {
+    faults.failNewArray = call == 2;
+    return false;
+  };
+  std::vector<CMPIInstance*> out;
+  EXPECT_EQ(
+      IPConfigObjectFactory().getAllSPComputerCMPIInstances(broker(), context(), makePath("YRNx_MgmtHwComputerSystem"),
+                                                            "YRNx_MgmtHwComputerSystem", nullptr, false, out, &status),
+      1);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+  ASSERT_EQ(out.size(), 1u);
+  EXPECT_EQ(text(out[0], "Name"), "sp1");
+}
+
 }  // namespace

@@ -1,5 +1,7 @@
 // GetInstance, EnumInstances and EnumInstanceNames of the six composite classes: what reaches the result object, the
 // agent's log and trace, and the broker's trace.
+#include <stdexcept>
+
 #include "support/Samples.h"
 
 namespace {
@@ -278,6 +280,14 @@ TEST_P(InstanceOperationsTest, NullUnderlyingInstancesDoNoHarm) {
   EXPECT_EQ(enumInstances(classPath()).rc, CMPI_RC_OK);
   EXPECT_EQ(enumInstanceNames(classPath()).rc, CMPI_RC_OK);
   EXPECT_EQ(getInstance(instancePath(1)).rc, CMPI_RC_OK);
+}
+
+TEST_P(InstanceOperationsTest, AnExceptionPassesThroughToTheObjectManager) {
+  faults.onUpCall = [](const UpCall&) { throw std::runtime_error("thrown below"); };
+  EXPECT_THROW(enumInstances(classPath()), std::runtime_error);
+  EXPECT_THROW(enumInstanceNames(classPath()), std::runtime_error);
+  EXPECT_THROW(getInstance(instancePath(1)), std::runtime_error);
+  EXPECT_TRUE(result.order.empty());
 }
 
 }  // namespace
