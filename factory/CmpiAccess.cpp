@@ -50,6 +50,15 @@ CMPIData propertyOf(const CMPIInstance* instance, const char* name, CMPIStatus* 
   return CMIsNullObject(instance) ? nothing : CMGetProperty(instance, name, status);
 }
 
+CMPIData instanceItem(const CMPIData& item) {
+  CMPIData instance = {CMPI_instance, CMPI_nullValue, {}};
+  if (item.type == CMPI_instance && !CMIsNullObject(item.value.inst)) {
+    instance.state = CMPI_goodValue;
+    instance.value.inst = item.value.inst;
+  }
+  return instance;
+}
+
 CMPIObjectPath* pathOf(const CMPIInstance* instance, CMPIStatus* status) {
   return CMIsNullObject(instance) ? nullptr : CMGetObjectPath(instance, status);
 }

@@ -25,6 +25,11 @@ const char* renderingOf(const CMPIObjectPath* path);
 CMPIData keyOf(const CMPIObjectPath* path, const char* name, CMPIStatus* status);
 CMPIData propertyOf(const CMPIInstance* instance, const char* name, CMPIStatus* status);
 
+// What an enumeration delivered, fit to be handed on: the instance of an item whose type says that it carries one, a
+// null instance for an item of any other type. The item's own state says nothing: OpenPegasus leaves CMPI_nullValue on
+// items that carry good instances.
+CMPIData instanceItem(const CMPIData& item);
+
 // The instance's object path, null where the instance is.
 CMPIObjectPath* pathOf(const CMPIInstance* instance, CMPIStatus* status);
 

@@ -84,8 +84,8 @@ int readComposites(const CompositeClass& row, const Request& request, const CMPI
   }
 
   const CMPIObjectPath* const path = CMNewObjectPath(broker, underlyingNameSpace, row.underlying, status);
-  const CMPIEnumeration* const underlyings =
-      path == nullptr ? nullptr : CBEnumInstances(broker, ctx, path, nullptr, status);
+  // Asked also without a path: the broker's answer to that is the client's.
+  const CMPIEnumeration* const underlyings = CBEnumInstances(broker, ctx, path, nullptr, status);
   if (status->rc != CMPI_RC_OK || CMIsNullObject(underlyings)) {
     end(row, frame);
     return 0;
@@ -93,14 +93,14 @@ int readComposites(const CompositeClass& row, const Request& request, const CMPI
 
   CMPIUint16 index = 0;
   while (CMHasNext(underlyings, status)) {
-    const CMPIData data = CMGetNext(underlyings, status);
-    const CMPIInstance* const underlying = data.value.inst;
+    const CMPIData item = instanceItem(CMGetNext(underlyings, status));
+    const CMPIInstance* const underlying = item.value.inst;
     if (!isSelected(row, underlying, status)) {
       continue;
     }
     CMPIInstance* const composite = makeComposite(row, request);
     for (const MappedProperty& property : row.mapped) {
-      mapProperty(data, composite, property.name, property.type, status);
+      mapProperty(item, composite, property.name, property.type, status);
     }
     for (const TextProperty& property : row.finals) {
       setText(composite, property.name, property.value);

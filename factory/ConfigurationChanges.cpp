@@ -69,11 +69,11 @@ int IPConfigObjectFactory::modifyIPProtocolendptCMPIInstance(const CMPIBroker*, 
                                                              const CMPIInstance* ci, CMPIStatus* status) {
   const Frame frame = factoryFrame(__func__);
   frame.entering(458);
-  const std::string name = textOf(keyOf(cop, "Name", status), status);
+  const std::string name = textOf(keyOf(cop, "Name", status), nullptr);
   frame.variable("IpName", name.c_str(), 469);
-  const std::string ipv4Address = textOf(propertyOf(ci, "IPv4Address", status), status);
+  const std::string ipv4Address = textOf(propertyOf(ci, "IPv4Address", status), nullptr);
   frame.variable("Ipv4Address", ipv4Address.c_str(), 476);
-  const std::string subnetMask = textOf(propertyOf(ci, "SubnetMask", status), status);
+  const std::string subnetMask = textOf(propertyOf(ci, "SubnetMask", status), nullptr);
   frame.variable("Ipv4SubnetMask", subnetMask.c_str(), 483);
   const int result = executeModifyInstance(name, ipv4Address, subnetMask);
   frame.exiting(487);
@@ -90,11 +90,11 @@ int IPConfigObjectFactory::modifyStaticIPCMPIInstance(const CMPIBroker*, const C
     return 0;
   }
   std::vector<std::string> fields;
-  Tokenize(textOf(identifier, status), fields, ":");
+  Tokenize(textOf(identifier, nullptr), fields, ":");
   const std::string name = fields.size() == 2 ? fields[1] : "";
-  const std::string ipv4Address = textOf(propertyOf(ci, "IPv4Address", status), status);
+  const std::string ipv4Address = textOf(propertyOf(ci, "IPv4Address", status), nullptr);
   frame.variable("Ipv4Address", ipv4Address.c_str(), 431);
-  const std::string subnetMask = textOf(propertyOf(ci, "SubnetMask", status), status);
+  const std::string subnetMask = textOf(propertyOf(ci, "SubnetMask", status), nullptr);
   frame.variable("Ipv4SubnetMask", subnetMask.c_str(), 438);
   // Whether the write went through is told by the instrumentation's log, not to the client.
   executeModifyInstance(name, ipv4Address, subnetMask);

@@ -70,6 +70,9 @@ class Run {
       return std::nullopt;
     }
     rehome(outerPath, ref_, &status_);
+    if (builder_.outerIdentifierRead) {
+      keyOf(outerPath, "InstanceID", &status_);
+    }
     std::vector<CMPIInstance*> inners;
     if (!read(builder_.inner, inners)) {
       return react(builder_.innerFailed);
@@ -128,10 +131,23 @@ class Run {
 
   const char* identifierOf(const CMPIObjectPath* path) { return textOf(keyOf(path, "InstanceID", &status_), &status_); }
 
+  // Nothing where the read or the conversion to characters left an error, even with a value beside it.
+  std::optional<std::string> readableIdentifierOf(const CMPIObjectPath* path) {
+    CMPIStatus read = {CMPI_RC_OK, nullptr};
+    CMPIStatus conversion = {CMPI_RC_OK, nullptr};
+    const std::string identifier = textOf(keyOf(path, "InstanceID", &read), &conversion);
+    if (read.rc != CMPI_RC_OK || conversion.rc != CMPI_RC_OK) {
+      return std::nullopt;
+    }
+    return identifier;
+  }
+
   // The values of CIM_ElementSettingData: 1 "Is Default"/"Is Current", 2 "Is Not …", 3 "Is Next For Single Use".
   void setSettingFlags(CMPIInstance* instance, const CMPIObjectPath* sequencePath) {
     std::vector<std::string> fields;
-    IPConfigObjectFactory().Tokenize(identifierOf(sequencePath), fields, ":");
+    if (const std::optional<std::string> identifier = readableIdentifierOf(sequencePath)) {
+      IPConfigObjectFactory().Tokenize(*identifier, fields, ":");
+    }
     const CMPIUint16 isInForce = fields.size() > 2 ? 2 : 1;
     const CMPIUint16 isNext = 3;
     CMSetProperty(instance, "IsDefault", &isInForce, CMPI_uint16);

@@ -49,8 +49,9 @@ struct AssociationBuilder {
   bool firstIsOuter;
   bool keysOnPath;  // the references become keys of the instance's path at once; else the broker derives them
 
-  const char* innerMarker;  // the word that the inner end's "InstanceID" must contain, or null to pair everything
-  bool settingFlags;        // sets "IsDefault", "IsCurrent" and "IsNext" by the form of the inner end's "InstanceID"
+  bool outerIdentifierRead;  // the outer end's "InstanceID" is read, and nothing made of it
+  const char* innerMarker;   // the word that the inner end's "InstanceID" must contain, or null to pair everything
+  bool settingFlags;         // sets "IsDefault", "IsCurrent" and "IsNext" by the form of the inner end's "InstanceID"
 
   Reaction outerFailed;
   Reaction outerNull;

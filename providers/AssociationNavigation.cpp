@@ -67,16 +67,21 @@ class Navigation {
     associationPath_ = CMNewObjectPath(broker_, nameSpaceOf(op_, &status_), unit_.associationClass, &status_);
   }
 
-  // A new association instance between the source, its path as received, and a far-end instance; null where it could
-  // not be made.
-  CMPIInstance* makeReference(const CMPIInstance* farInstance) {
+  // What ties the source to one far-end instance.
+  struct Reference {
+    CMPIInstance* instance;  // null where it could not be made
+    bool hasFarEnd;          // whether the far-end instance has a path to refer to
+  };
+
+  // A new association instance between the source, its path as received, and a far-end instance.
+  Reference makeReference(const CMPIInstance* farInstance) {
     CMPIInstance* const instance =
         associationPath_ == nullptr ? nullptr : CMNewInstance(broker_, associationPath_, &status_);
     const CMPIObjectPath* const farPath = rehomedPathOf(farInstance);
     const bool farIsA = farEnd_ == &unit_.endA;
     setReference(instance, unit_.referenceToA, farIsA ? farPath : op_);
     setReference(instance, unit_.referenceToB, farIsA ? op_ : farPath);
-    return instance;
+    return {instance, farPath != nullptr};
   }
 
   CMPIObjectPath* rehomedPathOf(const CMPIInstance* instance) {
@@ -164,7 +169,7 @@ CMPIStatus references(const AssociationCall& call, const CMPIContext* ctx, const
                       const CMPIObjectPath* op) {
   return forEachReferenced(call, ctx, op, &KindWords::references,
                            [&](Navigation& navigation, const CMPIInstance* instance) {
-                             CMReturnInstance(rslt, navigation.makeReference(instance));
+                             CMReturnInstance(rslt, navigation.makeReference(instance).instance);
                            });
 }
 
@@ -172,12 +177,12 @@ CMPIStatus referenceNames(const AssociationCall& call, const CMPIContext* ctx, c
                           const CMPIObjectPath* op) {
   return forEachReferenced(call, ctx, op, &KindWords::referenceNames,
                            [&](Navigation& navigation, const CMPIInstance* instance) {
+                             const auto reference = navigation.makeReference(instance);
                              // A name that lacked the key of one end would name nothing.
-                             if (navigation.rehomedPathOf(instance) == nullptr) {
+                             if (!reference.hasFarEnd) {
                                return;
                              }
-                             const CMPIInstance* const reference = navigation.makeReference(instance);
-                             if (const CMPIObjectPath* const path = navigation.rehomedPathOf(reference)) {
+                             if (const CMPIObjectPath* const path = navigation.rehomedPathOf(reference.instance)) {
                                CMReturnObjectPath(rslt, path);
                              }
                            });

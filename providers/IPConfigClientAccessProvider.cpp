@@ -35,6 +35,7 @@ const AssociationBuilder builder = {
     .second = "Dependent",
     .firstIsOuter = false,
     .keysOnPath = true,
+    .outerIdentifierRead = false,
     .innerMarker = nullptr,
     .settingFlags = false,
     .outerFailed = {Reaction::Course::EndWith0},

@@ -43,6 +43,7 @@ const AssociationBuilder builder = {
     .second = "PartComponent",
     .firstIsOuter = false,
     .keysOnPath = false,
+    .outerIdentifierRead = true,
     .innerMarker = "dhcp",
     .settingFlags = false,
     .outerFailed =

@@ -36,6 +36,7 @@ const AssociationBuilder builder = {
     .second = "SettingData",
     .firstIsOuter = true,
     .keysOnPath = false,
+    .outerIdentifierRead = false,
     .innerMarker = nullptr,
     .settingFlags = true,
     .outerFailed = {Reaction::Course::EndWith0},

@@ -44,6 +44,7 @@ const AssociationBuilder builder = {
     .second = "PartComponent",
     .firstIsOuter = false,
     .keysOnPath = false,
+    .outerIdentifierRead = true,
     .innerMarker = "static",
     .settingFlags = false,
     .outerFailed = {Reaction::Course::EndWith1},

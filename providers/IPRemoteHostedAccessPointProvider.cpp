@@ -35,6 +35,7 @@ const AssociationBuilder builder = {
     .second = "Dependent",
     .firstIsOuter = true,
     .keysOnPath = false,
+    .outerIdentifierRead = false,
     .innerMarker = nullptr,
     .settingFlags = false,
     .outerFailed = {Reaction::Course::EndWith0},

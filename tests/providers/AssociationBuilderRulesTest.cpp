@@ -76,6 +76,18 @@ TEST_F(ElementSettingDataBuilderTest, AnIdentifierThatCannotBeReadIsDefaultAndCu
   EXPECT_EQ(flagsFor(Testing::withKey(makePath(Classes::sequence), "InstanceID", nullValue)), "1 1 3");
 }
 
+TEST_F(ElementSettingDataBuilderTest, AnIdentifierThatWasReadWithAnErrorIsDefaultAndCurrentEvenWithAValueBesideIt) {
+  CMPIData identifier = {CMPI_string, CMPI_keyValue, {}};
+  identifier.value.string = CMNewString(faults.real(), "BMC:eth0:static", nullptr);
+  const auto path = [&](CMPIrc rc) {
+    return Testing::withKey(makePath(Classes::sequence), "InstanceID", identifier, rc);
+  };
+  EXPECT_EQ(flagsFor(path(CMPI_RC_OK)), "2 2 3");
+  EXPECT_EQ(flagsFor(path(CMPI_RC_ERR_FAILED)), "1 1 3");
+  identifier.value.string = Testing::withCode(identifier.value.string, CMPI_RC_ERR_FAILED);
+  EXPECT_EQ(flagsFor(path(CMPI_RC_OK)), "1 1 3");
+}
+
 TEST_F(ElementSettingDataBuilderTest, TheEndpointPlaysNoPart) {
   faults.upCallScripts.clear();
   addEnds({"eth0", "eth1"}, {"BMC:eth0:static"});
@@ -132,6 +144,19 @@ TEST_P(OrderedMemberBuilderTest, TheMarkerIsSearchedWithRegardToCase) {
 TEST_P(OrderedMemberBuilderTest, ASettingIsAMemberWhateverItsOwnIdentifier) {
   addEnds({"BMC:eth0", "BMC:elsewhere"}, {"BMC:eth0:" + marker});
   EXPECT_EQ(groups(), (Strings{sequence("BMC:eth0:" + marker), sequence("BMC:eth0:" + marker)}));
+}
+
+TEST_P(OrderedMemberBuilderTest, ASettingsIdentifierIsReadOnceForEverySetting) {
+  addEnds({"BMC:eth0", "BMC:eth1"}, {"BMC:eth0:" + marker});
+  Strings read;
+  faults.onNewInstance = [&](const std::string& className, int call, CMPIInstance* instance) {
+    if (className == model().outer) {
+      Testing::withPath(instance, Testing::withKeysRecorded(
+                                      makePath(className, {{"InstanceID", "BMC:eth" + std::to_string(call)}}), read));
+    }
+  };
+  EXPECT_EQ(groups(), (Strings{sequence("BMC:eth0:" + marker), sequence("BMC:eth0:" + marker)}));
+  EXPECT_EQ(read, (Strings{"InstanceID", "InstanceID"}));
 }
 
 TEST_P(OrderedMemberBuilderTest, ASequenceWithoutReadableIdentifierHasNoMembers) {

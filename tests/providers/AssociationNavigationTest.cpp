@@ -68,6 +68,24 @@ TEST_P(AssociationNavigationTest, ReferenceNamesAnswerThePathsOfTheReferencesAtH
   EXPECT_EQ(pairs, hasKeys ? sourceTiedToFarNames() : Strings(3, "(none) -> (none)"));
 }
 
+TEST_P(AssociationNavigationTest, TheReferenceIsMadeFirstAndTheFarEndsPathIsTakenOnce) {
+  for (const Navigation navigation : {Navigation::References, Navigation::ReferenceNames}) {
+    SCOPED_TRACE(nameOf(navigation));
+    int taken = 0;
+    Strings takenBefore;  // how many far paths had been taken when each reference was made
+    faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
+      if (className == farClass()) {
+        Testing::withPathsCounted(instance, taken);
+      } else {
+        takenBefore.push_back(std::to_string(taken));
+      }
+    };
+    navigate(navigation, source());
+    EXPECT_EQ(takenBefore, (Strings{"0", "1", "2"}));
+    EXPECT_EQ(taken, 3);
+  }
+}
+
 TEST_P(AssociationNavigationTest, ReadsTheFarEndOnceWithoutFilterAndNeverCallsReturnDone) {
   for (const Navigation navigation : navigations) {
     SCOPED_TRACE(nameOf(navigation));

@@ -265,12 +265,51 @@ TEST_P(InstanceOperationsTest, APathThatCannotBeMadeYieldsANullInstance) {
   EXPECT_TRUE(result.paths.empty());
 }
 
-TEST_P(InstanceOperationsTest, AnUnderlyingPathThatCannotBeMadeMeansNothingToEnumerate) {
+TEST_P(InstanceOperationsTest, AnUnderlyingPathThatCannotBeMadeIsAskedForAllTheSameAndTheBrokersAnswerIsTheClients) {
   add(1);
   faults.failNewObjectPath = [&](const std::string& className, int) { return className == sample().underlying; };
-  EXPECT_EQ(enumInstances(classPath()).rc, CMPI_RC_ERR_FAILED);
+  faults.upCallScripts[""].status = {CMPI_RC_ERR_INVALID_PARAMETER, CMNewString(faults.real(), "no path", nullptr)};
+  const CMPIStatus answer = enumInstances(classPath());
+  EXPECT_EQ(answer.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_EQ(text(answer.msg), "no path");
   EXPECT_TRUE(result.instances.empty());
-  EXPECT_TRUE(faults.upCalls.empty());
+  EXPECT_EQ(faults.upCalls, (std::vector<UpCall>{{"", "", false}}));
+}
+
+TEST_P(InstanceOperationsTest, AnItemIsItsInstanceWhateverItsStateSays) {
+  CMPIInstance* const underlying = makeInstance("root/yrnse", sample().underlying, acceptable(sample(), 1));
+  for (const CMPIValueState state : {CMPI_goodValue, CMPI_nullValue, CMPI_keyValue, CMPI_notFound, CMPI_badValue}) {
+    CMPIData item = {CMPI_instance, state, {}};
+    item.value.inst = underlying;
+    script().items = {item};
+    result.instances.clear();
+    EXPECT_EQ(enumInstances(classPath()).rc, CMPI_RC_OK);
+    ASSERT_EQ(result.instances.size(), 1u) << state;
+    for (const auto& [name, value] : keysOf(sample(), 1)) {
+      EXPECT_EQ(text(result.instances.front(), name), value) << state;
+    }
+  }
+}
+
+TEST_P(InstanceOperationsTest, AnItemThatIsNoInstanceIsNeverFollowed) {
+  constexpr CMPIType types[] = {CMPI_null, CMPI_boolean, CMPI_uint8,  CMPI_uint64,    CMPI_real64,   CMPI_ref,
+                                CMPI_args, CMPI_filter,  CMPI_chars,  CMPI_string,    CMPI_booleanA, CMPI_dateTime,
+                                CMPI_ptr,  CMPI_class,   CMPI_uint8A, CMPI_instanceA, CMPI_stringA};
+  for (const CMPIType type : types) {
+    // Whoever follows this pointer as an instance dies of it.
+    CMPIData item = {type, CMPI_goodValue, {}};
+    item.value.uint64 = 8;
+    script().items.push_back(item);
+  }
+  EXPECT_EQ(enumInstances(classPath()).rc, CMPI_RC_OK);
+  // Only the computer systems are taken without a look at a property.
+  const bool takesEvery = GetParam().className == "YRNx_MgmtHwComputerSystem";
+  ASSERT_EQ(result.instances.size(), takesEvery ? std::size(types) : 0u);
+  for (const CMPIInstance* const instance : result.instances) {
+    EXPECT_FALSE(hasProperty(instance, "Name"));
+    EXPECT_FALSE(hasProperty(instance, "Dedicated"));
+    EXPECT_TRUE(hasProperty(instance, "Index"));
+  }
 }
 
 TEST_P(InstanceOperationsTest, NullUnderlyingInstancesDoNoHarm) {

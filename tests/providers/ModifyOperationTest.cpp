@@ -105,6 +105,20 @@ TEST_F(ModifyOperationTest, AMissingPropertyIsNotWrittenAndItsCodeIsTheAnswerOnl
   EXPECT_EQ(instrumentation().nodes[0].values, (std::map<int, std::string>{{25, "192.0.2.7"}}));
 }
 
+TEST_F(ModifyOperationTest, TheStatusIsThatOfTheLastReadAndNotOfItsConversion) {
+  CMPIData mask = {CMPI_string, CMPI_goodValue, {}};
+  mask.value.string = withCode(CMNewString(faults.real(), "255.255.255.0", nullptr), CMPI_RC_ERR_FAILED);
+  for (const auto& [className, path] :
+       {std::pair{endpointClass, endpointPath("eth0")}, std::pair{staticClass, staticPath("BMC:eth0")}}) {
+    CMPIInstance* const instance = makeInstance(requestNameSpace, className, {{"IPv4Address", "192.0.2.7"}});
+    EXPECT_EQ(modify(className, path, withProperty(instance, "SubnetMask", mask)).rc, CMPI_RC_OK) << className;
+    EXPECT_EQ(modify(className, path, withProperty(instance, "SubnetMask", mask, CMPI_RC_ERR_ACCESS_DENIED)).rc,
+              CMPI_RC_ERR_ACCESS_DENIED)
+        << className;
+    EXPECT_EQ(instrumentation().nodes[0].values.at(26), "255.255.255.0") << className;
+  }
+}
+
 TEST_F(ModifyOperationTest, AnEmptyAddressWithAMaskWritesTheMaskAlone) {
   modifyEndpoint(endpointPath("eth0"), {{"IPv4Address", ""}, {"SubnetMask", "255.0.0.0"}});
   EXPECT_EQ(instrumentation().nodes[0].values, (std::map<int, std::string>{{26, "255.0.0.0"}}));

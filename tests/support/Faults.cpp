@@ -11,7 +11,7 @@ FaultyBroker* current = nullptr;
 // An enumeration over a script's instances.
 struct ScriptedEnumeration {
   CMPIEnumeration base;
-  std::vector<CMPIInstance*> instances;
+  std::vector<CMPIData> items;
   std::size_t position = 0;
 };
 
@@ -27,14 +27,12 @@ void set(CMPIStatus* status, CMPIrc rc) {
 
 CMPIBoolean hasNext(const CMPIEnumeration* enumeration, CMPIStatus* status) {
   set(status, CMPI_RC_OK);
-  return scripted(enumeration).position < scripted(enumeration).instances.size();
+  return scripted(enumeration).position < scripted(enumeration).items.size();
 }
 
 CMPIData getNext(const CMPIEnumeration* enumeration, CMPIStatus* status) {
   set(status, CMPI_RC_OK);
-  CMPIData data = {CMPI_instance, CMPI_goodValue, {}};
-  data.value.inst = scripted(enumeration).instances.at(scripted(enumeration).position++);
-  return data;
+  return scripted(enumeration).items.at(scripted(enumeration).position++);
 }
 
 CMPIEnumerationFT enumerationTable = {CMPICurrentVersion, nullptr, nullptr, getNext, hasNext, nullptr};
@@ -56,6 +54,7 @@ struct Alteration {
   std::map<std::string, std::pair<CMPIData, CMPIrc>> properties;
   CMPIObjectPath* path = nullptr;
   std::vector<std::string>* calls = nullptr;
+  int* pathCount = nullptr;
 };
 
 std::map<const CMPIInstance*, std::unique_ptr<Alteration>>& alterations() {
@@ -66,7 +65,7 @@ std::map<const CMPIInstance*, std::unique_ptr<Alteration>>& alterations() {
 Alteration& alterationOf(CMPIInstance* instance) {
   std::unique_ptr<Alteration>& alteration = alterations()[instance];
   if (alteration == nullptr || instance->ft != &alteration->table) {
-    alteration = std::make_unique<Alteration>(Alteration{*instance->ft, instance->ft, {}, nullptr, nullptr});
+    alteration = std::make_unique<Alteration>(Alteration{*instance->ft, instance->ft, {}});
     instance->ft = &alteration->table;
   }
   return *alteration;
@@ -126,6 +125,12 @@ CMPIObjectPath* alteredPath(const CMPIInstance* instance, CMPIStatus* status) {
   return path;
 }
 
+CMPIObjectPath* countedPath(const CMPIInstance* instance, CMPIStatus* status) {
+  const Alteration& alteration = *alterations().at(instance);
+  ++*alteration.pathCount;
+  return alteration.original->getObjectPath(instance, status);
+}
+
 }  // namespace
 
 FaultyBroker::FaultyBroker(const CMPIBroker* real)
@@ -148,7 +153,9 @@ FaultyBroker::~FaultyBroker() {
 
 CMPIEnumeration* FaultyBroker::enumerateInstances(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath* path,
                                                   const char** properties, CMPIStatus* status) {
-  const UpCall call = {text(CMGetNameSpace(path, nullptr)), text(CMGetClassName(path, nullptr)), properties != nullptr};
+  const UpCall call = path == nullptr ? UpCall{"", "", properties != nullptr}
+                                      : UpCall{text(CMGetNameSpace(path, nullptr)), text(CMGetClassName(path, nullptr)),
+                                               properties != nullptr};
   current->upCalls.push_back(call);
   if (current->onUpCall) {
     current->onUpCall(call);
@@ -162,7 +169,12 @@ CMPIEnumeration* FaultyBroker::enumerateInstances(const CMPIBroker*, const CMPIC
   }
   auto enumeration = std::make_unique<ScriptedEnumeration>();
   enumeration->base = {enumeration.get(), &enumerationTable};
-  enumeration->instances = script.instances;
+  for (CMPIInstance* const instance : script.instances) {
+    CMPIData item = {CMPI_instance, CMPI_goodValue, {}};
+    item.value.inst = instance;
+    enumeration->items.push_back(item);
+  }
+  enumeration->items.insert(enumeration->items.end(), script.items.begin(), script.items.end());
   enumerations().push_back(std::move(enumeration));
   return &enumerations().back()->base;
 }
@@ -229,6 +241,13 @@ CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path) {
   return instance;
 }
 
+CMPIInstance* withPathsCounted(CMPIInstance* instance, int& count) {
+  Alteration& alteration = alterationOf(instance);
+  alteration.pathCount = &count;
+  alteration.table.getObjectPath = countedPath;
+  return instance;
+}
+
 CMPIInstance* withoutPath(CMPIInstance* instance) { return withPath(instance, nullptr); }
 
 CMPIInstance* withoutHandle() {
@@ -248,6 +267,8 @@ struct KeyAlteration {
   CMPIObjectPathFT* original;
   std::string name;
   CMPIData data;
+  CMPIrc rc;
+  std::vector<std::string>* names = nullptr;
 };
 
 std::map<const CMPIObjectPath*, std::unique_ptr<KeyAlteration>>& keyAlterations() {
@@ -260,18 +281,61 @@ CMPIData alteredKey(const CMPIObjectPath* path, const char* name, CMPIStatus* st
   if (alteration.name != name) {
     return alteration.original->getKey(path, name, status);
   }
-  set(status, CMPI_RC_OK);
+  set(status, alteration.rc);
   return alteration.data;
+}
+
+CMPIData recordedKey(const CMPIObjectPath* path, const char* name, CMPIStatus* status) {
+  const KeyAlteration& alteration = *keyAlterations().at(path);
+  alteration.names->push_back(name);
+  return alteration.original->getKey(path, name, status);
+}
+
+CMPIObjectPath* withGetKey(CMPIObjectPath* path, KeyAlteration alteration,
+                           CMPIData (*getKey)(const CMPIObjectPath*, const char*, CMPIStatus*)) {
+  auto owned = std::make_unique<KeyAlteration>(std::move(alteration));
+  owned->table.getKey = getKey;
+  path->ft = &owned->table;
+  keyAlterations()[path] = std::move(owned);
+  return path;
+}
+
+struct CodedString {
+  CMPIString base;
+  CMPIStringFT table;
+  CMPIString* original;
+  CMPIrc rc;
+};
+
+std::map<const CMPIString*, std::unique_ptr<CodedString>>& codedStrings() {
+  static std::map<const CMPIString*, std::unique_ptr<CodedString>> all;
+  return all;
+}
+
+const char* codedCharacters(const CMPIString* string, CMPIStatus* status) {
+  const CodedString& coded = *codedStrings().at(string);
+  const char* const characters = CMGetCharsPtr(coded.original, nullptr);
+  set(status, coded.rc);
+  return characters;
 }
 
 }  // namespace
 
-CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data) {
-  auto alteration = std::make_unique<KeyAlteration>(KeyAlteration{*path->ft, path->ft, name, data});
-  alteration->table.getKey = alteredKey;
-  path->ft = &alteration->table;
-  keyAlterations()[path] = std::move(alteration);
-  return path;
+CMPIString* withCode(CMPIString* string, CMPIrc rc) {
+  auto coded = std::make_unique<CodedString>(CodedString{*string, *string->ft, string, rc});
+  coded->table.getCharPtr = codedCharacters;
+  coded->base.ft = &coded->table;
+  CMPIString* const result = &coded->base;
+  codedStrings()[result] = std::move(coded);
+  return result;
+}
+
+CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data, CMPIrc rc) {
+  return withGetKey(path, {*path->ft, path->ft, name, data, rc}, alteredKey);
+}
+
+CMPIObjectPath* withKeysRecorded(CMPIObjectPath* path, std::vector<std::string>& names) {
+  return withGetKey(path, {*path->ft, path->ft, {}, {}, CMPI_RC_OK, &names}, recordedKey);
 }
 
 namespace {

@@ -13,6 +13,7 @@ namespace Testing {
 // What the enumeration of one underlying class answers.
 struct UpCallScript {
   std::vector<CMPIInstance*> instances;  // null elements are answered as they are
+  std::vector<CMPIData> items;           // answered after the instances, as they are
   CMPIStatus status = {CMPI_RC_OK, nullptr};
   bool nullEnumeration = false;
 };
@@ -85,14 +86,20 @@ class FaultyBroker {
 CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
 // The instance, with its table replaced in part: getObjectPath answers `path`.
 CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path);
+// The instance, with its table replaced in part: counts the calls of getObjectPath.
+CMPIInstance* withPathsCounted(CMPIInstance* instance, int& count);
 // The instance, with its table replaced in part: getObjectPath answers null.
 CMPIInstance* withoutPath(CMPIInstance* instance);
 // An instance whose handle is null.
 CMPIInstance* withoutHandle();
 // A path whose handle is null.
 CMPIObjectPath* pathWithoutHandle();
-// The path, with its table replaced in part: getKey answers `data` for the name.
-CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data);
+// The path, with its table replaced in part: getKey answers `data` with the code `rc` for the name.
+CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
+// The path, with its table replaced in part: the names that getKey is asked for are appended to `names`.
+CMPIObjectPath* withKeysRecorded(CMPIObjectPath* path, std::vector<std::string>& names);
+// A string of the broker whose characters are read with the code `rc`.
+CMPIString* withCode(CMPIString* string, CMPIrc rc);
 
 // Keeps what a provider delivers.
 class RecordingResult {
