@@ -1,23 +1,23 @@
-#include "AssociationBuilder.h"
-
-#include <Trace.h>
-
+// The builders of association instances: each pairs the composite instances of an association's two ends.
 #include <cstring>
 #include <optional>
 
-#include "CmpiAccess.h"
+#include "factory/CmpiAccess.h"
+#include "providers/operations/AssociationOperations.h"
+#include "trace/Trace.h"
 
 namespace QV::IPConfigComposite {
 
 namespace {
 
-// One run of a builder. Its members answer with the result to end with, or nothing to go on.
+// One run of a builder. Its members return the result to end with, or nothing to go on.
 class Run {
  public:
-  Run(const AssociationBuilder& builder, const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties,
+  Run(const AssociationUnit& unit, const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties,
       const CMPIContext* ctx, std::vector<CMPIInstance*>& out)
-      : builder_(builder),
-        frame_(builder.component, builder.file, builder.function),
+      : unit_(unit),
+        pairing_(unit.pairing),
+        frame_(unit.trace.component, unit.trace.file, unit.trace.builder),
         broker_(broker),
         ref_(ref),
         properties_(properties),
@@ -25,24 +25,24 @@ class Run {
         out_(out) {}
 
   int run() {
-    frame_.markEntry(builder_.entryLine);
+    frame_.markEntry(unit_.trace.builderEntryLine);
     std::vector<CMPIInstance*> outers;
-    if (!read(builder_.outer, outers)) {
+    if (!read(pairing_.outer, outers)) {
       // An outer end that cannot be read always ends the run.
-      return *react(builder_.outerFailed);
+      return *react(unit_.onFailure.outerUnreadable);
     }
     for (std::uint16_t i = 0; i < countOf(outers); ++i) {
       if (const std::optional<int> result = pairWithInners(outers.at(i))) {
         return *result;
       }
     }
-    frame_.markExit(builder_.exitLine);
+    frame_.markExit(unit_.trace.builderExitLine);
     return 0;
   }
 
  private:
   std::optional<int> react(const Reaction& reaction) {
-    if (reaction.message != nullptr) {
+    if (reaction.message) {
       frame_.failure(reaction.message, reaction.line);
     }
     switch (reaction.course) {
@@ -56,26 +56,27 @@ class Run {
     return std::nullopt;
   }
 
-  bool read(const End& end, std::vector<CMPIInstance*>& instances) {
+  bool read(End end, std::vector<CMPIInstance*>& instances) {
+    const CompositeClass& composite = unit_.association.classAt(end);
     IPConfigObjectFactory factory;
-    return (factory.*end.getAll)(broker_, ctx_, ref_, end.className, nullptr, false, instances, &status_) == 0;
+    return (factory.*composite.getAll)(broker_, ctx_, ref_, composite.name, nullptr, false, instances, &status_) == 0;
   }
 
   std::optional<int> pairWithInners(const CMPIInstance* outer) {
     if (CMIsNullObject(outer)) {
-      return react(builder_.outerNull);
+      return react(unit_.onFailure.outerUnusable);
     }
-    CMPIObjectPath* const outerPath = pathOf(outer, &status_);
+    CMPIObjectPath* outerPath = pathOf(outer, &status_);
     if (CMIsNullObject(outerPath)) {
       return std::nullopt;
     }
     rehome(outerPath, ref_, &status_);
-    if (builder_.outerIdentifierRead) {
+    if (pairing_.readsOuterIdentifier) {
       keyOf(outerPath, "InstanceID", &status_);
     }
     std::vector<CMPIInstance*> inners;
-    if (!read(builder_.inner, inners)) {
-      return react(builder_.innerFailed);
+    if (!read(otherThan(pairing_.outer), inners)) {
+      return react(unit_.onFailure.innerUnreadable);
     }
     for (std::uint16_t i = 0; i < countOf(inners); ++i) {
       if (const std::optional<int> result = pair(outerPath, inners.at(i))) {
@@ -87,52 +88,55 @@ class Run {
 
   std::optional<int> pair(const CMPIObjectPath* outerPath, const CMPIInstance* inner) {
     if (CMIsNullObject(inner)) {
-      return react(builder_.innerNull);
+      return react(unit_.onFailure.innerUnusable);
     }
-    CMPIObjectPath* const innerPath = pathOf(inner, &status_);
+    CMPIObjectPath* innerPath = pathOf(inner, &status_);
     if (CMIsNullObject(innerPath)) {
       return std::nullopt;
     }
     rehome(innerPath, ref_, &status_);
-    if (builder_.innerMarker != nullptr && std::strstr(identifierOf(innerPath), builder_.innerMarker) == nullptr) {
+    if (!contains(innerPath, pairing_.wordInInnerIdentifier)) {
       return std::nullopt;
     }
 
-    CMPIObjectPath* const path =
-        CMNewObjectPath(broker_, nameSpaceOf(ref_, &status_), builder_.associationClass, &status_);
+    CMPIObjectPath* path = CMNewObjectPath(broker_, nameSpaceOf(ref_, &status_), unit_.association.name, &status_);
     if (CMIsNullObject(path)) {
-      return react(builder_.pathFailed);
+      return react(unit_.onFailure.pathUnmade);
     }
     rehome(path, ref_, &status_);
-    const CMPIObjectPath* const firstPath = builder_.firstIsOuter ? outerPath : innerPath;
-    const CMPIObjectPath* const secondPath = builder_.firstIsOuter ? innerPath : outerPath;
-    if (builder_.keysOnPath) {
-      CMAddKey(path, builder_.first, &firstPath, CMPI_ref);
-      CMAddKey(path, builder_.second, &secondPath, CMPI_ref);
+    const auto& [first, second] = unit_.association.referencesOfInstance;
+    const CMPIObjectPath* firstPath = first.end == pairing_.outer ? outerPath : innerPath;
+    const CMPIObjectPath* secondPath = second.end == pairing_.outer ? outerPath : innerPath;
+    if (pairing_.referencesAreKeys) {
+      CMAddKey(path, first.name, &firstPath, CMPI_ref);
+      CMAddKey(path, second.name, &secondPath, CMPI_ref);
     }
 
-    CMPIInstance* const instance = CMNewInstance(broker_, path, nullptr);
+    CMPIInstance* instance = CMNewInstance(broker_, path, nullptr);
     if (CMIsNullObject(instance)) {
-      if (builder_.instanceFailed == UnmadeInstance::Append) {
+      if (unit_.onFailure.instanceUnmade == UnmadeInstance::Append) {
         out_.push_back(instance);
       }
       return std::nullopt;
     }
-    const char* keys[] = {builder_.first, builder_.second, nullptr};
+    const char* keys[] = {first.name, second.name, nullptr};
     CMSetPropertyFilter(instance, properties_, keys);
-    setReference(instance, builder_.first, firstPath);
-    setReference(instance, builder_.second, secondPath);
-    if (builder_.settingFlags) {
-      setSettingFlags(instance, innerPath);
+    setReference(instance, first.name, firstPath);
+    setReference(instance, second.name, secondPath);
+    if (pairing_.setsDefaultCurrentNext) {
+      setDefaultCurrentNext(instance, innerPath);
     }
     out_.push_back(instance);
     return std::nullopt;
   }
 
-  const char* identifierOf(const CMPIObjectPath* path) { return textOf(keyOf(path, "InstanceID", &status_), &status_); }
+  // Reads the identifier only for a word that must be there.
+  bool contains(const CMPIObjectPath* path, const char* word) {
+    return *word == '\0' || std::strstr(textOf(keyOf(path, "InstanceID", &status_), &status_), word);
+  }
 
-  // Nothing where the read or the conversion to characters left an error, even with a value beside it.
-  std::optional<std::string> readableIdentifierOf(const CMPIObjectPath* path) {
+  // Nothing if the read or the conversion to characters left an error, even with a value beside it.
+  static std::optional<std::string> readableIdentifierOf(const CMPIObjectPath* path) {
     CMPIStatus read = {CMPI_RC_OK, nullptr};
     CMPIStatus conversion = {CMPI_RC_OK, nullptr};
     const std::string identifier = textOf(keyOf(path, "InstanceID", &read), &conversion);
@@ -143,7 +147,7 @@ class Run {
   }
 
   // The values of CIM_ElementSettingData: 1 "Is Default"/"Is Current", 2 "Is Not …", 3 "Is Next For Single Use".
-  void setSettingFlags(CMPIInstance* instance, const CMPIObjectPath* sequencePath) {
+  static void setDefaultCurrentNext(CMPIInstance* instance, const CMPIObjectPath* sequencePath) {
     std::vector<std::string> fields;
     if (const std::optional<std::string> identifier = readableIdentifierOf(sequencePath)) {
       IPConfigObjectFactory().Tokenize(*identifier, fields, ":");
@@ -155,7 +159,8 @@ class Run {
     CMSetProperty(instance, "IsNext", &isNext, CMPI_uint16);
   }
 
-  const AssociationBuilder& builder_;
+  const AssociationUnit& unit_;
+  const AssociationUnit::Pairing& pairing_;
   const Frame frame_;
   const CMPIBroker* broker_;
   const CMPIObjectPath* ref_;
@@ -167,9 +172,9 @@ class Run {
 
 }  // namespace
 
-int buildAssociations(const AssociationBuilder& builder, const CMPIBroker* broker, const CMPIObjectPath* ref,
+int buildAssociations(const AssociationUnit& unit, const CMPIBroker* broker, const CMPIObjectPath* ref,
                       const char** properties, const CMPIContext* ctx, std::vector<CMPIInstance*>& out) {
-  return Run(builder, broker, ref, properties, ctx, out).run();
+  return Run(unit, broker, ref, properties, ctx, out).run();
 }
 
 }  // namespace QV::IPConfigComposite

@@ -1,18 +1,18 @@
-// The read operations of the six providers that serve a composite class, told once; a unit is a row.
+// The operations of the six providers that serve a composite class, told once; a unit is a row.
 #pragma once
 
 #include <cmpift.h>
 
 #include <string>
 
-#include "IPConfigObjectFactory.h"
+#include "factory/Model.h"
 
 namespace QV::IPConfigComposite {
 
 struct InstanceUnit {
   const std::string& component;  // the unit's logger
   const char* file;              // the unit's name, as its trace lines show it
-  GetAll getAll;                 // reads every instance of the unit's class
+  const CompositeClass& serves;
 };
 
 // One call of an operation: the unit, its broker, and the operation's own name for the trace.
@@ -22,17 +22,21 @@ struct InstanceCall {
   const char* function;
 };
 
-// Answers the first instance whose path equals the requested one; nothing, with the status as it stands, where none
-// does. A path without keys is refused.
+// Returns the first instance whose path equals the requested one; nothing, with the status as it stands, if none does
+// (compatibility 15). A path without keys is refused.
 CMPIStatus getInstance(const InstanceCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
                        const CMPIObjectPath* op, const char** properties);
 
-// Answers every instance, null ones included.
+// Returns every instance, null ones included (compatibility 14).
 CMPIStatus enumInstances(const InstanceCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
                          const CMPIObjectPath* op, const char** properties);
 
-// Answers the path of every instance that has one.
+// Returns the path of every instance that has one.
 CMPIStatus enumInstanceNames(const InstanceCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
                              const CMPIObjectPath* op);
+
+// Hands the client's instance to the factory member that writes. A null instance is refused with CMPI_RC_ERR_FAILED.
+CMPIStatus modifyInstance(const InstanceCall& call, Modify modify, const CMPIContext* ctx, const CMPIResult* rslt,
+                          const CMPIObjectPath* cop, const CMPIInstance* ci, const char** properties);
 
 }  // namespace QV::IPConfigComposite

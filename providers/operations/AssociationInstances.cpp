@@ -1,15 +1,17 @@
 // The instance side of an association class: what the unit's builder makes.
 #include <QV/ProviderHelper.h>
-#include <Trace.h>
 
-#include "AssociationOperations.h"
-#include "CmpiAccess.h"
+#include "factory/CmpiAccess.h"
+#include "providers/operations/AssociationOperations.h"
+#include "trace/Trace.h"
 
 namespace QV::IPConfigComposite {
 
 namespace {
 
-Frame frameOf(const AssociationCall& call) { return Frame(call.unit.component, call.unit.file, call.function); }
+Frame frameOf(const AssociationCall& call) {
+  return Frame(call.unit.trace.component, call.unit.trace.file, call.function);
+}
 
 CMPIStatus done(const CMPIResult* rslt, const Frame& frame, const CMPIStatus& status) {
   CMReturnDone(rslt);
@@ -25,13 +27,14 @@ CMPIStatus getAssociation(const AssociationCall& call, BuildInstances build, con
   frame.markEntry();
   CMPIStatus status = {CMPI_RC_OK, nullptr};
   if (CMGetKeyCount(op, &status) == 0) {
+    // compatibility 15: said in the log; to the client it is no error.
     frame.failure("At least one key should be passed");
     return done(rslt, frame, status);
   }
   std::vector<CMPIInstance*> instances;
   if (build(op, properties, ctx, instances) == 0) {
     for (std::uint16_t i = 0; i < countOf(instances); ++i) {
-      const CMPIInstance* const instance = instances.at(i);
+      const CMPIInstance* instance = instances.at(i);
       if (!CMIsNullObject(instance) && isObjPathsEqual(op, pathOf(instance, &status), true)) {
         CMReturnInstance(rslt, instance);
         break;
@@ -63,7 +66,7 @@ CMPIStatus enumAssociationNames(const AssociationCall& call, BuildInstances buil
   std::vector<CMPIInstance*> instances;
   if (build(op, nullptr, ctx, instances) == 0) {
     for (std::uint16_t i = 0; i < countOf(instances); ++i) {
-      if (const CMPIObjectPath* const path = pathOf(instances.at(i), &status)) {
+      if (const CMPIObjectPath* path = pathOf(instances.at(i), &status)) {
         CMReturnObjectPath(rslt, path);
       }
     }

@@ -1,5 +1,5 @@
 // The named operations that every unit gives its function tables: stubs, and one-line calls of the operations told
-// once. Each unit states before them its `broker`, its row and, where it has one, its builder.
+// once. Each unit states before them its `broker` and its row, `unit`.
 #pragma once
 
 #include <cmpimacs.h>
@@ -25,7 +25,7 @@
     CMReturn(CMPI_RC_ERR_NOT_SUPPORTED);                                                                           \
   }
 
-// The operations of a unit that serves a composite class; needs `broker` and `unit` (InstanceUnit).
+// The operations of a unit that serves a composite class.
 #define IPCONFIG_INSTANCE_OPERATIONS(prefix)                                                            \
   CMPIStatus prefix##GetInstance(CMPIInstanceMI*, const CMPIContext* ctx, const CMPIResult* rslt,       \
                                  const CMPIObjectPath* op, const char** properties) {                   \
@@ -48,12 +48,11 @@
     return modifyInstance({unit, broker, __func__}, &IPConfigObjectFactory::modify, ctx, rslt, cop, ci, properties); \
   }
 
-// The operations of a unit that serves an association class; needs `broker`, `unit` (AssociationUnit) and `builder`
-// (AssociationBuilder). `Result` is the builder's result type.
+// The operations of a unit that serves an association class. `Result` is the builder's result type (compatibility 24).
 #define IPCONFIG_ASSOCIATION_OPERATIONS(prefix, builderName, Result)                                                   \
   Result builderName(const CMPIObjectPath* ref, const char** properties, const CMPIContext* ctx,                       \
                      std::vector<CMPIInstance*>& out) {                                                                \
-    return static_cast<Result>(buildAssociations(builder, broker, ref, properties, ctx, out));                         \
+    return static_cast<Result>(buildAssociations(unit, broker, ref, properties, ctx, out));                            \
   }                                                                                                                    \
   namespace {                                                                                                          \
   int buildInstances(const CMPIObjectPath* ref, const char** properties, const CMPIContext* ctx,                       \

@@ -1,11 +1,9 @@
 // The association side: from a source object to what lies at the far end.
-#include <QV/ProviderHelper.h>
-#include <Trace.h>
+#include <optional>
 
-#include <cstring>
-
-#include "AssociationOperations.h"
-#include "CmpiAccess.h"
+#include "factory/CmpiAccess.h"
+#include "providers/operations/AssociationOperations.h"
+#include "trace/Trace.h"
 
 namespace QV::IPConfigComposite {
 
@@ -16,17 +14,17 @@ class Navigation {
  public:
   Navigation(const AssociationCall& call, const CMPIContext* ctx, const CMPIObjectPath* op)
       : unit_(call.unit),
-        frame_(call.unit.component, call.unit.file, call.function),
+        frame_(call.unit.trace.component, call.unit.trace.file, call.function),
         broker_(call.broker),
         ctx_(ctx),
         op_(op) {
     frame_.markEntry();
-    if (unit_.kindWords != nullptr) {
+    if (unit_.wordInSequence) {
       sourceIdentifier_ = textOf(keyOf(op_, "InstanceID", &status_), &status_);
     }
   }
 
-  // Finds the class at the far end; false where the model has none.
+  // Finds the class at the far end; false if the model has none.
   bool resolve(const char* assocClass, const char* resultClass) {
     target_ = IPConfigObjectFactory().get_assoc_targetClass_ObjectPath(broker_, op_, assocClass, resultClass, &status_);
     return !CMIsNullObject(target_);
@@ -38,22 +36,19 @@ class Navigation {
   }
 
   // Hands every associated far-end instance to `visit`. A far end that cannot be read ends the operation without the
-  // exit marker.
+  // exit marker (compatibility 12).
   template <typename Visit>
-  CMPIStatus forEachAssociated(const char* kindWord, Visit visit) {
-    const std::string targetClass = classNameOf(target_, &status_);
-    farEnd_ = targetClass == unit_.endA.className   ? &unit_.endA
-              : targetClass == unit_.endB.className ? &unit_.endB
-                                                    : nullptr;
-    if (farEnd_ != nullptr) {
+  CMPIStatus forEachAssociated(const char* wordInSequence, Visit visit) {
+    farEnd_ = endOf(classNameOf(target_, &status_));
+    if (farEnd_) {
+      const CompositeClass& composite = unit_.association.classAt(*farEnd_);
       std::vector<CMPIInstance*> instances;
       IPConfigObjectFactory factory;
-      if ((factory.*farEnd_->getAll)(broker_, ctx_, op_, farEnd_->className, nullptr, false, instances, &status_) !=
-          0) {
+      if ((factory.*composite.getAll)(broker_, ctx_, op_, composite.name, nullptr, false, instances, &status_) != 0) {
         return status_;
       }
       for (std::uint16_t i = 0; i < countOf(instances); ++i) {
-        if (isAssociated(instances.at(i), kindWord)) {
+        if (isAssociated(instances.at(i), wordInSequence)) {
           visit(instances.at(i));
         }
       }
@@ -64,46 +59,60 @@ class Navigation {
 
   // The keyless path that all association instances of one call are made on.
   void makeAssociationPath() {
-    associationPath_ = CMNewObjectPath(broker_, nameSpaceOf(op_, &status_), unit_.associationClass, &status_);
+    associationPath_ = CMNewObjectPath(broker_, nameSpaceOf(op_, &status_), unit_.association.name, &status_);
   }
 
   // What ties the source to one far-end instance.
-  struct Reference {
-    CMPIInstance* instance;  // null where it could not be made
+  struct ReferenceInstance {
+    CMPIInstance* instance;  // null if it could not be made
     bool hasFarEnd;          // whether the far-end instance has a path to refer to
   };
 
   // A new association instance between the source, its path as received, and a far-end instance.
-  Reference makeReference(const CMPIInstance* farInstance) {
-    CMPIInstance* const instance =
-        associationPath_ == nullptr ? nullptr : CMNewInstance(broker_, associationPath_, &status_);
-    const CMPIObjectPath* const farPath = rehomedPathOf(farInstance);
-    const bool farIsA = farEnd_ == &unit_.endA;
-    setReference(instance, unit_.referenceToA, farIsA ? farPath : op_);
-    setReference(instance, unit_.referenceToB, farIsA ? op_ : farPath);
+  ReferenceInstance makeReference(const CMPIInstance* farInstance) {
+    CMPIInstance* instance = associationPath_ ? CMNewInstance(broker_, associationPath_, &status_) : nullptr;
+    const CMPIObjectPath* farPath = rehomedPathOf(farInstance);
+    for (const Reference& reference : unit_.association.references) {
+      setReference(instance, reference.name, reference.end == farEnd_ ? farPath : op_);
+    }
     return {instance, farPath != nullptr};
   }
 
   CMPIObjectPath* rehomedPathOf(const CMPIInstance* instance) {
-    CMPIObjectPath* const path = pathOf(instance, &status_);
+    CMPIObjectPath* path = pathOf(instance, &status_);
     rehome(path, op_, &status_);
     return path;
   }
 
  private:
-  bool isAssociated(const CMPIInstance* farInstance, const char* kindWord) {
-    if (unit_.kindWords == nullptr) {
+  // The end whose class has exactly that name (compatibility 22).
+  std::optional<End> endOf(const std::string& className) const {
+    for (const End end : {End::A, End::B}) {
+      if (className == unit_.association.classAt(end).name) {
+        return end;
+      }
+    }
+    return std::nullopt;
+  }
+
+  bool isAssociated(const CMPIInstance* farInstance, const char* wordInSequence) {
+    if (!unit_.wordInSequence) {
       return true;
     }
     const std::string identifier = textOf(propertyOf(farInstance, "InstanceID", &status_), &status_);
     if (identifier.empty()) {
       return false;
     }
-    if (farEnd_ == &unit_.endA) {
-      return identifier.find(sourceIdentifier_) != std::string::npos && identifier.find(kindWord) != std::string::npos;
+    if (farEnd_ == sequenceEnd) {
+      return identifier.find(sourceIdentifier_) != std::string::npos &&
+             identifier.find(wordInSequence) != std::string::npos;
     }
+    // compatibility 26: towards the settings no word is asked for.
     return sourceIdentifier_.find(identifier) != std::string::npos;
   }
+
+  // Where identifiers decide, the sequence is this end and the setting the other.
+  static constexpr End sequenceEnd = End::A;
 
   const AssociationUnit& unit_;
   const Frame frame_;
@@ -114,11 +123,11 @@ class Navigation {
   std::string sourceIdentifier_;
   const CMPIObjectPath* target_ = nullptr;
   const CMPIObjectPath* associationPath_ = nullptr;
-  const End* farEnd_ = nullptr;
+  std::optional<End> farEnd_;
 };
 
-const char* kindWordOf(const AssociationUnit& unit, const char* KindWords::*operation) {
-  return unit.kindWords == nullptr ? nullptr : unit.kindWords->*operation;
+const char* wordOf(const AssociationUnit& unit, const char* WordInSequence::*operation) {
+  return unit.wordInSequence ? unit.wordInSequence->*operation : nullptr;
 }
 
 }  // namespace
@@ -129,7 +138,7 @@ CMPIStatus associators(const AssociationCall& call, const CMPIContext* ctx, cons
   if (!navigation.resolve(assocClass, resultClass)) {
     return navigation.fail("Object Path is NULL in Associators.");
   }
-  return navigation.forEachAssociated(kindWordOf(call.unit, &KindWords::associators),
+  return navigation.forEachAssociated(wordOf(call.unit, &WordInSequence::associators),
                                       [&](const CMPIInstance* instance) { CMReturnInstance(rslt, instance); });
 }
 
@@ -139,9 +148,9 @@ CMPIStatus associatorNames(const AssociationCall& call, const CMPIContext* ctx, 
   if (!navigation.resolve(assocClass, resultClass)) {
     return navigation.fail("Object Path is NULL in AssociatorNames.");
   }
-  return navigation.forEachAssociated(kindWordOf(call.unit, &KindWords::associatorNames),
+  return navigation.forEachAssociated(wordOf(call.unit, &WordInSequence::associatorNames),
                                       [&](const CMPIInstance* instance) {
-                                        if (const CMPIObjectPath* const path = navigation.rehomedPathOf(instance)) {
+                                        if (const CMPIObjectPath* path = navigation.rehomedPathOf(instance)) {
                                           CMReturnObjectPath(rslt, path);
                                         }
                                       });
@@ -152,14 +161,14 @@ namespace {
 // The walk that References and ReferenceNames share: both resolve with the unit's own association class.
 template <typename Visit>
 CMPIStatus forEachReferenced(const AssociationCall& call, const CMPIContext* ctx, const CMPIObjectPath* op,
-                             const char* KindWords::*operation, Visit visit) {
+                             const char* WordInSequence::*operation, Visit visit) {
   Navigation navigation(call, ctx, op);
-  const bool resolved = navigation.resolve(call.unit.associationClass, nullptr);
+  const bool resolved = navigation.resolve(call.unit.association.name, nullptr);
   navigation.makeAssociationPath();
   if (!resolved) {
-    return navigation.fail("Object Path is NULL in References.");
+    return navigation.fail("Object Path is NULL in References.");  // compatibility 8: for the names too
   }
-  return navigation.forEachAssociated(kindWordOf(call.unit, operation),
+  return navigation.forEachAssociated(wordOf(call.unit, operation),
                                       [&](const CMPIInstance* instance) { visit(navigation, instance); });
 }
 
@@ -167,7 +176,7 @@ CMPIStatus forEachReferenced(const AssociationCall& call, const CMPIContext* ctx
 
 CMPIStatus references(const AssociationCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
                       const CMPIObjectPath* op) {
-  return forEachReferenced(call, ctx, op, &KindWords::references,
+  return forEachReferenced(call, ctx, op, &WordInSequence::references,
                            [&](Navigation& navigation, const CMPIInstance* instance) {
                              CMReturnInstance(rslt, navigation.makeReference(instance).instance);
                            });
@@ -175,14 +184,14 @@ CMPIStatus references(const AssociationCall& call, const CMPIContext* ctx, const
 
 CMPIStatus referenceNames(const AssociationCall& call, const CMPIContext* ctx, const CMPIResult* rslt,
                           const CMPIObjectPath* op) {
-  return forEachReferenced(call, ctx, op, &KindWords::referenceNames,
+  return forEachReferenced(call, ctx, op, &WordInSequence::referenceNames,
                            [&](Navigation& navigation, const CMPIInstance* instance) {
                              const auto reference = navigation.makeReference(instance);
                              // A name that lacked the key of one end would name nothing.
                              if (!reference.hasFarEnd) {
                                return;
                              }
-                             if (const CMPIObjectPath* const path = navigation.rehomedPathOf(reference.instance)) {
+                             if (const CMPIObjectPath* path = navigation.rehomedPathOf(reference.instance)) {
                                CMReturnObjectPath(rslt, path);
                              }
                            });
