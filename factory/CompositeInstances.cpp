@@ -114,7 +114,7 @@ int readComposites(const CompositeClass& row, const char* function, const Reques
     }
     out.push_back(composite);
     if (row.extra == Extra::NumberedSystem) {
-      frame.progress(" Insatance done");
+      frame.progress(" Insatance done");  // compatibility 2
       traceToBroker(broker, CMPI_LEV_INFO, "***Returning One IPConfig instance***");
     }
   }

@@ -1,5 +1,4 @@
-// Serves the association by which DHCP settings are members of assignment setting sequences. The texts of the builder's
-// messages are fixed vocabulary, misnomers and runs of blanks included.
+// Serves the association by which DHCP settings are members of assignment setting sequences.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"
 

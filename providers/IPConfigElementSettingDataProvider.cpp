@@ -1,5 +1,4 @@
-// Serves the association by which assignment setting sequences apply to IP protocol endpoints. The texts of the
-// builder's messages are fixed vocabulary, misnomers and runs of blanks included.
+// Serves the association by which assignment setting sequences apply to IP protocol endpoints.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"
 

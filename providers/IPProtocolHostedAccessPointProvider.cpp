@@ -1,5 +1,4 @@
-// Serves the association by which the computer system hosts IP protocol endpoints. The texts of the
-// builder's messages are kept to the letter (compatibility 2).
+// Serves the association by which the computer system hosts IP protocol endpoints.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"
 

@@ -1,5 +1,4 @@
-// Serves the association by which the computer system hosts remote service access points. The texts of the builder's
-// messages are fixed vocabulary, misnomers and runs of blanks included.
+// Serves the association by which the computer system hosts remote service access points.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"
 

@@ -1,5 +1,5 @@
 // The operations of the six association providers, told once; a unit is a row, in which every deliberate difference
-// stands, to the last blank of a message.
+// stands, to the last blank of a message (compatibility 2).
 #pragma once
 
 #include <cmpift.h>
