@@ -2,7 +2,6 @@
 
 #include <cmpimacs.h>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Types.h"
 
 namespace Cimom::CimXml {
@@ -39,15 +38,12 @@ void ClassWriter::write(const ClassDefinition& definition) {
   if (definition.superclass) xml_.attribute("SUPERCLASS", definition.superclass->name);
   qualifiers(definition.qualifiers);
   for (const auto& declaration : definition.properties)
-    if (isShown(definition, declaration.originClass) && view_.properties.includes(declaration.name.c_str()))
-      property(definition, declaration);
+    if (isShown(declaration.propagated) && view_.properties.includes(declaration.name.c_str())) property(declaration);
   for (const auto& declaration : definition.methods)
-    if (isShown(definition, declaration.originClass)) method(definition, declaration);
+    if (isShown(declaration.propagated)) method(declaration);
 }
 
-bool ClassWriter::isShown(const ClassDefinition& definition, const std::string& originClass) const {
-  return !view_.localOnly || sameName(definition.name, originClass);
-}
+bool ClassWriter::isShown(bool propagated) const { return !view_.localOnly || !propagated; }
 
 void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
   if (!view_.includeQualifiers) return;
@@ -62,18 +58,18 @@ void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
   }
 }
 
-void ClassWriter::property(const ClassDefinition& definition, const PropertyDeclaration& property) {
+void ClassWriter::property(const PropertyDeclaration& property) {
   const auto scope = xml_.element(propertyElement(property), "NAME", property.name);
   writeType(xml_, property);
-  origin(definition, property.originClass);
+  origin(property.originClass, property.propagated);
   qualifiers(property.qualifiers);
   values_.value(property.defaultValue.toCmpi());
 }
 
-void ClassWriter::method(const ClassDefinition& definition, const MethodDeclaration& method) {
+void ClassWriter::method(const MethodDeclaration& method) {
   const auto scope = xml_.element("METHOD", "NAME", method.name);
   if (const char* type = typeName(method.returnType)) xml_.attribute("TYPE", type);
-  origin(definition, method.originClass);
+  origin(method.originClass, method.propagated);
   qualifiers(method.qualifiers);
   for (const auto& declaration : method.parameters) parameter(declaration);
 }
@@ -84,9 +80,9 @@ void ClassWriter::parameter(const PropertyDeclaration& parameter) {
   qualifiers(parameter.qualifiers);
 }
 
-void ClassWriter::origin(const ClassDefinition& definition, const std::string& originClass) {
+void ClassWriter::origin(const std::string& originClass, bool propagated) {
   if (view_.includeClassOrigin) xml_.attribute("CLASSORIGIN", originClass);
-  xml_.attribute("PROPAGATED", truth(!sameName(definition.name, originClass)));
+  xml_.attribute("PROPAGATED", truth(propagated));
 }
 
 }  // namespace Cimom::CimXml

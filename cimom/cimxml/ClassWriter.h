@@ -8,7 +8,7 @@ namespace Cimom::CimXml {
 
 /// What of a class a client wants to see (DSP0200, GetClass).
 struct ClassView {
-  bool localOnly = true;  ///< leaves out what the class inherits
+  bool localOnly = true;  ///< leaves out what the class inherits and does not override
   bool includeQualifiers = true;
   bool includeClassOrigin = false;
   PropertyFilter properties;
@@ -23,11 +23,11 @@ class ClassWriter {
 
  private:
   void qualifiers(const Qualifiers& qualifiers);
-  void property(const ClassDefinition& definition, const PropertyDeclaration& property);
-  void method(const ClassDefinition& definition, const MethodDeclaration& method);
+  void property(const PropertyDeclaration& property);
+  void method(const MethodDeclaration& method);
   void parameter(const PropertyDeclaration& parameter);
-  void origin(const ClassDefinition& definition, const std::string& originClass);
-  bool isShown(const ClassDefinition& definition, const std::string& originClass) const;
+  void origin(const std::string& originClass, bool propagated);
+  bool isShown(bool propagated) const;
 
   XmlWriter& xml_;
   const std::string none_;  ///< a schema's default values are in no host and no namespace

@@ -35,6 +35,7 @@ struct PropertyDeclaration {
   Value defaultValue;          ///< null where the schema gives none
   Qualifiers qualifiers;       ///< inherited ones included
   std::string originClass;     ///< the class that declared it first
+  bool propagated = false;     ///< inherited as it is; false where this class declares or overrides it
 
   bool isKey() const { return isQualified(qualifiers, "Key"); }
   bool isReference() const { return !referenceClass.empty(); }
@@ -46,6 +47,7 @@ struct MethodDeclaration {
   std::vector<PropertyDeclaration> parameters;
   Qualifiers qualifiers;
   std::string originClass;
+  bool propagated = false;
 };
 
 /// A class with everything that it inherits: the superclass's features come first, in the superclass's order, an

@@ -34,6 +34,12 @@ ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefiniti
   inheritQualifiers(resolved.qualifiers, superclass->qualifiers);
   resolved.properties = superclass->properties;
   resolved.methods = superclass->methods;
+  for (PropertyDeclaration& property : resolved.properties) {
+    property.propagated = true;
+  }
+  for (MethodDeclaration& method : resolved.methods) {
+    method.propagated = true;
+  }
   for (PropertyDeclaration property : declaration.own.properties) {
     PropertyDeclaration* overridden = findOverridden(resolved.properties, property);
     if (!overridden) {

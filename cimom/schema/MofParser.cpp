@@ -178,7 +178,7 @@ void MofParser::feature(ClassDefinition& definition) {
 
 void MofParser::method(ClassDefinition& definition, const std::string& name, CMPIType returnType,
                        Qualifiers qualifiers) {
-  MethodDeclaration declaration{name, returnType, {}, std::move(qualifiers), definition.name};
+  MethodDeclaration declaration{name, returnType, {}, std::move(qualifiers), definition.name, false};
   expect("(");
   if (!token_.is(")")) {
     do {

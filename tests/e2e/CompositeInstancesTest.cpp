@@ -37,18 +37,20 @@ Values endpointValues(const std::string& name, const Values& more) {
                    {"AddressType", "1"},
                    {"EnabledState", "2"},
                    {"RequestedState", "12"},
-                   {"EnabledDefault", "2"}};
+                   {"EnabledDefault", "2"},
+                   {"TransitioningToState", "12"}};
   values.insert(more.begin(), more.end());
   return values;
 }
 
 Values accessPointValues(const std::string& name, const std::string& info, const std::string& context,
                          const std::string& format) {
-  return {{"Name", quoted(name)},       {"SystemCreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
-          {"SystemName", R"("BMC")"},   {"CreationClassName", R"("YRNx_RemoteAccessPoint")"},
-          {"AccessInfo", quoted(info)}, {"AccessContext", context},
-          {"InfoFormat", format},       {"EnabledState", "5"},
-          {"RequestedState", "12"},     {"EnabledDefault", "2"}};
+  return {{"Name", quoted(name)},        {"SystemCreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
+          {"SystemName", R"("BMC")"},    {"CreationClassName", R"("YRNx_RemoteAccessPoint")"},
+          {"AccessInfo", quoted(info)},  {"AccessContext", context},
+          {"InfoFormat", format},        {"EnabledState", "5"},
+          {"RequestedState", "12"},      {"EnabledDefault", "2"},
+          {"TransitioningToState", "12"}};
 }
 
 Values settingValues(const std::string& id, const std::string& elementName, const std::string& origin) {
@@ -73,7 +75,8 @@ std::vector<ClassCase> classCases() {
          {"Index", "1"},
          {"EnabledState", "5"},
          {"RequestedState", "12"},
-         {"EnabledDefault", "2"}}}},
+         {"EnabledDefault", "2"},
+         {"TransitioningToState", "12"}}}},
       {"YRNx_MgmtHwIPProtocolEndPoint",
        {endpoint("eth0"), endpoint("eth1")},
        {endpointValues("eth0", {{"IPv4Address", R"("192.0.2.10")"},

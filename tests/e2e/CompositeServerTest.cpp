@@ -142,8 +142,8 @@ TEST_F(CompositeServer, DoesNotStartWithoutTheLibraryOfAProvider) {
 }
 
 TEST_F(CompositeServer, AnswersAnErrorWhereNoUnderlyingProviderIsRegistered) {
-  const Cimomd cimomd({"--schema", SOURCE_DIR "/schema", "--registration", BINARY_DIR "/share/CompositeIPConfig.reg",
-                       "--provider-dir", BINARY_DIR "/lib"},
+  const Cimomd cimomd({"--schema", BINARY_DIR "/share/cimomd", "--registration",
+                       BINARY_DIR "/share/cimomd/CompositeIPConfig.reg", "--provider-dir", BINARY_DIR "/lib"},
                       {{"QV_AGENT_INI", directory_.write("agent.ini", "[log]\ndestination = off\n").string()}});
   const Completed completed = run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
   EXPECT_NE(completed.status, 0);

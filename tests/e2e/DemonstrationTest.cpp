@@ -35,7 +35,7 @@ TEST_F(Demonstration, LeavesNothingBehindWhereItFails) {
   fs::remove(build() / "share");
   const Completed completed = demonstrate({});
   EXPECT_NE(completed.status, 0);
-  EXPECT_THAT(completed.errors, HasSubstr("CompositeIPConfig.reg"));
+  EXPECT_THAT(completed.errors, HasSubstr("share/cimomd"));
   expectNothingLeft();
 }
 

@@ -82,9 +82,10 @@ class Registration : public testing::Test {
 TEST_F(Registration, WritesAStanzaForEachClass) {
   const Completed completed = registration({"sfcb", table("CompositeIPConfig"), table("UnderlyingIPConfig")});
   ASSERT_EQ(completed.status, 0) << completed.errors;
-  EXPECT_EQ(count(completed.output, "   type: instance\n   namespace: root/cimv2\n#\n"), 6U);
-  EXPECT_EQ(count(completed.output, "   type: instance association\n   namespace: root/cimv2\n#\n"), 6U);
-  EXPECT_EQ(count(completed.output, "   type: instance\n   namespace: root/yrnse\n#\n"), 6U);
+  const std::string end = "\n   group: compositeipconfig\n#\n";
+  EXPECT_EQ(count(completed.output, "   type: instance\n   namespace: root/cimv2" + end), 6U);
+  EXPECT_EQ(count(completed.output, "   type: instance association\n   namespace: root/cimv2" + end), 6U);
+  EXPECT_EQ(count(completed.output, "   type: instance\n   namespace: root/yrnse" + end), 6U);
   EXPECT_EQ(count(completed.output, "   location: compositeipconfigprovider\n"), 12U);
   EXPECT_THAT(completed.output, HasSubstr("[YRNx_MgmtHwDHCPOrderedMemberOfCollection]\n"
                                           "   provider: IPConfigDHCPOrderedMembetOfCollProvider\n"
@@ -96,6 +97,7 @@ TEST_F(Registration, WritesTheInstancesThatOpenPegasusWants) {
   const Completed completed = registration({"pegasus", table("CompositeIPConfig"), table("UnderlyingIPConfig")});
   ASSERT_EQ(completed.status, 0) << completed.errors;
   EXPECT_EQ(count(completed.output, "instance of PG_ProviderModule {"), 2U);
+  EXPECT_EQ(count(completed.output, "  UserContext = 4;\n  ModuleGroupName = \"compositeipconfig\";\n};\n"), 2U);
   EXPECT_EQ(count(completed.output, "instance of PG_Provider {"), 13U);
   EXPECT_EQ(count(completed.output, "instance of PG_ProviderCapabilities {"), 18U);
   EXPECT_EQ(count(completed.output, "ProviderType = { 2 };"), 12U);
@@ -133,6 +135,47 @@ TEST_F(Registration, ShowsHowItIsUsed) {
   EXPECT_EQ(completed.status, 2);
   EXPECT_THAT(completed.errors, HasSubstr("registration sfcb TABLE..."));
   EXPECT_NE(registration({"sfcb", "/nowhere"}).status, 0);
+}
+
+class ClassFilesToolTest : public testing::Test {
+ protected:
+  Completed classFiles(const std::string& objectManager, const std::string& differences, const std::string& mof) const {
+    return run({SOURCE_DIR "/tools/class-files", objectManager, directory_.write("differences", differences).string(),
+                directory_.write("classes.mof", mof).string()});
+  }
+
+  void expectRefused(const std::string& differences, const std::string& mof, const std::string& reason) const {
+    const Completed completed = classFiles("sfcb", differences, mof);
+    EXPECT_EQ(completed.status, 1) << differences << mof;
+    EXPECT_THAT(completed.errors, HasSubstr(reason));
+  }
+
+  const std::string mof_ =
+      "class A : B {\n    [Key, Override(\"N\"), Description(\"Key, Override(\\\"N\\\"), one\")]\n  string N;\n};\n"
+      "class C : D {\n    [Key, Override(\"N\"), MaxLen(8)]\n  string N;\n};\n";
+  TemporaryDirectory directory_;
+};
+
+TEST_F(ClassFilesToolTest, LeavesOutWhatTheObjectManagerIsListedFor) {
+  const std::string table = "# comment\nA superclass,keys pegasus,sfcb # why\nC keys sfcb\n";
+  const Completed changed = classFiles("sfcb", table, mof_);
+  ASSERT_EQ(changed.status, 0) << changed.errors;
+  EXPECT_EQ(changed.output,
+            "class A {\n    [Description(\"Key, Override(\\\"N\\\"), one\")]\n  string N;\n};\n"
+            "class C : D {\n    [Override(\"N\"), MaxLen(8)]\n  string N;\n};\n");
+  EXPECT_EQ(classFiles("cimomd", table, mof_).output, mof_);
+  EXPECT_EQ(classFiles("sfcb", "", mof_).output, mof_);
+}
+
+TEST_F(ClassFilesToolTest, RefusesADifferenceThatItCannotMake) {
+  expectRefused("A superclass\n", mof_, "differences:1: expected a class, what it is without, and object managers");
+  expectRefused("A methods sfcb\n", mof_, "differences:1: unknown part \"methods\"");
+  expectRefused("X keys sfcb\n", mof_, "there is no class X here");
+  expectRefused("A superclass sfcb\n", "class A {\n};\n", "classes.mof:1: A has no superclass on this line");
+  expectRefused("A keys sfcb\n", "class A {\n  [MaxLen(8), Key]\n  string N;\n};\n", "classes.mof:2: Key must not be");
+  expectRefused("A superclass sfcb\n", "class A : B {\n  [Override(\"N\")]\n  string N;\n};\n",
+                "classes.mof:2: Override must not be");
+  EXPECT_EQ(run({SOURCE_DIR "/tools/class-files"}).status, 2);
 }
 
 }  // namespace

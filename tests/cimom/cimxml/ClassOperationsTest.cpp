@@ -60,6 +60,11 @@ TEST_F(ClassOperations, GetClassShowsWhatIsInheritedOnlyWhenAsked) {
                     HasSubstr("NAME=\"Extra\" TYPE=\"string\" CLASSORIGIN=\"TEST_Part\" PROPAGATED=\"false\"")));
 }
 
+TEST_F(ClassOperations, GetClassShowsWhatTheClassOverrides) {
+  EXPECT_THAT(getClass("TEST_Part", flag("IncludeClassOrigin", "TRUE")),
+              HasSubstr("NAME=\"WithDefault\" TYPE=\"uint16\" CLASSORIGIN=\"TEST_Thing\" PROPAGATED=\"false\""));
+}
+
 TEST_F(ClassOperations, APropertyListTrimsTheClass) {
   EXPECT_THAT(
       getClass("TEST_Part", everything + parameter("PropertyList", "<VALUE.ARRAY><VALUE>u64</VALUE></VALUE.ARRAY>")),

@@ -21,9 +21,9 @@ CompositeStack::CompositeStack(const std::string& processor, int logThreshold) {
 }
 
 std::vector<std::string> CompositeStack::options() {
-  return {"--schema",       SOURCE_DIR "/schema",
-          "--registration", BINARY_DIR "/share/CompositeIPConfig.reg",
-          "--registration", BINARY_DIR "/share/UnderlyingIPConfig.reg",
+  return {"--schema",       BINARY_DIR "/share/cimomd",
+          "--registration", BINARY_DIR "/share/cimomd/CompositeIPConfig.reg",
+          "--registration", BINARY_DIR "/share/cimomd/UnderlyingIPConfig.reg",
           "--provider-dir", BINARY_DIR "/lib"};
 }
 

@@ -1,0 +1,68 @@
+// The classes as a client of cimomd sees them, and what they say of the instances.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <regex>
+
+#include "cimom/schema/ClassRepository.h"
+#include "tests/e2e/support/CompositeStack.h"
+
+namespace {
+
+using namespace Testing;
+using testing::Contains;
+using testing::ElementsAre;
+using testing::IsEmpty;
+using testing::Not;
+
+class CompositeSchemaTest : public testing::Test {
+ protected:
+  // The properties of a class whose Write qualifier is true, as GetClass shows them.
+  std::vector<std::string> writable(const std::string& className) const {
+    const std::string shown = stack_.wbemcli("-dx gc", className).errors;
+    std::vector<std::string> names;
+    const std::regex property("<PROPERTY[^ ]* NAME=\"(\\w+)\".*?</PROPERTY");
+    for (std::sregex_iterator found(shown.begin(), shown.end(), property), end; found != end; ++found) {
+      if (std::regex_search(found->str(), std::regex("NAME=\"Write\"[^>]*><VALUE>TRUE"))) {
+        names.push_back((*found)[1]);
+      }
+    }
+    return names;
+  }
+
+  TemporaryDirectory directory_;
+  const CompositeStack stack_{simulatedProcessor(directory_.path() / "processor.json")};
+};
+
+TEST_F(CompositeSchemaTest, ShowsAddressAndMaskAsWritable) {
+  // EnabledDefault is the DMTF's.
+  EXPECT_THAT(writable("YRNx_MgmtHwIPProtocolEndPoint"), ElementsAre("EnabledDefault", "IPv4Address", "SubnetMask"));
+  EXPECT_THAT(writable("YRNx_MgmtHwStaticIPAssignmentSettingData"), ElementsAre("IPv4Address", "SubnetMask"));
+  EXPECT_THAT(writable("CIM_IPProtocolEndpoint"), ElementsAre("EnabledDefault"));
+  EXPECT_THAT(writable("CIM_StaticIPAssignmentSettingData"), Contains("GatewayIPv4Address"));
+}
+
+// Whatever a client sees either stands in our class, with its meaning, or is what the schema gives by default.
+TEST_F(CompositeSchemaTest, DeclaresEveryValueThatAnInstanceShows) {
+  Cimom::ClassRepository repository;
+  repository.add(Cimom::MofReader().readPath(BINARY_DIR "/share/cimomd"));
+  for (const Cimom::ClassDefinition* definition : repository.all()) {
+    if (!definition->name.starts_with("YRN")) {
+      continue;
+    }
+    const char* const nameSpace = definition->name.starts_with("YRNQV_") ? "root/yrnse" : "root/cimv2";
+    const std::vector<Printed> instances = stack_.instances("ei", definition->name, {}, nameSpace);
+    EXPECT_THAT(instances, Not(IsEmpty())) << definition->name;
+    for (const Printed& instance : instances) {
+      for (const auto& [name, value] : instance.values) {
+        const Cimom::PropertyDeclaration* const property = definition->findProperty(name);
+        ASSERT_TRUE(property) << definition->name << '.' << name;
+        EXPECT_TRUE(Cimom::findQualifier(property->qualifiers, "Description") ||
+                    value == property->defaultValue.toString())
+            << definition->name << '.' << name << " = " << value;
+      }
+    }
+  }
+}
+
+}  // namespace
