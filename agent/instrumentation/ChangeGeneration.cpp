@@ -53,6 +53,9 @@ Descriptor openRegular(const fs::path& path) {
   if (!S_ISREG(status.st_mode)) {
     fail(path, "is not a regular file");
   }
+  if (status.st_nlink > 1) {
+    fail(path, "has another name too, a hard link: what would be written might be somebody else's file");
+  }
   if (status.st_size == 0) {
     // The umask of its maker must not shut out the group's other users. Only its owner may do this, and need.
     ::fchmod(file.number(), ownerAndGroup);

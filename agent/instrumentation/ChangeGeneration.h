@@ -17,7 +17,7 @@ class ChangeGeneration {
 
   // The number as it is now. The first call of all makes the file, for its owner and group, and a directory that is
   // missing. Throws std::runtime_error that names the file and why it cannot be used: it cannot be opened for reading
-  // and writing, is a symbolic link or anything else that is no regular file, or has content that is not ours.
+  // and writing, is a link or anything else that is no regular file, or has content that is not ours.
   Number current() const;
 
   // Gives it a number that it never had. Throws as current() does, and where the file cannot be written.

@@ -184,6 +184,18 @@ TEST_F(ChangeGenerationTest, RefusesASymbolicLink) {
   EXPECT_EQ(Testing::readFile(target), "12345678");
 }
 
+TEST_F(ChangeGenerationTest, RefusesAHardLink) {
+  const std::string target = directory / "target";
+  Testing::writeFile(target, "");
+  fs::permissions(target, fs::perms::owner_read | fs::perms::owner_write);
+  fs::create_hard_link(target, file);
+
+  expectRefusal("a hard link");
+
+  EXPECT_EQ(Testing::readFile(target), "");
+  EXPECT_EQ(modeOfFile(), 0600U);
+}
+
 TEST_F(ChangeGenerationTest, RefusesAFifoWithoutWaitingForItsOtherEnd) {
   ASSERT_EQ(::mkfifo(file.c_str(), 0600), 0);
   expectRefusal("is not a regular file");
