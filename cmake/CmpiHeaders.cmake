@@ -16,3 +16,4 @@ message(STATUS "CMPI headers: ${CMPI_HEADERS}")
 # SYSTEM: the convenience macros cast in C's manner.
 add_library(cmpi INTERFACE)
 target_include_directories(cmpi SYSTEM INTERFACE "${CMPI_HEADERS}")
+target_compile_definitions(cmpi INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU)

@@ -1,4 +1,4 @@
-# Settings that every target shares: C++20, warnings as errors, hidden symbols, sanitizers.
+# Settings that every target shares: C++20, warnings (errors with the presets), hidden symbols, sanitizers, coverage.
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
@@ -11,8 +11,7 @@ if(NOT CMAKE_BUILD_TYPE)
 endif()
 
 add_compile_options(-Wall -Wextra -Wpedantic -Wshadow -Wnon-virtual-dtor -Wold-style-cast -Woverloaded-virtual
-                    -Wformat=2 -Werror)
-add_compile_definitions(CMPI_PLATFORM_LINUX_GENERIC_GNU)
+                    -Wformat=2)
 
 find_program(CCACHE ccache)
 if(CCACHE)
@@ -24,4 +23,8 @@ if(SANITIZE)
   add_link_options(-fsanitize=${SANITIZE})
 else()
   add_link_options(-Wl,--no-undefined)
+endif()
+if(COVERAGE)
+  add_compile_options(--coverage -fprofile-update=atomic)
+  add_link_options(--coverage)
 endif()

@@ -1,36 +1,25 @@
 // Which class lies at the far end of an association, seen from either end.
 #include <QV/ProviderHelper.h>
 
-#include "ClassNames.h"
-#include "CmpiAccess.h"
-#include "FactoryFrame.h"
-#include "IPConfigObjectFactory.h"
+#include "factory/CmpiAccess.h"
+#include "factory/FactoryFrame.h"
+#include "factory/Model.h"
 
 namespace QV::IPConfigComposite {
 
 namespace {
 
-struct Navigation {
-  const char* source;
-  const char* association;
-  const char* target;
-};
-
-// Searched from the top; the first row whose source and association match gives the target.
-constexpr Navigation navigations[] = {
-    {ClassNames::ipProtocolEndpoint, ClassNames::hostedAccessPoint, ClassNames::computerSystem},
-    {ClassNames::computerSystem, ClassNames::hostedAccessPoint, ClassNames::ipProtocolEndpoint},
-    {ClassNames::computerSystem, ClassNames::remoteHostedAccessPoint, ClassNames::remoteServiceAccessPoint},
-    {ClassNames::remoteServiceAccessPoint, ClassNames::remoteHostedAccessPoint, ClassNames::computerSystem},
-    {ClassNames::ipProtocolEndpoint, ClassNames::elementSettingData, ClassNames::assignmentSettingSequence},
-    {ClassNames::assignmentSettingSequence, ClassNames::elementSettingData, ClassNames::ipProtocolEndpoint},
-    {ClassNames::assignmentSettingSequence, ClassNames::dhcpOrderedMember, ClassNames::dhcpAssignmentSetting},
-    {ClassNames::dhcpAssignmentSetting, ClassNames::dhcpOrderedMember, ClassNames::assignmentSettingSequence},
-    {ClassNames::staticAssignmentSetting, ClassNames::staticOrderedMember, ClassNames::assignmentSettingSequence},
-    {ClassNames::assignmentSettingSequence, ClassNames::staticOrderedMember, ClassNames::staticAssignmentSetting},
-    {ClassNames::remoteServiceAccessPoint, ClassNames::clientAccess, ClassNames::ipProtocolEndpoint},
-    {ClassNames::ipProtocolEndpoint, ClassNames::clientAccess, ClassNames::remoteServiceAccessPoint},
-};
+// Null for a pair that the model does not have.
+const CompositeClass* farEndOf(const char* sourceClass, const char* associationClass) {
+  for (const Association* association : associations) {
+    for (const End end : {End::A, End::B}) {
+      if (textEqual(sourceClass, association->classAt(end).name) && textEqual(associationClass, association->name)) {
+        return &association->classAt(otherThan(end));
+      }
+    }
+  }
+  return nullptr;
+}
 
 }  // namespace
 
@@ -38,12 +27,10 @@ const char* IPConfigObjectFactory::get_assoc_targetClass_Name(const CMPIBroker*,
                                                               const char* assocClass, const char*, CMPIStatus* status) {
   const Frame frame = factoryFrame(__func__);
   frame.entering();
-  const char* const sourceClass = classNameOf(sourcePath, status);
-  for (const Navigation& navigation : navigations) {
-    if (textEqual(sourceClass, navigation.source) && textEqual(assocClass, navigation.association)) {
-      frame.progress(navigation.target);
-      return navigation.target;
-    }
+  const char* sourceClass = classNameOf(sourcePath, status);
+  if (const CompositeClass* target = farEndOf(sourceClass, assocClass)) {
+    frame.progress(target->name);
+    return target->name;
   }
   frame.progress("Target Assoc Class Not Found");
   frame.variable("sourceclass", sourceClass);
@@ -56,13 +43,13 @@ CMPIObjectPath* IPConfigObjectFactory::get_assoc_targetClass_ObjectPath(const CM
                                                                         CMPIStatus* status) {
   const Frame frame = factoryFrame(__func__);
   frame.entering();
-  const char* const targetName = get_assoc_targetClass_Name(broker, sourcePath, assocClass, resultClass, status);
+  const char* targetName = get_assoc_targetClass_Name(broker, sourcePath, assocClass, resultClass, status);
   frame.variable("targetName", targetName);
   if (textEqual(targetName, "")) {
     return nullptr;
   }
   frame.progress(" Creating CMNewObjectPath");
-  CMPIObjectPath* const path = CMNewObjectPath(broker, nameSpaceOf(sourcePath, status), targetName, status);
+  CMPIObjectPath* path = CMNewObjectPath(broker, nameSpaceOf(sourcePath, status), targetName, status);
   rehome(path, sourcePath, status);
   return path;
 }

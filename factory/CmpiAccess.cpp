@@ -1,4 +1,4 @@
-#include "CmpiAccess.h"
+#include "factory/CmpiAccess.h"
 
 #include <QV/ProviderHelper.h>
 
@@ -6,7 +6,7 @@ namespace QV::IPConfigComposite {
 
 namespace {
 
-const char* orEmpty(const char* text) { return text != nullptr ? text : ""; }
+const char* orEmpty(const char* text) { return text ? text : ""; }
 
 constexpr CMPIData nothing = {CMPI_null, CMPI_nullValue, {}};
 
@@ -70,7 +70,7 @@ void setText(CMPIInstance* instance, const char* name, const char* text) {
 }
 
 void setReference(CMPIInstance* instance, const char* name, const CMPIObjectPath* path) {
-  if (!CMIsNullObject(instance) && path != nullptr) {
+  if (!CMIsNullObject(instance) && path) {
     CMSetProperty(instance, name, &path, CMPI_ref);
   }
 }
@@ -83,7 +83,7 @@ void rehome(CMPIObjectPath* path, const CMPIObjectPath* request, CMPIStatus* sta
 }
 
 void traceToBroker(const CMPIBroker* broker, int level, const char* text) {
-  if (broker != nullptr) {
+  if (broker) {
     CMTraceMessage(broker, level, "CompositeIPConfigProvider", text, nullptr);
   }
 }

@@ -44,7 +44,7 @@ void rehome(CMPIObjectPath* path, const CMPIObjectPath* request, CMPIStatus* sta
 // Writes to the object manager's own CMPI trace at a CMPI_LEV_ level.
 void traceToBroker(const CMPIBroker* broker, int level, const char* text);
 
-// How many instances a walk visits: the interface counts them in 16 bits.
+// How many instances a walk visits: their number cut to 16 bits (compatibility 6).
 std::uint16_t countOf(const std::vector<CMPIInstance*>& instances);
 
 }  // namespace QV::IPConfigComposite

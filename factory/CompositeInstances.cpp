@@ -1,8 +1,7 @@
-#include "CompositeInstances.h"
+#include "factory/CompositeInstances.h"
 
-#include "CmpiAccess.h"
-#include "FactoryFrame.h"
-#include "IPConfigObjectFactory.h"
+#include "factory/CmpiAccess.h"
+#include "factory/FactoryFrame.h"
 
 namespace QV::IPConfigComposite {
 
@@ -29,11 +28,11 @@ bool isSelected(const CompositeClass& row, const CMPIInstance* underlying, CMPIS
   return false;
 }
 
-// Whether memory for an array can be had. The array is dropped: it only decides whether the system is built at all, so
-// that a broker out of memory ends the request with a status instead of a system without its "Dedicated".
+// Whether memory for an array can be had (compatibility 17). The array is dropped: it only decides whether the system
+// is built at all, so that a broker out of memory ends the request with a status.
 bool probeForArray(const Request& request) {
   constexpr CMPICount probeSize = 4;
-  if (CMNewArray(request.broker, probeSize, CMPI_uint16, request.status) != nullptr) {
+  if (CMNewArray(request.broker, probeSize, CMPI_uint16, request.status)) {
     return true;
   }
   constexpr const char* failed = "Create Array for Property Dedicated failed.";
@@ -45,7 +44,7 @@ bool probeForArray(const Request& request) {
 void copyDedicated(const Frame& frame, const CMPIInstance* underlying, CMPIInstance* composite, CMPIStatus* status) {
   frame.progress(" CMGetProperty Dedicated");
   const CMPIData dedicated = propertyOf(underlying, "Dedicated", status);
-  if (CMIsNullValue(dedicated) || !CMIsArray(dedicated) || dedicated.value.array == nullptr) {
+  if (CMIsNullValue(dedicated) || !CMIsArray(dedicated) || !dedicated.value.array) {
     return;
   }
   CMGetArrayCount(dedicated.value.array, status);
@@ -72,20 +71,20 @@ void end(const CompositeClass& row, const Frame& frame) {
 
 }  // namespace
 
-int readComposites(const CompositeClass& row, const Request& request, const CMPIContext* ctx, const char* className,
-                   std::vector<CMPIInstance*>& out) {
-  const Frame frame = factoryFrame(row.getAll);
+int readComposites(const CompositeClass& row, const char* function, const Request& request, const CMPIContext* ctx,
+                   const char* className, std::vector<CMPIInstance*>& out) {
+  const Frame frame = factoryFrame(function);
   frame.entering();
-  const CMPIBroker* const broker = request.broker;
-  CMPIStatus* const status = request.status;
+  const CMPIBroker* broker = request.broker;
+  CMPIStatus* status = request.status;
   if (!textEqual(className, row.name)) {
     traceToBroker(broker, CMPI_LEV_WARNING, "***No instance found***");
     return 1;
   }
 
-  const CMPIObjectPath* const path = CMNewObjectPath(broker, underlyingNameSpace, row.underlying, status);
+  const CMPIObjectPath* path = CMNewObjectPath(broker, underlyingNameSpace, row.underlying, status);
   // Asked also without a path: the broker's answer to that is the client's.
-  const CMPIEnumeration* const underlyings = CBEnumInstances(broker, ctx, path, nullptr, status);
+  const CMPIEnumeration* underlyings = CBEnumInstances(broker, ctx, path, nullptr, status);
   if (status->rc != CMPI_RC_OK || CMIsNullObject(underlyings)) {
     end(row, frame);
     return 0;
@@ -94,11 +93,12 @@ int readComposites(const CompositeClass& row, const Request& request, const CMPI
   CMPIUint16 index = 0;
   while (CMHasNext(underlyings, status)) {
     const CMPIData item = instanceItem(CMGetNext(underlyings, status));
-    const CMPIInstance* const underlying = item.value.inst;
+    const CMPIInstance* underlying = item.value.inst;
     if (!isSelected(row, underlying, status)) {
       continue;
     }
-    CMPIInstance* const composite = makeComposite(row, request);
+    CMPIInstance* composite =
+        (IPConfigObjectFactory().*row.make)(broker, request.ref, request.properties, request.noFilter, status);
     for (const MappedProperty& property : row.mapped) {
       mapProperty(item, composite, property.name, property.type, status);
     }
@@ -114,7 +114,7 @@ int readComposites(const CompositeClass& row, const Request& request, const CMPI
     }
     out.push_back(composite);
     if (row.extra == Extra::NumberedSystem) {
-      frame.progress(" Insatance done");
+      frame.progress(" Insatance done");  // compatibility 2
       traceToBroker(broker, CMPI_LEV_INFO, "***Returning One IPConfig instance***");
     }
   }
@@ -122,19 +122,19 @@ int readComposites(const CompositeClass& row, const Request& request, const CMPI
   return 0;
 }
 
-CMPIInstance* makeComposite(const CompositeClass& row, const Request& request) {
-  const Frame frame = factoryFrame(row.make);
+CMPIInstance* makeComposite(const CompositeClass& row, const char* function, const Request& request) {
+  const Frame frame = factoryFrame(function);
   frame.entering();
-  const CMPIBroker* const broker = request.broker;
+  const CMPIBroker* broker = request.broker;
   frame.progress("Calling CMNewObjectPath");
-  CMPIObjectPath* const path = CMNewObjectPath(broker, nameSpaceOf(request.ref, request.status), row.name, nullptr);
+  CMPIObjectPath* path = CMNewObjectPath(broker, nameSpaceOf(request.ref, request.status), row.name, nullptr);
   if (CMIsNullObject(path)) {
     frame.exiting();
     return nullptr;
   }
 
   frame.progress("Calling CMSetNameSpace");
-  const char* const nameSpace = nameSpaceOf(request.ref, request.status);
+  const char* nameSpace = nameSpaceOf(request.ref, request.status);
   frame.variable("namesp", nameSpace);
   frame.variable("systemname", getSystemName().c_str());
   CMSetNameSpace(path, nameSpace);
@@ -142,7 +142,7 @@ CMPIInstance* makeComposite(const CompositeClass& row, const Request& request) {
   CMSetHostname(path, getSystemName().c_str());
 
   frame.progress("Calling CMNewInstance");
-  CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
+  CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
   if (!CMIsNullObject(instance)) {
     if (!request.noFilter) {
       CMSetPropertyFilter(instance, request.properties, row.keys.data());

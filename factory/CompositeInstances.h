@@ -1,11 +1,11 @@
-// How composite instances are read and made, for every row of CompositeClass.h.
+// How composite instances are read and made, for every row of the model.
 #pragma once
 
 #include <cmpidt.h>
 
 #include <vector>
 
-#include "CompositeClass.h"
+#include "factory/Model.h"
 
 namespace QV::IPConfigComposite {
 
@@ -18,9 +18,9 @@ struct Request {
   CMPIStatus* status;
 };
 
-// The getAll and the make member of a class.
-int readComposites(const CompositeClass& row, const Request& request, const CMPIContext* ctx, const char* className,
-                   std::vector<CMPIInstance*>& out);
-CMPIInstance* makeComposite(const CompositeClass& row, const Request& request);
+// What the getAll and the make member of a class do; `function` is the member's own name, for the trace.
+int readComposites(const CompositeClass& row, const char* function, const Request& request, const CMPIContext* ctx,
+                   const char* className, std::vector<CMPIInstance*>& out);
+CMPIInstance* makeComposite(const CompositeClass& row, const char* function, const Request& request);
 
 }  // namespace QV::IPConfigComposite

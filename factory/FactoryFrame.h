@@ -1,9 +1,9 @@
 // The trace frame of the factory's members.
 #pragma once
 
-#include <Trace.h>
-
 #include <string>
+
+#include "trace/Trace.h"
 
 namespace QV::IPConfigComposite {
 

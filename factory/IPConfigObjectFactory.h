@@ -11,6 +11,16 @@ namespace QV::IPConfigComposite {
 // The system-name field that the identifiers of the management processor's settings begin with.
 inline constexpr const char* bmcComputername = "BMC";
 
+// The composite classes: the factory's members that read all instances of one and make a single new one, and the row of
+// the model (factory/Model.cpp) that says what it is.
+#define IPCONFIG_COMPOSITE_CLASSES(PAIR)                                                                             \
+  PAIR(getAllSPComputerCMPIInstances, makeSPComputerInstance, computerSystem)                                        \
+  PAIR(getAllIPProtocolendptCMPIInstances, makeIPProtocolEndptInstance, ipProtocolEndpoint)                          \
+  PAIR(getAllIPAssignmentSettingCMPIInstances, makeIPAssignmentSettingInstance, assignmentSettingSequence)           \
+  PAIR(getAllStaticIPAssignmentSettingCMPIInstances, makeStaticIPAssignmentSettingInstance, staticAssignmentSetting) \
+  PAIR(getAllDHCPAssignmentSettingCMPIInstances, makeDHCPAssignmentSettingInstance, dhcpAssignmentSetting)           \
+  PAIR(getAllIPRemoteSAPCMPIInstances, makeIPRemoteSAPInstance, remoteServiceAccessPoint)
+
 // A provider operation makes one on its stack, calls members and drops it: the factory holds nothing, and every call
 // starts from the underlying classes as they are now.
 //
@@ -20,7 +30,7 @@ inline constexpr const char* bmcComputername = "BMC";
 // to every broker call and holds, on return, what the last of them left.
 class IPConfigObjectFactory {
  public:
-  // The read pairs, one for each composite class.
+  // The read pairs of IPCONFIG_COMPOSITE_CLASSES.
   //
   // getAll… appends an instance for every underlying instance that belongs to the management processor to `out`, in the
   // order of the underlying enumeration. Returns 0 when the enumeration ran, also when the broker reported its failure
@@ -29,43 +39,13 @@ class IPConfigObjectFactory {
   // of every instance.
   //
   // make… returns one new instance with its constant properties, or null where no object path could be made.
-  int getAllSPComputerCMPIInstances(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* ref,
-                                    const char* className, const char** properties, bool noFilter,
-                                    std::vector<CMPIInstance*>& out, CMPIStatus* status);
-  CMPIInstance* makeSPComputerInstance(const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties,
-                                       bool noFilter, CMPIStatus* status);
-
-  int getAllIPProtocolendptCMPIInstances(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* ref,
-                                         const char* className, const char** properties, bool noFilter,
-                                         std::vector<CMPIInstance*>& out, CMPIStatus* status);
-  CMPIInstance* makeIPProtocolEndptInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
-                                            const char** properties, bool noFilter, CMPIStatus* status);
-
-  int getAllIPAssignmentSettingCMPIInstances(const CMPIBroker* broker, const CMPIContext* ctx,
-                                             const CMPIObjectPath* ref, const char* className, const char** properties,
-                                             bool noFilter, std::vector<CMPIInstance*>& out, CMPIStatus* status);
-  CMPIInstance* makeIPAssignmentSettingInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
-                                                const char** properties, bool noFilter, CMPIStatus* status);
-
-  int getAllStaticIPAssignmentSettingCMPIInstances(const CMPIBroker* broker, const CMPIContext* ctx,
-                                                   const CMPIObjectPath* ref, const char* className,
-                                                   const char** properties, bool noFilter,
-                                                   std::vector<CMPIInstance*>& out, CMPIStatus* status);
-  CMPIInstance* makeStaticIPAssignmentSettingInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
-                                                      const char** properties, bool noFilter, CMPIStatus* status);
-
-  int getAllDHCPAssignmentSettingCMPIInstances(const CMPIBroker* broker, const CMPIContext* ctx,
-                                               const CMPIObjectPath* ref, const char* className,
-                                               const char** properties, bool noFilter, std::vector<CMPIInstance*>& out,
-                                               CMPIStatus* status);
-  CMPIInstance* makeDHCPAssignmentSettingInstance(const CMPIBroker* broker, const CMPIObjectPath* ref,
-                                                  const char** properties, bool noFilter, CMPIStatus* status);
-
-  int getAllIPRemoteSAPCMPIInstances(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* ref,
-                                     const char* className, const char** properties, bool noFilter,
-                                     std::vector<CMPIInstance*>& out, CMPIStatus* status);
-  CMPIInstance* makeIPRemoteSAPInstance(const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties,
-                                        bool noFilter, CMPIStatus* status);
+#define IPCONFIG_DECLARE_PAIR(getAll, make, row)                                                                  \
+  int getAll(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* ref, const char* className,  \
+             const char** properties, bool noFilter, std::vector<CMPIInstance*>& out, CMPIStatus* status);        \
+  CMPIInstance* make(const CMPIBroker* broker, const CMPIObjectPath* ref, const char** properties, bool noFilter, \
+                     CMPIStatus* status);
+  IPCONFIG_COMPOSITE_CLASSES(IPCONFIG_DECLARE_PAIR)
+#undef IPCONFIG_DECLARE_PAIR
 
   // The write members: take the new "IPv4Address" and "SubnetMask" from the client's instance `ci` and the interface's
   // name from the keys of the request's path `cop`, and hand them to executeModifyInstance. The broker, the context,
@@ -85,7 +65,7 @@ class IPConfigObjectFactory {
   // when there is no interface node or the instrumentation threw.
   int executeModifyInstance(std::string name, std::string ipv4Address, std::string subnetMask);
 
-  // Kept for callers of the class; reports its entry and does nothing.
+  // Reports its entry and does nothing (compatibility 23).
   void executeSAPModifyInstance(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* cop,
                                 const CMPIInstance* ci, CMPIStatus* status, const char** properties);
 
@@ -103,8 +83,14 @@ class IPConfigObjectFactory {
   void Tokenize(const std::string& text, std::vector<std::string>& tokens, const std::string& delimiters);
 };
 
-// The shape of every getAll member.
+// The shapes of the read pairs.
 using GetAll = int (IPConfigObjectFactory::*)(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*, const char*,
                                               const char**, bool, std::vector<CMPIInstance*>&, CMPIStatus*);
+using Make = CMPIInstance* (IPConfigObjectFactory::*)(const CMPIBroker*, const CMPIObjectPath*, const char**, bool,
+                                                      CMPIStatus*);
+
+// The shape of the write members.
+using Modify = int (IPConfigObjectFactory::*)(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath*,
+                                              const char**, bool, const CMPIInstance*, CMPIStatus*);
 
 }  // namespace QV::IPConfigComposite

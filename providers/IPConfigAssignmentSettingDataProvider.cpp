@@ -1,6 +1,6 @@
 // Serves the IP assignment setting sequences.
-#include "InstanceOperations.h"
-#include "ProviderUnit.h"
+#include "providers/operations/InstanceOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -12,7 +12,7 @@ const std::string loggerIPConfigAssignmentSettingProvider = "Tarnwick.IPConfigAs
 const InstanceUnit unit = {
     .component = loggerIPConfigAssignmentSettingProvider,
     .file = "IPConfigAssignmentSettingDataProvider",
-    .getAll = &IPConfigObjectFactory::getAllIPAssignmentSettingCMPIInstances,
+    .serves = assignmentSettingSequence,
 };
 
 }  // namespace

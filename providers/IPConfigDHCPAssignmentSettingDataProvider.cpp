@@ -1,6 +1,6 @@
 // Serves the DHCP assignment settings.
-#include "InstanceOperations.h"
-#include "ProviderUnit.h"
+#include "providers/operations/InstanceOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -12,7 +12,7 @@ const std::string loggerIPConfigDHCPAssnSettingDataProvider = "Tarnwick.IPConfig
 const InstanceUnit unit = {
     .component = loggerIPConfigDHCPAssnSettingDataProvider,
     .file = "IPConfigDHCPAssignmentSettingDataProvider",
-    .getAll = &IPConfigObjectFactory::getAllDHCPAssignmentSettingCMPIInstances,
+    .serves = dhcpAssignmentSetting,
 };
 
 }  // namespace

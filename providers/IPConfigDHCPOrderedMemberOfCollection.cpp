@@ -1,8 +1,6 @@
-// Serves the association by which DHCP settings are members of assignment setting sequences. The texts of the builder's
-// messages are fixed vocabulary, misnomers and runs of blanks included.
-#include "AssociationOperations.h"
-#include "ClassNames.h"
-#include "ProviderUnit.h"
+// Serves the association by which DHCP settings are members of assignment setting sequences.
+#include "providers/operations/AssociationOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -11,54 +9,38 @@ namespace {
 const CMPIBroker* broker = nullptr;
 const std::string loggerIPConfigDHCPOrderedMembetOfCollProvider = "Tarnwick.IPConfigDHCPOrderedMembetOfCollProvider";
 
-// ReferenceNames asks for "static" where the other three ask for "dhcp": clients have come to rely on what it answers.
-const KindWords kindWords = {
+const WordInSequence wordInSequence = {
     .associators = "dhcp",
     .associatorNames = "dhcp",
     .references = "dhcp",
-    .referenceNames = "static",
+    .referenceNames = "static",  // compatibility 7
 };
 
 const AssociationUnit unit = {
-    .component = loggerIPConfigDHCPOrderedMembetOfCollProvider,
-    .file = "IPConfigDHCPOrderedMemberOfCollection",
-    .associationClass = ClassNames::dhcpOrderedMember,
-    .endA = {ClassNames::assignmentSettingSequence, &IPConfigObjectFactory::getAllIPAssignmentSettingCMPIInstances},
-    .endB = {ClassNames::dhcpAssignmentSetting, &IPConfigObjectFactory::getAllDHCPAssignmentSettingCMPIInstances},
-    .referenceToA = "GroupComponent",
-    .referenceToB = "PartComponent",
-    .kindWords = &kindWords,
-};
-
-const AssociationBuilder builder = {
-    .component = loggerIPConfigDHCPOrderedMembetOfCollProvider,
-    .file = "IPConfigDHCPOrderedMemberOfCollection",
-    .function = "IPConfigDHCPOrderedCMPIInstances",
-    .entryLine = 51,
-    .exitLine = 162,
-    .associationClass = ClassNames::dhcpOrderedMember,
-    .outer = {ClassNames::dhcpAssignmentSetting, &IPConfigObjectFactory::getAllDHCPAssignmentSettingCMPIInstances},
-    .inner = {ClassNames::assignmentSettingSequence, &IPConfigObjectFactory::getAllIPAssignmentSettingCMPIInstances},
-    .first = "GroupComponent",
-    .second = "PartComponent",
-    .firstIsOuter = false,
-    .keysOnPath = false,
-    .outerIdentifierRead = true,
-    .innerMarker = "dhcp",
-    .settingFlags = false,
-    .outerFailed =
-        {Reaction::Course::EndWith1,
-         "***Can't get CLASS_MGMT_HW_DHCP_ASSIGNMENT_SETTING_DATAObjectPaths.      Exiting EnumerateInstanceNames***",
-         68},
-    .outerNull = {Reaction::Course::GoOn},
-    .innerFailed = {Reaction::Course::EndWith0},
-    .innerNull = {Reaction::Course::EndWith1, "CMPIObjectPath is NULL for CLASS_MGMT_HW_DHCP_ASSIGNMENT_SETTING_DATA",
-                  110},
-    .pathFailed =
-        {Reaction::Course::EndWith1,
-         "Create CMPIObjectPath failed for                             CLASS_MGMT_HW_DHCP_ORDER_MEM_OF_COLLECTION.",
-         135},
-    .instanceFailed = UnmadeInstance::Append,
+    .association = dhcpOrderedMember,
+    .trace =
+        {
+            .component = loggerIPConfigDHCPOrderedMembetOfCollProvider,
+            .file = "IPConfigDHCPOrderedMemberOfCollection",
+            .builder = "IPConfigDHCPOrderedCMPIInstances",
+            .builderEntryLine = 51,
+            .builderExitLine = 162,
+        },
+    .wordInSequence = &wordInSequence,
+    .pairing = {.outer = End::B, .readsOuterIdentifier = true, .wordInInnerIdentifier = "dhcp"},
+    .onFailure =
+        {
+            .outerUnreadable = endWith1("***Can't get CLASS_MGMT_HW_DHCP_ASSIGNMENT_SETTING_DATAObjectPaths.      "
+                                        "Exiting EnumerateInstanceNames***",
+                                        68),
+            .outerUnusable = goOn(),
+            .innerUnreadable = endWith0(),
+            .innerUnusable = endWith1("CMPIObjectPath is NULL for CLASS_MGMT_HW_DHCP_ASSIGNMENT_SETTING_DATA", 110),
+            .pathUnmade = endWith1("Create CMPIObjectPath failed for                             "
+                                   "CLASS_MGMT_HW_DHCP_ORDER_MEM_OF_COLLECTION.",
+                                   135),
+            .instanceUnmade = UnmadeInstance::Append,
+        },
 };
 
 }  // namespace

@@ -1,6 +1,6 @@
 // Serves the management processor's computer system.
-#include "InstanceOperations.h"
-#include "ProviderUnit.h"
+#include "providers/operations/InstanceOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -12,7 +12,7 @@ const std::string loggerIPConfigProvider = "Tarnwick.IPConfigProvider";
 const InstanceUnit unit = {
     .component = loggerIPConfigProvider,
     .file = "IPConfigProvider",
-    .getAll = &IPConfigObjectFactory::getAllSPComputerCMPIInstances,
+    .serves = computerSystem,
 };
 
 }  // namespace

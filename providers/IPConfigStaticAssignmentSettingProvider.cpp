@@ -1,6 +1,6 @@
 // Serves the static IP assignment settings.
-#include "ModifyOperation.h"
-#include "ProviderUnit.h"
+#include "providers/operations/InstanceOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -12,7 +12,7 @@ const std::string loggerIPConfigStaticAssnSettingProvider = "Tarnwick.IPConfigSt
 const InstanceUnit unit = {
     .component = loggerIPConfigStaticAssnSettingProvider,
     .file = "IPConfigStaticAssignmentSettingProvider",
-    .getAll = &IPConfigObjectFactory::getAllStaticIPAssignmentSettingCMPIInstances,
+    .serves = staticAssignmentSetting,
 };
 
 }  // namespace

@@ -1,6 +1,6 @@
 // Serves the IP protocol endpoints.
-#include "ModifyOperation.h"
-#include "ProviderUnit.h"
+#include "providers/operations/InstanceOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -12,7 +12,7 @@ const std::string loggerIPProtocolEndpointProvider = "Tarnwick.IPProtocolEndpoin
 const InstanceUnit unit = {
     .component = loggerIPProtocolEndpointProvider,
     .file = "IPProtocolEndpointProvider",
-    .getAll = &IPConfigObjectFactory::getAllIPProtocolendptCMPIInstances,
+    .serves = ipProtocolEndpoint,
 };
 
 }  // namespace

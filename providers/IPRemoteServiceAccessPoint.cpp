@@ -1,6 +1,6 @@
 // Serves the remote service access points.
-#include "ModifyOperation.h"
-#include "ProviderUnit.h"
+#include "providers/operations/InstanceOperations.h"
+#include "providers/operations/ProviderUnit.h"
 
 namespace QV::IPConfigComposite {
 
@@ -12,7 +12,7 @@ const std::string loggerIPRemoteServiceAccessPointProvider = "Tarnwick.IPRemoteS
 const InstanceUnit unit = {
     .component = loggerIPRemoteServiceAccessPointProvider,
     .file = "IPRemoteServiceAccessPoint",
-    .getAll = &IPConfigObjectFactory::getAllIPRemoteSAPCMPIInstances,
+    .serves = remoteServiceAccessPoint,
 };
 
 }  // namespace

@@ -20,26 +20,23 @@ enum MessageType : int {
   FreeMessage = 3,
 };
 
-// Levels of the agent's log: progress, and failures that the library noticed.
-inline constexpr int progressLevel = 4000;
-inline constexpr int failureLevel = 6000;
-
-namespace TraceDetail {
+namespace IPConfigComposite::TraceDetail {
 
 constexpr std::size_t bufferSize = 512;
 
-inline const char* orEmpty(const char* text) { return text != nullptr ? text : ""; }
+inline const char* orEmpty(const char* text) { return text ? text : ""; }
 
-}  // namespace TraceDetail
+}  // namespace IPConfigComposite::TraceDetail
 
 // Formats a line about a function (`text` is its name) or, as FreeMessage, a message (`text` is the message). A type
 // that is none of the four yields the empty text; a line longer than 511 characters is cut. The result is valid until
 // the next call of this overload anywhere in the library.
 inline char* trace(const char* file, const char* text, unsigned int line, MessageType type) {
-  static char messageBuffer[TraceDetail::bufferSize];
+  using IPConfigComposite::TraceDetail::orEmpty;
+  static char messageBuffer[IPConfigComposite::TraceDetail::bufferSize];
   std::memset(messageBuffer, 0, sizeof messageBuffer);
-  file = TraceDetail::orEmpty(file);
-  text = TraceDetail::orEmpty(text);
+  file = orEmpty(file);
+  text = orEmpty(text);
   const int lineNumber = static_cast<int>(line);
   switch (type) {
     case EntryMessage:
@@ -61,13 +58,19 @@ inline char* trace(const char* file, const char* text, unsigned int line, Messag
 
 // Formats a line about a variable. The result is valid until the next call of this overload anywhere in the library.
 inline char* trace(const char* name, const char* file, unsigned int line, const char* value) {
-  static char messageBuffer[TraceDetail::bufferSize];
+  using IPConfigComposite::TraceDetail::orEmpty;
+  static char messageBuffer[IPConfigComposite::TraceDetail::bufferSize];
   std::memset(messageBuffer, 0, sizeof messageBuffer);
-  std::snprintf(messageBuffer, sizeof messageBuffer, "VARIABLE: '%s' has Value '%s' at line %d in %s",
-                TraceDetail::orEmpty(name), TraceDetail::orEmpty(value), static_cast<int>(line),
-                TraceDetail::orEmpty(file));
+  std::snprintf(messageBuffer, sizeof messageBuffer, "VARIABLE: '%s' has Value '%s' at line %d in %s", orEmpty(name),
+                orEmpty(value), static_cast<int>(line), orEmpty(file));
   return messageBuffer;
 }
+
+namespace IPConfigComposite {
+
+// Levels of the agent's log: progress, and failures that the library noticed.
+inline constexpr int progressLevel = 4000;
+inline constexpr int failureLevel = 6000;
 
 namespace TraceDetail {
 
@@ -91,9 +94,12 @@ constexpr const char* frameFile = "Trace.h";
 
 }  // namespace TraceDetail
 
+}  // namespace IPConfigComposite
+
 // Opens the frame of a provider operation: the rule, then the operation's ENTERING line. The text names the operation;
-// the location that the logger sees is the frame's own, with the source lines that readers of the log filter on.
+// the location that the logger sees is the frame's own, at fixed lines (compatibility 3).
 inline void markProviderEntry(const std::string& component, const char* file, const char* function, unsigned int line) {
+  using namespace IPConfigComposite;
   TraceDetail::send(component, progressLevel, "markProviderEntry", TraceDetail::frameFile, 336,
                     [] { return TraceDetail::rule; });
   TraceDetail::send(component, progressLevel, "markProviderEntry", TraceDetail::frameFile, 337,
@@ -102,14 +108,17 @@ inline void markProviderEntry(const std::string& component, const char* file, co
 
 // Closes the frame: the operation's EXITING line, then the rule.
 inline void markProviderExit(const std::string& component, const char* file, const char* function, unsigned int line) {
+  using namespace IPConfigComposite;
   TraceDetail::send(component, progressLevel, "markProviderExit", TraceDetail::frameFile, 348,
                     [=] { return trace(file, function, line, ExitMessage); });
   TraceDetail::send(component, progressLevel, "markProviderExit", TraceDetail::frameFile, 349,
                     [] { return TraceDetail::rule; });
 }
 
+namespace IPConfigComposite {
+
 // What one function reports under: its unit's component and source file and its own name. The component must outlive
-// the frame. Lines default to the caller's.
+// the frame. A line's number is the caller's unless given; numbers that are given are fixed (compatibility 3).
 class Frame {
  public:
   Frame(const std::string& component, const char* file, const char* function)
@@ -142,5 +151,7 @@ class Frame {
   const char* file_;
   const char* function_;
 };
+
+}  // namespace IPConfigComposite
 
 }  // namespace QV

@@ -9,8 +9,12 @@ Integer fromSigned(std::int64_t value) { return {value < 0, static_cast<std::uin
 
 }  // namespace
 
+bool hasValue(const CMPIData& data) { return (data.state & (CMPI_nullValue | CMPI_notFound | CMPI_badValue)) == 0; }
+
 std::optional<Integer> integerOf(const CMPIData& data) {
-  if (CMIsNullValue(data)) return std::nullopt;
+  if (!hasValue(data)) {
+    return std::nullopt;
+  }
   switch (data.type) {
     case CMPI_uint8:
       return Integer{false, data.value.uint8};
@@ -34,18 +38,21 @@ std::optional<Integer> integerOf(const CMPIData& data) {
 }
 
 std::optional<std::string> textOf(const CMPIData& data) {
-  if (CMIsNullValue(data)) return std::nullopt;
-  if (data.type == CMPI_chars && data.value.chars) return data.value.chars;
-  if (data.type != CMPI_string || CMIsNullObject(data.value.string)) return std::nullopt;
-  const char* characters = CMGetCharsPtr(data.value.string, nullptr);
-  if (!characters) return std::nullopt;
-  return characters;
+  if (!hasValue(data)) {
+    return std::nullopt;
+  }
+  if (data.type == CMPI_chars && data.value.chars) {
+    return data.value.chars;
+  }
+  return data.type == CMPI_string ? textOf(data.value.string) : std::nullopt;
 }
 
-std::string charactersOf(const CMPIString* string) {
-  if (CMIsNullObject(string)) return {};
-  const char* characters = CMGetCharsPtr(string, nullptr);
-  return characters ? characters : "";
+std::optional<std::string> textOf(const CMPIString* string) {
+  const char* characters = CMIsNullObject(string) ? nullptr : CMGetCharsPtr(string, nullptr);
+  if (!characters) {
+    return std::nullopt;
+  }
+  return characters;
 }
 
 }  // namespace QV

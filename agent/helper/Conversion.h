@@ -1,4 +1,5 @@
-// CMPI data as ordinary values. A datum that is null, or whose pointer is, has no value of any kind.
+// CMPI data as ordinary values. A datum that is null, bad or not found, or whose pointer is null, has no value of any
+// kind: object managers hand out all of these.
 #pragma once
 
 #include <cmpidt.h>
@@ -23,12 +24,15 @@ struct Integer {
   }
 };
 
+// Whether the state says that there is a value. Its type and its pointers are still to be looked at.
+bool hasValue(const CMPIData& data);
+
 std::optional<Integer> integerOf(const CMPIData& data);
 
 // The characters of a string or chars datum.
 std::optional<std::string> textOf(const CMPIData& data);
 
-// The characters of a broker's string: empty where the string, its handle or its characters are null.
-std::string charactersOf(const CMPIString* string);
+// The characters of a broker's string.
+std::optional<std::string> textOf(const CMPIString* string);
 
 }  // namespace QV

@@ -28,13 +28,22 @@ CMPIStatus set(CMPIInstance* target, const char* name, DataType type, const CMPI
 }  // namespace
 
 void mapProperty(CMPIData source, CMPIInstance* target, const char* name, DataType type, CMPIStatus* status) {
-  if (CMIsNullValue(source) || source.type != CMPI_instance || CMIsNullObject(source.value.inst)) return;
-  if (CMIsNullObject(target) || !name) return;
+  // The type and the pointer tell whether there is an instance. The state does not: OpenPegasus leaves it null on every
+  // item of an enumeration.
+  if (source.type != CMPI_instance || CMIsNullObject(source.value.inst)) {
+    return;
+  }
+  if (CMIsNullObject(target) || !name) {
+    return;
+  }
   CMPIStatus outcome{CMPI_RC_OK, nullptr};
   const CMPIData data = CMGetProperty(source.value.inst, name, &outcome);
-  const bool present = outcome.rc == CMPI_RC_OK && !CMIsNullValue(data);
-  if (present) outcome = set(target, name, type, data);
-  if (status) *status = outcome;
+  if (outcome.rc == CMPI_RC_OK && hasValue(data)) {
+    outcome = set(target, name, type, data);
+  }
+  if (status) {
+    *status = outcome;
+  }
 }
 
 }  // namespace QV

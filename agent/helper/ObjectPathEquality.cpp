@@ -1,5 +1,8 @@
 #include <cmpimacs.h>
 
+#include <algorithm>
+#include <optional>
+#include <string>
 #include <vector>
 
 #include "QV/ProviderHelper.h"
@@ -13,14 +16,25 @@ struct Key {
   CMPIData value;
 };
 
+using Keys = std::vector<Key>;
+
+// Nothing where they cannot be read, or one of them has no name: such a path names no instance that can be told.
 // Some object managers look a key up by its exact spelling only, so the keys are taken by index.
-std::vector<Key> keysOf(const CMPIObjectPath* path) {
-  std::vector<Key> keys;
-  const CMPICount count = CMGetKeyCount(path, nullptr);
-  for (CMPICount index = 0; index < count; ++index) {
-    CMPIString* name = nullptr;
-    const CMPIData value = CMGetKeyAt(path, index, &name, nullptr);
-    keys.push_back({charactersOf(name), value});
+std::optional<Keys> keysOf(const CMPIObjectPath* path) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const CMPICount count = CMGetKeyCount(path, &status);
+  Keys keys;
+  for (CMPICount index = 0; status.rc == CMPI_RC_OK && index < count; ++index) {
+    CMPIString* string = nullptr;
+    const CMPIData value = CMGetKeyAt(path, index, &string, &status);
+    const auto name = textOf(string);
+    if (!name) {
+      return std::nullopt;
+    }
+    keys.push_back({*name, value});
+  }
+  if (status.rc != CMPI_RC_OK) {
+    return std::nullopt;
   }
   return keys;
 }
@@ -33,13 +47,15 @@ bool bothEqual(const Optional& a, const Optional& b) {
 }
 
 bool isNull(const CMPIData& data) {
-  return CMIsNullValue(data) || (data.type == CMPI_string && CMIsNullObject(data.value.string)) ||
+  return !hasValue(data) || (data.type == CMPI_string && !textOf(data.value.string)) ||
          (data.type == CMPI_chars && !data.value.chars) || (data.type == CMPI_ref && CMIsNullObject(data.value.ref)) ||
          (data.type == CMPI_dateTime && CMIsNullObject(data.value.dateTime));
 }
 
 bool sameValue(const CMPIData& a, const CMPIData& b) {
-  if (isNull(a) || isNull(b)) return isNull(a) && isNull(b);
+  if (isNull(a) || isNull(b)) {
+    return isNull(a) && isNull(b);
+  }
   if (bothEqual(integerOf(a), integerOf(b)) || bothEqual(textOf(a), textOf(b))) return true;
   if (a.type != b.type) return false;
   switch (a.type) {
@@ -54,36 +70,54 @@ bool sameValue(const CMPIData& a, const CMPIData& b) {
     case CMPI_ref:
       return samePath(a.value.ref, b.value.ref);
     case CMPI_dateTime:
-      return charactersOf(CMGetStringFormat(a.value.dateTime, nullptr)) ==
-             charactersOf(CMGetStringFormat(b.value.dateTime, nullptr));
+      return bothEqual(textOf(CMGetStringFormat(a.value.dateTime, nullptr)),
+                       textOf(CMGetStringFormat(b.value.dateTime, nullptr)));
     default:
       return false;
   }
 }
 
-bool hasEqualKey(const std::vector<Key>& keys, const Key& wanted) {
-  for (const Key& key : keys) {
-    if (textEqual(key.name.c_str(), wanted.name.c_str())) return sameValue(key.value, wanted.value);
-  }
-  return false;
+bool hasEqualKey(const Keys& keys, const Key& wanted) {
+  return std::any_of(keys.begin(), keys.end(), [&](const Key& key) {
+    return textEqual(key.name.c_str(), wanted.name.c_str()) && sameValue(key.value, wanted.value);
+  });
 }
 
-// By class and keys, without the namespaces.
+bool holdsAll(const Keys& keys, const Keys& wanted) {
+  return std::all_of(wanted.begin(), wanted.end(), [&](const Key& key) { return hasEqualKey(keys, key); });
+}
+
+bool sameKeys(const std::optional<Keys>& a, const std::optional<Keys>& b) {
+  return a && b && a->size() == b->size() && holdsAll(*a, *b) && holdsAll(*b, *a);
+}
+
+// A name as it was read; nothing beside an error, whatever the pointer is.
+std::optional<std::string> asRead(const CMPIString* name, const CMPIStatus& status) {
+  return status.rc == CMPI_RC_OK ? textOf(name) : std::nullopt;
+}
+
+std::optional<std::string> classOf(const CMPIObjectPath* path) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const CMPIString* name = CMGetClassName(path, &status);
+  return asRead(name, status);
+}
+
+std::string namespaceOf(const CMPIObjectPath* path) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  const CMPIString* name = CMGetNameSpace(path, &status);
+  return asRead(name, status).value_or("");
+}
+
+// By class and keys, without the namespaces. A path whose class is not known equals nothing.
 bool samePath(const CMPIObjectPath* a, const CMPIObjectPath* b) {
-  if (!textEqual(charactersOf(CMGetClassName(a, nullptr)).c_str(), charactersOf(CMGetClassName(b, nullptr)).c_str()))
-    return false;
-  const auto keysOfA = keysOf(a);
-  const auto keysOfB = keysOf(b);
-  if (keysOfA.size() != keysOfB.size()) return false;
-  for (const Key& key : keysOfA) {
-    if (!hasEqualKey(keysOfB, key)) return false;
-  }
-  return true;
+  const auto classOfA = classOf(a);
+  const auto classOfB = classOf(b);
+  return classOfA && classOfB && textEqual(classOfA->c_str(), classOfB->c_str()) && sameKeys(keysOf(a), keysOf(b));
 }
 
 bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b) {
-  const std::string namespaceOfA = charactersOf(CMGetNameSpace(a, nullptr));
-  const std::string namespaceOfB = charactersOf(CMGetNameSpace(b, nullptr));
+  const std::string namespaceOfA = namespaceOf(a);
+  const std::string namespaceOfB = namespaceOf(b);
   return namespaceOfA.empty() || namespaceOfB.empty() || textEqual(namespaceOfA.c_str(), namespaceOfB.c_str());
 }
 

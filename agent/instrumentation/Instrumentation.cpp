@@ -1,33 +1,21 @@
 #include "QV/Instrumentation.h"
 
 #include <exception>
-#include <experimental/source_location>
 
-#include "TWLog/TWLog.h"
 #include "instrumentation/InterfaceCursor.h"
 #include "instrumentation/SharedBackEnd.h"
+#include "log/Report.h"
 
 namespace QV {
 namespace {
 
 // Callers do not keep the text of what is thrown, and a destructor throws nothing: the log is where the reason stays.
-void logFailure(const char* reason, const std::experimental::source_location& where) noexcept {
-  try {
-    const std::string component = "Tarnwick.Instrumentation";
-    const std::string text = reason;
-    const auto line = static_cast<int>(where.line());
-    TWLog::TWLogger::logLevelMessage(where.function_name(), "Instrumentation", line, component, 6000, nullptr, 0, 0,
-                                     text);
-    TWLog::TWLogger::traceLevelMessage(where.function_name(), "Instrumentation", line, component, 6000, nullptr, 0, 0,
-                                       text);
-  } catch (const std::exception&) {
-    // Out of memory: the failure itself is still thrown to the caller.
-  }
+void logFailure(const char* reason, const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) noexcept {
+  TWLog::report("Tarnwick.Instrumentation", TWLog::failureLevel, reason, where);
 }
 
 template <typename Operation>
-auto logged(const Operation& operation,
-            std::experimental::source_location where = std::experimental::source_location::current()) {
+auto logged(const Operation& operation, const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) {
   try {
     return operation();
   } catch (const std::exception& error) {
@@ -48,7 +36,7 @@ Instrumentation::~Instrumentation() {
   try {
     state_->cursor.flush();
   } catch (const std::exception& error) {
-    logFailure(error.what(), std::experimental::source_location::current());
+    logFailure(error.what());
   }
   delete state_;
 }

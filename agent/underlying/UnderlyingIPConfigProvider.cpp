@@ -1,14 +1,15 @@
 // The CMPI instance provider of the underlying classes, one algorithm over their table. Read only: the processor is
-// changed through the instrumentation.
+// changed through the instrumentation. Object managers do hand out null objects with a good status, and good pointers
+// beside a bad one: what is made or delivered is looked at, and a request that cannot go on says why.
 #include <cmpimacs.h>
 
 #include <exception>
-#include <experimental/source_location>
 #include <functional>
 #include <stdexcept>
 
 #include "QV/ProviderHelper.h"
-#include "TWLog/TWLog.h"
+#include "helper/Conversion.h"
+#include "log/Report.h"
 #include "underlying/ClassTable.h"
 
 namespace {
@@ -17,7 +18,25 @@ using namespace QV;
 
 const CMPIBroker* broker = nullptr;
 
-// What set a property or a key of an object of the broker: CMPI_chars is itself the pointer, all else is pointed at.
+// Throws where the object manager did not do what it was asked for: "take the key" "Name".
+void require(const CMPIStatus& status, const char* what, const char* which) {
+  if (status.rc != CMPI_RC_OK) {
+    const auto reason = textOf(status.msg);
+    throw std::runtime_error("the object manager does not " + std::string(what) + ' ' + which + ": status " +
+                             std::to_string(status.rc) + (reason ? ", " + *reason : ""));
+  }
+}
+
+template <typename Object>
+Object* requireMade(Object* object, const CMPIStatus& status, const char* what, const char* which) {
+  require(status, what, which);
+  if (CMIsNullObject(object)) {
+    throw std::runtime_error("the object manager does not " + std::string(what) + ' ' + which);
+  }
+  return object;
+}
+
+// What sets a property or a key of an object of the broker: CMPI_chars is itself the pointer, all else is pointed at.
 using Setter = std::function<void(const char* name, const CMPIValue* value, CMPIType type)>;
 
 void setValue(const Setter& set, const char* name, const std::string& text) {
@@ -37,13 +56,14 @@ void setValue(const Setter& set, const char* name, std::uint8_t number) {
 }
 
 void setValue(const Setter& set, const char* name, const std::vector<std::uint16_t>& numbers) {
-  CMPIArray* array = CMNewArray(broker, static_cast<CMPICount>(numbers.size()), CMPI_uint16, nullptr);
-  if (!array) throw std::bad_alloc();
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIArray* made = CMNewArray(broker, static_cast<CMPICount>(numbers.size()), CMPI_uint16, &status);
+  CMPIArray* array = requireMade(made, status, "make an array for", name);
   CMPICount index = 0;
   CMPIValue value{};
   for (const std::uint16_t number : numbers) {
     value.uint16 = number;
-    CMSetArrayElementAt(array, index++, &value, CMPI_uint16);
+    require(CMSetArrayElementAt(array, index++, &value, CMPI_uint16), "fill an array for", name);
   }
   value.array = array;
   set(name, &value, CMPI_uint16A);
@@ -57,75 +77,96 @@ void setProperty(const Setter& set, const Property& property) {
 
 bool isKey(const UnderlyingClass& underlyingClass, const Property& property) {
   for (const char* key : underlyingClass.keys) {
-    if (textEqual(key, property.name)) return true;
+    if (textEqual(key, property.name)) {
+      return true;
+    }
   }
   return false;
 }
 
-// One request: the class that it asks for, and the namespace in which its objects are made.
+// One request: the class that it asks for, the namespace in which its objects are made, and where they go.
 class Request {
  public:
-  Request(const UnderlyingClass& underlyingClass, std::string nameSpace)
-      : class_(underlyingClass), namespace_(std::move(nameSpace)) {}
+  Request(const UnderlyingClass& underlyingClass, std::string nameSpace, const CMPIResult* result)
+      : class_(underlyingClass), keys_(underlyingClass.keys), namespace_(std::move(nameSpace)), result_(result) {}
 
   Instances read() const { return readInstances(class_); }
 
   CMPIObjectPath* pathOf(const InstanceProperties& properties) const {
     CMPIObjectPath* path = newPath();
     const Setter addKey = [&](const char* name, const CMPIValue* value, CMPIType type) {
-      CMAddKey(path, name, value, type);
+      require(CMAddKey(path, name, value, type), "take the key", name);
     };
     for (const Property& property : properties) {
-      if (isKey(class_, property)) setProperty(addKey, property);
+      if (isKey(class_, property)) {
+        setProperty(addKey, property);
+      }
     }
     return path;
   }
 
-  CMPIInstance* instanceOf(const InstanceProperties& properties, const char** wanted) const {
+  // A property that the object manager does not take is one that its class does not declare: it is left out.
+  CMPIInstance* instanceOf(const InstanceProperties& properties, const char** wanted) {
     CMPIStatus status{CMPI_RC_OK, nullptr};
-    CMPIInstance* instance = CMNewInstance(broker, pathOf(properties), &status);
-    if (CMIsNullObject(instance)) throw std::runtime_error("the object manager made no instance");
-    auto keys = class_.keys;
-    CMSetPropertyFilter(instance, wanted, keys.data());
+    CMPIInstance* made = CMNewInstance(broker, pathOf(properties), &status);
+    CMPIInstance* instance = requireMade(made, status, "make an instance of", class_.name);
+    if (wanted) {
+      CMSetPropertyFilter(instance, wanted, keys_.data());
+    }
     const Setter set = [&](const char* name, const CMPIValue* value, CMPIType type) {
       CMSetProperty(instance, name, value, type);
     };
-    for (const Property& property : properties) setProperty(set, property);
+    for (const Property& property : properties) {
+      setProperty(set, property);
+    }
     return instance;
   }
 
+  void deliver(const CMPIObjectPath* path) const {
+    require(CMReturnObjectPath(result_, path), "take an object path of", class_.name);
+  }
+
+  void deliver(const CMPIInstance* instance) const {
+    require(CMReturnInstance(result_, instance), "take an instance of", class_.name);
+  }
+
+  void deliverEnd() const { require(CMReturnDone(result_), "take the end of", class_.name); }
+
  private:
   CMPIObjectPath* newPath() const {
-    CMPIObjectPath* path = CMNewObjectPath(broker, namespace_.c_str(), class_.name, nullptr);
-    if (CMIsNullObject(path)) throw std::runtime_error("the object manager made no object path");
-    return path;
+    CMPIStatus status{CMPI_RC_OK, nullptr};
+    CMPIObjectPath* made = CMNewObjectPath(broker, namespace_.c_str(), class_.name, &status);
+    return requireMade(made, status, "make an object path of", class_.name);
   }
 
   const UnderlyingClass& class_;
+  std::array<const char*, 5> keys_;  // as long as the instances that refer to them
   const std::string namespace_;
+  const CMPIResult* const result_;
 };
 
-std::string charactersOf(const CMPIString* string) {
-  const char* characters = CMIsNullObject(string) ? nullptr : CMGetCharsPtr(string, nullptr);
-  return characters ? characters : "";
-}
-
-CMPIStatus failed(CMPIrc code, const std::string& reason,
-                  const std::experimental::source_location& where = std::experimental::source_location::current()) {
-  TWLog::TWLogger::logLevelMessage(where.function_name(), "UnderlyingIPConfigProvider", static_cast<int>(where.line()),
-                                   "Tarnwick.UnderlyingIPConfigProvider", 6000, nullptr, 0, 0, reason);
-  CMPIStatus status{code, nullptr};
-  status.msg = CMNewString(broker, reason.c_str(), nullptr);
-  return status;
+CMPIStatus failed(CMPIrc code, const char* reason,
+                  const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) noexcept {
+  TWLog::report("Tarnwick.UnderlyingIPConfigProvider", TWLog::failureLevel, reason, where);
+  CMPIStatus made{CMPI_RC_OK, nullptr};
+  CMPIString* message = CMNewString(broker, reason, &made);
+  return {code, made.rc == CMPI_RC_OK && !CMIsNullObject(message) ? message : nullptr};
 }
 
 // Runs an operation on the class that the path names; no exception leaves for the object manager.
-CMPIStatus serve(const CMPIObjectPath* path, const std::function<CMPIStatus(const Request&)>& operation) {
+CMPIStatus serve(const CMPIResult* result, const CMPIObjectPath* path,
+                 const std::function<CMPIStatus(Request&)>& operation) {
+  if (!result || CMIsNullObject(path)) {
+    return failed(CMPI_RC_ERR_INVALID_PARAMETER, "the object manager passes no object path, or nowhere to put results");
+  }
   try {
-    const std::string name = charactersOf(CMGetClassName(path, nullptr));
+    const std::string name = textOf(CMGetClassName(path, nullptr)).value_or("");
     const UnderlyingClass* underlyingClass = findUnderlyingClass(name.c_str());
-    if (!underlyingClass) return failed(CMPI_RC_ERR_INVALID_CLASS, "the class '" + name + "' is not served here");
-    return operation(Request(*underlyingClass, charactersOf(CMGetNameSpace(path, nullptr))));
+    if (!underlyingClass) {
+      return failed(CMPI_RC_ERR_INVALID_CLASS, ("the class '" + name + "' is not served here").c_str());
+    }
+    Request request(*underlyingClass, textOf(CMGetNameSpace(path, nullptr)).value_or(""), result);
+    return operation(request);
   } catch (const std::exception& error) {
     return failed(CMPI_RC_ERR_FAILED, error.what());
   }
@@ -138,30 +179,35 @@ CMPIStatus underlyingCleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) {
 
 CMPIStatus underlyingEnumInstanceNames(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result,
                                        const CMPIObjectPath* path) {
-  return serve(path, [&](const Request& request) {
-    for (const InstanceProperties& properties : request.read()) CMReturnObjectPath(result, request.pathOf(properties));
-    CMReturnDone(result);
+  return serve(result, path, [](const Request& request) {
+    for (const InstanceProperties& properties : request.read()) {
+      request.deliver(request.pathOf(properties));
+    }
+    request.deliverEnd();
     return ok;
   });
 }
 
 CMPIStatus underlyingEnumInstances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result,
                                    const CMPIObjectPath* path, const char** wanted) {
-  return serve(path, [&](const Request& request) {
-    for (const InstanceProperties& properties : request.read())
-      CMReturnInstance(result, request.instanceOf(properties, wanted));
-    CMReturnDone(result);
+  return serve(result, path, [&](Request& request) {
+    for (const InstanceProperties& properties : request.read()) {
+      request.deliver(request.instanceOf(properties, wanted));
+    }
+    request.deliverEnd();
     return ok;
   });
 }
 
 CMPIStatus underlyingGetInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result,
                                  const CMPIObjectPath* path, const char** wanted) {
-  return serve(path, [&](const Request& request) {
+  return serve(result, path, [&](Request& request) {
     for (const InstanceProperties& properties : request.read()) {
-      if (!isObjPathsEqual(path, request.pathOf(properties), false)) continue;
-      CMReturnInstance(result, request.instanceOf(properties, wanted));
-      CMReturnDone(result);
+      if (!isObjPathsEqual(path, request.pathOf(properties), false)) {
+        continue;
+      }
+      request.deliver(request.instanceOf(properties, wanted));
+      request.deliverEnd();
       return ok;
     }
     return CMPIStatus{CMPI_RC_ERR_NOT_FOUND, nullptr};

@@ -3,8 +3,8 @@
 #include <charconv>
 #include <string_view>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Errors.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {
@@ -14,19 +14,23 @@ constexpr unsigned notExtended = 510;
 
 // Man: http://www.dmtf.org/cim/mapping/http/v1.0 ; ns=73
 std::string prefixOf(const Http::Request& request) {
-  if (request.method != "M-POST") return {};
+  if (request.method != "M-POST") {
+    return {};
+  }
   const std::string* declaration = request.headers.find("Man");
-  if (!declaration || declaration->find(extension) == std::string::npos)
+  if (!declaration || declaration->find(extension) == std::string::npos) {
     throw TransportError(notExtended, "",
-                         "M-POST demands no extension that this server knows: it knows " + std::string(extension));
+                         "the Man header of an M-POST must name the extension " + std::string(extension));
+  }
   const auto marker = declaration->find("ns=");
   const auto digits = marker == std::string::npos ? std::string() : declaration->substr(marker + 3, 2);
-  if (digits.size() != 2 || digits.find_first_not_of("0123456789") != std::string::npos)
-    throw TransportError(notExtended, "", "the Man header has no ns= with two digits");
+  if (digits.size() != 2 || digits.find_first_not_of("0123456789") != std::string::npos) {
+    throw TransportError(notExtended, "", "the Man header must contain ns= and two digits");
+  }
   return digits + "-";
 }
 
-// %XX as its byte; what is no escape stays.
+// %XX as its byte; anything else stays.
 std::string unescape(std::string_view text) {
   std::string result;
   for (std::size_t i = 0; i < text.size(); ++i) {
@@ -35,7 +39,9 @@ std::string unescape(std::string_view text) {
     const bool isEscape =
         text[i] == '%' && text.size() - i > 2 && std::from_chars(digits, digits + 2, byte, 16).ptr == digits + 2;
     result += isEscape ? static_cast<char>(byte) : text[i];
-    if (isEscape) i += 2;
+    if (isEscape) {
+      i += 2;
+    }
   }
   return result;
 }
@@ -51,14 +57,18 @@ std::string nameSpaceOf(const std::string& object, bool isIntrinsic) {
 OperationHeaders::OperationHeaders(const Http::Request& request)
     : headers_(request.headers), prefix_(prefixOf(request)) {
   const std::string* operation = find("CIMOperation");
-  if (!operation || !sameName(*operation, "MethodCall"))
-    throw TransportError(400, "unsupported-operation",
-                         operation ? "the header CIMOperation is not MethodCall" : "there is no header CIMOperation");
+  if (!operation || !sameName(*operation, "MethodCall")) {
+    throw TransportError(
+        400, "unsupported-operation",
+        operation ? "the CIMOperation header must be MethodCall" : "the CIMOperation header is missing");
+  }
   const std::string* version = find("CIMProtocolVersion");
-  if (version && !version->starts_with("1."))
-    throw TransportError(501, "unsupported-protocol-version", "CIMProtocolVersion is " + *version + ", not 1.x");
-  if (find("CIMBatch"))
-    throw TransportError(501, "multiple-requests-unsupported", "this server takes one request in a message");
+  if (version && !version->starts_with("1.")) {
+    throw TransportError(501, "unsupported-protocol-version", "CIMProtocolVersion must be 1.x, not " + *version);
+  }
+  if (find("CIMBatch")) {
+    throw TransportError(501, "multiple-requests-unsupported", "only one request per message is supported");
+  }
 }
 
 const std::string* OperationHeaders::find(const std::string& name) const { return headers_.find(prefix_ + name); }
@@ -66,13 +76,19 @@ const std::string* OperationHeaders::find(const std::string& name) const { retur
 void OperationHeaders::requireMatch(const Request& message) const {
   const auto refuse = [](const std::string& what) { throw TransportError(400, "header-mismatch", what); };
   const std::string* method = find("CIMMethod");
-  if (!method) return refuse("there is no header CIMMethod");
-  if (!sameName(unescape(*method), message.method))
-    refuse("the header CIMMethod says " + *method + ", the message " + message.method);
+  if (!method) {
+    return refuse("the CIMMethod header is missing");
+  }
+  if (!sameName(unescape(*method), message.method)) {
+    refuse("the CIMMethod header is " + *method + ", but the message calls " + message.method);
+  }
   const std::string* object = find("CIMObject");
-  if (!object) return refuse("there is no header CIMObject");
-  if (!sameName(nameSpaceOf(*object, message.isIntrinsic), message.nameSpace))
-    refuse("the header CIMObject says " + *object + ", the message " + message.nameSpace);
+  if (!object) {
+    return refuse("the CIMObject header is missing");
+  }
+  if (!sameName(nameSpaceOf(*object, message.isIntrinsic), message.nameSpace)) {
+    refuse("the CIMObject header names " + *object + ", but the message names " + message.nameSpace);
+  }
 }
 
 void OperationHeaders::addTo(Http::Headers& reply) const {

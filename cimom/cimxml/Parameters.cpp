@@ -4,23 +4,27 @@
 
 #include <algorithm>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Errors.h"
-#include "cimom/cimxml/Types.h"
+#include "cimom/cimxml/ScalarText.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {
 
 [[noreturn]] void refuse(std::string_view name, const char* what) {
-  throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the parameter " + std::string(name) + " " + what);
+  throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter " + std::string(name) + " " + what);
 }
 
 // The value of a parameter that may be missing; null then.
 template <typename Kind>
 const Kind* valueOf(const Parameter* parameter, const char* otherwise) {
-  if (!parameter) return nullptr;
+  if (!parameter) {
+    return nullptr;
+  }
   const auto* value = std::get_if<Kind>(&parameter->value);
-  if (!value) refuse(parameter->name, otherwise);
+  if (!value) {
+    refuse(parameter->name, otherwise);
+  }
   return value;
 }
 
@@ -29,9 +33,13 @@ const Kind* valueOf(const Parameter* parameter, const char* otherwise) {
 Parameters::Parameters(const Request& request, const std::vector<std::string_view>& known) : request_(request) {
   for (auto parameter = request.parameters.begin(); parameter != request.parameters.end(); ++parameter) {
     const auto isSame = [parameter](const auto& other) { return sameName(parameter->name, other); };
-    if (std::none_of(known.begin(), known.end(), isSame)) refuse(parameter->name, "is not known");
-    if (std::any_of(request.parameters.begin(), parameter, [&](const Parameter& other) { return isSame(other.name); }))
-      refuse(parameter->name, "is given twice");
+    if (std::none_of(known.begin(), known.end(), isSame)) {
+      refuse(parameter->name, "is unknown");
+    }
+    if (std::any_of(request.parameters.begin(), parameter,
+                    [&](const Parameter& other) { return isSame(other.name); })) {
+      refuse(parameter->name, "is a duplicate");
+    }
   }
 }
 
@@ -44,50 +52,71 @@ const Parameter* Parameters::find(std::string_view name) const {
 }
 
 std::optional<std::string> Parameters::text(std::string_view name) const {
-  const auto* text = valueOf<std::string>(find(name), "is no text");
-  if (!text) return std::nullopt;
+  const auto* text = valueOf<std::string>(find(name), "must be text");
+  if (!text) {
+    return std::nullopt;
+  }
   return *text;
 }
 
 bool Parameters::flag(std::string_view name, bool whenMissing) const {
   const auto value = text(name);
-  if (!value) return whenMissing;
+  if (!value) {
+    return whenMissing;
+  }
   const auto parsed = parseScalar(CMPI_boolean, *value);
-  if (!parsed) refuse(name, "is neither TRUE nor FALSE");
+  if (!parsed) {
+    refuse(name, "must be TRUE or FALSE");
+  }
   return parsed->boolean != 0;
 }
 
 std::string Parameters::className(std::string_view name) const {
-  const auto* value = valueOf<ObjectName>(find(name), "is no name of a class");
-  if (!value) return {};
-  if (!value->keys.empty()) refuse(name, "is no name of a class");
+  const auto* value = valueOf<ObjectName>(find(name), "must be a class name");
+  if (!value) {
+    return {};
+  }
+  if (!value->keys.empty()) {
+    refuse(name, "must be a class name");
+  }
   return value->className;
 }
 
 std::string Parameters::requiredClassName(std::string_view name) const {
   auto value = className(name);
-  if (value.empty()) refuse(name, "is missing");
+  if (value.empty()) {
+    refuse(name, "is missing");
+  }
   return value;
 }
 
 const ObjectName& Parameters::instanceName(std::string_view name) const {
-  const auto* value = valueOf<ObjectName>(find(name), "is no name of an instance");
-  if (!value) refuse(name, "is missing");
+  const auto* value = valueOf<ObjectName>(find(name), "must be an instance name");
+  if (!value) {
+    refuse(name, "is missing");
+  }
   return *value;
 }
 
 const Instance& Parameters::instance(std::string_view name) const {
-  const auto* value = valueOf<Instance>(find(name), "is no instance");
-  if (!value) refuse(name, "is missing");
+  const auto* value = valueOf<Instance>(find(name), "must be an instance");
+  if (!value) {
+    refuse(name, "is missing");
+  }
   return *value;
 }
 
 std::optional<std::vector<std::string>> Parameters::propertyList() const {
-  const auto* texts = valueOf<Texts>(find("PropertyList"), "is no list of names");
-  if (!texts) return std::nullopt;
+  const auto* texts = valueOf<Texts>(find("PropertyList"), "must be a list of names");
+  if (!texts) {
+    return std::nullopt;
+  }
   std::vector<std::string> names;
-  for (const auto& text : *texts)
-    if (text) names.push_back(*text);
+  for (const auto& text : *texts) {
+    if (text) {
+      names.push_back(*text);
+    }
+  }
   return names;
 }
 

@@ -136,6 +136,22 @@ TEST_F(BmcStack, IsChangedByTwoObjectManagersOneAfterTheOther) {
   EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.79/255.255.255.0 Static Address");
 }
 
+TEST_F(BmcStack, ShowsAtOnceWhatAnotherObjectManagerChanged) {
+  bmc_.emplace();
+  QV::BackEndSettings settings = bmc_->settings();
+  settings["cache"] = "60";
+  startObjectManager(settings);
+  const CompositeStack other(sectionFor(settings));
+  EXPECT_EQ(stack_->get(endpoint("lan1")).at("IPv4Address"), quoted("192.0.2.10"));
+  EXPECT_EQ(other.get(endpoint("lan1")).at("IPv4Address"), quoted("192.0.2.10"));
+  stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  EXPECT_EQ(other.get(endpoint("lan1")).at("IPv4Address"), quoted("192.0.2.77"));
+  other.modify(staticSetting("lan1"), "IPv4Address=192.0.2.78");
+  EXPECT_EQ(stack_->get(endpoint("lan1")).at("IPv4Address"), quoted("192.0.2.78"));
+  EXPECT_EQ(bmc_->witness("IP Address"), "192.0.2.78");
+  EXPECT_EQ(stack_->log() + other.log(), "");
+}
+
 TEST_F(BmcStack, SendsNothingOfAChangeThatNoInterfaceCanHave) {
   start();
   stack_->modify(endpoint("lan1"), "IPv4Address=127.0.0.1");

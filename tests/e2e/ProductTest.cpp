@@ -137,7 +137,7 @@ TEST_F(Registration, ShowsHowItIsUsed) {
   EXPECT_NE(registration({"sfcb", "/nowhere"}).status, 0);
 }
 
-class ClassFiles : public testing::Test {
+class ClassFilesToolTest : public testing::Test {
  protected:
   Completed classFiles(const std::string& objectManager, const std::string& differences, const std::string& mof) const {
     return run({SOURCE_DIR "/tools/class-files", objectManager, directory_.write("differences", differences).string(),
@@ -156,7 +156,7 @@ class ClassFiles : public testing::Test {
   TemporaryDirectory directory_;
 };
 
-TEST_F(ClassFiles, LeaveOutWhatTheObjectManagerIsListedFor) {
+TEST_F(ClassFilesToolTest, LeavesOutWhatTheObjectManagerIsListedFor) {
   const std::string table = "# comment\nA superclass,keys pegasus,sfcb # why\nC keys sfcb\n";
   const Completed changed = classFiles("sfcb", table, mof_);
   ASSERT_EQ(changed.status, 0) << changed.errors;
@@ -167,7 +167,7 @@ TEST_F(ClassFiles, LeaveOutWhatTheObjectManagerIsListedFor) {
   EXPECT_EQ(classFiles("sfcb", "", mof_).output, mof_);
 }
 
-TEST_F(ClassFiles, AreNotWrittenWhereADifferenceCannotBeMade) {
+TEST_F(ClassFilesToolTest, RefusesADifferenceThatItCannotMake) {
   expectRefused("A superclass\n", mof_, "differences:1: expected a class, what it is without, and object managers");
   expectRefused("A methods sfcb\n", mof_, "differences:1: unknown part \"methods\"");
   expectRefused("X keys sfcb\n", mof_, "there is no class X here");

@@ -1,6 +1,5 @@
 // The class at the far end of an association: the table, the traces, and the path that is made of it.
-#include <IPConfigObjectFactory.h>
-
+#include "factory/IPConfigObjectFactory.h"
 #include "support/CompositeTest.h"
 
 namespace {

@@ -1,8 +1,7 @@
 // The factory's read pairs, for all six composite classes.
-#include <IPConfigObjectFactory.h>
-
 #include <ostream>
 
+#include "factory/IPConfigObjectFactory.h"
 #include "support/Samples.h"
 
 namespace {

@@ -1,7 +1,7 @@
 // The write to the instrumentation, with a stand-in that records every call and throws where a test wants it.
-#include <IPConfigObjectFactory.h>
 #include <gtest/gtest.h>
 
+#include "factory/IPConfigObjectFactory.h"
 #include "support/RecordingLog.h"
 #include "support/ScriptedInstrumentation.h"
 

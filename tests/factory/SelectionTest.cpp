@@ -1,8 +1,7 @@
 // Which underlying instances belong to the management processor.
-#include <IPConfigObjectFactory.h>
-
 #include <ostream>
 
+#include "factory/IPConfigObjectFactory.h"
 #include "support/Samples.h"
 
 namespace {

@@ -1,5 +1,6 @@
-#include <IPConfigObjectFactory.h>
 #include <gtest/gtest.h>
+
+#include "factory/IPConfigObjectFactory.h"
 
 namespace {
 

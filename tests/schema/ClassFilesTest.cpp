@@ -7,7 +7,7 @@
 #include <map>
 #include <sstream>
 
-#include "cimom/registry/ProviderRegistration.h"
+#include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 #include "tests/schema/ClassText.h"
 

@@ -1,7 +1,7 @@
-#include <Trace.h>
 #include <gtest/gtest.h>
 
 #include "support/RecordingLog.h"
+#include "trace/Trace.h"
 
 namespace {
 
@@ -105,7 +105,7 @@ TEST_F(TraceTest, MarkersReportFromTheirOwnPlace) {
 }
 
 TEST_F(TraceTest, AFunctionsLinesCarryItsOwnPlaceAndReachTheLogBeforeTheTrace) {
-  const QV::Frame frame(component, "Unit", "function");
+  const QV::IPConfigComposite::Frame frame(component, "Unit", "function");
   frame.entering(1);
   frame.progress("going", 2);
   frame.variable("n", "v", 3);

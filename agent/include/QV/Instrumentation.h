@@ -23,9 +23,9 @@ enum Properties {
 
 }  // namespace NodeLexicon
 
-// A cursor over the nodes of one type. Writes made through it take effect on the management processor no later than its
-// destruction. Every member but the destructor may throw an exception derived from std::exception whose text names the
-// cause: an unreachable processor, a refused value, a damaged state.
+// A cursor over the nodes of one type. Writes made through it are sent to the management processor no later than its
+// destruction, see setProperty. Every member but the destructor may throw an exception derived from std::exception
+// whose text names the cause: an unreachable processor, a refused value, a damaged state.
 class Instrumentation {
  public:
   Instrumentation();
@@ -48,6 +48,12 @@ class Instrumentation {
 
   // Writes a property of the current node; false where the node has no such settable property. A value that no
   // management processor may be given is refused with an exception before anything is sent.
+  //
+  // An address waits for the mask that may follow: both then are one change, made as a whole or not at all, and the
+  // call that writes the mask sends it. A mask that is refused, or that cannot be sent, withdraws the address that was
+  // accepted before it. An address that no mask follows is sent by the next call of operator++ or selectNode, which
+  // throws where it fails, or by the destructor, which only logs: who writes an address alone does not learn from
+  // setProperty whether the management processor takes it.
   bool setProperty(NodeLexicon::Properties property, std::string& value);
 
  private:

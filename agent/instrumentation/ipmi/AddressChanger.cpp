@@ -47,7 +47,9 @@ void AddressChanger::apply(const AddressChange& change) {
 
 void AddressChanger::write(const AddressSettings& from, const AddressSettings& to) {
   ParameterTransaction transaction(transport_, channel_, held_);
-  begun_ = true;
+  if (!std::exchange(begun_, true)) {
+    onBegin_();
+  }
   transaction.write(planWrites(from, to));
 }
 

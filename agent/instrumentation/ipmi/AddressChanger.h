@@ -1,9 +1,11 @@
 // A change of an interface's address from the first look to the confirmation that it holds.
 #pragma once
 
-#include <atomic>
 #include <chrono>
 #include <cstdint>
+#include <functional>
+#include <string>
+#include <utility>
 
 #include "instrumentation/ManagementProcessor.h"
 #include "instrumentation/ipmi/AddressPlan.h"
@@ -14,11 +16,11 @@ namespace QV::Ipmi {
 
 class AddressChanger {
  public:
-  // `begun` becomes true before the first request that may change the configuration, for whoever no longer waits for
-  // the outcome. Processors may take a moment to apply a change: `patience` is how long it is read back.
-  AddressChanger(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::atomic<bool>& begun,
+  // `onBegin` is called before the first request that may change the configuration, once. Processors may take a moment
+  // to apply a change: `patience` is how long it is read back.
+  AddressChanger(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::function<void()> onBegin,
                  std::chrono::milliseconds patience)
-      : transport_(transport), channel_(channel), held_(held), begun_(begun), patience_(patience) {}
+      : transport_(transport), channel_(channel), held_(held), onBegin_(std::move(onBegin)), patience_(patience) {}
 
   // Returns once the processor shows the change, which is at once where it has the values already. Throws IpmiError
   // that says whether nothing was changed, the earlier values were put back, or the outcome is unknown.
@@ -32,8 +34,9 @@ class AddressChanger {
   IpmiTransport& transport_;
   const std::uint8_t channel_;
   HeldLocks& held_;
-  std::atomic<bool>& begun_;
+  const std::function<void()> onBegin_;
   const std::chrono::milliseconds patience_;
+  bool begun_ = false;
 };
 
 }  // namespace QV::Ipmi

@@ -8,6 +8,7 @@
 #include <string>
 #include <vector>
 
+#include "instrumentation/ChangeGeneration.h"
 #include "instrumentation/ManagementProcessor.h"
 #include "instrumentation/ipmi/IpmiConnection.h"
 #include "instrumentation/ipmi/IpmiSettings.h"
@@ -19,12 +20,15 @@ namespace QV::Ipmi {
 // passed, save what it needs to give a lock back, and throws IpmiError where it fails.
 class IpmiProcessor {
  public:
-  explicit IpmiProcessor(const IpmiSettings& settings) : settings_(settings), connection_(settings) {}
+  explicit IpmiProcessor(const IpmiSettings& settings)
+      : settings_(settings), connection_(settings), generation_(settings.generationFile) {}
 
-  // The processor as it is, or as it was at most the cache time ago and before nobody's change through this object.
+  // The processor as it is, or as it was at most the cache time ago where no process of this machine has changed it
+  // since.
   ManagementProcessor read(Deadline deadline);
 
-  // See AddressChanger for `begun`.
+  // `begun` becomes true before the first request that may change the configuration, for whoever no longer waits for
+  // the outcome.
   void change(Deadline deadline, const std::string& interfaceName, const AddressChange& change,
               std::atomic<bool>& begun);
 
@@ -32,10 +36,20 @@ class IpmiProcessor {
   void close() { connection_.close(); }
 
  private:
+  using Clock = std::chrono::steady_clock;
+
+  // A look at the processor, and the time and the generation that it was begun at.
   struct Snapshot {
     ManagementProcessor processor;
-    std::chrono::steady_clock::time_point taken;
+    Clock::time_point begunAt;
+    ChangeGeneration::Number generation;
   };
+
+  bool snapshotHolds(Clock::time_point now);
+  // Nothing where no look may be kept: the settings want none, or the other processes' changes cannot be learned of.
+  std::optional<ChangeGeneration::Number> generation();
+  void announceChange();
+  void reportGenerationFailure(const std::string& reason);
 
   void startOperation(Deadline deadline);
   const std::vector<std::uint8_t>& channels();
@@ -46,6 +60,8 @@ class IpmiProcessor {
   unsigned channelsOfSession_ = 0;
   HeldLocks heldLocks_;
   std::optional<Snapshot> snapshot_;
+  const ChangeGeneration generation_;
+  bool generationFailed_ = false;
 };
 
 }  // namespace QV::Ipmi

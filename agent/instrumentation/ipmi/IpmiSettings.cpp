@@ -19,7 +19,8 @@ constexpr std::size_t longestSecret = 20;
 const std::set<std::uint64_t> soundCipherSuites = {3, 8, 12, 17};
 
 const std::set<std::string> commonKeys = {
-    "connection", "channels", "ipv6", "session_timeout", "retransmission_timeout", "cache", "operation_timeout"};
+    "connection", "channels",       "ipv6", "operation_timeout", "session_timeout", "retransmission_timeout",
+    "cache",      "generation_file"};
 const std::set<std::string> inBandKeys = {"device"};
 const std::set<std::string> lanKeys = {"host",     "port",         "user",      "password_file",
                                        "k_g_file", "cipher_suite", "privilege", "workarounds"};
@@ -73,6 +74,14 @@ void readTimes(SettingReader& reader, IpmiSettings& settings) {
   reader.seconds("cache", settings.cache, 0ms, 60s);
 }
 
+// The processes that share the file need not share a working directory.
+void readGenerationFile(SettingReader& reader, IpmiSettings& settings) {
+  reader.text("generation_file", settings.generationFile);
+  if (!settings.generationFile.starts_with('/')) {
+    refuseValue("generation_file", settings.generationFile, "must be an absolute path");
+  }
+}
+
 std::string readShortSecret(const std::string& key, const std::string& path) {
   try {
     return readSecretFile(path);
@@ -97,6 +106,7 @@ IpmiSettings parseSettings(const BackEndSettings& section) {
   reader.choice("ipv6", settings.ipv6,
                 {{"off", Ipv6Choice::Off}, {"static", Ipv6Choice::Static}, {"dynamic", Ipv6Choice::Dynamic}});
   readTimes(reader, settings);
+  readGenerationFile(reader, settings);
   return settings;
 }
 

@@ -48,6 +48,9 @@ struct IpmiSettings {
   std::chrono::milliseconds sessionTimeout{3000};
   std::chrono::milliseconds retransmissionTimeout{500};
   std::chrono::milliseconds cache{1000};
+
+  // Where all processes of the machine tell each other of changes, so that a look is kept no longer than it is true.
+  std::string generationFile = "/var/lib/compositeipconfig/ipmi-generation";
 };
 
 // The settings that the section tells, checked. Throws std::runtime_error that names the key and what is wrong with its

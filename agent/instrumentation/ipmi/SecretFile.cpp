@@ -9,22 +9,10 @@
 #include <stdexcept>
 #include <system_error>
 
+#include "instrumentation/Descriptor.h"
+
 namespace QV::Ipmi {
 namespace {
-
-class Descriptor {
- public:
-  explicit Descriptor(const std::string& path) : number_(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK)) {}
-  ~Descriptor() {
-    if (number_ >= 0) ::close(number_);
-  }
-  Descriptor(const Descriptor&) = delete;
-  Descriptor& operator=(const Descriptor&) = delete;
-  int number() const { return number_; }
-
- private:
-  int number_;
-};
 
 [[noreturn]] void failWithErrno(const std::string& path) {
   throw std::runtime_error(path + " cannot be read: " + std::generic_category().message(errno));
@@ -33,9 +21,9 @@ class Descriptor {
 }  // namespace
 
 std::string readSecretFile(const std::string& path) {
-  const Descriptor file(path);
+  const Descriptor file(path, O_RDONLY | O_NONBLOCK);
   struct stat status {};
-  if (file.number() < 0 || ::fstat(file.number(), &status) != 0) failWithErrno(path);
+  if (!file.isOpen() || ::fstat(file.number(), &status) != 0) failWithErrno(path);
   if (!S_ISREG(status.st_mode)) throw std::runtime_error(path + " is no regular file");
   if ((status.st_mode & (S_IRWXG | S_IRWXO)) != 0)
     throw std::runtime_error(path + " is open to others than its owner: chmod 600 it");

@@ -10,6 +10,7 @@
 #include <stdexcept>
 #include <string_view>
 
+#include "instrumentation/Descriptor.h"
 #include "instrumentation/simulated/FileLock.h"
 
 namespace QV {
@@ -24,24 +25,6 @@ constexpr std::chrono::milliseconds lockTimeout{4000};
   throw std::runtime_error(path.string() + ": " + what + ": " + std::strerror(errno));
 }
 
-// An open file; closed with the object.
-class Descriptor {
- public:
-  Descriptor(const fs::path& path, int flags, mode_t mode = 0)
-      : number_(::open(path.c_str(), flags | O_CLOEXEC, mode)) {}
-  ~Descriptor() {
-    if (number_ >= 0) ::close(number_);
-  }
-  Descriptor(const Descriptor&) = delete;
-  Descriptor& operator=(const Descriptor&) = delete;
-
-  bool open() const { return number_ >= 0; }
-  int number() const { return number_; }
-
- private:
-  const int number_;
-};
-
 fs::path followLinks(fs::path path) {
   constexpr int mostLinks = 40;  // the kernel's own limit
   for (int links = 0; fs::is_symlink(path); ++links) {
@@ -55,7 +38,7 @@ fs::path withSuffix(const fs::path& path, const char* suffix) { return path.stri
 
 std::optional<std::string> readAll(const fs::path& path) {
   const Descriptor file(path, O_RDONLY);
-  if (!file.open()) {
+  if (!file.isOpen()) {
     if (errno == ENOENT) return std::nullopt;
     fail(path, "cannot be opened");
   }
@@ -94,7 +77,7 @@ void replace(const fs::path& target, std::string_view text) {
   ::unlink(fresh.c_str());
   try {
     const Descriptor file(fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, 0640);
-    if (!file.open()) fail(fresh, "cannot be created");
+    if (!file.isOpen()) fail(fresh, "cannot be created");
     struct stat original {};
     if (::stat(target.c_str(), &original) == 0) keepModeAndOwner(file, fresh, original);
     writeAll(file, fresh, text);
@@ -105,7 +88,7 @@ void replace(const fs::path& target, std::string_view text) {
     throw;
   }
   const Descriptor directory(target.parent_path(), O_RDONLY | O_DIRECTORY);
-  if (!directory.open() || ::fsync(directory.number()) != 0) fail(target, "cannot be brought to the disk");
+  if (!directory.isOpen() || ::fsync(directory.number()) != 0) fail(target, "cannot be brought to the disk");
 }
 
 }  // namespace

@@ -5,11 +5,32 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <type_traits>
 
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
 
 namespace QV {
+
+// An object of the broker with a table of its own, whose slots a test replaces: what an object manager may hand out.
+template <typename Object>
+class Altered {
+ public:
+  using Table = std::remove_pointer_t<decltype(Object::ft)>;
+
+  explicit Altered(Object* object) : table(*object->ft), object_(object), original_(object->ft) { object->ft = &table; }
+  ~Altered() { object_->ft = original_; }
+  Altered(const Altered&) = delete;
+  Altered& operator=(const Altered&) = delete;
+
+  operator Object*() const { return object_; }
+
+  Table table;
+
+ private:
+  Object* const object_;
+  Table* const original_;
+};
 
 class WithBroker : public testing::Test {
  protected:

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <ostream>
 #include <string>
+#include <vector>
 
 #include "QV/ProviderHelper.h"
 #include "agent/helper/BrokerFixture.h"
@@ -117,17 +118,116 @@ TEST_F(MapProperty, worksWithoutAStatus) {
   mapProperty(instanceData(source_), target_, "Text", Uint8, nullptr);
 }
 
+TEST_F(MapProperty, readsAnInstanceWhateverItsStateSays) {
+  CMSetProperty(source_, "Text", "x", CMPI_chars);
+  for (const int state : {CMPI_nullValue, CMPI_keyValue, CMPI_notFound, CMPI_badValue, 0xffff}) {
+    CMPIData item = instanceData(source_);
+    item.state = static_cast<CMPIValueState>(state);
+    CMPIInstance* target = sample();
+    mapProperty(item, target, "Text", String, &status_);
+    EXPECT_EQ(status_.rc, CMPI_RC_OK) << state;
+    const CMPIData mapped = CMGetProperty(target, "Text", nullptr);
+    ASSERT_FALSE(CMIsNullValue(mapped)) << state;
+    EXPECT_EQ(characters(mapped.value.string), "x");
+  }
+}
+
+TEST_F(MapProperty, neverFollowsAnItemThatIsNoInstance) {
+  CMPIString* string = CMNewString(broker(), "x", nullptr);
+  CMPIArray* instances = CMNewArray(broker(), 1, CMPI_instance, nullptr);
+  CMPIValue element{};
+  element.inst = source_;
+  CMSetArrayElementAt(instances, 0, &element, CMPI_instance);
+  std::vector<CMPIData> items;
+  const auto add = [&](int type, const auto& set) {
+    CMPIData item{};
+    item.type = static_cast<CMPIType>(type);
+    set(item.value);
+    items.push_back(item);
+  };
+  const auto number = [](CMPIValue& value) { value.uint64 = 0x0101010101010101; };
+  for (const int type : {CMPI_null, CMPI_boolean, CMPI_char16, CMPI_real32, CMPI_real64, CMPI_uint8, CMPI_uint16,
+                         CMPI_uint32, CMPI_uint64, CMPI_sint8, CMPI_sint16, CMPI_sint32, CMPI_sint64, 0xffff}) {
+    add(type, number);
+    add(type | CMPI_ARRAY, number);
+  }
+  add(CMPI_string, [&](CMPIValue& value) { value.string = string; });
+  add(CMPI_chars, [&](CMPIValue& value) { value.chars = const_cast<char*>("x"); });
+  add(CMPI_ref, [&](CMPIValue& value) { value.ref = path("Sample"); });
+  add(CMPI_dateTime, [&](CMPIValue& value) { value.dateTime = CMNewDateTime(broker(), nullptr); });
+  add(CMPI_instanceA, [&](CMPIValue& value) { value.array = instances; });
+
+  for (const CMPIData& item : items) {
+    mapProperty(item, target_, "Id", String, &status_);
+    EXPECT_EQ(status_.rc, CMPI_RC_ERROR) << "untouched, type " << item.type;
+  }
+  EXPECT_TRUE(CMIsNullValue(read("Id")));
+}
+
+TEST_F(MapProperty, setsNothingThatIsReadBesideAnError) {
+  CMSetProperty(source_, "Text", "x", CMPI_chars);
+  Altered altered(source_);
+  static CMPIInstanceFT real;
+  real = *target_->ft;
+  altered.table.getProperty = [](const CMPIInstance* instance, const char* name, CMPIStatus* status) {
+    const CMPIData data = real.getProperty(instance, name, nullptr);
+    *status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    return data;
+  };
+
+  EXPECT_TRUE(CMIsNullValue(map("Text", String)));
+  EXPECT_EQ(status_.rc, CMPI_RC_ERR_ACCESS_DENIED);
+}
+
+// What getProperty answers with rc OK, and what becomes of it as a string and as a number.
+TEST_F(MapProperty, setsNothingWhereThePropertyHasNoValueOrNoObject) {
+  static CMPIData answer;
+  Altered altered(source_);
+  altered.table.getProperty = [](const CMPIInstance*, const char*, CMPIStatus*) { return answer; };
+  CMPIString withoutHandle{nullptr, CMNewString(broker(), "x", nullptr)->ft};
+  Altered withoutCharacters(CMNewString(broker(), "x", nullptr));
+  withoutCharacters.table.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
+  const auto expectUnset = [&](const char* what) {
+    EXPECT_TRUE(CMIsNullValue(map("Text", String))) << what;
+    EXPECT_TRUE(CMIsNullValue(map("U16", Uint16))) << what;
+    EXPECT_TRUE(CMIsNullValue(map("U8", Uint8))) << what;
+  };
+
+  for (const int state : {CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
+    answer = {CMPI_uint16, static_cast<CMPIValueState>(state), {}};
+    expectUnset("a number without a value");
+    answer = {CMPI_string, static_cast<CMPIValueState>(state), {}};
+    answer.value.string = CMNewString(broker(), "x", nullptr);
+    expectUnset("a string without a value");
+  }
+  answer = {CMPI_string, CMPI_goodValue, {}};
+  expectUnset("a null string");
+  answer.value.string = &withoutHandle;
+  expectUnset("a string without a handle");
+  answer.value.string = withoutCharacters;
+  expectUnset("a string without characters");
+  answer = {CMPI_chars, CMPI_goodValue, {}};
+  expectUnset("null characters");
+  answer = {CMPI_null, CMPI_goodValue, {}};
+  expectUnset("no type");
+}
+
+TEST_F(MapProperty, copiesCharacters) {
+  static CMPIData answer;
+  answer = {CMPI_chars, CMPI_goodValue, {}};
+  answer.value.chars = const_cast<char*>("x");
+  Altered altered(source_);
+  altered.table.getProperty = [](const CMPIInstance*, const char*, CMPIStatus*) { return answer; };
+  const CMPIData data = map("Text", String);
+  ASSERT_FALSE(CMIsNullValue(data));
+  EXPECT_EQ(characters(data.value.string), "x");
+}
+
 TEST_F(MapProperty, leavesNullsAlone) {
   CMSetProperty(source_, "Text", "x", CMPI_chars);
   CMPIInstance emptyHandle{nullptr, source_->ft};
-  CMPIData nullState = instanceData(source_);
-  nullState.state = CMPI_nullValue;
-  CMPIData noInstance{};
-  noInstance.type = CMPI_string;
   mapProperty(instanceData(nullptr), target_, "Text", String, &status_);
   mapProperty(instanceData(&emptyHandle), target_, "Text", String, &status_);
-  mapProperty(nullState, target_, "Text", String, &status_);
-  mapProperty(noInstance, target_, "Text", String, &status_);
   mapProperty(instanceData(source_), nullptr, "Text", String, &status_);
   mapProperty(instanceData(source_), &emptyHandle, "Text", String, &status_);
   mapProperty(instanceData(source_), target_, nullptr, String, &status_);

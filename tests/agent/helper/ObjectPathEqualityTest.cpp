@@ -1,5 +1,9 @@
 #include <gtest/gtest.h>
 
+#include <map>
+#include <memory>
+#include <vector>
+
 #include "QV/ProviderHelper.h"
 #include "agent/helper/BrokerFixture.h"
 
@@ -149,6 +153,174 @@ TEST_F(ObjectPaths, compareNamespacesWhereTheyAreToldTo) {
 
 TEST_F(ObjectPaths, doNotCompareANamespaceThatOneOfThemLacks) {
   EXPECT_TRUE(equal(path("Keyed"), path("Keyed", ""), true));
+}
+
+// What object managers may hand out: each makes the path equal to nothing, itself included, without a crash.
+TEST_F(ObjectPaths, whoseClassIsNotToldEqualNothing) {
+  static CMPIString withoutCharacters;
+  static CMPIStringFT withoutCharactersTable;
+  withoutCharactersTable = *CMNewString(broker(), "x", nullptr)->ft;
+  withoutCharactersTable.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
+  withoutCharacters = {&withoutCharacters, &withoutCharactersTable};
+  using Get = CMPIString*(const CMPIObjectPath*, CMPIStatus*);
+  Get* const gets[] = {
+      [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; },
+      [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return &withoutCharacters; },
+      [](const CMPIObjectPath* path, CMPIStatus* status) {
+        CMPIString* name = CMGetNameSpace(path, nullptr);
+        *status = {CMPI_RC_ERR_FAILED, nullptr};
+        return name;
+      },
+  };
+  for (Get* const get : gets) {
+    Altered one(keyed("1", "2"));
+    Altered other(keyed("1", "2"));
+    one.table.getClassName = get;
+    other.table.getClassName = get;
+    EXPECT_FALSE(equal(one, other));
+    EXPECT_FALSE(equal(one, keyed("1", "2")));
+  }
+}
+
+TEST_F(ObjectPaths, withoutANamespaceAreComparedWithoutIt) {
+  Altered lacking(keyed("1", "2"));
+  lacking.table.getNameSpace = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
+  EXPECT_TRUE(equal(lacking, keyed("1", "2"), true));
+  lacking.table.getNameSpace = [](const CMPIObjectPath* path, CMPIStatus* status) {
+    *status = {CMPI_RC_ERR_FAILED, nullptr};
+    return CMGetClassName(path, nullptr);
+  };
+  EXPECT_TRUE(equal(lacking, keyed("1", "2"), true)) << "what is read beside an error is none";
+}
+
+TEST_F(ObjectPaths, whoseKeysCannotBeReadEqualNothing) {
+  static CMPIObjectPathFT real;
+  real = *path("Keyed")->ft;
+  const auto expectNoneEqual = [this](const auto& alter) {
+    Altered one(keyed("1", "2"));
+    Altered other(keyed("1", "2"));
+    alter(one.table);
+    alter(other.table);
+    EXPECT_FALSE(equal(one, other));
+    EXPECT_FALSE(equal(one, keyed("1", "2")));
+    EXPECT_FALSE(equal(one, path("Keyed")));
+  };
+  expectNoneEqual([](CMPIObjectPathFT& table) {
+    table.getKeyCount = [](const CMPIObjectPath*, CMPIStatus* status) {
+      *status = {CMPI_RC_ERR_FAILED, nullptr};
+      return CMPICount{0};
+    };
+  });
+  expectNoneEqual([](CMPIObjectPathFT& table) {
+    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* status) {
+      const CMPIData data = real.getKeyAt(path, index, name, nullptr);
+      *status = {CMPI_RC_ERR_FAILED, nullptr};
+      return data;
+    };
+  });
+  expectNoneEqual([](CMPIObjectPathFT& table) {
+    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* status) {
+      const CMPIData data = real.getKeyAt(path, index, nullptr, status);
+      *name = nullptr;
+      return data;
+    };
+  });
+}
+
+TEST_F(ObjectPaths, areEqualInBothDirectionsWhereAKeyComesTwice) {
+  Altered twice(keyed("1", "2"));
+  twice.table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* status) {
+    *status = {CMPI_RC_OK, nullptr};
+    *name = CMGetNameSpace(path, nullptr);
+    CMPIData data{};
+    data.type = CMPI_uint16;
+    return data;
+  };
+  EXPECT_TRUE(equal(twice, twice));
+  EXPECT_FALSE(equal(twice, keyed("1", "2")));
+}
+
+// A key as an object manager may deliver it, in a path with that key alone.
+class KeysAsDelivered : public ObjectPaths {
+ protected:
+  CMPIObjectPath* delivering(CMPIData data) {
+    CMPIObjectPath* made = ofText("placeholder");
+    const auto [entry, inserted] = delivered.emplace(made, data);
+    EXPECT_TRUE(inserted);
+    altered_.push_back(std::make_unique<Altered<CMPIObjectPath>>(made));
+    altered_.back()->table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* status) {
+      *status = {CMPI_RC_OK, nullptr};
+      *name = CMGetClassName(path, nullptr);
+      return delivered.at(path);
+    };
+    return made;
+  }
+
+  void TearDown() override {
+    altered_.clear();
+    delivered.clear();
+  }
+
+  static inline std::map<const CMPIObjectPath*, CMPIData> delivered;
+
+ private:
+  std::vector<std::unique_ptr<Altered<CMPIObjectPath>>> altered_;
+};
+
+TEST_F(KeysAsDelivered, areTheSameAsCharactersAndAsAString) {
+  CMPIData asCharacters{};
+  asCharacters.type = CMPI_chars;
+  asCharacters.value.chars = const_cast<char*>("eth0");
+  CMPIData asString{};
+  asString.type = CMPI_string;
+  asString.value.string = CMNewString(broker(), "eth0", nullptr);
+  EXPECT_TRUE(equal(delivering(asCharacters), delivering(asString)));
+
+  CMPIData asKey = asString;
+  asKey.state = CMPI_keyValue;
+  EXPECT_TRUE(equal(delivering(asCharacters), delivering(asKey)));
+}
+
+TEST_F(KeysAsDelivered, withoutAValueEqualEachOtherAndNothingElse) {
+  CMPIString withoutHandle{nullptr, CMNewString(broker(), "x", nullptr)->ft};
+  std::vector<CMPIData> withoutValue;
+  for (const int type : {CMPI_string, CMPI_chars, CMPI_ref, CMPI_dateTime}) {
+    withoutValue.push_back({static_cast<CMPIType>(type), CMPI_goodValue, {}});
+  }
+  for (const int state : {CMPI_nullValue, CMPI_notFound, CMPI_badValue}) {
+    withoutValue.push_back({CMPI_uint64, static_cast<CMPIValueState>(state | CMPI_keyValue), {}});
+    withoutValue.back().value.uint64 = 7;
+  }
+  withoutValue.push_back({CMPI_string, CMPI_goodValue, {}});
+  withoutValue.back().value.string = &withoutHandle;
+  CMPIData seven{CMPI_uint64, CMPI_keyValue, {}};
+  seven.value.uint64 = 7;
+  CMPIData empty{CMPI_string, CMPI_keyValue, {}};
+  empty.value.string = CMNewString(broker(), "", nullptr);
+
+  for (const CMPIData& data : withoutValue) {
+    EXPECT_TRUE(equal(delivering(data), delivering(withoutValue.front()))) << data.type << ' ' << data.state;
+    EXPECT_FALSE(equal(delivering(data), delivering(seven))) << data.type << ' ' << data.state;
+    EXPECT_FALSE(equal(delivering(data), delivering(empty))) << data.type << ' ' << data.state;
+  }
+}
+
+TEST_F(KeysAsDelivered, thatReferToAPathWhoseClassIsNotToldEqualNothing) {
+  Altered nameless(keyed("1", "2"));
+  CMPIData reference{CMPI_ref, CMPI_keyValue, {}};
+  reference.value.ref = nameless;
+  EXPECT_TRUE(equal(delivering(reference), delivering(reference)));
+
+  nameless.table.getClassName = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
+  EXPECT_FALSE(equal(delivering(reference), delivering(reference)));
+}
+
+TEST_F(KeysAsDelivered, areNotFollowedWhereTheirTypeIsNoneOfAKey) {
+  for (const int type : {CMPI_null, CMPI_instance, CMPI_stringA, CMPI_refA, CMPI_uint16A, 0xffff}) {
+    CMPIData data{static_cast<CMPIType>(type), CMPI_keyValue, {}};
+    data.value.uint64 = 0x0101010101010101;
+    EXPECT_FALSE(equal(delivering(data), delivering(data))) << type;
+  }
 }
 
 TEST_F(ObjectPaths, thatAreNullEqualNothing) {

@@ -56,14 +56,16 @@ TEST_F(AnInstrumentation, sendsAWaitingAddressWhenItIsDestroyed) {
   EXPECT_THAT(log(), IsEmpty());
 }
 
-TEST_F(AnInstrumentation, throwsAndLogsARefusal) {
+TEST_F(AnInstrumentation, throwsLogsAndTracesARefusal) {
   Instrumentation instrumentation;
   instrumentation.selectNode(IpInterfaceNode);
   std::string value = "192.0.2.0256";
   const std::string refusal = thrownBy([&] { instrumentation.setProperty(Ipv4Address, value); });
   EXPECT_THAT(refusal, HasSubstr("interface eth0: the IPv4 address '192.0.2.0256' is not four decimal numbers"));
-  EXPECT_THAT(log(), HasSubstr(" 6000 Tarnwick.Instrumentation "));
-  EXPECT_THAT(log(), testing::EndsWith(refusal + '\n'));
+  for (const std::string& lines : {log(), Testing::readFile(AgentEnvironment::instance().trace())}) {
+    EXPECT_THAT(lines, HasSubstr(" 6000 Tarnwick.Instrumentation setProperty (Instrumentation:"));
+    EXPECT_THAT(lines, testing::EndsWith(refusal + '\n'));
+  }
 }
 
 TEST_F(AnInstrumentation, logsWhatItCannotThrowAnyMore) {

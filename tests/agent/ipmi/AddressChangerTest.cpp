@@ -34,7 +34,8 @@ constexpr unsigned lockRequest = 5, firstWrite = 6;
 class AddressChangerTest : public testing::Test {
  protected:
   void change(const AddressChange& change, std::chrono::milliseconds patience = 0ms) {
-    QV::Ipmi::AddressChanger(bmc, 1, held, begun, patience).apply(change);
+    const auto onBegin = [this] { ++begun; };
+    QV::Ipmi::AddressChanger(bmc, 1, held, onBegin, patience).apply(change);
   }
   auto refusal(const std::string& first, const std::string& second = "") {
     return ThrowsMessage<IpmiError>(AllOf(HasSubstr(first), HasSubstr(second)));
@@ -55,7 +56,7 @@ class AddressChangerTest : public testing::Test {
 
   ScriptedBmc bmc;
   HeldLocks held;
-  std::atomic<bool> begun = false;
+  int begun = 0;
 };
 
 TEST_F(AddressChangerTest, HoldsHoweverTheBmcApplies) {
@@ -106,7 +107,21 @@ TEST_F(AddressChangerTest, WritesNothingWhereTheValuesAreSoAlready) {
   change({"192.0.2.10", "255.255.255.0"});
 
   EXPECT_THAT(bmc.written, IsEmpty());
-  EXPECT_FALSE(begun);
+  EXPECT_EQ(begun, 0);
+}
+
+TEST_F(AddressChangerTest, TellsThatItBeginsBeforeTheFirstWriteAndOnce) {
+  bmc.applies = ScriptedBmc::Applies::AtOnce;
+  bmc.beforeRequest = [&](unsigned number) {
+    EXPECT_EQ(begun, number < firstWrite ? 0 : 1) << "request " << number;
+    if (bmc.values[LanParameter::SubnetMask] == newMask) {
+      bmc.values[LanParameter::SubnetMask] = {255, 255, 0, 0};
+    }
+  };
+
+  EXPECT_THAT([&] { change(bothValues); }, refusal("the earlier values were put back"));
+
+  EXPECT_EQ(begun, 1);
 }
 
 TEST_F(AddressChangerTest, MakesTheSourceStaticFirstAndKeepsTheMaskThatDhcpGave) {
@@ -289,7 +304,7 @@ TEST_F(AddressChangerTest, HasAnUnknownOutcomeWhereTheBmcIsGoneAndRemembersTheLo
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("outcome of the change of lan1 is unknown", "set host to the new"));
 
-  EXPECT_TRUE(begun);
+  EXPECT_EQ(begun, 1);
   EXPECT_THAT(held, ElementsAre(1));
   EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 6000, "lock of LAN channel 1 may stay set"));
 }
@@ -301,7 +316,7 @@ TEST_F(AddressChangerTest, ChangesNothingWhereTheConnectionBreaksWithTheLock) {
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("session timeout"));
 
-  EXPECT_FALSE(begun);
+  EXPECT_EQ(begun, 0);
   expectNoLock();
 }
 

@@ -216,7 +216,7 @@ TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrect
 }
 
 TEST(IpmiSessionRefused, InBandWhereThereIsNoDriverNamesTheModules) {
-  IpmiBackEnd backEnd(parseSettings({{"device", "/dev/no-such-ipmi"}}));
+  IpmiBackEnd backEnd(parseSettings({{"device", "/dev/no-such-ipmi"}, {"cache", "0"}}));
 
   EXPECT_THAT([&] { backEnd.read(); }, refusal("the BMC behind /dev/no-such-ipmi gives no session: no such device"));
 }

@@ -48,6 +48,13 @@ Process::~Process() {
   ::close(output_);
 }
 
+void Process::writeLine(const std::string& line) {
+  const std::string text = line + '\n';
+  if (::write(input_, text.data(), text.size()) != static_cast<ssize_t>(text.size())) {
+    throw std::runtime_error("the program does not take its input");
+  }
+}
+
 std::string Process::readLine() {
   std::string line;
   for (char next = 0; ::read(output_, &next, 1) == 1 && next != '\n';) line.push_back(next);

@@ -17,6 +17,9 @@ class Process {
   Process(const Process&) = delete;
   Process& operator=(const Process&) = delete;
 
+  // Hands it a line on its standard input.
+  void writeLine(const std::string& line);
+
   // The next line of its output, without the line feed; what there is where the output ends before.
   std::string readLine();
 

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <future>
 #include <thread>
 
 #include "agent/ipmi/RecordedLog.h"
@@ -50,6 +51,158 @@ TEST(IpmiRoundTrips, AreNoneWithinTheCacheTime) {
 
   EXPECT_EQ(backEnd.read(), first);
   EXPECT_EQ(wire.requests(), 0u);
+}
+
+// Two back ends are what two processes have: each its own look, and the file in common.
+class IpmiRoundTripsWithAnother : public testing::Test {
+ protected:
+  QV::Ipmi::IpmiSettings cached(std::uint16_t port) const {
+    auto settings = parseSettings(bmc.settings(port));
+    settings.cache = std::chrono::minutes(1);
+    return settings;
+  }
+
+  // What the next read costs, and whether it shows the address.
+  unsigned requestsOfRead(const std::string& address) {
+    wire.reset();
+    EXPECT_EQ(reader.read().interfaces.at(0).ipv4Address, address);
+    return wire.requests();
+  }
+
+  const SimulatedBmc bmc;
+  UdpRelay wire{bmc.port()};
+  IpmiBackEnd reader{cached(wire.port())};
+  IpmiBackEnd writer{cached(bmc.port())};
+};
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixAfterItsChangeAndThenNone) {
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+
+  writer.change("lan1", {"192.0.2.77", "255.255.255.128"});
+
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreNoneWhereItHadNothingToWrite) {
+  writer.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 12u);
+
+  writer.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  EXPECT_THROW(writer.change("lan2", {"192.0.2.78", "255.255.255.128"}), std::runtime_error);
+
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixAfterAChangeThatTheBmcRefused) {
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+
+  bmc.hook("check", "exit 1");
+  EXPECT_THROW(writer.change("lan1", {"192.0.2.77", "255.255.255.128"}), std::runtime_error);
+
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixOnceWhileItsChangeIsUnderWayAndOnceWhenItIsOver) {
+  // Given a change that waits for the answer to its first write: three requests to look, one for the lock's state, one
+  // for the lock
+  constexpr unsigned firstWrite = 6;
+  UdpRelay slowWire(bmc.port());
+  IpmiBackEnd slowWriter(cached(slowWire.port()));
+  slowWriter.read();
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+  slowWire.reset();
+  slowWire.cutAtRequest(firstWrite);
+  auto change = std::async(std::launch::async, [&] { slowWriter.change("lan1", {"192.0.2.77", "255.255.255.128"}); });
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+  while (slowWire.requests() < firstWrite && std::chrono::steady_clock::now() < deadline) {
+    std::this_thread::yield();
+  }
+
+  // When others read meanwhile and afterwards, however it ends
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+  slowWire.join();
+  change.wait();
+
+  // Then they look once more
+  wire.reset();
+  reader.read();
+  EXPECT_EQ(wire.requests(), 6u);
+}
+
+// The text of what the operation throws; empty where it succeeds.
+template <typename Operation>
+std::string failureOf(const Operation& operation) {
+  try {
+    operation();
+    return {};
+  } catch (const std::runtime_error& error) {
+    return error.what();
+  }
+}
+
+// What was written under a lock may be applied or dropped when the lock is given back, whenever that is. The simulator
+// shows it until then, and drops it.
+TEST_F(IpmiRoundTripsWithAnother, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
+  // Given a change that is over and left its lock behind, and a look that was begun since
+  UdpRelay brokenWire(bmc.port());
+  auto settings = bmc.settings(brokenWire.port());
+  settings["operation_timeout"] = "1";
+  settings["session_timeout"] = "0.4";
+  IpmiBackEnd brokenWriter(parseSettings(settings));
+  const auto readBroken = [&] { return failureOf([&] { brokenWriter.read(); }); };
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(20);
+  const auto inTime = [&] { return std::chrono::steady_clock::now() < deadline; };
+  readBroken();
+  brokenWire.cutAtRequest(7);
+  EXPECT_NE(failureOf([&] { brokenWriter.change("lan1", {"192.0.2.77", "255.255.255.128"}); }), "");
+  while (readBroken().find("gives no session") == std::string::npos && inTime()) {
+  }
+  ASSERT_EQ(bmc.witness("Set in Progress"), "Set In Progress");
+  reader.read();
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
+
+  // When the lock is given back
+  brokenWire.join();
+  while (!readBroken().empty() && inTime()) {
+  }
+  ASSERT_EQ(bmc.witness("Set in Progress"), "Set Complete");
+
+  // Then the processor is looked at once more
+  EXPECT_NE(requestsOfRead("192.0.2.10"), 0u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixEachTimeWhereChangesCannotBeLearnedOfAndTheLogSaysSoOnce) {
+  std::filesystem::create_symlink("/dev/null", bmc.generationFile());
+  IpmiFixture::takeLog();
+
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+
+  const auto log = IpmiFixture::takeLog();
+  const auto tells = [&](const auto& line) {
+    return !line.trace && line.level == 6000 && line.text.starts_with(bmc.generationFile() + ": is a symbolic link");
+  };
+  EXPECT_EQ(std::count_if(log.begin(), log.end(), tells), 1);
+  EXPECT_TRUE(IpmiFixture::contains(log, 6000, "generation_file"));
+
+  // And once the file can be used, looks are kept again
+  std::filesystem::remove(bmc.generationFile());
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixAfterTheChangeOfOneThatCachesNothingItself) {
+  IpmiBackEnd uncached(parseSettings(bmc.settings()));
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+
+  uncached.change("lan1", {"192.0.2.77", "255.255.255.128"});
+
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
 }
 
 TEST(IpmiRoundTrips, OfAChangeInAHeldSessionAreThirteen) {

@@ -53,6 +53,7 @@ TEST_F(IpmiSettingsTest, OfAnEmptySectionAreInBand) {
   EXPECT_EQ(settings.sessionTimeout, 3s);
   EXPECT_EQ(settings.retransmissionTimeout, 500ms);
   EXPECT_EQ(settings.cache, 1s);
+  EXPECT_EQ(settings.generationFile, "/var/lib/compositeipconfig/ipmi-generation");
 }
 
 TEST_F(IpmiSettingsTest, OfALanConnectionHaveSoundDefaults) {
@@ -80,7 +81,8 @@ TEST_F(IpmiSettingsTest, TakeEveryKey) {
                                                    {"operation_timeout", "2.5"},
                                                    {"session_timeout", "1"},
                                                    {"retransmission_timeout", "0.25"},
-                                                   {"cache", "0"}}));
+                                                   {"cache", "0"},
+                                                   {"generation_file", "/run/generation"}}));
 
   EXPECT_EQ(settings.port, 9623);
   EXPECT_EQ(readKey(settings), "\x01\x02\xff");
@@ -94,6 +96,7 @@ TEST_F(IpmiSettingsTest, TakeEveryKey) {
   EXPECT_EQ(settings.sessionTimeout, 1000ms);
   EXPECT_EQ(settings.retransmissionTimeout, 250ms);
   EXPECT_EQ(settings.cache, 0ms);
+  EXPECT_EQ(settings.generationFile, "/run/generation");
 }
 
 TEST_F(IpmiSettingsTest, FitTheTimeOutsOfASessionIntoAnOperation) {
@@ -134,6 +137,8 @@ TEST_F(IpmiSettingsTest, RefuseBadValuesByNameAndReason) {
                         {"session_timeout", "6", "seconds from 0.04 to 5"},
                         {"retransmission_timeout", "2", "seconds from 0.01 to 1.5"},
                         {"cache", "-1", "seconds from 0 to 60"},
+                        {"generation_file", "generation", "must be an absolute path"},
+                        {"generation_file", "", "is missing"},
                         {"password_file", "/nowhere/password", "cannot be read: No such file"}};
   for (const auto& [key, value, reason] : cases)
     EXPECT_THAT([&] { parseSettings(lan({{key, value}})); }, refusal(key, reason)) << key << " = " << value;

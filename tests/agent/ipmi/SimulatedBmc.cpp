@@ -55,7 +55,8 @@ QV::BackEndSettings SimulatedBmc::settings(std::uint16_t port) const {
           {"password_file", directory_ / "password"},
           {"cipher_suite", "3"},
           {"workarounds", "opensesspriv"},
-          {"cache", "0"}};
+          {"cache", "0"},
+          {"generation_file", generationFile()}};
 }
 
 std::string SimulatedBmc::ipmitool(const std::vector<std::string>& command) const {

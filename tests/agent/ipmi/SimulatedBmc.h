@@ -24,12 +24,15 @@ class SimulatedBmc {
   // applies at once: then all is zero.
   std::uint16_t port() const { return port_; }
 
-  // A section of agent.ini that reaches it through the given port of this machine; 0 means its own.
+  // A section of agent.ini that reaches it through the given port of this machine; 0 means its own. Nothing is cached.
   QV::BackEndSettings settings(std::uint16_t port = 0) const;
 
   // What ipmitool says: of a value that `lan print` shows, "IP Address Source" say; of any command.
   std::string witness(const std::string& label) const;
   std::string ipmitool(const std::vector<std::string>& command) const;
+
+  // The file in which processes with these settings tell each other of changes.
+  std::string generationFile() const { return directory_ / "generation"; }
 
   // A shell script that runs before the simulator gets, sets or checks a LAN parameter ("get", "set", "check"); where
   // it fails, so does the simulator's step. $SIMULATOR is its process. Works with Personality::AppliesOnCommit.

@@ -1,5 +1,5 @@
-// An agent of its own for a test program: an agent.ini whose simulated processor and log lie in a temporary directory.
-// The agent's libraries read agent.ini once in a process, so it is put in place before the first test.
+// An agent of its own for a test program: an agent.ini whose simulated processor, log and trace lie in a temporary
+// directory. The agent's libraries read agent.ini once in a process, so it is put in place before the first test.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -21,6 +21,7 @@ class AgentEnvironment : public testing::Environment {
     directory_ = std::make_unique<Testing::TemporaryDirectory>();
     const std::string ini = *directory_ / "agent.ini";
     Testing::writeFile(ini, "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " + log() +
+                                "\n[trace]\ndestination = file\nfile = " + trace() +
                                 "\n[simulated]\nstate = " + state() + "\n");
     ::setenv("QV_AGENT_INI", ini.c_str(), 1);
   }
@@ -29,11 +30,16 @@ class AgentEnvironment : public testing::Environment {
 
   std::string state() const { return *directory_ / "processor.json"; }
   std::string log() const { return *directory_ / "agent.log"; }
+  std::string trace() const { return *directory_ / "agent.trace"; }
 
-  // The factory configuration and an empty log again.
+  // The factory configuration, an empty log and an empty trace again.
   void reset() const {
     std::filesystem::remove(state());
-    if (std::filesystem::exists(log())) std::filesystem::resize_file(log(), 0);
+    for (const std::string& file : {log(), trace()}) {
+      if (std::filesystem::exists(file)) {
+        std::filesystem::resize_file(file, 0);
+      }
+    }
   }
 
  private:

@@ -143,6 +143,7 @@ class TheUnderlyingProvider : public testing::Test {
   std::string message() const { return status_.msg ? CMGetCharsPtr(status_.msg, nullptr) : ""; }
 
   static std::string log() { return Testing::readFile(AgentEnvironment::instance().log()); }
+  static std::string trace() { return Testing::readFile(AgentEnvironment::instance().trace()); }
 
   Cimom::ObjectManager manager_;
   Cimom::RequestScope scope_{manager_.broker()};
@@ -266,7 +267,7 @@ TEST_F(TheUnderlyingProvider, showsAtOnceWhatTheInstrumentationWrote) {
   EXPECT_THAT(enumerate("YRNQV_StaticIPAssignmentSettingData").at(1), Contains(Pair("IPv4Address", "198.51.100.77")));
 }
 
-TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsIt) {
+TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsAndTracesIt) {
   Testing::writeFile(AgentEnvironment::instance().state(), "{");
   for (const char* className : classNames) {
     if (className == std::string("YRNQV_Stranger")) continue;
@@ -278,8 +279,10 @@ TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsIt) {
     CBGetInstance(broker(), scope_.context(), path(className), nullptr, &status_);
     EXPECT_EQ(status_.rc, CMPI_RC_ERR_FAILED) << className;
   }
-  EXPECT_THAT(log(), HasSubstr(" 6000 Tarnwick.UnderlyingIPConfigProvider "));
-  EXPECT_THAT(log(), HasSubstr(AgentEnvironment::instance().state() + ": "));
+  for (const std::string& lines : {log(), trace()}) {
+    EXPECT_THAT(lines, HasSubstr(" 6000 Tarnwick.UnderlyingIPConfigProvider serve (UnderlyingIPConfigProvider:"));
+    EXPECT_THAT(lines, HasSubstr(AgentEnvironment::instance().state() + ": "));
+  }
 }
 
 TEST_F(TheUnderlyingProvider, refusesAClassThatItDoesNotServe) {

@@ -96,6 +96,17 @@ TEST(StateWriters, thatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
   EXPECT_FALSE(std::filesystem::exists(state + ".new"));
 }
 
+TEST(StateWriters, areSeenByTheNextReadOfAProcessThatHasReadBefore) {
+  const Testing::TemporaryDirectory directory;
+  const std::string state = directory / "state.json";
+  SimulatedBackEnd processor(state);
+  ASSERT_EQ(processor.read().interfaces.at(0).ipv4Address, "192.0.2.10");
+
+  EXPECT_EQ(Writer(state, "eth0", "192.0.2", 1).await(), 0);
+
+  EXPECT_EQ(processor.read().interfaces.at(0).ipv4Address, "192.0.2.1");
+}
+
 TEST(StateWriters, thatRunAtOnceLoseNothing) {
   const Testing::TemporaryDirectory directory;
   const std::string state = directory / "state.json";

@@ -1,0 +1,57 @@
+// What stands behind those CMPI objects that are no CIM values themselves.
+#pragma once
+
+#include <cmpidt.h>
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "cimom/model/Value.h"
+
+namespace Cimom {
+
+struct Text {
+  std::string characters;
+};
+
+struct Context {
+  NamedValues entries;
+};
+
+struct Args {
+  NamedValues arguments;
+};
+
+struct Enumeration {
+  std::vector<Value> items;
+  std::size_t next = 0;
+};
+
+// A CIM_Error that a provider fills in; texts that nobody set are absent.
+struct Error {
+  std::optional<std::string> owningEntity;
+  std::optional<std::string> messageId;
+  std::optional<std::string> message;
+  CMPIErrorSeverity severity = CMPIErrorSeverityUnknown;
+  CMPIErrorProbableCause probableCause = CMPIErrorProbableCauseUnknown;
+  CMPIrc statusCode = CMPI_RC_OK;
+  std::optional<std::string> statusCodeDescription;
+  CMPIErrorType type = CMPIErrorTypeUnknown;
+  std::optional<std::string> otherType;
+  std::optional<std::string> probableCauseDescription;
+  std::optional<std::string> source;
+  CMPIErrorSrcFormat sourceFormat = CMPIErrorSrcFormatUnknown;
+  std::optional<std::string> otherSourceFormat;
+  std::optional<Array> recommendedActions;
+  std::optional<Array> messageArguments;
+};
+
+// What a provider delivers to one operation.
+struct Result {
+  CMPIType kind = CMPI_null;  // CMPI_instance or CMPI_ref if the operation takes only those; CMPI_null: anything
+  std::vector<Value> items;
+  std::optional<Error> error;  // the first error that the provider returned as a CMPIError
+};
+
+}  // namespace Cimom

@@ -1,0 +1,33 @@
+#include "cimom/model/ClassDefinition.h"
+
+#include "cimom/model/Names.h"
+
+namespace Cimom {
+
+const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view name) {
+  return findNamed(qualifiers, name);
+}
+
+bool isQualified(const Qualifiers& qualifiers, std::string_view name) {
+  const Qualifier* qualifier = findQualifier(qualifiers, name);
+  return qualifier && qualifier->value.isTrue();
+}
+
+const PropertyDeclaration* ClassDefinition::findProperty(std::string_view propertyName) const {
+  return findNamed(properties, propertyName);
+}
+
+const MethodDeclaration* ClassDefinition::findMethod(std::string_view methodName) const {
+  return findNamed(methods, methodName);
+}
+
+bool ClassDefinition::isA(std::string_view className) const {
+  for (const ClassDefinition* ancestor = this; ancestor; ancestor = ancestor->superclass) {
+    if (sameName(ancestor->name, className)) {
+      return true;
+    }
+  }
+  return false;
+}
+
+}  // namespace Cimom

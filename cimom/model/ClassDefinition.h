@@ -1,0 +1,69 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "cimom/model/Value.h"
+
+namespace Cimom {
+
+// A qualifier with its value and flavor (DSP0004).
+struct Qualifier {
+  std::string name;
+  Value value;
+  bool toSubclass = true;     // false: Restricted
+  bool overridable = true;    // false: DisableOverride
+  bool translatable = false;  // Translatable
+};
+
+using Qualifiers = std::vector<Qualifier>;
+
+// The qualifier of that name, or null.
+const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view name);
+
+// Whether a boolean qualifier is there and true.
+bool isQualified(const Qualifiers& qualifiers, std::string_view name);
+
+// A property of a class, or a parameter of a method.
+struct PropertyDeclaration {
+  std::string name;
+  CMPIType type = CMPI_null;   // arrays with the bit CMPI_ARRAY; CMPI_ref for a reference
+  std::string referenceClass;  // the class that a reference refers to, else empty
+  unsigned arraySize = 0;      // of a fixed-size array, else 0
+  Value defaultValue;          // null if the schema has none
+  Qualifiers qualifiers;       // inherited ones included
+  std::string originClass;     // the class that declared it first
+  bool propagated = false;     // inherited as it is; false if this class declares or overrides it
+
+  bool isKey() const { return isQualified(qualifiers, "Key"); }
+  bool isReference() const { return !referenceClass.empty(); }
+};
+
+struct MethodDeclaration {
+  std::string name;
+  CMPIType returnType = CMPI_null;
+  std::vector<PropertyDeclaration> parameters;
+  Qualifiers qualifiers;
+  std::string originClass;
+  bool propagated = false;
+};
+
+// A class with everything that it inherits: the superclass's features come first, in the superclass's order, an
+// overriding one in the place of the one that it overrides.
+struct ClassDefinition {
+  std::string name;
+  const ClassDefinition* superclass = nullptr;
+  Qualifiers qualifiers;
+  std::vector<PropertyDeclaration> properties;
+  std::vector<MethodDeclaration> methods;
+  std::string declaredAt;  // "FILE:LINE"
+
+  const PropertyDeclaration* findProperty(std::string_view propertyName) const;
+  const MethodDeclaration* findMethod(std::string_view methodName) const;
+  bool isAssociation() const { return isQualified(qualifiers, "Association"); }
+  // Whether this is the class of that name or one of its subclasses.
+  bool isA(std::string_view className) const;
+};
+
+}  // namespace Cimom

@@ -1,0 +1,94 @@
+#include "cimom/model/Instance.h"
+
+#include <algorithm>
+
+#include "cimom/ground/Errors.h"
+#include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
+
+namespace Cimom {
+
+Instance::Instance(const ClassDefinition& definition, ObjectPath path)
+    : definition_(&definition), path_(std::move(path)), values_(definition.properties.size()) {
+  takeKeys();
+}
+
+const Value& Instance::operator[](std::size_t index) const {
+  return values_[index] ? *values_[index] : definition_->properties[index].defaultValue;
+}
+
+const Value* Instance::find(std::string_view name) const {
+  const PropertyDeclaration* property = definition_->findProperty(name);
+  return property ? &(*this)[static_cast<std::size_t>(property - definition_->properties.data())] : nullptr;
+}
+
+void Instance::set(std::string_view name, Value value) {
+  const PropertyDeclaration* property = definition_->findProperty(name);
+  if (!property) {
+    return;
+  }
+  if (value.isNull()) {
+    value = Value::null(property->type);
+  } else if (value.type() != property->type) {
+    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, definition_->name + "." + property->name + " must be of type " +
+                                                         describeType(property->type) + ", not " +
+                                                         describeType(value.type()));
+  }
+  if (filter_ && !filter_->contains(property->name) && !property->isKey()) {
+    return;
+  }
+  values_[static_cast<std::size_t>(property - definition_->properties.data())] = std::move(value);
+}
+
+void Instance::setFilter(const std::vector<std::string>& properties) {
+  filter_.emplace(properties.begin(), properties.end());
+}
+
+ObjectPath Instance::path() const {
+  ObjectPath complete = path_;
+  for (std::size_t index = 0; index < size(); ++index) {
+    const PropertyDeclaration& property = definition_->properties[index];
+    const Value& value = (*this)[index];
+    if (!property.isKey() || value.isNull()) {
+      continue;
+    }
+    const Value* given = complete.keys.find(property.name);
+    if (!given || given->isNull()) {
+      complete.keys.set(property.name, value);
+    }
+  }
+  return complete;
+}
+
+void Instance::setPath(ObjectPath path) {
+  if (!sameName(path.className, definition_->name)) {
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER,
+                      "an instance of " + definition_->name + " cannot have a path of " + path.className);
+  }
+  path_ = std::move(path);
+  takeKeys();
+}
+
+Instance Instance::withoutDefaults() const {
+  Instance bare = *this;
+  for (std::size_t index = 0; index < size(); ++index) {
+    if (!bare.values_[index]) {
+      bare.values_[index] = Value::null(definition_->properties[index].type);
+    }
+  }
+  return bare;
+}
+
+void Instance::takeKeys() {
+  for (const auto& [name, value] : path_.keys) {
+    const PropertyDeclaration* property = definition_->findProperty(name);
+    if (!property || !property->isKey()) {
+      continue;
+    }
+    if (auto typed = value.as(property->type)) {
+      set(name, *std::move(typed));
+    }
+  }
+}
+
+}  // namespace Cimom

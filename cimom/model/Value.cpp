@@ -1,0 +1,158 @@
+#include "cimom/model/Value.h"
+
+#include <cstring>
+#include <type_traits>
+#include <utility>
+
+#include "cimom/model/Instance.h"
+#include "cimom/model/Names.h"
+#include "cimom/model/ObjectPath.h"
+#include "cimom/model/Types.h"
+
+namespace Cimom {
+namespace {
+
+template <typename T>
+CMPIValue scalarOf(T value) {
+  CMPIValue content = {};
+  std::memcpy(&content, &value, sizeof value);
+  return content;
+}
+
+// Calls `operation` with the integer; nothing happens to a value of any other type.
+template <typename Union, typename Operation>
+void visitInteger(CMPIType type, Union& value, Operation operation) {
+  visitNumber(type, value, [&](auto& number) {
+    if constexpr (std::is_integral_v<std::remove_reference_t<decltype(number)>>) {
+      operation(number);
+    }
+  });
+}
+
+std::string quoted(std::string_view text) {
+  std::string result = "\"";
+  for (const char letter : text) {
+    if (letter == '"' || letter == '\\') {
+      result += '\\';
+    }
+    result += letter;
+  }
+  return result + '"';
+}
+
+}  // namespace
+
+Value Value::null(CMPIType type) { return Value(type, {}); }
+Value Value::boolean(bool value) { return Value(CMPI_boolean, scalarOf<CMPIBoolean>(value)); }
+Value Value::uint32(CMPIUint32 value) { return Value(CMPI_uint32, scalarOf(value)); }
+Value Value::uint64(CMPIUint64 value) { return Value(CMPI_uint64, scalarOf(value)); }
+Value Value::sint64(CMPISint64 value) { return Value(CMPI_sint64, scalarOf(value)); }
+Value Value::real64(CMPIReal64 value) { return Value(CMPI_real64, scalarOf(value)); }
+Value Value::char16(CMPIChar16 value) { return Value(CMPI_char16, scalarOf(value)); }
+Value Value::scalar(CMPIType type, const CMPIValue& value) { return Value(type, value); }
+Value Value::string(std::string value) { return Value(CMPI_string, std::move(value)); }
+Value Value::dateTime(DateTime value) { return Value(CMPI_dateTime, value); }
+Value Value::reference(ObjectPath value) {
+  return Value(CMPI_ref, std::make_shared<const ObjectPath>(std::move(value)));
+}
+Value Value::instance(Instance value) {
+  return Value(CMPI_instance, std::make_shared<const Instance>(std::move(value)));
+}
+Value Value::array(Array value) {
+  const CMPIType type = arrayOf(value.elementType);
+  return Value(type, std::make_shared<const Array>(std::move(value)));
+}
+
+bool Value::isTrue() const {
+  const CMPIValue* content = scalar();
+  return type_ == CMPI_boolean && content && content->boolean;
+}
+
+const ObjectPath* Value::path() const {
+  const auto* content = std::get_if<std::shared_ptr<const ObjectPath>>(&content_);
+  return content ? content->get() : nullptr;
+}
+
+const Instance* Value::embedded() const {
+  const auto* content = std::get_if<std::shared_ptr<const Instance>>(&content_);
+  return content ? content->get() : nullptr;
+}
+
+const Array* Value::elements() const {
+  const auto* content = std::get_if<std::shared_ptr<const Array>>(&content_);
+  return content ? content->get() : nullptr;
+}
+
+std::optional<Value> Value::asInteger(CMPIType type) const {
+  std::optional<Value> result;
+  if (const CMPIValue* content = scalar()) {
+    visitInteger(type_, *content, [&](auto number) {
+      CMPIValue other = {};
+      visitInteger(type, other, [&](auto& target) {
+        using Target = std::remove_reference_t<decltype(target)>;
+        if (std::in_range<Target>(number)) {
+          target = static_cast<Target>(number);
+          result = Value(type, other);
+        }
+      });
+    });
+  }
+  return result;
+}
+
+std::optional<Value> Value::as(CMPIType type) const {
+  if (isNull()) {
+    return null(type);
+  }
+  return type_ == type ? *this : asInteger(type);
+}
+
+std::string Value::toString() const {
+  if (isNull()) {
+    return "NULL";
+  }
+  if (const auto* string = text()) {
+    return quoted(*string);
+  }
+  if (const ObjectPath* reference = path()) {
+    return quoted(reference->toString());
+  }
+  if (const Instance* instance = embedded()) {
+    return quoted(instance->path().toString());
+  }
+  if (const DateTime* dateTime = time()) {
+    return quoted(dateTime->format());
+  }
+  if (const Array* array = elements()) {
+    std::string list = "{";
+    for (const Value& element : array->elements) {
+      list += (list.size() > 1 ? "," : "") + element.toString();
+    }
+    return list + "}";
+  }
+  switch (type_) {
+    case CMPI_boolean:
+      return isTrue() ? "TRUE" : "FALSE";
+    case CMPI_char16:
+      return std::to_string(scalar()->char16);
+    case CMPI_ptr:
+      return "(pointer)";
+    default:
+      return numberText(type_, *scalar());
+  }
+}
+
+const Value* NamedValues::find(std::string_view name) const {
+  const Entry* entry = findNamed(entries_, name);
+  return entry ? &entry->value : nullptr;
+}
+
+void NamedValues::set(std::string_view name, Value value) {
+  if (Entry* entry = findNamed(entries_, name)) {
+    entry->value = std::move(value);
+  } else {
+    entries_.push_back({std::string(name), std::move(value)});
+  }
+}
+
+}  // namespace Cimom

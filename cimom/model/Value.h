@@ -1,0 +1,107 @@
+// CIM values: single, in arrays, and by name.
+#pragma once
+
+#include <cmpidt.h>
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <variant>
+#include <vector>
+
+#include "cimom/model/DateTime.h"
+
+namespace Cimom {
+
+struct Array;
+struct ObjectPath;
+class Instance;
+
+// A typed CIM value, possibly null: what properties, keys, arguments and array elements hold. Values of object types
+// are copies: nothing that happens to the object that they were taken from changes them.
+class Value {
+ public:
+  // Null, of no type.
+  Value() = default;
+
+  static Value null(CMPIType type);
+  static Value boolean(bool value);
+  static Value uint32(CMPIUint32 value);
+  static Value uint64(CMPIUint64 value);
+  static Value sint64(CMPISint64 value);
+  static Value real64(CMPIReal64 value);
+  static Value char16(CMPIChar16 value);
+  // Of any type that CMPI passes by value.
+  static Value scalar(CMPIType type, const CMPIValue& value);
+  static Value string(std::string value);
+  static Value dateTime(DateTime value);
+  static Value reference(ObjectPath value);
+  static Value instance(Instance value);
+  static Value array(Array value);
+
+  CMPIType type() const { return type_; }
+  bool isNull() const { return std::holds_alternative<std::monostate>(content_); }
+  // Whether this is the boolean TRUE.
+  bool isTrue() const;
+
+  // A value of a type that CMPI passes by value, or null.
+  const CMPIValue* scalar() const { return std::get_if<CMPIValue>(&content_); }
+  // The text of a CMPI_string, or null.
+  const std::string* text() const { return std::get_if<std::string>(&content_); }
+  // The time stamp or interval of a CMPI_dateTime, or null.
+  const DateTime* time() const { return std::get_if<DateTime>(&content_); }
+  // The path of a reference, or null.
+  const ObjectPath* path() const;
+  // The embedded instance, or the instance of a result, or null.
+  const Instance* embedded() const;
+  // The array, or null.
+  const Array* elements() const;
+
+  // The same number as another integer type; none if it is no integer or does not fit.
+  std::optional<Value> asInteger(CMPIType type) const;
+  // The same value as `type`: itself if it has that type, a null of it, or the same number; none otherwise.
+  std::optional<Value> as(CMPIType type) const;
+
+  // The value as a key of an untyped WBEM URI (DSP0207) writes it: numbers and TRUE/FALSE bare, all else in quotes.
+  std::string toString() const;
+
+ private:
+  using Content = std::variant<std::monostate, CMPIValue, std::string, DateTime, std::shared_ptr<const ObjectPath>,
+                               std::shared_ptr<const Instance>, std::shared_ptr<const Array>>;
+
+  Value(CMPIType type, Content content) : type_(type), content_(std::move(content)) {}
+
+  CMPIType type_ = CMPI_null;
+  Content content_;
+};
+
+// A CIM array: elements of one type, each of which may be null.
+struct Array {
+  CMPIType elementType = CMPI_null;
+  std::vector<Value> elements;
+};
+
+// Values by name in the order in which they came: the keys of a path, the arguments of a method, the entries of a
+// context. Names are looked up without regard to case and keep the spelling that they were first given with.
+class NamedValues {
+ public:
+  struct Entry {
+    std::string name;
+    Value value;
+  };
+
+  const Value* find(std::string_view name) const;
+  void set(std::string_view name, Value value);
+
+  std::size_t size() const { return entries_.size(); }
+  bool empty() const { return entries_.empty(); }
+  const Entry& operator[](std::size_t index) const { return entries_[index]; }
+  auto begin() const { return entries_.begin(); }
+  auto end() const { return entries_.end(); }
+
+ private:
+  std::vector<Entry> entries_;
+};
+
+}  // namespace Cimom

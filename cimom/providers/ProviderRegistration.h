@@ -1,0 +1,40 @@
+#pragma once
+
+#include <cmpift.h>
+
+#include <filesystem>
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace Cimom {
+
+// Which provider serves a class, and where.
+struct ProviderRegistration {
+  std::string className;
+  std::string provider;  // the name in the factory functions' names
+  std::string location;  // the library lib<location>.so; of no meaning for a provider linked into the program
+  bool instance = false;
+  bool association = false;
+  std::vector<std::string> namespaces;
+  std::string registeredAt;  // "FILE:LINE", for messages
+};
+
+// A provider's factory functions, as CMPI defines them.
+using InstanceFactory = std::function<CMPIInstanceMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
+using AssociationFactory = std::function<CMPIAssociationMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
+
+// Reads a registration file: one stanza per class,
+//
+//     [ClassName]
+//        provider: ProviderName
+//        location: library
+//        type: instance association
+//        namespace: root/cimv2
+//     #
+//
+// `#` starts a comment; `group`, which other object managers take for their processes, is accepted and means nothing.
+// Throws ConfigurationError "FILE:LINE: what is wrong".
+std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& file);
+
+}  // namespace Cimom

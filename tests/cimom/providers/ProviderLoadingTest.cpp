@@ -1,0 +1,99 @@
+#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/TemporaryDirectory.h"
+
+namespace {
+
+using namespace Cimom;
+using namespace Testing;
+using testing::AllOf;
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+class ProviderLoadingTest : public testing::Test {
+ protected:
+  ProviderLoadingTest() {
+    manager.loadSchemaText(testSchema, testNamespace);
+    manager.addProviderDirectory(directory.path());
+    manager.addProviderDirectory(PROBE_DIRECTORY);
+  }
+
+  void registerProvider(const std::string& provider, const std::string& location,
+                        const std::string& className = "TST_Processor", const std::string& type = "instance") {
+    manager.loadRegistration(directory.write("providers.reg", "[" + className + "]\nprovider: " + provider +
+                                                                  "\nlocation: " + location + "\ntype: " + type +
+                                                                  "\nnamespace: root/test\n"));
+  }
+
+  // The message with which an enumeration fails and, the same in substance, the one of the check.
+  std::vector<std::string> complaints() {
+    const RequestScope scope(manager.broker());
+    CMPIStatus status = ok;
+    const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "TST_Processor", nullptr);
+    EXPECT_EQ(CBEnumInstances(manager.broker(), RequestScope::current()->context(), path, nullptr, &status), nullptr);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+    std::vector<std::string> result = {shownText(status.msg)};
+    try {
+      manager.checkProviders();
+    } catch (const ConfigurationError& error) {
+      result.emplace_back(error.what());
+    }
+    return result;
+  }
+
+  TemporaryDirectory directory;
+  ObjectManager manager;
+};
+
+TEST_F(ProviderLoadingTest, ASharedObjectServesItsClass) {
+  registerProvider("ProbeSystem", "probe");
+  manager.checkProviders();
+  const RequestScope scope(manager.broker());
+  const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "CIM_System", nullptr);
+  CMPIContext* context = RequestScope::current()->context();
+  const std::vector<std::string> expected = {
+      "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"",
+      "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"two\""};
+  EXPECT_EQ(pathsOf(CBEnumInstances(manager.broker(), context, path, nullptr, nullptr)), expected);
+  EXPECT_EQ(pathsOf(CBEnumInstanceNames(manager.broker(), context, path, nullptr)), expected);
+}
+
+TEST_F(ProviderLoadingTest, AMissingLibraryIsNamedWithWhereItWasLookedFor) {
+  registerProvider("ProbeSystem", "missing");
+  EXPECT_THAT(complaints(),
+              ElementsAre(AllOf(HasSubstr("libmissing.so"), HasSubstr(directory.path().string())),
+                          AllOf(HasSubstr("providers.reg:1: provider ProbeSystem"), HasSubstr("libmissing.so"))));
+}
+
+TEST_F(ProviderLoadingTest, AFileThatIsNotALibraryIsNamedWithTheLoadersReason) {
+  registerProvider("ProbeSystem", "garbage");
+  EXPECT_THAT(complaints(),
+              ElementsAre(AllOf(HasSubstr("cannot load "), HasSubstr("libgarbage.so: ")), HasSubstr("libgarbage.so")));
+}
+
+TEST_F(ProviderLoadingTest, AMissingFactoryIsNamed) {
+  registerProvider("ProbeSystem", "nofactory");
+  EXPECT_THAT(complaints(), ElementsAre(HasSubstr("libnofactory.so has no function ProbeSystem_Create_InstanceMI"),
+                                        HasSubstr("ProbeSystem_Create_InstanceMI")));
+}
+
+TEST_F(ProviderLoadingTest, AFactoryOfTheOtherTypeDoesNotDo) {
+  registerProvider("ProbeSystem", "probe", "TST_Hosted", "association");
+  EXPECT_THROW(manager.checkProviders(), ConfigurationError);
+}
+
+TEST_F(ProviderLoadingTest, AClassThatTheSchemaLacksIsFoundByTheCheck) {
+  registerProvider("ProbeSystem", "probe", "TST_Nothing");
+  try {
+    manager.checkProviders();
+    FAIL();
+  } catch (const ConfigurationError& error) {
+    EXPECT_THAT(error.what(), HasSubstr("providers.reg:1: class TST_Nothing is not in the schema"));
+  }
+}
+
+TEST_F(ProviderLoadingTest, ALinkedProviderWithoutTheFactoryIsNamed) {
+  manager.addProvider({"TST_Processor", "Linked", "", true, false, {testNamespace}, ""}, nullptr, nullptr);
+  EXPECT_THAT(complaints(), ElementsAre(HasSubstr("Linked_Create_InstanceMI"), HasSubstr("provider Linked")));
+}
+
+}  // namespace
