@@ -22,8 +22,9 @@ using testing::Not;
 
 constexpr int warmUp = 1000;
 constexpr int requests = 5000;
-// What an allocator may take more without a leak: 0.2 KiB a request.
-constexpr long toleratedKib = 1024;
+// An allocator grows in steps, when another thread comes to it, say: what leaks, grows in every round.
+constexpr int rounds = 3;
+constexpr long toleratedKib = 512;
 
 // An intrinsic method and its parameters.
 struct Call {
@@ -120,19 +121,20 @@ TEST_F(HostEndurance, ServesThousandsOfRequestsInTheSameMemory) {
   };
   serve(warmUp);
   const auto processes = ObjectManager::providerProcesses();
-  const long before = residentProviders();
+  for (int round = 1, grown = toleratedKib + 1; round <= rounds && grown > toleratedKib; ++round) {
+    // When
+    const long before = residentProviders();
+    const auto begin = std::chrono::steady_clock::now();
+    serve(requests);
+    const std::chrono::duration<double> seconds = std::chrono::steady_clock::now() - begin;
 
-  // When
-  const auto begin = std::chrono::steady_clock::now();
-  serve(requests);
-  const std::chrono::duration<double> seconds = std::chrono::steady_clock::now() - begin;
-
-  // Then
-  const long after = residentProviders();
+    // Then
+    grown = static_cast<int>(residentProviders() - before);
+    std::cout << requests << " requests in " << seconds.count() << " s, providers resident " << before
+              << " KiB before, " << before + grown << " KiB after\n";
+    EXPECT_TRUE(grown <= toleratedKib || round < rounds) << "the providers grew in every round";
+  }
   EXPECT_EQ(ObjectManager::providerProcesses(), processes);
-  EXPECT_LE(after - before, toleratedKib);
-  std::cout << requests << " requests in " << seconds.count() << " s, providers resident " << before << " KiB before, "
-            << after << " KiB after\n";
 }
 
 }  // namespace

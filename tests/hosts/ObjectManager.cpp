@@ -2,6 +2,7 @@
 
 #include <arpa/inet.h>
 #include <netinet/in.h>
+#include <signal.h>
 #include <sys/socket.h>
 #include <unistd.h>
 
@@ -127,9 +128,9 @@ void ObjectManager::install(const Edit& edit) {
   }
 }
 
-void ObjectManager::remove() {
+void ObjectManager::remove(const Edit& edit) {
   for (const std::string& step : removing()) {
-    carryOut(step);
+    carryOut(step, edit);
     if (step.ends_with(" stop")) awaitEnd();
   }
 }
@@ -149,8 +150,8 @@ void ObjectManager::registerSeparately() const {
       "/pegasus/*.peg.mof");
 }
 
-void ObjectManager::start() {
-  carryOut(title() + " start");
+void ObjectManager::start(const Edit& edit) {
+  carryOut(title() + " start", edit);
   awaitListening();
 }
 
@@ -162,6 +163,11 @@ void ObjectManager::stop() {
 void ObjectManager::restart() {
   stop();
   start();
+}
+
+void ObjectManager::kill() {
+  for (const pid_t process : processesRunning(programs())) ::kill(process, SIGKILL);
+  awaitEnd();
 }
 
 bool ObjectManager::isListening() const { return LoopbackSocket(port_).connects(); }

@@ -36,13 +36,15 @@ class ObjectManager : public WbemClient {
 
   /// From stock to serving, and back again. An edit changes the commands of every step before they are run.
   void install(const Edit& edit = {});
-  void remove();
+  void remove(const Edit& edit = {});
   /// A new version over the one that is there.
   void upgrade();
 
-  void start();
+  void start(const Edit& edit = {});
   void stop();
   void restart();
+  /// Ends it without asking it to end.
+  void kill();
 
   /// Writes agent.ini: the managed system is managed.example, and the given sections say how the management processor
   /// is reached. Takes effect with the next start of the object manager.
@@ -66,6 +68,12 @@ class ObjectManager : public WbemClient {
 
   /// Whether it answers Associators and AssociatorNames where the client names no association class.
   virtual bool answersWithoutAClass() const = 0;
+
+  /// Whether a request ends, with an error, when the provider process that it was given to is killed.
+  virtual bool answersRequestsThatItLost() const = 0;
+
+  /// The program that its step "start" starts.
+  virtual std::string program() const = 0;
 
   /// The name that it has in the document.
   virtual std::string title() const = 0;

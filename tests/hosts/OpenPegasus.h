@@ -12,6 +12,8 @@ class OpenPegasus : public ObjectManager {
   bool unloadProviders() override;
   void allowProviders() override;
   bool answersWithoutAClass() const override { return true; }
+  bool answersRequestsThatItLost() const override { return true; }
+  std::string program() const override { return "cimserver"; }
   std::string title() const override { return "OpenPegasus"; }
 
  protected:

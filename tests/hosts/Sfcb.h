@@ -12,6 +12,8 @@ class Sfcb : public ObjectManager {
   bool unloadProviders() override;
   void allowProviders() override;
   bool answersWithoutAClass() const override { return false; }
+  bool answersRequestsThatItLost() const override { return false; }
+  std::string program() const override { return "sfcbd"; }
   std::string title() const override { return "sfcb"; }
 
  protected:
