@@ -7,9 +7,9 @@
 #include <memory>
 #include <string_view>
 
-#include "cimom/ConfigurationError.h"
 #include "cimom/broker/MessageSink.h"
-#include "cimom/registry/ProviderRegistration.h"
+#include "cimom/ground/Errors.h"
+#include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {

@@ -3,7 +3,7 @@
 
 #include <vector>
 
-#include "cimom/broker/Value.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 

@@ -6,7 +6,7 @@
 #include <string_view>
 
 #include "cimom/broker/MessageSink.h"
-#include "cimom/registry/ProviderRegistry.h"
+#include "cimom/providers/ProviderRegistry.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {

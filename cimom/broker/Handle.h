@@ -9,14 +9,14 @@
 #include <utility>
 
 #include "cimom/broker/Array.h"
-#include "cimom/broker/DateTime.h"
 #include "cimom/broker/Error.h"
-#include "cimom/broker/Instance.h"
 #include "cimom/broker/NamedValues.h"
-#include "cimom/broker/ObjectPath.h"
 #include "cimom/broker/RequestScope.h"
 #include "cimom/broker/Result.h"
 #include "cimom/broker/StatusError.h"
+#include "cimom/model/DateTime.h"
+#include "cimom/model/Instance.h"
+#include "cimom/model/ObjectPath.h"
 
 namespace Cimom {
 

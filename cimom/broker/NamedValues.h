@@ -6,8 +6,8 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/broker/Names.h"
-#include "cimom/broker/Value.h"
+#include "cimom/model/Names.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 

@@ -5,7 +5,7 @@
 #include <vector>
 
 #include "cimom/broker/Error.h"
-#include "cimom/broker/Value.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 

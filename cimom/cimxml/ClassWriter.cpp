@@ -2,8 +2,8 @@
 
 #include <cmpimacs.h>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Types.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {

@@ -2,7 +2,7 @@
 #define CIMOM_CIMXML_CLASSWRITER_H_
 
 #include "cimom/cimxml/ObjectWriter.h"
-#include "cimom/schema/ClassDefinition.h"
+#include "cimom/model/ClassDefinition.h"
 
 namespace Cimom::CimXml {
 

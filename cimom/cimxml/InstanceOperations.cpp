@@ -2,8 +2,8 @@
 
 #include <algorithm>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Call.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {

@@ -3,8 +3,8 @@
 #include <charconv>
 #include <string_view>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Errors.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {

@@ -4,12 +4,12 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/broker/Names.h"
 #include "cimom/broker/RequestScope.h"
 #include "cimom/cimxml/AssociationOperations.h"
 #include "cimom/cimxml/Call.h"
 #include "cimom/cimxml/ClassOperations.h"
 #include "cimom/cimxml/InstanceOperations.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {

@@ -4,9 +4,9 @@
 
 #include <algorithm>
 
-#include "cimom/broker/Names.h"
 #include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/Types.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 namespace {

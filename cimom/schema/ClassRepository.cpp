@@ -2,8 +2,8 @@
 
 #include <algorithm>
 
-#include "cimom/ConfigurationError.h"
-#include "cimom/broker/Names.h"
+#include "cimom/ground/Errors.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom {
 namespace {

@@ -7,8 +7,8 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/broker/Names.h"
-#include "cimom/schema/ClassDefinition.h"
+#include "cimom/model/ClassDefinition.h"
+#include "cimom/model/Names.h"
 #include "cimom/schema/Mof.h"
 
 namespace Cimom {

@@ -7,7 +7,7 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/schema/ClassDefinition.h"
+#include "cimom/model/ClassDefinition.h"
 
 namespace Cimom {
 

@@ -3,8 +3,8 @@
 #include <charconv>
 #include <cstdint>
 
-#include "cimom/ConfigurationError.h"
-#include "cimom/broker/Names.h"
+#include "cimom/ground/Errors.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom {
 namespace {

@@ -4,7 +4,7 @@
 #include <string>
 #include <string_view>
 
-#include "cimom/broker/Value.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 

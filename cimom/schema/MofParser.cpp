@@ -3,8 +3,8 @@
 #include <algorithm>
 
 #include "cimom/broker/Array.h"
-#include "cimom/broker/Names.h"
 #include "cimom/broker/StatusError.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom {
 namespace {

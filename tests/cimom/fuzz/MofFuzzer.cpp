@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <string_view>
 
-#include "cimom/ConfigurationError.h"
+#include "cimom/ground/Errors.h"
 #include "cimom/schema/ClassRepository.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {

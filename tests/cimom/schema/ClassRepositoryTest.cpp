@@ -1,7 +1,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "cimom/ConfigurationError.h"
+#include "cimom/ground/Errors.h"
 #include "cimom/schema/ClassRepository.h"
 #include "tests/cimom/support/ManagedElements.h"
 

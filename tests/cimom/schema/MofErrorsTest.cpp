@@ -1,7 +1,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "cimom/ConfigurationError.h"
+#include "cimom/ground/Errors.h"
 #include "cimom/schema/Mof.h"
 #include "tests/cimom/support/ManagedElements.h"
 #include "tests/support/TemporaryDirectory.h"

@@ -1,8 +1,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "cimom/ConfigurationError.h"
 #include "cimom/broker/Array.h"
+#include "cimom/ground/Errors.h"
 #include "cimom/schema/Mof.h"
 #include "tests/support/TemporaryDirectory.h"
 

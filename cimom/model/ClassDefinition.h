@@ -5,7 +5,7 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/broker/Value.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 

@@ -6,8 +6,8 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/registry/Provider.h"
-#include "cimom/registry/ProviderRegistration.h"
+#include "cimom/providers/Provider.h"
+#include "cimom/providers/ProviderRegistration.h"
 
 namespace Cimom {
 

@@ -7,8 +7,8 @@
 #include <string_view>
 #include <vector>
 
-#include "cimom/broker/ObjectPath.h"
-#include "cimom/schema/ClassDefinition.h"
+#include "cimom/model/ClassDefinition.h"
+#include "cimom/model/ObjectPath.h"
 
 namespace Cimom {
 

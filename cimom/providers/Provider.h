@@ -8,8 +8,8 @@
 #include <string>
 #include <vector>
 
-#include "cimom/registry/ProviderLibrary.h"
-#include "cimom/registry/ProviderRegistration.h"
+#include "cimom/providers/ProviderLibrary.h"
+#include "cimom/providers/ProviderRegistration.h"
 
 namespace Cimom {
 

@@ -8,7 +8,7 @@
 #include <string>
 #include <variant>
 
-#include "cimom/broker/DateTime.h"
+#include "cimom/model/DateTime.h"
 
 namespace Cimom {
 

@@ -1,4 +1,4 @@
-#include "cimom/registry/ProviderLibrary.h"
+#include "cimom/providers/ProviderLibrary.h"
 
 #include <dlfcn.h>
 

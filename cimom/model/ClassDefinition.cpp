@@ -1,8 +1,8 @@
-#include "cimom/schema/ClassDefinition.h"
+#include "cimom/model/ClassDefinition.h"
 
 #include <algorithm>
 
-#include "cimom/broker/Names.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom {
 namespace {

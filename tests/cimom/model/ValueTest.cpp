@@ -4,7 +4,7 @@
 #include <limits>
 
 #include "cimom/broker/Array.h"
-#include "cimom/broker/Value.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 namespace {

@@ -1,4 +1,4 @@
-#include "cimom/broker/ObjectPath.h"
+#include "cimom/model/ObjectPath.h"
 
 namespace Cimom {
 

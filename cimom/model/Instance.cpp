@@ -1,4 +1,4 @@
-#include "cimom/broker/Instance.h"
+#include "cimom/model/Instance.h"
 
 #include <algorithm>
 

@@ -1,4 +1,4 @@
-#include "cimom/registry/Provider.h"
+#include "cimom/providers/Provider.h"
 
 #include "cimom/broker/Handle.h"
 #include "cimom/broker/ProviderGuard.h"

@@ -1,4 +1,4 @@
-#include "cimom/broker/DateTime.h"
+#include "cimom/model/DateTime.h"
 
 #include <charconv>
 #include <chrono>

@@ -1,10 +1,10 @@
-#include "cimom/registry/ProviderRegistry.h"
+#include "cimom/providers/ProviderRegistry.h"
 
 #include <algorithm>
 
-#include "cimom/ConfigurationError.h"
-#include "cimom/broker/Names.h"
 #include "cimom/broker/StatusError.h"
+#include "cimom/ground/Errors.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom {
 

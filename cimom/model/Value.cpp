@@ -1,4 +1,4 @@
-#include "cimom/broker/Value.h"
+#include "cimom/model/Value.h"
 
 #include <charconv>
 #include <cstring>
@@ -6,9 +6,9 @@
 
 #include "cimom/broker/Array.h"
 #include "cimom/broker/Handle.h"
-#include "cimom/broker/Instance.h"
-#include "cimom/broker/ObjectPath.h"
 #include "cimom/broker/StatusError.h"
+#include "cimom/model/Instance.h"
+#include "cimom/model/ObjectPath.h"
 
 namespace Cimom {
 namespace {

@@ -1,11 +1,11 @@
-#include "cimom/registry/ProviderRegistration.h"
+#include "cimom/providers/ProviderRegistration.h"
 
 #include <algorithm>
 #include <fstream>
 #include <sstream>
 #include <string_view>
 
-#include "cimom/ConfigurationError.h"
+#include "cimom/ground/Errors.h"
 
 namespace Cimom {
 namespace {
