@@ -1,16 +1,23 @@
 #include "cimom/ObjectManager.h"
 
 #include "cimom/broker/BrokerCore.h"
+#include "cimom/routing/Router.h"
 #include "cimom/schema/Mof.h"
 
 namespace Cimom {
 
 struct ObjectManager::Parts {
-  BrokerCore core;
+  Parts() { core.operations = &router; }
+
   MofReader reader;
+  BrokerCore core;
+  // Ends first: a provider may still make up-calls while it is cleaned up.
+  Router router{&core.broker};
 
   void addNamespaces(const ProviderRegistration& registration) {
-    for (const std::string& nameSpace : registration.namespaces) core.classes.addNamespace(nameSpace);
+    for (const std::string& nameSpace : registration.namespaces) {
+      core.classes.addNamespace(nameSpace);
+    }
   }
 };
 
@@ -29,28 +36,30 @@ void ObjectManager::loadSchemaText(std::string_view mof, std::string_view nameSp
 
 void ObjectManager::loadRegistration(const std::filesystem::path& file) {
   for (const ProviderRegistration& registration : readRegistration(file)) {
-    parts_->core.providers.add(registration);
+    parts_->router.providers().add(registration);
     parts_->addNamespaces(registration);
   }
 }
 
 void ObjectManager::addProviderDirectory(const std::filesystem::path& directory) {
-  parts_->core.providers.addDirectory(directory);
+  parts_->router.providers().addDirectory(directory);
 }
 
 void ObjectManager::addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
                                 AssociationFactory associationFactory) {
-  parts_->core.providers.add(registration, std::move(instanceFactory), std::move(associationFactory));
+  parts_->router.providers().add(registration, std::move(instanceFactory), std::move(associationFactory));
   parts_->addNamespaces(registration);
 }
 
 void ObjectManager::checkProviders() {
-  for (const auto& [registration, provider] : parts_->core.providers.entries()) {
-    if (parts_->core.classes.find(registration.className)) continue;
+  for (const auto& [registration, provider] : parts_->router.providers().entries()) {
+    if (parts_->core.classes.find(registration.className)) {
+      continue;
+    }
     throw ConfigurationError((registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") + "class " +
                              registration.className + " is not in the schema");
   }
-  parts_->core.providers.load();
+  parts_->router.providers().load();
 }
 
 void ObjectManager::setLog(MessageSink sink) { parts_->core.log = std::move(sink); }

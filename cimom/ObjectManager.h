@@ -1,5 +1,4 @@
-#ifndef CIMOM_OBJECTMANAGER_H_
-#define CIMOM_OBJECTMANAGER_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -7,44 +6,44 @@
 #include <memory>
 #include <string_view>
 
-#include "cimom/broker/MessageSink.h"
+#include "cimom/broker/BrokerCore.h"
 #include "cimom/ground/Errors.h"
 #include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {
 
-/// A CIM object manager without a wire: schema, registered providers and a CMPI 2.0 broker, through whose up-call
-/// table (CMPIBrokerFT) every CIM operation goes. Requests may run on several threads at once, each inside a
-/// RequestScope, once everything is loaded.
+// A CIM object manager without a wire: schema, registered providers and a CMPI 2.0 broker, through whose up-call
+// table (CMPIBrokerFT) every CIM operation goes. Requests may run on several threads at once, each inside a
+// RequestScope, once everything is loaded.
 class ObjectManager {
  public:
   ObjectManager();
-  /// Cleans every provider up that was used, then unloads the libraries. No request may be under way.
+  // Cleans every provider up that was used, then unloads the libraries. No request may be under way.
   ~ObjectManager();
 
-  /// Reads MOF from a file or from every *.mof under a directory.
-  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  // Reads MOF from a file or from every *.mof under a directory.
+  // Throws ConfigurationError "FILE:LINE: what is wrong".
   void loadSchema(const std::filesystem::path& fileOrDirectory);
-  /// Reads MOF from a text and makes the namespace known.
+  // Reads MOF from a text and makes the namespace known.
   void loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin = "text");
 
-  /// Reads a registration file (ProviderRegistration.h) and makes its namespaces known.
-  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  // Reads a registration file (ProviderRegistration.h) and makes its namespaces known.
+  // Throws ConfigurationError "FILE:LINE: what is wrong".
   void loadRegistration(const std::filesystem::path& file);
-  /// Where libraries are looked for, after the directories added before.
+  // Where libraries are looked for, after the directories added before.
   void addProviderDirectory(const std::filesystem::path& directory);
-  /// Registers a provider that is linked into this program; a factory of a type that the registration does not name
-  /// may be null.
+  // Registers a provider that is linked into this program; a factory of a type that the registration does not name
+  // may be null.
   void addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
                    AssociationFactory associationFactory);
-  /// Loads every registered library now.
-  /// @throws ConfigurationError for a library or a factory that is not there, or a class that the schema lacks
+  // Loads every registered library now.
+  // Throws ConfigurationError for a library or a factory that is not there, or a class that the schema lacks.
   void checkProviders();
 
-  /// Where CMLogMessage goes; by default a line on the standard error output.
+  // Where CMLogMessage goes; by default a line on the standard error output.
   void setLog(MessageSink sink);
-  /// Where CMTraceMessage goes; by default nowhere.
+  // Where CMTraceMessage goes; by default nowhere.
   void setTrace(MessageSink sink);
 
   const CMPIBroker* broker() const;
@@ -56,5 +55,3 @@ class ObjectManager {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_OBJECTMANAGER_H_

@@ -43,17 +43,27 @@ class EndSignals {
 };
 
 void load(ObjectManager& manager, const Configuration& configuration) {
-  for (const auto& schema : configuration.schemas) manager.loadSchema(schema);
-  for (const auto& registration : configuration.registrations) manager.loadRegistration(registration);
-  for (const auto& directory : configuration.providerDirectories) manager.addProviderDirectory(directory);
+  for (const auto& schema : configuration.schemas) {
+    manager.loadSchema(schema);
+  }
+  for (const auto& registration : configuration.registrations) {
+    manager.loadRegistration(registration);
+  }
+  for (const auto& directory : configuration.providerDirectories) {
+    manager.addProviderDirectory(directory);
+  }
   manager.checkProviders();
 }
 
 std::string contentOf(const std::filesystem::path& file) {
-  if (file.empty()) return {};
+  if (file.empty()) {
+    return {};
+  }
   std::ifstream stream(file, std::ios::binary);
   std::string content{std::istreambuf_iterator<char>(stream), {}};
-  if (content.empty()) throw Http::ServerError("cannot read " + file.string());
+  if (content.empty()) {
+    throw Http::ServerError("cannot read " + file.string());
+  }
   return content;
 }
 
@@ -88,7 +98,9 @@ void serve(const Configuration& configuration, const EndSignals& endSignals) {
                       [&endpoint](const Http::Request& request) { return endpoint.handle(request); });
   std::cout << "listening on " << server.endpoint() << std::endl;
   endSignals.wait();
-  if (server.drain(configuration.shutdownTimeout)) return;
+  if (server.drain(configuration.shutdownTimeout)) {
+    return;
+  }
   // A provider that is still at work can neither be cleaned up nor unloaded.
   std::cerr << "cimomd: requests are still being answered after " << configuration.shutdownTimeout.count()
             << " s: ending without the providers' cleanup" << std::endl;
@@ -100,7 +112,9 @@ void serve(const Configuration& configuration, const EndSignals& endSignals) {
 int main(int argc, char** argv) {
   try {
     const auto configuration = readCommandLine(argc, argv);
-    if (!configuration) return 0;
+    if (!configuration) {
+      return 0;
+    }
     const EndSignals endSignals;
     serve(*configuration, endSignals);
     return 0;

@@ -4,7 +4,7 @@
 #include <iostream>
 #include <string>
 
-#include "cimom/broker/StatusError.h"
+#include "cimom/ground/Errors.h"
 
 namespace Cimom {
 namespace {
@@ -13,7 +13,9 @@ void logToStandardError(int severity, std::string_view component, std::string_vi
   constexpr std::array<const char*, 5> names = {"message", "error", "info", "warning", "debug"};
   const auto index = severity >= CMPI_SEV_ERROR && severity <= CMPI_DEV_DEBUG ? static_cast<std::size_t>(severity) : 0;
   std::string line = std::string(names[index]) + ": ";
-  if (!component.empty()) line.append(component).append(": ");
+  if (!component.empty()) {
+    line.append(component).append(": ");
+  }
   // One write, so that the lines of several threads stay whole.
   std::cerr << line.append(text).append("\n") << std::flush;
 }
@@ -21,13 +23,13 @@ void logToStandardError(int severity, std::string_view component, std::string_vi
 }  // namespace
 
 BrokerCore::BrokerCore()
-    : log(logToStandardError),
-      broker{this, &upCallTable, &encapsulationTable, &extensionTable, &memoryTable},
-      providers(&broker) {}
+    : log(logToStandardError), broker{this, &upCallTable, &encapsulationTable, &extensionTable, &memoryTable} {}
 
 const ClassDefinition& BrokerCore::requireClass(std::string_view className) const {
   const ClassDefinition* definition = classes.find(className);
-  if (!definition) throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "no class \"" + std::string(className) + "\"");
+  if (!definition) {
+    throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "no class \"" + std::string(className) + "\"");
+  }
   return *definition;
 }
 
@@ -38,7 +40,9 @@ void BrokerCore::requireNamespace(std::string_view nameSpace) const {
 }
 
 BrokerCore& coreOf(const CMPIBroker* broker) {
-  if (!broker || !broker->hdl) throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIBroker");
+  if (!broker || !broker->hdl) {
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIBroker");
+  }
   return *static_cast<BrokerCore*>(broker->hdl);
 }
 

@@ -1,41 +1,43 @@
-#ifndef CIMOM_BROKER_BROKERCORE_H_
-#define CIMOM_BROKER_BROKERCORE_H_
+#pragma once
 
 #include <cmpift.h>
 
+#include <functional>
 #include <string_view>
 
-#include "cimom/broker/MessageSink.h"
-#include "cimom/providers/ProviderRegistry.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {
 
-/// What stands behind the broker that providers see.
+class OperationHandler;
+
+// Takes a message that a provider logs or traces: its severity (CMPI_SEV_…) or level (CMPI_LEV_…), the component that
+// sends it and the text. It may be called from several threads at once.
+using MessageSink = std::function<void(int level, std::string_view component, std::string_view text)>;
+
+// What stands behind the broker that providers see.
 struct BrokerCore {
   BrokerCore();
 
-  /// @throws StatusError CMPI_RC_ERR_INVALID_CLASS
+  // Throws StatusError CMPI_RC_ERR_INVALID_CLASS.
   const ClassDefinition& requireClass(std::string_view className) const;
-  /// @throws StatusError CMPI_RC_ERR_INVALID_NAMESPACE
+  // Throws StatusError CMPI_RC_ERR_INVALID_NAMESPACE.
   void requireNamespace(std::string_view nameSpace) const;
 
   ClassRepository classes;
-  MessageSink log;
+  MessageSink log;  // at first a line on the standard error output
   MessageSink trace;
+  OperationHandler* operations = nullptr;  // who carries up-calls out; there before the first of them
   CMPIBroker broker;
-  ProviderRegistry providers;
 };
 
-/// @throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the broker or its handle is null
+// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the broker or its handle is null.
 BrokerCore& coreOf(const CMPIBroker* broker);
 
-/// The broker's four function tables.
+// The broker's four function tables.
 extern CMPIBrokerFT upCallTable;
 extern CMPIBrokerEncFT encapsulationTable;
 extern CMPIBrokerExtFT extensionTable;
 extern CMPIBrokerMemFT memoryTable;
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_BROKERCORE_H_

@@ -1,12 +1,15 @@
+#include <cstdarg>
+#include <vector>
+
 #include "cimom/broker/BrokerCore.h"
 #include "cimom/broker/Guard.h"
-#include "cimom/broker/MessageText.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom {
 namespace {
 
-/// Makes an object for a broker's caller.
-template <class Operation>
+// Makes an object for a broker's caller.
+template <typename Operation>
 auto made(const CMPIBroker* broker, CMPIStatus* status, Operation operation) {
   using Object = std::invoke_result_t<Operation>;
   return guarded(status, Object{}, [&] {
@@ -22,7 +25,7 @@ CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, 
   });
 }
 
-/// The class need not be known: a path may be made for what another object manager has. A null namespace is none.
+// The class need not be known: a path may be made for what another object manager has. A null namespace is none.
 CMPIObjectPath* newObjectPath(const CMPIBroker* broker, const char* nameSpace, const char* className,
                               CMPIStatus* status) {
   return made(broker, status, [&] {
@@ -40,8 +43,8 @@ CMPIString* newString(const CMPIBroker* broker, const char* text, CMPIStatus* st
 
 CMPIArray* newArray(const CMPIBroker* broker, CMPICount count, CMPIType type, CMPIStatus* status) {
   return made(broker, status, [&] {
-    const Value element = Value::fromCmpi(nullptr, type);
-    if (type == CMPI_null || (type & CMPI_ARRAY)) {
+    const Value element = fromCmpi(nullptr, type);
+    if (type == CMPI_null || isArray(type)) {
       throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
                         "no array has elements of the CMPI type " + std::to_string(type));
     }
@@ -76,7 +79,7 @@ CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, c
   });
 }
 
-/// What any CMPI object begins with.
+// What any CMPI object begins with.
 struct AnyObject {
   const void* hdl;
   const void* ft;
@@ -90,17 +93,17 @@ struct ObjectType {
 
 std::string bareName(const char* name) { return name; }
 
-template <class Model>
+template <typename Model>
 ObjectType typeRow(std::string (*describe)(const void* object)) {
   return {&Abi<Model>::table, Abi<Model>::name, describe};
 }
 
-template <class Model>
+template <typename Model>
 const Model& modelBehind(const void* object) {
   return modelOf<Model>(static_cast<const typename Abi<Model>::Type*>(object));
 }
 
-/// The type of an object that a provider knows by its address only. An object tells it by its function table.
+// The type of an object that a provider knows by its address only. An object tells it by its function table.
 const ObjectType& typeOf(const void* object) {
   static const ObjectType types[] = {
       typeRow<Text>([](const void* any) { return std::string(textOf(static_cast<const CMPIString*>(any))); }),
@@ -117,7 +120,9 @@ const ObjectType& typeOf(const void* object) {
   const auto* any = static_cast<const AnyObject*>(object);
   if (any && any->hdl) {
     for (const ObjectType& type : types) {
-      if (any->ft == type.table) return type;
+      if (any->ft == type.table) {
+        return type;
+      }
     }
   }
   throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "not an object of this broker");
@@ -137,7 +142,67 @@ CMPIString* getType(const CMPIBroker* broker, const void* object, CMPIStatus* st
   return made(broker, status, [&] { return make(Text{typeOf(object).name}); });
 }
 
-/// There are no message files: the text that the caller gives is the message, with its arguments put in.
+// The next argument; what is narrower than an int travels as one.
+std::string argumentText(std::va_list* arguments) {
+  // NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized): the caller has started the list.
+  const int type = va_arg(*arguments, int);
+  switch (type) {
+    case CMPI_boolean:
+      return va_arg(*arguments, int) ? "true" : "false";
+    case CMPI_uint8:
+    case CMPI_uint16:
+    case CMPI_sint8:
+    case CMPI_sint16:
+    case CMPI_sint32:
+      return std::to_string(va_arg(*arguments, int));
+    case CMPI_uint32:
+      return std::to_string(va_arg(*arguments, unsigned));
+    case CMPI_uint64:
+      return std::to_string(va_arg(*arguments, CMPIUint64));
+    case CMPI_sint64:
+      return std::to_string(va_arg(*arguments, CMPISint64));
+    case CMPI_real32:
+    case CMPI_real64:
+      return std::to_string(va_arg(*arguments, double));
+    case CMPI_chars: {
+      const char* text = va_arg(*arguments, const char*);
+      return text ? text : "";
+    }
+    case CMPI_string:
+      return textOf(va_arg(*arguments, const CMPIString*));
+    default:
+      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, "no message argument has the CMPI type " + std::to_string(type));
+  }
+}
+
+// A message with "$0" … "$9" replaced by its arguments: `count` pairs of a CMPIType and a value of it.
+std::string messageText(const std::string& message, CMPICount count, std::va_list arguments) {
+  std::va_list rest;
+  va_copy(rest, arguments);
+  std::vector<std::string> texts;
+  try {
+    while (texts.size() < count) {
+      texts.push_back(argumentText(&rest));
+    }
+  } catch (...) {
+    va_end(rest);
+    throw;
+  }
+  va_end(rest);
+  std::string result;
+  for (std::size_t position = 0; position < message.size(); ++position) {
+    const unsigned digit = position + 1 < message.size() ? static_cast<unsigned>(message[position + 1] - '0') : 10;
+    if (message[position] == '$' && digit < texts.size() && digit < 10) {
+      result += texts[digit];
+      ++position;
+    } else {
+      result += message[position];
+    }
+  }
+  return result;
+}
+
+// There are no message files: the text that the caller gives is the message, with its arguments put in.
 CMPIString* defaultMessage(const CMPIBroker* broker, const char* text, CMPIStatus* status, CMPICount count,
                            std::va_list arguments) {
   return made(broker, status,
@@ -165,7 +230,9 @@ CMPIString* getMessage2(const CMPIBroker* broker, const char*, const CMPIMsgFile
 CMPIStatus openMessageFile(const CMPIBroker* broker, const char*, CMPIMsgFileHandle* file) {
   return guarded([&] {
     coreOf(broker);
-    if (file) *file = nullptr;
+    if (file) {
+      *file = nullptr;
+    }
     throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no message files");
   });
 }
@@ -174,13 +241,15 @@ CMPIStatus closeMessageFile(const CMPIBroker* broker, const CMPIMsgFileHandle) {
   return openMessageFile(broker, nullptr, nullptr);
 }
 
-/// The text of a message comes as characters or as a string; the characters win where both are there.
+// The text of a message comes as characters or as a string; the characters win where both are there.
 CMPIStatus send(const CMPIBroker* broker, MessageSink BrokerCore::*sink, int level, const char* component,
                 const char* text, const CMPIString* string) {
   return guarded([&] {
     const auto& receiver = coreOf(broker).*sink;
     const char* message = text ? text : textOf(string);
-    if (receiver) receiver(level, component ? component : "", message);
+    if (receiver) {
+      receiver(level, component ? component : "", message);
+    }
   });
 }
 

@@ -22,15 +22,19 @@ pthread_mutex_t* mutexOf(CMPI_MUTEX_TYPE mutex) { return static_cast<pthread_mut
 pthread_cond_t* conditionOf(CMPI_COND_TYPE condition) { return static_cast<pthread_cond_t*>(condition); }
 pthread_t threadOf(CMPI_THREAD_TYPE thread) { return reinterpret_cast<pthread_t>(thread); }
 
-/// The file name of a library as providers are looked for; the caller frees it.
+// The file name of a library as providers are looked for; the caller frees it.
 char* resolveFileName(const char* name) {
-  if (!name) return nullptr;
+  if (!name) {
+    return nullptr;
+  }
   const std::string file = std::string("lib") + name + ".so";
   return ::strdup(file.c_str());
 }
 
 CMPI_THREAD_TYPE newThread(CMPI_THREAD_RETURN(CMPI_THREAD_CDECL* start)(void*), void* parameter, int detached) {
-  if (!start) return nullptr;
+  if (!start) {
+    return nullptr;
+  }
   pthread_attr_t attributes;
   pthread_attr_init(&attributes);
   pthread_attr_setdetachstate(&attributes, detached ? PTHREAD_CREATE_DETACHED : PTHREAD_CREATE_JOINABLE);
@@ -57,9 +61,13 @@ int threadOnce(int* once, void (*initialise)()) { return once && initialise ? pt
 
 int createThreadKey(CMPI_THREAD_KEY_TYPE* key, void (*cleanup)(void*)) {
   pthread_key_t made;
-  if (!key) return EINVAL;
+  if (!key) {
+    return EINVAL;
+  }
   const int error = pthread_key_create(&made, cleanup);
-  if (!error) *key = made;
+  if (!error) {
+    *key = made;
+  }
   return error;
 }
 
@@ -71,11 +79,13 @@ int setThreadSpecific(CMPI_THREAD_KEY_TYPE key, void* value) {
   return pthread_setspecific(static_cast<pthread_key_t>(key), value);
 }
 
-/// A mutex that its thread may lock again, where `recursive` says so.
+// A mutex that its thread may lock again, where `recursive` says so.
 CMPI_MUTEX_TYPE newMutex(int recursive) {
   auto mutex = std::unique_ptr<pthread_mutex_t>(new (std::nothrow) pthread_mutex_t);
   pthread_mutexattr_t attributes;
-  if (!mutex || pthread_mutexattr_init(&attributes)) return nullptr;
+  if (!mutex || pthread_mutexattr_init(&attributes)) {
+    return nullptr;
+  }
   pthread_mutexattr_settype(&attributes, recursive ? PTHREAD_MUTEX_RECURSIVE : PTHREAD_MUTEX_DEFAULT);
   const int error = pthread_mutex_init(mutex.get(), &attributes);
   pthread_mutexattr_destroy(&attributes);
@@ -83,27 +93,37 @@ CMPI_MUTEX_TYPE newMutex(int recursive) {
 }
 
 void destroyMutex(CMPI_MUTEX_TYPE mutex) {
-  if (!mutex) return;
+  if (!mutex) {
+    return;
+  }
   pthread_mutex_destroy(mutexOf(mutex));
   delete mutexOf(mutex);
 }
 
 void lockMutex(CMPI_MUTEX_TYPE mutex) {
-  if (mutex) pthread_mutex_lock(mutexOf(mutex));
+  if (mutex) {
+    pthread_mutex_lock(mutexOf(mutex));
+  }
 }
 
 void unlockMutex(CMPI_MUTEX_TYPE mutex) {
-  if (mutex) pthread_mutex_unlock(mutexOf(mutex));
+  if (mutex) {
+    pthread_mutex_unlock(mutexOf(mutex));
+  }
 }
 
 CMPI_COND_TYPE newCondition(int) {
   auto condition = std::unique_ptr<pthread_cond_t>(new (std::nothrow) pthread_cond_t);
-  if (!condition || pthread_cond_init(condition.get(), nullptr)) return nullptr;
+  if (!condition || pthread_cond_init(condition.get(), nullptr)) {
+    return nullptr;
+  }
   return condition.release();
 }
 
 void destroyCondition(CMPI_COND_TYPE condition) {
-  if (!condition) return;
+  if (!condition) {
+    return;
+  }
   pthread_cond_destroy(conditionOf(condition));
   delete conditionOf(condition);
 }

@@ -1,25 +1,27 @@
-#ifndef CIMOM_BROKER_GUARD_H_
-#define CIMOM_BROKER_GUARD_H_
+#pragma once
 
 #include <exception>
 
+#include "cimom/broker/CmpiValue.h"
 #include "cimom/broker/Handle.h"
 
 namespace Cimom {
 
-/// Makes a status. Its message belongs to the request; outside any request there is nobody to own it and it is null.
+// Makes a status. Its message belongs to the request; outside any request there is nobody to own it and it is null.
 inline CMPIStatus makeStatus(CMPIrc code, const char* message) noexcept {
   CMPIStatus status = {code, nullptr};
   try {
-    if (message && RequestScope::current()) status.msg = make(Text{message});
+    if (message && RequestScope::current()) {
+      status.msg = make(Text{message});
+    }
   } catch (const std::exception&) {
     // The code alone still tells what is wrong.
   }
   return status;
 }
 
-/// Runs what stands behind a slot of a function table: no exception passes the binary interface.
-template <class Operation>
+// Runs what stands behind a slot of a function table: no exception passes the binary interface.
+template <typename Operation>
 CMPIStatus guarded(Operation operation) noexcept {
   try {
     operation();
@@ -31,35 +33,43 @@ CMPIStatus guarded(Operation operation) noexcept {
   }
 }
 
-/// The same for a slot that gives a result and reports through a status pointer, which may be null.
-template <class Given, class Operation>
+// The same for a slot that gives a result and reports through a status pointer, which may be null.
+template <typename Given, typename Operation>
 Given guarded(CMPIStatus* status, Given failure, Operation operation) noexcept {
   Given result = failure;
   const CMPIStatus outcome = guarded([&] { result = operation(); });
-  if (status) *status = outcome;
+  if (status) {
+    *status = outcome;
+  }
   return result;
 }
 
-/// A name or text that a slot requires.
-/// @throws StatusError CMPI_RC_ERR_INVALID_PARAMETER where it is null
+// A name or text that a slot requires.
+// Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER where it is null.
 inline const char* required(const char* text, const char* what) {
-  if (!text) throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string(what) + " is null");
+  if (!text) {
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string(what) + " is null");
+  }
   return text;
 }
 
-/// What a slot gives that has no value to give.
-constexpr CMPIData kNoData = {CMPI_null, CMPI_nullValue | CMPI_notFound, {}};
+// What a slot gives that has no value to give.
+constexpr CMPIData noData = {CMPI_null, CMPI_nullValue | CMPI_notFound, {}};
 
-/// The slots `release` and `clone`, the same for every object.
-template <class Model>
+// The slots `release` and `clone`, the same for every object.
+template <typename Model>
 CMPIStatus release(typename Abi<Model>::Type* object) {
-  if (!object || !object->hdl) return makeStatus(CMPI_RC_ERR_INVALID_HANDLE, "release of a null object");
+  if (!object || !object->hdl) {
+    return makeStatus(CMPI_RC_ERR_INVALID_HANDLE, "release of a null object");
+  }
   auto* handle = static_cast<Handle<Model>*>(object);
-  if (!handle->inScope) delete handle;
+  if (!handle->inScope) {
+    delete handle;
+  }
   return {CMPI_RC_OK, nullptr};
 }
 
-template <class Model>
+template <typename Model>
 typename Abi<Model>::Type* clone(const typename Abi<Model>::Type* object, CMPIStatus* status) {
   using Type = typename Abi<Model>::Type;
   return guarded(status, static_cast<Type*>(nullptr), [&]() -> Type* {
@@ -71,30 +81,32 @@ typename Abi<Model>::Type* clone(const typename Abi<Model>::Type* object, CMPISt
   });
 }
 
-/// A string of the request; null where there is no text.
+// A string of the request; null where there is no text.
 inline CMPIString* makeText(const std::optional<std::string>& text) { return text ? make(Text{*text}) : nullptr; }
 
-/// An entry of named values by index, as the slots get…At give it.
-/// @throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY past the end
+// An entry of named values by index, as the slots get…At give it.
+// Throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY past the end.
 inline CMPIData entryAt(const NamedValues& values, CMPICount index, CMPIString** name,
                         CMPIValueState state = CMPI_goodValue) {
   if (index >= values.size()) {
     throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, "no entry at index " + std::to_string(index));
   }
   const auto& entry = values[index];
-  const CMPIData data = entry.value.toCmpi(state);
-  if (name) *name = make(Text{entry.name});
+  const CMPIData data = toCmpi(entry.value, state);
+  if (name) {
+    *name = make(Text{entry.name});
+  }
   return data;
 }
 
-/// An entry of named values by name, as the slots get… give it.
-/// @throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY where there is none
+// An entry of named values by name, as the slots get… give it.
+// Throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY where there is none.
 inline CMPIData entryOf(const NamedValues& values, const char* name, CMPIValueState state = CMPI_goodValue) {
   const Value* value = values.find(required(name, "the name"));
-  if (!value) throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, std::string("no entry \"") + name + "\"");
-  return value->toCmpi(state);
+  if (!value) {
+    throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, std::string("no entry \"") + name + "\"");
+  }
+  return toCmpi(*value, state);
 }
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_GUARD_H_

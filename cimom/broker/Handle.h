@@ -1,5 +1,4 @@
-#ifndef CIMOM_BROKER_HANDLE_H_
-#define CIMOM_BROKER_HANDLE_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -8,35 +7,15 @@
 #include <type_traits>
 #include <utility>
 
-#include "cimom/broker/Array.h"
-#include "cimom/broker/Error.h"
-#include "cimom/broker/NamedValues.h"
+#include "cimom/broker/Models.h"
 #include "cimom/broker/RequestScope.h"
-#include "cimom/broker/Result.h"
-#include "cimom/broker/StatusError.h"
-#include "cimom/model/DateTime.h"
+#include "cimom/ground/Errors.h"
 #include "cimom/model/Instance.h"
-#include "cimom/model/ObjectPath.h"
 
 namespace Cimom {
 
-/// The models behind the CMPI objects that are no more than their contents.
-struct Text {
-  std::string characters;
-};
-struct Context {
-  NamedValues entries;
-};
-struct Args {
-  NamedValues arguments;
-};
-struct Enumeration {
-  std::vector<Value> items;
-  std::size_t next = 0;
-};
-
-/// Which CMPI object a model is behind: its struct, its function table and its name.
-template <class Model>
+// Which CMPI object a model is behind: its struct, its function table and its name.
+template <typename Model>
 struct Abi;
 
 #define CIMOM_ABI(MODEL, OBJECT)                 \
@@ -60,9 +39,9 @@ CIMOM_ABI(Error, CMPIError);
 
 #undef CIMOM_ABI
 
-/// A CMPI object: the struct that providers see, and the model behind it. The struct's handle is this object, but for
-/// strings it is the characters, as providers that read a string's handle directly expect.
-template <class Model>
+// A CMPI object: the struct that providers see, and the model behind it. The struct's handle is this object, but for
+// strings it is the characters, as providers that read a string's handle directly expect.
+template <typename Model>
 struct Handle final : Object, Abi<Model>::Type {
   explicit Handle(Model contents, bool ownedElsewhere = false) : model(std::move(contents)) {
     inScope = ownedElsewhere;
@@ -77,15 +56,15 @@ struct Handle final : Object, Abi<Model>::Type {
   Model model;
 };
 
-/// A CMPI object for the time of a call, on the caller's stack.
-template <class Model>
+// A CMPI object for the time of a call, on the caller's stack.
+template <typename Model>
 Handle<Model> lend(Model model) {
   return Handle<Model>(std::move(model), true);
 }
 
-/// The model behind a CMPI object.
-/// @throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the object or its handle is null
-template <class Model>
+// The model behind a CMPI object.
+// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the object or its handle is null.
+template <typename Model>
 Model& modelOf(const typename Abi<Model>::Type* object) {
   static_assert(!std::is_same_v<Model, Text>, "textOf reads a string");
   if (!object || !object->hdl) {
@@ -94,15 +73,17 @@ Model& modelOf(const typename Abi<Model>::Type* object) {
   return static_cast<Handle<Model>*>(object->hdl)->model;
 }
 
-/// The characters of a CMPI string.
-/// @throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the string or its handle is null
+// The characters of a CMPI string.
+// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the string or its handle is null.
 inline const char* textOf(const CMPIString* string) {
-  if (!string || !string->hdl) throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIString");
+  if (!string || !string->hdl) {
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIString");
+  }
   return static_cast<const char*>(string->hdl);
 }
 
-/// Makes a CMPI object, owned by the current request scope where there is one and else by the caller.
-template <class Model>
+// Makes a CMPI object, owned by the current request scope where there is one and else by the caller.
+template <typename Model>
 typename Abi<Model>::Type* make(Model model) {
   auto handle = std::make_unique<Handle<Model>>(std::move(model));
   auto* object = handle.get();
@@ -114,5 +95,3 @@ typename Abi<Model>::Type* make(Model model) {
 }
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_HANDLE_H_

@@ -8,26 +8,28 @@ CMPIValueState stateOf(const PropertyDeclaration& property) {
 }
 
 CMPIData getProperty(const CMPIInstance* instance, const char* name, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] {
+  return guarded(status, noData, [&] {
     const Instance& model = modelOf<Instance>(instance);
     const Value* value = model.find(required(name, "the property's name"));
     if (!value) {
       throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, model.definition().name + " has no property \"" + name + "\"");
     }
-    return value->toCmpi(stateOf(*model.definition().findProperty(name)));
+    return toCmpi(*value, stateOf(*model.definition().findProperty(name)));
   });
 }
 
 CMPIData getPropertyAt(const CMPIInstance* instance, CMPICount index, CMPIString** name, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] {
+  return guarded(status, noData, [&] {
     const Instance& model = modelOf<Instance>(instance);
     if (index >= model.size()) {
       throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY,
                         model.definition().name + " has no property at index " + std::to_string(index));
     }
     const PropertyDeclaration& property = model.definition().properties[index];
-    const CMPIData data = model[index].toCmpi(stateOf(property));
-    if (name) *name = make(Text{property.name});
+    const CMPIData data = toCmpi(model[index], stateOf(property));
+    if (name) {
+      *name = make(Text{property.name});
+    }
     return data;
   });
 }
@@ -39,11 +41,11 @@ CMPICount getPropertyCount(const CMPIInstance* instance, CMPIStatus* status) {
 CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
   return guarded([&] {
     Instance& model = modelOf<Instance>(instance);
-    model.set(required(name, "the property's name"), Value::fromCmpi(value, type));
+    model.set(required(name, "the property's name"), fromCmpi(value, type));
   });
 }
 
-/// The class says where a property comes from; the origin that the caller names adds nothing to it.
+// The class says where a property comes from; the origin that the caller names adds nothing to it.
 CMPIStatus setPropertyWithOrigin(const CMPIInstance* instance, const char* name, const CMPIValue* value,
                                  const CMPIType type, const char*) {
   return setProperty(instance, name, value, type);
@@ -61,13 +63,17 @@ CMPIStatus setObjectPath(CMPIInstance* instance, const CMPIObjectPath* path) {
   });
 }
 
-/// The class knows its keys, so that the caller's list of them is not needed.
+// The class knows its keys, so that the caller's list of them is not needed.
 CMPIStatus setPropertyFilter(CMPIInstance* instance, const char** properties, const char**) {
   return guarded([&] {
     Instance& model = modelOf<Instance>(instance);
-    if (!properties) return;
+    if (!properties) {
+      return;
+    }
     std::vector<std::string> names;
-    for (const char** name = properties; *name; ++name) names.emplace_back(*name);
+    for (const char** name = properties; *name; ++name) {
+      names.emplace_back(*name);
+    }
     model.setFilter(names);
   });
 }

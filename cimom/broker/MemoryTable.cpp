@@ -33,12 +33,12 @@ char* cmpiStrDup(const CMPIBroker*, const char* text) { return text ? ::strdup(t
 
 void cmpiFree(const CMPIBroker*, void* memory) { std::free(memory); }
 
-template <class Model>
+template <typename Model>
 void freeObject(const CMPIBroker*, typename Abi<Model>::Type* object) {
   release<Model>(object);
 }
 
-/// There is nothing to free: this broker makes no select expressions.
+// There is nothing to free: this broker makes no select expressions.
 void freeSelectExp(const CMPIBroker*, CMPISelectExp*) {}
 
 }  // namespace

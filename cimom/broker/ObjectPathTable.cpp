@@ -20,16 +20,16 @@ CMPIString* getText(const CMPIObjectPath* path, CMPIStatus* status) {
 CMPIStatus addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, const CMPIType type) {
   return guarded([&] {
     ObjectPath& model = modelOf<ObjectPath>(path);
-    model.keys.set(required(name, "the key's name"), Value::fromCmpi(value, type));
+    model.keys.set(required(name, "the key's name"), fromCmpi(value, type));
   });
 }
 
 CMPIData getKey(const CMPIObjectPath* path, const char* name, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] { return entryOf(modelOf<ObjectPath>(path).keys, name, CMPI_keyValue); });
+  return guarded(status, noData, [&] { return entryOf(modelOf<ObjectPath>(path).keys, name, CMPI_keyValue); });
 }
 
 CMPIData getKeyAt(const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] { return entryAt(modelOf<ObjectPath>(path).keys, index, name, CMPI_keyValue); });
+  return guarded(status, noData, [&] { return entryAt(modelOf<ObjectPath>(path).keys, index, name, CMPI_keyValue); });
 }
 
 CMPICount getKeyCount(const CMPIObjectPath* path, CMPIStatus* status) {
@@ -51,17 +51,21 @@ CMPIStatus setHostAndNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObj
   });
 }
 
-/// The path's class, as the broker of the current request knows it.
+// The path's class, as the broker of the current request knows it.
 const ClassDefinition& classOf(const CMPIObjectPath* path) {
   const std::string& name = modelOf<ObjectPath>(path).className;
   const CMPIBroker* broker = RequestScope::currentBroker();
-  if (!broker) throw StatusError(CMPI_RC_ERR_FAILED, "qualifiers can be read within a request only");
+  if (!broker) {
+    throw StatusError(CMPI_RC_ERR_FAILED, "qualifiers can be read within a request only");
+  }
   return coreOf(broker).requireClass(name);
 }
 
-template <class Declaration>
+template <typename Declaration>
 const Declaration& declared(const Declaration* declaration, CMPIrc code, const char* name) {
-  if (!declaration) throw StatusError(code, std::string("not declared: \"") + name + "\"");
+  if (!declaration) {
+    throw StatusError(code, std::string("not declared: \"") + name + "\"");
+  }
   return *declaration;
 }
 
@@ -69,35 +73,37 @@ const MethodDeclaration& methodOf(const CMPIObjectPath* path, const char* name) 
   return declared(classOf(path).findMethod(required(name, "the method's name")), CMPI_RC_ERR_METHOD_NOT_FOUND, name);
 }
 
-/// A qualifier's value; what is not qualified gives a null value with CMPI_RC_ERR_NOT_FOUND.
+// A qualifier's value; what is not qualified gives a null value with CMPI_RC_ERR_NOT_FOUND.
 CMPIData qualifierOf(const Qualifiers& qualifiers, const char* name) {
   const Qualifier* qualifier = findQualifier(qualifiers, required(name, "the qualifier's name"));
-  return declared(qualifier, CMPI_RC_ERR_NOT_FOUND, name).value.toCmpi();
+  return toCmpi(declared(qualifier, CMPI_RC_ERR_NOT_FOUND, name).value);
 }
 
 CMPIData getClassQualifier(const CMPIObjectPath* path, const char* qualifier, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] { return qualifierOf(classOf(path).qualifiers, qualifier); });
+  return guarded(status, noData, [&] { return qualifierOf(classOf(path).qualifiers, qualifier); });
 }
 
 CMPIData getPropertyQualifier(const CMPIObjectPath* path, const char* property, const char* qualifier,
                               CMPIStatus* status) {
-  return guarded(status, kNoData, [&] {
+  return guarded(status, noData, [&] {
     const auto* found = classOf(path).findProperty(required(property, "the property's name"));
     return qualifierOf(declared(found, CMPI_RC_ERR_NO_SUCH_PROPERTY, property).qualifiers, qualifier);
   });
 }
 
 CMPIData getMethodQualifier(const CMPIObjectPath* path, const char* method, const char* qualifier, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] { return qualifierOf(methodOf(path, method).qualifiers, qualifier); });
+  return guarded(status, noData, [&] { return qualifierOf(methodOf(path, method).qualifiers, qualifier); });
 }
 
 CMPIData getParameterQualifier(const CMPIObjectPath* path, const char* method, const char* parameter,
                                const char* qualifier, CMPIStatus* status) {
-  return guarded(status, kNoData, [&] {
+  return guarded(status, noData, [&] {
     const MethodDeclaration& declaration = methodOf(path, method);
     required(parameter, "the parameter's name");
     for (const PropertyDeclaration& one : declaration.parameters) {
-      if (sameName(one.name, parameter)) return qualifierOf(one.qualifiers, qualifier);
+      if (sameName(one.name, parameter)) {
+        return qualifierOf(one.qualifiers, qualifier);
+      }
     }
     throw StatusError(CMPI_RC_ERR_NOT_FOUND, std::string("not declared: \"") + parameter + "\"");
   });

@@ -17,7 +17,9 @@ RequestScope::RequestScope(const CMPIBroker* broker, bool opened)
 }
 
 RequestScope::~RequestScope() {
-  while (innermost != this) delete innermost;
+  while (innermost != this) {
+    delete innermost;
+  }
   innermost = outer_;
 }
 
@@ -43,8 +45,12 @@ RequestScope* RequestScope::open(const CMPIBroker* broker) { return new RequestS
 
 bool RequestScope::close(const RequestScope* opened) {
   const RequestScope* scope = innermost;
-  while (scope && scope->opened_ && scope != opened) scope = scope->outer_;
-  if (!scope || scope != opened || !scope->opened_) return false;
+  while (scope && scope->opened_ && scope != opened) {
+    scope = scope->outer_;
+  }
+  if (!scope || scope != opened || !scope->opened_) {
+    return false;
+  }
   delete scope;
   return true;
 }

@@ -1,5 +1,4 @@
-#ifndef CIMOM_BROKER_REQUESTSCOPE_H_
-#define CIMOM_BROKER_REQUESTSCOPE_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -8,7 +7,7 @@
 
 namespace Cimom {
 
-/// What every CMPI object that this object manager makes has in common: who frees it.
+// What every CMPI object that this object manager makes has in common: who frees it.
 class Object {
  public:
   Object() = default;
@@ -16,13 +15,13 @@ class Object {
   Object& operator=(const Object&) = delete;
   virtual ~Object() = default;
 
-  /// Owned by a scope or a caller's stack: releasing the object early is harmless and does nothing.
+  // Owned by a scope or a caller's stack: releasing the object early is harmless and does nothing.
   bool inScope = false;
 };
 
-/// The memory of one request. Every CMPI object that is made on this thread while the scope is the innermost one dies
-/// with it, and so does what the operations on such objects return. Scopes nest. Outside any scope an object belongs
-/// to who made it and goes with its release; a clone always does.
+// The memory of one request. Every CMPI object that is made on this thread while the scope is the innermost one dies
+// with it, and so does what the operations on such objects return. Scopes nest. Outside any scope an object belongs
+// to who made it and goes with its release; a clone always does.
 class RequestScope {
  public:
   explicit RequestScope(const CMPIBroker* broker);
@@ -30,19 +29,19 @@ class RequestScope {
   RequestScope(const RequestScope&) = delete;
   RequestScope& operator=(const RequestScope&) = delete;
 
-  /// The request's context, at first without entries; it is made when first asked for.
+  // The request's context, at first without entries; it is made when first asked for.
   CMPIContext* context();
 
-  /// The innermost scope of this thread; null where there is none.
+  // The innermost scope of this thread; null where there is none.
   static RequestScope* current();
-  /// The broker of the innermost scope of this thread; null where there is none.
+  // The broker of the innermost scope of this thread; null where there is none.
   static const CMPIBroker* currentBroker();
 
   void adopt(std::unique_ptr<Object> object);
 
-  /// Opens a scope on this thread that a later call of `close`, or the end of an outer scope, ends.
+  // Opens a scope on this thread that a later call of `close`, or the end of an outer scope, ends.
   static RequestScope* open(const CMPIBroker* broker);
-  /// Ends an opened scope and those inside it. Gives false where it is no opened scope of this thread.
+  // Ends an opened scope and those inside it. Gives false where it is no opened scope of this thread.
   static bool close(const RequestScope* opened);
 
  private:
@@ -56,5 +55,3 @@ class RequestScope {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_REQUESTSCOPE_H_

@@ -1,99 +1,113 @@
 #include "cimom/broker/BrokerCore.h"
 #include "cimom/broker/Guard.h"
-#include "cimom/routing/AssociationOperations.h"
-#include "cimom/routing/InstanceOperations.h"
+#include "cimom/broker/Operation.h"
 
 namespace Cimom {
 namespace {
 
-/// Runs an operation and hands its items out as an enumeration.
-template <class Run>
+const ClassDefinition& classFor(const BrokerCore& core, const ObjectPath& path) {
+  core.requireNamespace(path.nameSpace);
+  return core.requireClass(path.className);
+}
+
+// Runs an operation and hands its items out as an enumeration.
+template <typename Run>
 CMPIEnumeration* enumeration(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                              CMPIStatus* status, Run run) {
   return guarded(status, static_cast<CMPIEnumeration*>(nullptr), [&] {
-    return make(Enumeration{run(Operation(broker, context, path)), 0});
+    const Operation operation(broker, context, path);
+    return make(Enumeration{run(*operation.core.operations, operation), 0});
   });
 }
 
-CMPIEnumeration* enumerateInstanceNamesSlot(const CMPIBroker* broker, const CMPIContext* context,
-                                            const CMPIObjectPath* path, CMPIStatus* status) {
-  return enumeration(broker, context, path, status, enumerateInstanceNames);
+CMPIEnumeration* enumerateInstanceNames(const CMPIBroker* broker, const CMPIContext* context,
+                                        const CMPIObjectPath* path, CMPIStatus* status) {
+  return enumeration(broker, context, path, status, [](OperationHandler& handler, const Operation& operation) {
+    return handler.enumerateInstanceNames(operation);
+  });
 }
 
-CMPIEnumeration* enumerateInstancesSlot(const CMPIBroker* broker, const CMPIContext* context,
-                                        const CMPIObjectPath* path, const char** properties, CMPIStatus* status) {
-  return enumeration(broker, context, path, status,
-                     [&](const Operation& operation) { return enumerateInstances(operation, properties); });
+CMPIEnumeration* enumerateInstances(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                                    const char** properties, CMPIStatus* status) {
+  return enumeration(broker, context, path, status, [&](OperationHandler& handler, const Operation& operation) {
+    return handler.enumerateInstances(operation, properties);
+  });
 }
 
-CMPIInstance* getInstanceSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                              const char** properties, CMPIStatus* status) {
-  return guarded(status, static_cast<CMPIInstance*>(nullptr),
-                 [&] { return getInstance(Operation(broker, context, path), properties).toCmpi().value.inst; });
+CMPIInstance* getInstance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                          const char** properties, CMPIStatus* status) {
+  return guarded(status, static_cast<CMPIInstance*>(nullptr), [&] {
+    const Operation operation(broker, context, path);
+    return toCmpi(operation.core.operations->getInstance(operation, properties)).value.inst;
+  });
 }
 
-CMPIObjectPath* createInstanceSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                                   const CMPIInstance* instance, CMPIStatus* status) {
+CMPIObjectPath* createInstance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                               const CMPIInstance* instance, CMPIStatus* status) {
   return guarded(status, static_cast<CMPIObjectPath*>(nullptr), [&] {
     const Instance& model = modelOf<Instance>(instance);
-    return createInstance(Operation(broker, context, path), model).toCmpi().value.ref;
+    const Operation operation(broker, context, path);
+    return toCmpi(operation.core.operations->createInstance(operation, model)).value.ref;
   });
 }
 
-CMPIStatus modifyInstanceSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                              const CMPIInstance* instance, const char** properties) {
+CMPIStatus modifyInstance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                          const CMPIInstance* instance, const char** properties) {
   return guarded([&] {
     const Instance& model = modelOf<Instance>(instance);
-    modifyInstance(Operation(broker, context, path), model, properties);
+    const Operation operation(broker, context, path);
+    operation.core.operations->modifyInstance(operation, model, properties);
   });
 }
 
-CMPIStatus deleteInstanceSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path) {
-  return guarded([&] { deleteInstance(Operation(broker, context, path)); });
+CMPIStatus deleteInstance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path) {
+  return guarded([&] {
+    const Operation operation(broker, context, path);
+    operation.core.operations->deleteInstance(operation);
+  });
 }
 
 CMPIEnumeration* execQuery(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                            const char*, const char*, CMPIStatus* status) {
-  return enumeration(broker, context, path, status, [](const Operation&) -> std::vector<Value> {
+  return enumeration(broker, context, path, status, [](OperationHandler&, const Operation&) -> std::vector<Value> {
     throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no query language");
   });
 }
 
-CMPIEnumeration* associatorsSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+CMPIEnumeration* associators(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                             const char* associationClass, const char* resultClass, const char* role,
+                             const char* resultRole, const char** properties, CMPIStatus* status) {
+  return enumeration(broker, context, path, status, [&](OperationHandler& handler, const Operation& operation) {
+    return handler.associators(operation, {associationClass, resultClass, role, resultRole}, properties);
+  });
+}
+
+CMPIEnumeration* associatorNames(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                                  const char* associationClass, const char* resultClass, const char* role,
-                                 const char* resultRole, const char** properties, CMPIStatus* status) {
-  return enumeration(broker, context, path, status, [&](const Operation& operation) {
-    return associators(operation, {associationClass, resultClass, role, resultRole}, properties);
+                                 const char* resultRole, CMPIStatus* status) {
+  return enumeration(broker, context, path, status, [&](OperationHandler& handler, const Operation& operation) {
+    return handler.associatorNames(operation, {associationClass, resultClass, role, resultRole});
   });
 }
 
-CMPIEnumeration* associatorNamesSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                                     const char* associationClass, const char* resultClass, const char* role,
-                                     const char* resultRole, CMPIStatus* status) {
-  return enumeration(broker, context, path, status, [&](const Operation& operation) {
-    return associatorNames(operation, {associationClass, resultClass, role, resultRole});
+CMPIEnumeration* references(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                            const char* resultClass, const char* role, const char** properties, CMPIStatus* status) {
+  return enumeration(broker, context, path, status, [&](OperationHandler& handler, const Operation& operation) {
+    return handler.references(operation, {resultClass, nullptr, role, nullptr}, properties);
   });
 }
 
-CMPIEnumeration* referencesSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                                const char* resultClass, const char* role, const char** properties,
-                                CMPIStatus* status) {
-  return enumeration(broker, context, path, status, [&](const Operation& operation) {
-    return references(operation, {resultClass, nullptr, role, nullptr}, properties);
+CMPIEnumeration* referenceNames(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
+                                const char* resultClass, const char* role, CMPIStatus* status) {
+  return enumeration(broker, context, path, status, [&](OperationHandler& handler, const Operation& operation) {
+    return handler.referenceNames(operation, {resultClass, nullptr, role, nullptr});
   });
 }
 
-CMPIEnumeration* referenceNamesSlot(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                                    const char* resultClass, const char* role, CMPIStatus* status) {
-  return enumeration(broker, context, path, status, [&](const Operation& operation) {
-    return referenceNames(operation, {resultClass, nullptr, role, nullptr});
-  });
-}
-
-/// Method providers are not served: what a class declares is there but cannot be called.
+// Method providers are not served: what a class declares is there but cannot be called.
 CMPIData invokeMethod(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                       const char* method, const CMPIArgs*, CMPIArgs*, CMPIStatus* status) {
-  return guarded(status, kNoData, [&]() -> CMPIData {
+  return guarded(status, noData, [&]() -> CMPIData {
     const Operation operation(broker, context, path);
     const bool declared = operation.definition.findMethod(required(method, "the method's name"));
     throw StatusError(declared ? CMPI_RC_ERR_METHOD_NOT_AVAILABLE : CMPI_RC_ERR_METHOD_NOT_FOUND,
@@ -103,30 +117,32 @@ CMPIData invokeMethod(const CMPIBroker* broker, const CMPIContext* context, cons
 
 const PropertyDeclaration& requireProperty(const Operation& operation, const char* name) {
   const PropertyDeclaration* property = operation.definition.findProperty(required(name, "the property's name"));
-  if (property) return *property;
+  if (property) {
+    return *property;
+  }
   throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, operation.definition.name + " has no property \"" + name + "\"");
 }
 
-/// SetProperty is ModifyInstance of one property (DSP0200).
+// SetProperty is ModifyInstance of one property (DSP0200).
 CMPIStatus setProperty(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                        const char* name, const CMPIValue* value, CMPIType type) {
   return guarded([&] {
     const Operation operation(broker, context, path);
     const char* properties[] = {requireProperty(operation, name).name.c_str(), nullptr};
     Instance instance(operation.definition, operation.path);
-    instance.set(name, Value::fromCmpi(value, type));
-    modifyInstance(operation, instance, properties);
+    instance.set(name, fromCmpi(value, type));
+    operation.core.operations->modifyInstance(operation, instance, properties);
   });
 }
 
 CMPIData getProperty(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path, const char* name,
                      CMPIStatus* status) {
-  return guarded(status, kNoData, [&] {
+  return guarded(status, noData, [&] {
     const Operation operation(broker, context, path);
     const char* properties[] = {requireProperty(operation, name).name.c_str(), nullptr};
-    const Value instance = getInstance(operation, properties);
+    const Value instance = operation.core.operations->getInstance(operation, properties);
     const Value* value = instance.embedded()->find(name);
-    return value ? value->toCmpi() : kNoData;
+    return value ? toCmpi(*value) : noData;
   });
 }
 
@@ -137,19 +153,21 @@ CMPIStatus deliverIndication(const CMPIBroker* broker, const CMPIContext*, const
   });
 }
 
-/// A context that lives until the thread that it is for has detached.
+// A context that lives until the thread that it is for has detached.
 CMPIContext* prepareAttachThread(const CMPIBroker*, const CMPIContext* context) {
   return clone<Context>(context, nullptr);
 }
 
-/// The memory of the thread that a provider has attached; null where it has not.
+// The memory of the thread that a provider has attached; null where it has not.
 thread_local RequestScope* attached = nullptr;
 
 CMPIStatus attachThread(const CMPIBroker* broker, const CMPIContext* context) {
   return guarded([&] {
     coreOf(broker);
     modelOf<Context>(context);
-    if (attached) throw StatusError(CMPI_RC_ERR_FAILED, "the thread is attached already");
+    if (attached) {
+      throw StatusError(CMPI_RC_ERR_FAILED, "the thread is attached already");
+    }
     attached = RequestScope::open(broker);
   });
 }
@@ -158,7 +176,9 @@ CMPIStatus detachThread(const CMPIBroker* broker, const CMPIContext* context) {
   return guarded([&] {
     coreOf(broker);
     modelOf<Context>(context);
-    if (!attached) throw StatusError(CMPI_RC_ERR_FAILED, "the thread is not attached");
+    if (!attached) {
+      throw StatusError(CMPI_RC_ERR_FAILED, "the thread is not attached");
+    }
     RequestScope::close(attached);
     attached = nullptr;
     release<Context>(const_cast<CMPIContext*>(context));
@@ -166,6 +186,12 @@ CMPIStatus detachThread(const CMPIBroker* broker, const CMPIContext* context) {
 }
 
 }  // namespace
+
+Operation::Operation(const CMPIBroker* broker, const CMPIContext* callerContext, const CMPIObjectPath* requested)
+    : core(coreOf(broker)),
+      context(modelOf<Context>(callerContext)),
+      path(modelOf<ObjectPath>(requested)),
+      definition(classFor(core, path)) {}
 
 CMPIBrokerFT upCallTable = {
     .brokerCapabilities = CMPI_MB_InstanceManipulation | CMPI_MB_AssociationTraversal | CMPI_MB_BasicQualifierSupport |
@@ -177,17 +203,17 @@ CMPIBrokerFT upCallTable = {
     .attachThread = attachThread,
     .detachThread = detachThread,
     .deliverIndication = deliverIndication,
-    .enumerateInstanceNames = enumerateInstanceNamesSlot,
-    .getInstance = getInstanceSlot,
-    .createInstance = createInstanceSlot,
-    .modifyInstance = modifyInstanceSlot,
-    .deleteInstance = deleteInstanceSlot,
+    .enumerateInstanceNames = enumerateInstanceNames,
+    .getInstance = getInstance,
+    .createInstance = createInstance,
+    .modifyInstance = modifyInstance,
+    .deleteInstance = deleteInstance,
     .execQuery = execQuery,
-    .enumerateInstances = enumerateInstancesSlot,
-    .associators = associatorsSlot,
-    .associatorNames = associatorNamesSlot,
-    .references = referencesSlot,
-    .referenceNames = referenceNamesSlot,
+    .enumerateInstances = enumerateInstances,
+    .associators = associators,
+    .associatorNames = associatorNames,
+    .references = references,
+    .referenceNames = referenceNames,
     .invokeMethod = invokeMethod,
     .setProperty = setProperty,
     .getProperty = getProperty,

@@ -1,5 +1,3 @@
-#include "cimom/cimxml/AssociationOperations.h"
-
 #include "cimom/cimxml/Call.h"
 
 namespace Cimom::CimXml {
@@ -15,8 +13,9 @@ struct Traversal {
         list(call.parameters.propertyList()),
         names(list) {
     const ObjectName& name = call.parameters.instanceName("ObjectName");
-    if (name.keys.empty())
+    if (name.keys.empty()) {
       throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED, "associations are traversed from an instance, not from a class");
+    }
     source = call.objects.path(name);
   }
 

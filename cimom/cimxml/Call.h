@@ -1,5 +1,4 @@
-#ifndef CIMOM_CIMXML_CALL_H_
-#define CIMOM_CIMXML_CALL_H_
+#pragma once
 
 #include <cmpimacs.h>
 
@@ -7,15 +6,15 @@
 #include <string>
 #include <vector>
 
+#include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/ObjectBuilder.h"
 #include "cimom/cimxml/ObjectWriter.h"
 #include "cimom/cimxml/Operations.h"
 #include "cimom/cimxml/Parameters.h"
-#include "cimom/cimxml/Status.h"
 
 namespace Cimom::CimXml {
 
-/// An intrinsic method being performed, inside a request scope.
+// An intrinsic method being performed, inside a request scope.
 struct Call {
   const OperationContext& manager;
   const Request& request;
@@ -33,7 +32,7 @@ struct Call {
   }
 };
 
-/// Writes IRETURNVALUE with every object of the result of an up-call.
+// Writes IRETURNVALUE with every object of the result of an up-call.
 template <typename Write>
 void writeResult(const Call& call, const CMPIStatus& status, CMPIEnumeration* result, Write write) {
   requireOk(status, result);
@@ -46,15 +45,19 @@ void writeResult(const Call& call, const CMPIStatus& status, CMPIEnumeration* re
   }
 }
 
-/// A text as CMPI takes one that may be missing.
+// A text as CMPI takes one that may be missing.
 inline const char* orNull(const std::string& text) { return text.empty() ? nullptr : text.c_str(); }
 
-/// A list of properties as CMPI takes it: names up to a null, or null itself for all properties.
+// A list of properties as CMPI takes it: names up to a null, or null itself for all properties.
 class PropertyNames {
  public:
   explicit PropertyNames(const std::optional<std::vector<std::string>>& names) {
-    if (!names) return;
-    for (const auto& name : *names) pointers_.push_back(name.c_str());
+    if (!names) {
+      return;
+    }
+    for (const auto& name : *names) {
+      pointers_.push_back(name.c_str());
+    }
     pointers_.push_back(nullptr);
   }
 
@@ -64,11 +67,30 @@ class PropertyNames {
   std::vector<const char*> pointers_;
 };
 
-/// All properties, or those of the list.
+// All properties, or those of the list.
 inline PropertyFilter filterOf(const std::optional<std::vector<std::string>>& names) {
   return names ? PropertyFilter(*names) : PropertyFilter();
 }
 
-}  // namespace Cimom::CimXml
+// The operations on instances; each writes IRETURNVALUE where it returns something.
+void enumerateInstances(Call& call);
+void enumerateInstanceNames(Call& call);
+void getInstance(Call& call);
+void createInstance(Call& call);
+void modifyInstance(Call& call);
+void deleteInstance(Call& call);
+void getProperty(Call& call);
+void setProperty(Call& call);
 
-#endif  // CIMOM_CIMXML_CALL_H_
+// The traversals of associations from an instance; each writes IRETURNVALUE.
+void associators(Call& call);
+void associatorNames(Call& call);
+void references(Call& call);
+void referenceNames(Call& call);
+
+// The operations that read the schema; each writes IRETURNVALUE.
+void getClass(Call& call);
+void enumerateClasses(Call& call);
+void enumerateClassNames(Call& call);
+
+}  // namespace Cimom::CimXml

@@ -1,5 +1,3 @@
-#include "cimom/cimxml/ClassOperations.h"
-
 #include "cimom/cimxml/Call.h"
 #include "cimom/cimxml/ClassWriter.h"
 
@@ -7,13 +5,17 @@ namespace Cimom::CimXml {
 namespace {
 
 void requireNamespace(const Call& call) {
-  if (call.manager.classes.hasNamespace(call.request.nameSpace)) return;
+  if (call.manager.classes.hasNamespace(call.request.nameSpace)) {
+    return;
+  }
   throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "the namespace " + call.request.nameSpace + " is not known");
 }
 
 const ClassDefinition& requireClass(const Call& call, const std::string& name, CMPIrc whenUnknown) {
   const ClassDefinition* definition = call.manager.classes.find(name);
-  if (!definition) throw OperationError(whenUnknown, "the class " + name + " is not known");
+  if (!definition) {
+    throw OperationError(whenUnknown, "the class " + name + " is not known");
+  }
   return *definition;
 }
 
@@ -26,7 +28,9 @@ ClassView viewOf(const Parameters& parameters) {
 std::vector<const ClassDefinition*> requestedClasses(const Call& call) {
   requireNamespace(call);
   const std::string name = call.parameters.className("ClassName");
-  if (!name.empty()) requireClass(call, name, CMPI_RC_ERR_INVALID_CLASS);
+  if (!name.empty()) {
+    requireClass(call, name, CMPI_RC_ERR_INVALID_CLASS);
+  }
   return call.manager.classes.subclasses(name, call.parameters.flag("DeepInheritance", false));
 }
 
@@ -43,14 +47,17 @@ void enumerateClasses(Call& call) {
   const auto classes = requestedClasses(call);
   ClassWriter writer(call.xml, viewOf(call.parameters));
   const auto scope = call.xml.element("IRETURNVALUE");
-  for (const ClassDefinition* definition : classes) writer.write(*definition);
+  for (const ClassDefinition* definition : classes) {
+    writer.write(*definition);
+  }
 }
 
 void enumerateClassNames(Call& call) {
   const auto classes = requestedClasses(call);
   const auto scope = call.xml.element("IRETURNVALUE");
-  for (const ClassDefinition* definition : classes)
+  for (const ClassDefinition* definition : classes) {
     const auto name = call.xml.element("CLASSNAME", "NAME", definition->name);
+  }
 }
 
 }  // namespace Cimom::CimXml

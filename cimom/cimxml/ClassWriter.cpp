@@ -2,23 +2,26 @@
 
 #include <cmpimacs.h>
 
-#include "cimom/cimxml/Types.h"
+#include "cimom/broker/CmpiValue.h"
 #include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
 namespace {
 
 const char* truth(bool value) { return value ? "true" : "false"; }
 
-bool isArray(CMPIType type) { return (type & CMPI_ARRAY) != 0; }
-
 const char* propertyElement(const PropertyDeclaration& property) {
-  if (property.isReference()) return "PROPERTY.REFERENCE";
+  if (property.isReference()) {
+    return "PROPERTY.REFERENCE";
+  }
   return isArray(property.type) ? "PROPERTY.ARRAY" : "PROPERTY";
 }
 
 const char* parameterElement(const PropertyDeclaration& parameter) {
-  if (parameter.isReference()) return isArray(parameter.type) ? "PARAMETER.REFARRAY" : "PARAMETER.REFERENCE";
+  if (parameter.isReference()) {
+    return isArray(parameter.type) ? "PARAMETER.REFARRAY" : "PARAMETER.REFERENCE";
+  }
   return isArray(parameter.type) ? "PARAMETER.ARRAY" : "PARAMETER";
 }
 
@@ -27,22 +30,31 @@ void writeType(XmlWriter& xml, const PropertyDeclaration& declaration) {
   if (declaration.isReference()) {
     xml.attribute("REFERENCECLASS", declaration.referenceClass);
   } else {
-    xml.attribute("TYPE", typeName(declaration.type));
+    xml.attribute("TYPE", xmlTypeName(declaration.type));
   }
-  if (declaration.arraySize > 0) xml.attribute("ARRAYSIZE", std::to_string(declaration.arraySize));
+  if (declaration.arraySize > 0) {
+    xml.attribute("ARRAYSIZE", std::to_string(declaration.arraySize));
+  }
 }
 
 }  // namespace
 
 void ClassWriter::write(const ClassDefinition& definition) {
   const auto scope = xml_.element("CLASS", "NAME", definition.name);
-  if (definition.superclass) xml_.attribute("SUPERCLASS", definition.superclass->name);
+  if (definition.superclass) {
+    xml_.attribute("SUPERCLASS", definition.superclass->name);
+  }
   qualifiers(definition.qualifiers);
-  for (const auto& declaration : definition.properties)
-    if (isShown(definition, declaration.originClass) && view_.properties.includes(declaration.name.c_str()))
+  for (const auto& declaration : definition.properties) {
+    if (isShown(definition, declaration.originClass) && view_.properties.includes(declaration.name.c_str())) {
       property(definition, declaration);
-  for (const auto& declaration : definition.methods)
-    if (isShown(definition, declaration.originClass)) method(definition, declaration);
+    }
+  }
+  for (const auto& declaration : definition.methods) {
+    if (isShown(definition, declaration.originClass)) {
+      method(definition, declaration);
+    }
+  }
 }
 
 bool ClassWriter::isShown(const ClassDefinition& definition, const std::string& originClass) const {
@@ -50,15 +62,19 @@ bool ClassWriter::isShown(const ClassDefinition& definition, const std::string& 
 }
 
 void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
-  if (!view_.includeQualifiers) return;
+  if (!view_.includeQualifiers) {
+    return;
+  }
   for (const Qualifier& qualifier : qualifiers) {
-    const char* type = typeName(qualifier.value.type());
+    const char* type = xmlTypeName(qualifier.value.type());
     const auto scope = xml_.element("QUALIFIER", "NAME", qualifier.name);
-    if (type) xml_.attribute("TYPE", type);
+    if (type) {
+      xml_.attribute("TYPE", type);
+    }
     xml_.attribute("OVERRIDABLE", truth(qualifier.overridable));
     xml_.attribute("TOSUBCLASS", truth(qualifier.toSubclass));
     xml_.attribute("TRANSLATABLE", truth(qualifier.translatable));
-    values_.value(qualifier.value.toCmpi());
+    values_.value(toCmpi(qualifier.value));
   }
 }
 
@@ -67,15 +83,19 @@ void ClassWriter::property(const ClassDefinition& definition, const PropertyDecl
   writeType(xml_, property);
   origin(definition, property.originClass);
   qualifiers(property.qualifiers);
-  values_.value(property.defaultValue.toCmpi());
+  values_.value(toCmpi(property.defaultValue));
 }
 
 void ClassWriter::method(const ClassDefinition& definition, const MethodDeclaration& method) {
   const auto scope = xml_.element("METHOD", "NAME", method.name);
-  if (const char* type = typeName(method.returnType)) xml_.attribute("TYPE", type);
+  if (const char* type = xmlTypeName(method.returnType)) {
+    xml_.attribute("TYPE", type);
+  }
   origin(definition, method.originClass);
   qualifiers(method.qualifiers);
-  for (const auto& declaration : method.parameters) parameter(declaration);
+  for (const auto& declaration : method.parameters) {
+    parameter(declaration);
+  }
 }
 
 void ClassWriter::parameter(const PropertyDeclaration& parameter) {
@@ -85,7 +105,9 @@ void ClassWriter::parameter(const PropertyDeclaration& parameter) {
 }
 
 void ClassWriter::origin(const ClassDefinition& definition, const std::string& originClass) {
-  if (view_.includeClassOrigin) xml_.attribute("CLASSORIGIN", originClass);
+  if (view_.includeClassOrigin) {
+    xml_.attribute("CLASSORIGIN", originClass);
+  }
   xml_.attribute("PROPAGATED", truth(!sameName(definition.name, originClass)));
 }
 

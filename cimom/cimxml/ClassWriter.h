@@ -1,20 +1,19 @@
-#ifndef CIMOM_CIMXML_CLASSWRITER_H_
-#define CIMOM_CIMXML_CLASSWRITER_H_
+#pragma once
 
 #include "cimom/cimxml/ObjectWriter.h"
 #include "cimom/model/ClassDefinition.h"
 
 namespace Cimom::CimXml {
 
-/// What of a class a client wants to see (DSP0200, GetClass).
+// What of a class a client wants to see (DSP0200, GetClass).
 struct ClassView {
-  bool localOnly = true;  ///< leaves out what the class inherits
+  bool localOnly = true;  // leaves out what the class inherits
   bool includeQualifiers = true;
   bool includeClassOrigin = false;
   PropertyFilter properties;
 };
 
-/// Writes CLASS. Default values are made in the current request scope.
+// Writes CLASS. Default values are made in the current request scope.
 class ClassWriter {
  public:
   ClassWriter(XmlWriter& xml, ClassView view) : xml_(xml), values_(xml, none_, none_), view_(std::move(view)) {}
@@ -30,11 +29,9 @@ class ClassWriter {
   bool isShown(const ClassDefinition& definition, const std::string& originClass) const;
 
   XmlWriter& xml_;
-  const std::string none_;  ///< a schema's default values are in no host and no namespace
+  const std::string none_;  // a schema's default values are in no host and no namespace
   ObjectWriter values_;
   ClassView view_;
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_CLASSWRITER_H_

@@ -18,8 +18,12 @@ std::string_view view(const xmlChar* text) { return text ? reinterpret_cast<cons
 bool isText(const xmlNode& node) { return node.type == XML_TEXT_NODE || node.type == XML_CDATA_SECTION_NODE; }
 
 std::optional<Element> firstElement(xmlNode* node) {
-  while (node && node->type != XML_ELEMENT_NODE) node = node->next;
-  if (!node) return std::nullopt;
+  while (node && node->type != XML_ELEMENT_NODE) {
+    node = node->next;
+  }
+  if (!node) {
+    return std::nullopt;
+  }
   return Element(node);
 }
 
@@ -38,7 +42,9 @@ void refuseEntities(void* context, const xmlChar*, int, const xmlChar*, const xm
 
 std::string describe(const xmlParserCtxt& context) {
   const xmlError& error = context.lastError;
-  if (!error.message || context.errNo == XML_ERR_USER_STOP) return "the request declares entities";
+  if (!error.message || context.errNo == XML_ERR_USER_STOP) {
+    return "the request declares entities";
+  }
   return "line " + std::to_string(error.line) + ": " + trimmed(error.message);
 }
 
@@ -48,9 +54,13 @@ std::string_view Element::name() const { return view(node_->name); }
 
 std::optional<std::string> Element::attribute(std::string_view name) const {
   for (const xmlAttr* candidate = node_->properties; candidate; candidate = candidate->next) {
-    if (view(candidate->name) != name) continue;
+    if (view(candidate->name) != name) {
+      continue;
+    }
     std::string value;
-    for (const xmlNode* part = candidate->children; part; part = part->next) value += view(part->content);
+    for (const xmlNode* part = candidate->children; part; part = part->next) {
+      value += view(part->content);
+    }
     return value;
   }
   return std::nullopt;
@@ -58,7 +68,9 @@ std::optional<std::string> Element::attribute(std::string_view name) const {
 
 std::string Element::requiredAttribute(std::string_view name) const {
   auto value = attribute(name);
-  if (!value) refuse("has no attribute " + std::string(name));
+  if (!value) {
+    refuse("has no attribute " + std::string(name));
+  }
   return *std::move(value);
 }
 
@@ -80,15 +92,20 @@ std::optional<Element> Element::next() const { return firstElement(node_->next);
 
 Element Element::only() const {
   const auto child = first();
-  if (!child) refuse("is empty");
-  if (const auto second = child->next()) refuse("has " + std::string(second->name()) + " where nothing more may stand");
+  if (!child) {
+    refuse("is empty");
+  }
+  if (const auto second = child->next()) {
+    refuse("has " + std::string(second->name()) + " where nothing more may stand");
+  }
   return *child;
 }
 
 Element Element::only(std::string_view childName) const {
   const Element child = only();
-  if (!child.is(childName))
+  if (!child.is(childName)) {
     refuse("has " + std::string(child.name()) + " where " + std::string(childName) + " belongs");
+  }
   return child;
 }
 
@@ -101,11 +118,15 @@ Document::Document(std::string_view xml) : document_(nullptr, &xmlFreeDoc) {
   static std::once_flag initialized;
   std::call_once(initialized, xmlInitParser);
   const ParserContext context(xmlNewParserCtxt(), &xmlFreeParserCtxt);
-  if (!context) throw std::bad_alloc();
+  if (!context) {
+    throw std::bad_alloc();
+  }
   context->sax->entityDecl = &refuseEntities;
   document_.reset(xmlCtxtReadMemory(context.get(), xml.data(), static_cast<int>(xml.size()), nullptr, nullptr,
                                     XML_PARSE_NONET | XML_PARSE_NOERROR | XML_PARSE_NOWARNING | XML_PARSE_COMPACT));
-  if (!document_) throw TransportError(400, "request-not-well-formed", describe(*context));
+  if (!document_) {
+    throw TransportError(400, "request-not-well-formed", describe(*context));
+  }
 }
 
 Element Document::root() const { return Element(xmlDocGetRootElement(document_.get())); }

@@ -1,6 +1,5 @@
-/// An XML document in memory, and its elements as the request reader walks them.
-#ifndef CIMOM_CIMXML_DOCUMENT_H_
-#define CIMOM_CIMXML_DOCUMENT_H_
+// An XML document in memory, and its elements as the request reader walks them.
+#pragma once
 
 #include <libxml/tree.h>
 
@@ -11,8 +10,8 @@
 
 namespace Cimom::CimXml {
 
-/// What XML says of an element: comments, processing instructions and blanks between elements do not show. Errors are
-/// TransportErrors "request-not-valid" that name the element.
+// What XML says of an element: comments, processing instructions and blanks between elements do not show. Errors are
+// TransportErrors "request-not-valid" that name the element.
 class Element {
  public:
   explicit Element(xmlNode* node) : node_(node) {}
@@ -23,14 +22,14 @@ class Element {
   std::optional<std::string> attribute(std::string_view name) const;
   std::string requiredAttribute(std::string_view name) const;
 
-  /// The character data, without outer blanks; an element inside is an error.
+  // The character data, without outer blanks; an element inside is an error.
   std::string text() const;
 
-  std::optional<Element> first() const;  ///< child
-  std::optional<Element> next() const;   ///< sibling
+  std::optional<Element> first() const;  // child
+  std::optional<Element> next() const;   // sibling
 
-  Element only() const;                            ///< the one child
-  Element only(std::string_view childName) const;  ///< the one child, which has that name
+  Element only() const;                            // the one child
+  Element only(std::string_view childName) const;  // the one child, which has that name
 
   [[noreturn]] void refuse(const std::string& what) const;
 
@@ -40,8 +39,8 @@ class Element {
 
 class Document {
  public:
-  /// Throws TransportError "request-not-well-formed". Nothing but the text is read: no DTD, no external entity; a
-  /// document that declares entities is refused, and so is one nested deeper than 256 elements.
+  // Throws TransportError "request-not-well-formed". Nothing but the text is read: no DTD, no external entity; a
+  // document that declares entities is refused, and so is one nested deeper than 256 elements.
   explicit Document(std::string_view xml);
 
   Element root() const;
@@ -51,5 +50,3 @@ class Document {
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_DOCUMENT_H_

@@ -6,7 +6,7 @@
 #include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/OperationHeaders.h"
 #include "cimom/cimxml/Operations.h"
-#include "cimom/cimxml/RequestReader.h"
+#include "cimom/cimxml/Request.h"
 #include "cimom/cimxml/XmlWriter.h"
 
 namespace Cimom::CimXml {
@@ -58,8 +58,12 @@ Endpoint::Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std
     : broker_(broker), classes_(classes), host_(std::move(host)) {}
 
 Http::Response Endpoint::handle(const Http::Request& request) const {
-  if (request.path != "/cimom" && request.path != "/") return plain(404, "CIM operations are sent to /cimom");
-  if (request.method != "POST" && request.method != "M-POST") return refusedMethod(request.method);
+  if (request.path != "/cimom" && request.path != "/") {
+    return plain(404, "CIM operations are sent to /cimom");
+  }
+  if (request.method != "POST" && request.method != "M-POST") {
+    return refusedMethod(request.method);
+  }
   try {
     const OperationHeaders headers(request);
     const Request message = readRequest(request.body);
@@ -71,7 +75,9 @@ Http::Response Endpoint::handle(const Http::Request& request) const {
     return response;
   } catch (const TransportError& error) {
     Http::Response response = plain(error.httpStatus(), error.what());
-    if (!error.cimError().empty()) response.headers.add("CIMError", error.cimError());
+    if (!error.cimError().empty()) {
+      response.headers.add("CIMError", error.cimError());
+    }
     return response;
   }
 }

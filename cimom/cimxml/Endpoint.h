@@ -1,5 +1,4 @@
-#ifndef CIMOM_CIMXML_ENDPOINT_H_
-#define CIMOM_CIMXML_ENDPOINT_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -11,14 +10,14 @@
 
 namespace Cimom::CimXml {
 
-/// CIM operations over HTTP (DSP0200 1.4): takes POST and M-POST on /cimom and /. What is no CIM operation is answered
-/// with an HTTP status, the CIMError header that DSP0200 has for it and a line of plain text that tells what is wrong.
+// CIM operations over HTTP (DSP0200 1.4): takes POST and M-POST on /cimom and /. What is no CIM operation is answered
+// with an HTTP status, the CIMError header that DSP0200 has for it and a line of plain text that tells what is wrong.
 class Endpoint {
  public:
-  /// @param host stands in paths that name no host
+  // @param host stands in paths that name no host
   Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std::string host);
 
-  /// May be called from several threads at once.
+  // May be called from several threads at once.
   Http::Response handle(const Http::Request& request) const;
 
  private:
@@ -30,5 +29,3 @@ class Endpoint {
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_ENDPOINT_H_

@@ -1,13 +1,14 @@
-/// The two kinds of failure of a CIM-XML request.
-#ifndef CIMOM_CIMXML_ERRORS_H_
-#define CIMOM_CIMXML_ERRORS_H_
+// The two kinds of failure of a CIM-XML request.
+#pragma once
+
+#include <cmpimacs.h>
 
 #include <stdexcept>
 #include <string>
 
 namespace Cimom::CimXml {
 
-/// The message is refused as a whole: an HTTP status and, in the CIMError header, one of the words of DSP0200 for it.
+// The message is refused as a whole: an HTTP status and, in the CIMError header, one of the words of DSP0200 for it.
 class TransportError : public std::runtime_error {
  public:
   TransportError(unsigned httpStatus, std::string cimError, const std::string& what)
@@ -21,7 +22,7 @@ class TransportError : public std::runtime_error {
   std::string cimError_;
 };
 
-/// The operation fails: the code is the CIM status code of DSP0200, which CMPI's return codes below 50 are too.
+// The operation fails: the code is the CIM status code of DSP0200, which CMPI's return codes below 50 are too.
 class OperationError : public std::runtime_error {
  public:
   OperationError(int code, const std::string& description) : std::runtime_error(description), code_(code) {}
@@ -32,6 +33,24 @@ class OperationError : public std::runtime_error {
   int code_;
 };
 
-}  // namespace Cimom::CimXml
+// Turns a CMPI status that is not OK into an OperationError. Return codes that are CMPI's own and no CIM status
+// (CMPI_RC_ERROR_SYSTEM and the like) become CIM_ERR_FAILED.
+inline void requireOk(const CMPIStatus& status) {
+  if (status.rc == CMPI_RC_OK) {
+    return;
+  }
+  const char* text = status.msg ? CMGetCharsPtr(status.msg, nullptr) : nullptr;
+  const bool isCimStatus = status.rc <= CMPI_RC_ERR_METHOD_NOT_FOUND;
+  const int code = isCimStatus ? static_cast<int>(status.rc) : static_cast<int>(CMPI_RC_ERR_FAILED);
+  throw OperationError(code, text ? text : "the operation failed with return code " + std::to_string(status.rc));
+}
 
-#endif  // CIMOM_CIMXML_ERRORS_H_
+// The same, and the object must be there.
+inline void requireOk(const CMPIStatus& status, const void* object) {
+  requireOk(status);
+  if (!object) {
+    throw OperationError(CMPI_RC_ERR_FAILED, "the operation succeeded and gave nothing");
+  }
+}
+
+}  // namespace Cimom::CimXml

@@ -1,5 +1,3 @@
-#include "cimom/cimxml/InstanceOperations.h"
-
 #include <algorithm>
 
 #include "cimom/cimxml/Call.h"
@@ -14,11 +12,15 @@ using NameList = std::optional<std::vector<std::string>>;
 NameList visibleProperties(const Call& call, const std::string& className) {
   const NameList list = call.parameters.propertyList();
   const ClassDefinition* definition = call.manager.classes.find(className);
-  if (call.parameters.flag("DeepInheritance", true) || !definition) return list;
+  if (call.parameters.flag("DeepInheritance", true) || !definition) {
+    return list;
+  }
   std::vector<std::string> names;
   for (const PropertyDeclaration& property : definition->properties) {
     const auto isProperty = [&property](const std::string& name) { return sameName(name, property.name); };
-    if (!list || std::any_of(list->begin(), list->end(), isProperty)) names.push_back(property.name);
+    if (!list || std::any_of(list->begin(), list->end(), isProperty)) {
+      names.push_back(property.name);
+    }
   }
   return names;
 }
@@ -97,7 +99,9 @@ void setProperty(Call& call) {
   if (const Parameter* given = call.parameters.find("NewValue")) {
     std::visit(
         [&property](const auto& value) {
-          if constexpr (std::is_constructible_v<Value, decltype(value)>) property.value = value;
+          if constexpr (std::is_constructible_v<Value, decltype(value)>) {
+            property.value = value;
+          }
         },
         given->value);
   }

@@ -4,8 +4,9 @@
 
 #include <array>
 
-#include "cimom/cimxml/Status.h"
-#include "cimom/cimxml/Types.h"
+#include "cimom/cimxml/Errors.h"
+#include "cimom/cimxml/ScalarText.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
 namespace {
@@ -13,14 +14,21 @@ namespace {
 constexpr std::array<CMPIType, 3> numberTypes = {CMPI_sint64, CMPI_uint64, CMPI_real64};
 
 CMPIType numberType(const std::string& text) {
-  for (const CMPIType type : numberTypes)
-    if (parseScalar(type, text)) return type;
+  for (const CMPIType type : numberTypes) {
+    if (parseScalar(type, text)) {
+      return type;
+    }
+  }
   return CMPI_string;
 }
 
 CMPIType claimedType(const KeyValue& key) {
-  if (key.kind == KeyValue::Kind::Reference) return CMPI_ref;
-  if (const auto type = typeOf(key.type)) return *type;
+  if (key.kind == KeyValue::Kind::Reference) {
+    return CMPI_ref;
+  }
+  if (const CMPIType type = typeOfXmlName(key.type)) {
+    return type;
+  }
   switch (key.kind) {
     case KeyValue::Kind::Boolean:
       return CMPI_boolean;
@@ -35,12 +43,17 @@ CMPIType claimedType(const KeyValue& key) {
 std::string loneKey(const ClassDefinition* definition, const ObjectName& name) {
   std::string key;
   for (const auto& property : definition ? definition->properties : std::vector<PropertyDeclaration>()) {
-    if (!property.isKey()) continue;
-    if (!key.empty())
+    if (!property.isKey()) {
+      continue;
+    }
+    if (!key.empty()) {
       throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has more than one key");
+    }
     key = property.name;
   }
-  if (key.empty()) throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has no key");
+  if (key.empty()) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has no key");
+  }
   return key;
 }
 
@@ -51,8 +64,12 @@ CMPIObjectPath* ObjectBuilder::path(const ObjectName& name) const {
   const std::string& nameSpace = name.nameSpace.empty() ? nameSpace_ : name.nameSpace;
   CMPIObjectPath* path = CMNewObjectPath(broker_, nameSpace.c_str(), name.className.c_str(), &status);
   requireOk(status, path);
-  if (!name.host.empty()) requireOk(CMSetHostname(path, name.host.c_str()));
-  for (const KeyBinding& key : name.keys) addKey(path, name, key);
+  if (!name.host.empty()) {
+    requireOk(CMSetHostname(path, name.host.c_str()));
+  }
+  for (const KeyBinding& key : name.keys) {
+    addKey(path, name, key);
+  }
   return path;
 }
 
@@ -74,7 +91,7 @@ ObjectBuilder::TypedValue ObjectBuilder::keyValue(const KeyBinding& key, CMPITyp
                          "the key " + key.name + (isReference ? " is no reference" : " is a reference"));
   } else if (!scalar(type, key.value.text, typed.value)) {
     throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
-                         "the key " + key.name + " is no " + typeName(type) + ": \"" + key.value.text + "\"");
+                         "the key " + key.name + " is no " + describeType(type) + ": \"" + key.value.text + "\"");
   }
   return typed;
 }
@@ -92,26 +109,31 @@ CMPIInstance* ObjectBuilder::instance(const Instance& instance) const {
 
 ObjectBuilder::TypedValue ObjectBuilder::propertyValue(const std::string& className, const Property& property) const {
   const ClassDefinition* definition = classes_.find(className);
-  if (!definition) throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+  if (!definition) {
+    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+  }
   const PropertyDeclaration* declared = definition->findProperty(property.name);
-  if (!declared)
+  if (!declared) {
     throw OperationError(CMPI_RC_ERR_NO_SUCH_PROPERTY,
                          "the class " + definition->name + " has no property " + property.name);
+  }
   return typed(property, declared->type);
 }
 
 ObjectBuilder::TypedValue ObjectBuilder::typed(const Property& property, CMPIType type) const {
-  const CMPIType elementType = type & static_cast<CMPIType>(~CMPI_ARRAY);
+  const CMPIType elementType = elementTypeOf(type);
   const bool isArray = elementType != type;
-  const std::string declaredName = std::string(typeName(type)) + (isArray ? "[]" : "");
+  const std::string declaredName = describeType(type);
   TypedValue typed{{}, type, false};
-  if (!property.type.empty() && (property.type != typeName(type) || property.isArray != isArray))
+  if (!property.type.empty() && (property.type != xmlTypeName(type) || property.isArray != isArray)) {
     throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "the property " + property.name + " is of type " + declaredName +
                                                         ", not " + property.type + (property.isArray ? "[]" : ""));
+  }
   if (const auto* text = std::get_if<std::string>(&property.value); text && !isArray && type != CMPI_ref) {
-    if (!scalar(type, *text, typed.value))
+    if (!scalar(type, *text, typed.value)) {
       throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH,
                            "the property " + property.name + " is no " + declaredName + ": \"" + *text + "\"");
+    }
   } else if (const auto* texts = std::get_if<Texts>(&property.value); texts && isArray) {
     typed.value.array = array(property, *texts, elementType);
   } else if (const auto* name = std::get_if<ObjectName>(&property.value); name && type == CMPI_ref) {
@@ -129,12 +151,15 @@ CMPIArray* ObjectBuilder::array(const Property& property, const Texts& texts, CM
   CMPIArray* array = CMNewArray(broker_, static_cast<CMPICount>(texts.size()), elementType, &status);
   requireOk(status, array);
   for (CMPICount i = 0; i < texts.size(); ++i) {
-    if (!texts[i]) continue;  // an element is null until it is set
+    if (!texts[i]) {
+      continue;  // an element is null until it is set
+    }
     CMPIValue value{};
-    if (!scalar(elementType, *texts[i], value))
+    if (!scalar(elementType, *texts[i], value)) {
       throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "element " + std::to_string(i) + " of the property " +
-                                                          property.name + " is no " + typeName(elementType) + ": \"" +
-                                                          *texts[i] + "\"");
+                                                          property.name + " is no " + describeType(elementType) +
+                                                          ": \"" + *texts[i] + "\"");
+    }
     requireOk(CMSetArrayElementAt(array, i, &value, elementType));
   }
   return array;
@@ -151,7 +176,9 @@ bool ObjectBuilder::scalar(CMPIType type, const std::string& text, CMPIValue& va
     return status.rc == CMPI_RC_OK && value.dateTime;
   }
   const auto parsed = parseScalar(type, text);
-  if (parsed) value = *parsed;
+  if (parsed) {
+    value = *parsed;
+  }
   return parsed.has_value();
 }
 

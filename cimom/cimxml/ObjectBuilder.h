@@ -1,5 +1,4 @@
-#ifndef CIMOM_CIMXML_OBJECTBUILDER_H_
-#define CIMOM_CIMXML_OBJECTBUILDER_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -10,22 +9,22 @@
 
 namespace Cimom::CimXml {
 
-/// Makes CMPI objects of what a client sent; the class says which type each key and property has. The objects live in
-/// the current request scope. Errors are OperationErrors that name the key or the property.
+// Makes CMPI objects of what a client sent; the class says which type each key and property has. The objects live in
+// the current request scope. Errors are OperationErrors that name the key or the property.
 class ObjectBuilder {
  public:
   ObjectBuilder(const CMPIBroker* broker, const ClassRepository& classes, const std::string& nameSpace)
       : broker_(broker), classes_(classes), nameSpace_(nameSpace) {}
 
-  /// A key has its class's type; one that the class does not declare has the type that the client claims, or the one
-  /// that its text looks like.
+  // A key has its class's type; one that the class does not declare has the type that the client claims, or the one
+  // that its text looks like.
   CMPIObjectPath* path(const ObjectName& name) const;
 
-  /// A property that the class does not declare is CIM_ERR_NO_SUCH_PROPERTY, one of another type than the class's
-  /// CIM_ERR_TYPE_MISMATCH. What the client sets to null is null, whatever default the class has.
+  // A property that the class does not declare is CIM_ERR_NO_SUCH_PROPERTY, one of another type than the class's
+  // CIM_ERR_TYPE_MISMATCH. What the client sets to null is null, whatever default the class has.
   CMPIInstance* instance(const Instance& instance) const;
 
-  /// A property's new value.
+  // A property's new value.
   struct TypedValue {
     CMPIValue value{};
     CMPIType type = CMPI_null;
@@ -47,5 +46,3 @@ class ObjectBuilder {
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_OBJECTBUILDER_H_

@@ -1,12 +1,13 @@
 #include "cimom/cimxml/ObjectWriter.h"
 
 #include <cmpimacs.h>
-#include <strings.h>
 
 #include <algorithm>
 
 #include "cimom/cimxml/Errors.h"
-#include "cimom/cimxml/Types.h"
+#include "cimom/cimxml/ScalarText.h"
+#include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
 namespace {
@@ -18,23 +19,26 @@ const char* chars(const CMPIString* string) {
 
 // Object managers and providers mark a missing value by the state, by the type or by the pointer alone.
 bool isNull(const CMPIData& data) {
-  if (CMIsNullValue(data) || data.type == CMPI_null) return true;
+  if (CMIsNullValue(data) || data.type == CMPI_null) {
+    return true;
+  }
   const bool isPointer = data.type >= CMPI_ENC;
-  return isPointer && data.value.dataPtr.ptr == nullptr;
+  return isPointer && !data.value.dataPtr.ptr;
 }
 
 const CMPIObjectPath* pathOf(const CMPIInstance* instance) {
   const CMPIObjectPath* path = CMGetObjectPath(instance, nullptr);
-  if (!path) throw OperationError(CMPI_RC_ERR_FAILED, "the provider returned an instance without a path");
+  if (!path) {
+    throw OperationError(CMPI_RC_ERR_FAILED, "the provider returned an instance without a path");
+  }
   return path;
 }
 
 }  // namespace
 
 bool PropertyFilter::includes(const char* name) const {
-  return !names_ || std::any_of(names_->begin(), names_->end(), [name](const std::string& candidate) {
-    return strcasecmp(candidate.c_str(), name) == 0;
-  });
+  return !names_ || std::any_of(names_->begin(), names_->end(),
+                                [name](const std::string& candidate) { return sameName(candidate, name); });
 }
 
 void ObjectWriter::instanceName(const CMPIObjectPath* path) {
@@ -43,7 +47,9 @@ void ObjectWriter::instanceName(const CMPIObjectPath* path) {
   for (CMPICount i = 0; i < count; ++i) {
     CMPIString* keyName = nullptr;
     const CMPIData data = CMGetKeyAt(path, i, &keyName, nullptr);
-    if (!isNull(data)) keyBinding(chars(keyName), data);
+    if (!isNull(data)) {
+      keyBinding(chars(keyName), data);
+    }
   }
 }
 
@@ -54,7 +60,9 @@ void ObjectWriter::keyBinding(const char* name, const CMPIData& data) {
     return;
   }
   const auto value = xml_.element("KEYVALUE", "VALUETYPE", keyValueType(data.type));
-  if (const char* type = typeName(data.type)) xml_.attribute("TYPE", type);
+  if (const char* type = xmlTypeName(data.type)) {
+    xml_.attribute("TYPE", type);
+  }
   xml_.text(scalar(data.type, data.value));
 }
 
@@ -83,7 +91,9 @@ void ObjectWriter::instance(const CMPIInstance* instance) {
   for (CMPICount i = 0; i < count; ++i) {
     CMPIString* name = nullptr;
     const CMPIData data = CMGetPropertyAt(instance, i, &name, nullptr);
-    if (filter_.includes(chars(name))) property(chars(name), data);
+    if (filter_.includes(chars(name))) {
+      property(chars(name), data);
+    }
   }
 }
 
@@ -93,8 +103,10 @@ void ObjectWriter::property(const char* name, const CMPIData& data) {
     value(data);
     return;
   }
-  const char* type = typeName(data.type);
-  if (!type) return;
+  const char* type = xmlTypeName(data.type);
+  if (!type) {
+    return;
+  }
   const auto scope = xml_.element(CMIsArray(data) ? "PROPERTY.ARRAY" : "PROPERTY", "NAME", name);
   xml_.attribute("TYPE", type);
   value(data);
@@ -113,7 +125,9 @@ void ObjectWriter::objectWithPath(const CMPIInstance* object) {
 }
 
 void ObjectWriter::value(const CMPIData& data) {
-  if (isNull(data)) return;
+  if (isNull(data)) {
+    return;
+  }
   if (CMIsArray(data)) {
     array(data);
   } else if (data.type == CMPI_ref) {
@@ -143,7 +157,9 @@ void ObjectWriter::array(const CMPIData& data) {
 
 // An embedded instance is the text of its own XML; the attribute that would say so makes older clients abort.
 std::string ObjectWriter::scalar(CMPIType type, const CMPIValue& value) const {
-  if (type != CMPI_instance) return formatScalar(type, value);
+  if (type != CMPI_instance) {
+    return formatScalar(type, value);
+  }
   XmlWriter xml(XmlWriter::Prolog::None);
   ObjectWriter(xml, host_, nameSpace_).instance(value.inst);
   return xml.take();
@@ -153,7 +169,9 @@ void writeLocalNameSpacePath(XmlWriter& xml, std::string_view nameSpace) {
   const auto path = xml.element("LOCALNAMESPACEPATH");
   while (!nameSpace.empty()) {
     const std::string_view part = nameSpace.substr(0, nameSpace.find('/'));
-    if (!part.empty()) const auto scope = xml.element("NAMESPACE", "NAME", part);
+    if (!part.empty()) {
+      const auto scope = xml.element("NAMESPACE", "NAME", part);
+    }
     nameSpace.remove_prefix(std::min(part.size() + 1, nameSpace.size()));
   }
 }

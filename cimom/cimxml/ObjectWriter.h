@@ -1,6 +1,5 @@
-/// Writes CMPI objects as CIM-XML (DSP0201).
-#ifndef CIMOM_CIMXML_OBJECTWRITER_H_
-#define CIMOM_CIMXML_OBJECTWRITER_H_
+// Writes CMPI objects as CIM-XML (DSP0201).
+#pragma once
 
 #include <cmpidt.h>
 
@@ -13,10 +12,10 @@
 
 namespace Cimom::CimXml {
 
-/// Which properties a client wants to see; names without regard to case.
+// Which properties a client wants to see; names without regard to case.
 class PropertyFilter {
  public:
-  PropertyFilter() = default;  ///< all of them
+  PropertyFilter() = default;  // all of them
   explicit PropertyFilter(std::vector<std::string> names) : names_(std::move(names)) {}
 
   bool includes(const char* name) const;
@@ -27,29 +26,29 @@ class PropertyFilter {
 
 class ObjectWriter {
  public:
-  /// host and nameSpace stand in a path that names none itself.
+  // host and nameSpace stand in a path that names none itself.
   ObjectWriter(XmlWriter& xml, const std::string& host, const std::string& nameSpace, PropertyFilter filter = {})
       : xml_(xml), host_(host), nameSpace_(nameSpace), filter_(std::move(filter)) {}
 
-  /// INSTANCENAME; a key that is null has no form in CIM-XML and is left out.
+  // INSTANCENAME; a key that is null has no form in CIM-XML and is left out.
   void instanceName(const CMPIObjectPath* path);
 
-  /// INSTANCEPATH: with host and namespace.
+  // INSTANCEPATH: with host and namespace.
   void instancePath(const CMPIObjectPath* path);
 
-  /// OBJECTPATH.
+  // OBJECTPATH.
   void objectPath(const CMPIObjectPath* path);
 
-  /// INSTANCE; a property without a value is an empty element.
+  // INSTANCE; a property without a value is an empty element.
   void instance(const CMPIInstance* instance);
 
-  /// VALUE.NAMEDINSTANCE.
+  // VALUE.NAMEDINSTANCE.
   void namedInstance(const CMPIInstance* instance);
 
-  /// VALUE.OBJECTWITHPATH.
+  // VALUE.OBJECTWITHPATH.
   void objectWithPath(const CMPIInstance* instance);
 
-  /// VALUE, VALUE.ARRAY or VALUE.REFERENCE; nothing for a null value.
+  // VALUE, VALUE.ARRAY or VALUE.REFERENCE; nothing for a null value.
   void value(const CMPIData& data);
 
  private:
@@ -66,9 +65,7 @@ class ObjectWriter {
   PropertyFilter filter_;
 };
 
-/// LOCALNAMESPACEPATH of "root/cimv2".
+// LOCALNAMESPACEPATH of "root/cimv2".
 void writeLocalNameSpacePath(XmlWriter& xml, std::string_view nameSpace);
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_OBJECTWRITER_H_

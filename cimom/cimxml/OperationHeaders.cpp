@@ -14,15 +14,19 @@ constexpr unsigned notExtended = 510;
 
 // Man: http://www.dmtf.org/cim/mapping/http/v1.0 ; ns=73
 std::string prefixOf(const Http::Request& request) {
-  if (request.method != "M-POST") return {};
+  if (request.method != "M-POST") {
+    return {};
+  }
   const std::string* declaration = request.headers.find("Man");
-  if (!declaration || declaration->find(extension) == std::string::npos)
+  if (!declaration || declaration->find(extension) == std::string::npos) {
     throw TransportError(notExtended, "",
                          "M-POST demands no extension that this server knows: it knows " + std::string(extension));
+  }
   const auto marker = declaration->find("ns=");
   const auto digits = marker == std::string::npos ? std::string() : declaration->substr(marker + 3, 2);
-  if (digits.size() != 2 || digits.find_first_not_of("0123456789") != std::string::npos)
+  if (digits.size() != 2 || digits.find_first_not_of("0123456789") != std::string::npos) {
     throw TransportError(notExtended, "", "the Man header has no ns= with two digits");
+  }
   return digits + "-";
 }
 
@@ -35,7 +39,9 @@ std::string unescape(std::string_view text) {
     const bool isEscape =
         text[i] == '%' && text.size() - i > 2 && std::from_chars(digits, digits + 2, byte, 16).ptr == digits + 2;
     result += isEscape ? static_cast<char>(byte) : text[i];
-    if (isEscape) i += 2;
+    if (isEscape) {
+      i += 2;
+    }
   }
   return result;
 }
@@ -51,14 +57,17 @@ std::string nameSpaceOf(const std::string& object, bool isIntrinsic) {
 OperationHeaders::OperationHeaders(const Http::Request& request)
     : headers_(request.headers), prefix_(prefixOf(request)) {
   const std::string* operation = find("CIMOperation");
-  if (!operation || !sameName(*operation, "MethodCall"))
+  if (!operation || !sameName(*operation, "MethodCall")) {
     throw TransportError(400, "unsupported-operation",
                          operation ? "the header CIMOperation is not MethodCall" : "there is no header CIMOperation");
+  }
   const std::string* version = find("CIMProtocolVersion");
-  if (version && !version->starts_with("1."))
+  if (version && !version->starts_with("1.")) {
     throw TransportError(501, "unsupported-protocol-version", "CIMProtocolVersion is " + *version + ", not 1.x");
-  if (find("CIMBatch"))
+  }
+  if (find("CIMBatch")) {
     throw TransportError(501, "multiple-requests-unsupported", "this server takes one request in a message");
+  }
 }
 
 const std::string* OperationHeaders::find(const std::string& name) const { return headers_.find(prefix_ + name); }
@@ -66,13 +75,19 @@ const std::string* OperationHeaders::find(const std::string& name) const { retur
 void OperationHeaders::requireMatch(const Request& message) const {
   const auto refuse = [](const std::string& what) { throw TransportError(400, "header-mismatch", what); };
   const std::string* method = find("CIMMethod");
-  if (!method) return refuse("there is no header CIMMethod");
-  if (!sameName(unescape(*method), message.method))
+  if (!method) {
+    return refuse("there is no header CIMMethod");
+  }
+  if (!sameName(unescape(*method), message.method)) {
     refuse("the header CIMMethod says " + *method + ", the message " + message.method);
+  }
   const std::string* object = find("CIMObject");
-  if (!object) return refuse("there is no header CIMObject");
-  if (!sameName(nameSpaceOf(*object, message.isIntrinsic), message.nameSpace))
+  if (!object) {
+    return refuse("there is no header CIMObject");
+  }
+  if (!sameName(nameSpaceOf(*object, message.isIntrinsic), message.nameSpace)) {
     refuse("the header CIMObject says " + *object + ", the message " + message.nameSpace);
+  }
 }
 
 void OperationHeaders::addTo(Http::Headers& reply) const {

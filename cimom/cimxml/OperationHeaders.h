@@ -1,5 +1,4 @@
-#ifndef CIMOM_CIMXML_OPERATIONHEADERS_H_
-#define CIMOM_CIMXML_OPERATIONHEADERS_H_
+#pragma once
 
 #include <string>
 
@@ -8,27 +7,25 @@
 
 namespace Cimom::CimXml {
 
-/// The CIM extension headers of a request (DSP0200, 6.3). With M-POST (RFC 2774) their names have a prefix of two
-/// digits, which the Man header declares; the reply's headers have the same.
+// The CIM extension headers of a request (DSP0200, 6.3). With M-POST (RFC 2774) their names have a prefix of two
+// digits, which the Man header declares; the reply's headers have the same.
 class OperationHeaders {
  public:
-  /// Throws TransportError: unsupported-operation where this is no call of a method, unsupported-protocol-version, and
-  /// 510 (Not Extended) where an M-POST demands another extension or none.
+  // Throws TransportError: unsupported-operation where this is no call of a method, unsupported-protocol-version, and
+  // 510 (Not Extended) where an M-POST demands another extension or none.
   explicit OperationHeaders(const Http::Request& request);
 
-  /// Throws TransportError header-mismatch where CIMMethod or CIMObject differ from what the message says.
+  // Throws TransportError header-mismatch where CIMMethod or CIMObject differ from what the message says.
   void requireMatch(const Request& message) const;
 
-  /// Adds what marks a reply as the response to a method call.
+  // Adds what marks a reply as the response to a method call.
   void addTo(Http::Headers& reply) const;
 
  private:
   const std::string* find(const std::string& name) const;
 
   const Http::Headers& headers_;
-  std::string prefix_;  ///< "73-", or nothing
+  std::string prefix_;  // "73-", or nothing
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_OPERATIONHEADERS_H_

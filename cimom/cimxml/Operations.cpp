@@ -5,10 +5,7 @@
 #include <vector>
 
 #include "cimom/broker/RequestScope.h"
-#include "cimom/cimxml/AssociationOperations.h"
 #include "cimom/cimxml/Call.h"
-#include "cimom/cimxml/ClassOperations.h"
-#include "cimom/cimxml/InstanceOperations.h"
 #include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
@@ -54,8 +51,9 @@ const std::vector<Operation>& operations() {
 const Operation& findOperation(const std::string& name) {
   const auto operation = std::find_if(operations().begin(), operations().end(),
                                       [&name](const Operation& candidate) { return sameName(candidate.name, name); });
-  if (operation == operations().end())
+  if (operation == operations().end()) {
     throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED, "this server does not offer the operation " + name);
+  }
   return *operation;
 }
 
@@ -66,25 +64,33 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
                  (parameters.flag("IncludeQualifiers", false) ? CMPI_FLAG_IncludeQualifiers : 0) |
                  (parameters.flag("IncludeClassOrigin", false) ? CMPI_FLAG_IncludeClassOrigin : 0);
   requireOk(CMAddContextEntry(context, CMPIInvocationFlags, &flags, CMPI_uint32));
-  if (!manager.user.empty()) requireOk(CMAddContextEntry(context, CMPIPrincipal, manager.user.c_str(), CMPI_chars));
+  if (!manager.user.empty()) {
+    requireOk(CMAddContextEntry(context, CMPIPrincipal, manager.user.c_str(), CMPI_chars));
+  }
 }
 
 // Providers of methods are not taken, so a class's method is known at most.
 [[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
   const std::string& className = request.target.className;
-  if (!manager.classes.hasNamespace(request.nameSpace))
+  if (!manager.classes.hasNamespace(request.nameSpace)) {
     throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "the namespace " + request.nameSpace + " is not known");
+  }
   const ClassDefinition* definition = manager.classes.find(className);
-  if (!definition) throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
-  if (!definition->findMethod(request.method))
+  if (!definition) {
+    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+  }
+  if (!definition->findMethod(request.method)) {
     throw OperationError(CMPI_RC_ERR_METHOD_NOT_FOUND, "the class " + className + " has no method " + request.method);
+  }
   throw OperationError(CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "no provider performs the method " + request.method);
 }
 
 }  // namespace
 
 void perform(const OperationContext& manager, const Request& request, XmlWriter& xml) {
-  if (!request.isIntrinsic) refuseMethod(manager, request);
+  if (!request.isIntrinsic) {
+    refuseMethod(manager, request);
+  }
   const Operation& operation = findOperation(request.method);
   const Parameters parameters(request, operation.parameters);
   RequestScope scope(manager.broker);

@@ -1,5 +1,4 @@
-#ifndef CIMOM_CIMXML_OPERATIONS_H_
-#define CIMOM_CIMXML_OPERATIONS_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -11,19 +10,17 @@
 
 namespace Cimom::CimXml {
 
-/// What an operation works with.
+// What an operation works with.
 struct OperationContext {
   const CMPIBroker* broker;
   const ClassRepository& classes;
-  const std::string& host;  ///< stands in a path that names none
-  const std::string& user;  ///< who has authenticated; empty where nobody was asked
+  const std::string& host;  // stands in a path that names none
+  const std::string& user;  // who has authenticated; empty where nobody was asked
 };
 
-/// Performs a request's operation (DSP0200, 5.3) and writes what it returns as the content of IMETHODRESPONSE. All
-/// instances are the broker's: only class operations are answered from the class repository. Throws OperationError;
-/// what was written is then of no use. An operation that is not offered is CIM_ERR_NOT_SUPPORTED.
+// Performs a request's operation (DSP0200, 5.3) and writes what it returns as the content of IMETHODRESPONSE. All
+// instances are the broker's: only class operations are answered from the class repository. Throws OperationError;
+// what was written is then of no use. An operation that is not offered is CIM_ERR_NOT_SUPPORTED.
 void perform(const OperationContext& context, const Request& request, XmlWriter& xml);
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_OPERATIONS_H_

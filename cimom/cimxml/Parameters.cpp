@@ -5,7 +5,7 @@
 #include <algorithm>
 
 #include "cimom/cimxml/Errors.h"
-#include "cimom/cimxml/Types.h"
+#include "cimom/cimxml/ScalarText.h"
 #include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
@@ -18,9 +18,13 @@ namespace {
 // The value of a parameter that may be missing; null then.
 template <typename Kind>
 const Kind* valueOf(const Parameter* parameter, const char* otherwise) {
-  if (!parameter) return nullptr;
+  if (!parameter) {
+    return nullptr;
+  }
   const auto* value = std::get_if<Kind>(&parameter->value);
-  if (!value) refuse(parameter->name, otherwise);
+  if (!value) {
+    refuse(parameter->name, otherwise);
+  }
   return value;
 }
 
@@ -29,9 +33,13 @@ const Kind* valueOf(const Parameter* parameter, const char* otherwise) {
 Parameters::Parameters(const Request& request, const std::vector<std::string_view>& known) : request_(request) {
   for (auto parameter = request.parameters.begin(); parameter != request.parameters.end(); ++parameter) {
     const auto isSame = [parameter](const auto& other) { return sameName(parameter->name, other); };
-    if (std::none_of(known.begin(), known.end(), isSame)) refuse(parameter->name, "is not known");
-    if (std::any_of(request.parameters.begin(), parameter, [&](const Parameter& other) { return isSame(other.name); }))
+    if (std::none_of(known.begin(), known.end(), isSame)) {
+      refuse(parameter->name, "is not known");
+    }
+    if (std::any_of(request.parameters.begin(), parameter,
+                    [&](const Parameter& other) { return isSame(other.name); })) {
       refuse(parameter->name, "is given twice");
+    }
   }
 }
 
@@ -45,49 +53,70 @@ const Parameter* Parameters::find(std::string_view name) const {
 
 std::optional<std::string> Parameters::text(std::string_view name) const {
   const auto* text = valueOf<std::string>(find(name), "is no text");
-  if (!text) return std::nullopt;
+  if (!text) {
+    return std::nullopt;
+  }
   return *text;
 }
 
 bool Parameters::flag(std::string_view name, bool whenMissing) const {
   const auto value = text(name);
-  if (!value) return whenMissing;
+  if (!value) {
+    return whenMissing;
+  }
   const auto parsed = parseScalar(CMPI_boolean, *value);
-  if (!parsed) refuse(name, "is neither TRUE nor FALSE");
+  if (!parsed) {
+    refuse(name, "is neither TRUE nor FALSE");
+  }
   return parsed->boolean != 0;
 }
 
 std::string Parameters::className(std::string_view name) const {
   const auto* value = valueOf<ObjectName>(find(name), "is no name of a class");
-  if (!value) return {};
-  if (!value->keys.empty()) refuse(name, "is no name of a class");
+  if (!value) {
+    return {};
+  }
+  if (!value->keys.empty()) {
+    refuse(name, "is no name of a class");
+  }
   return value->className;
 }
 
 std::string Parameters::requiredClassName(std::string_view name) const {
   auto value = className(name);
-  if (value.empty()) refuse(name, "is missing");
+  if (value.empty()) {
+    refuse(name, "is missing");
+  }
   return value;
 }
 
 const ObjectName& Parameters::instanceName(std::string_view name) const {
   const auto* value = valueOf<ObjectName>(find(name), "is no name of an instance");
-  if (!value) refuse(name, "is missing");
+  if (!value) {
+    refuse(name, "is missing");
+  }
   return *value;
 }
 
 const Instance& Parameters::instance(std::string_view name) const {
   const auto* value = valueOf<Instance>(find(name), "is no instance");
-  if (!value) refuse(name, "is missing");
+  if (!value) {
+    refuse(name, "is missing");
+  }
   return *value;
 }
 
 std::optional<std::vector<std::string>> Parameters::propertyList() const {
   const auto* texts = valueOf<Texts>(find("PropertyList"), "is no list of names");
-  if (!texts) return std::nullopt;
+  if (!texts) {
+    return std::nullopt;
+  }
   std::vector<std::string> names;
-  for (const auto& text : *texts)
-    if (text) names.push_back(*text);
+  for (const auto& text : *texts) {
+    if (text) {
+      names.push_back(*text);
+    }
+  }
   return names;
 }
 

@@ -1,5 +1,4 @@
-#ifndef CIMOM_CIMXML_PARAMETERS_H_
-#define CIMOM_CIMXML_PARAMETERS_H_
+#pragma once
 
 #include <optional>
 #include <string>
@@ -10,28 +9,28 @@
 
 namespace Cimom::CimXml {
 
-/// The parameters of an intrinsic method, by name and kind. What is missing, given twice, not known or of another kind
-/// is an OperationError CIM_ERR_INVALID_PARAMETER that names it. A parameter without a value counts as not given.
+// The parameters of an intrinsic method, by name and kind. What is missing, given twice, not known or of another kind
+// is an OperationError CIM_ERR_INVALID_PARAMETER that names it. A parameter without a value counts as not given.
 class Parameters {
  public:
-  /// @param known the names that the method has
+  // @param known the names that the method has
   Parameters(const Request& request, const std::vector<std::string_view>& known);
 
   bool flag(std::string_view name, bool whenMissing) const;
   std::optional<std::string> text(std::string_view name) const;
 
-  /// The name of a class; empty where none is given.
+  // The name of a class; empty where none is given.
   std::string className(std::string_view name) const;
 
-  /// Throws where it is missing, too.
+  // Throws where it is missing, too.
   std::string requiredClassName(std::string_view name) const;
   const ObjectName& instanceName(std::string_view name) const;
   const Instance& instance(std::string_view name) const;
 
-  /// The names in a list of properties; nothing where no list is given, which means all of them.
+  // The names in a list of properties; nothing where no list is given, which means all of them.
   std::optional<std::vector<std::string>> propertyList() const;
 
-  /// The parameter as it came; null where it is not given.
+  // The parameter as it came; null where it is not given.
   const Parameter* find(std::string_view name) const;
 
  private:
@@ -39,5 +38,3 @@ class Parameters {
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_PARAMETERS_H_

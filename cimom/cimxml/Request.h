@@ -1,6 +1,5 @@
-/// A CIM-XML request as the client wrote it: texts and type names, before any class gives them a meaning.
-#ifndef CIMOM_CIMXML_REQUEST_H_
-#define CIMOM_CIMXML_REQUEST_H_
+// A CIM-XML request as the client wrote it: texts and type names, before any class gives them a meaning.
+#pragma once
 
 #include <memory>
 #include <optional>
@@ -12,62 +11,64 @@ namespace Cimom::CimXml {
 
 struct KeyBinding;
 
-/// CLASSNAME or INSTANCENAME, with whatever path stands around it.
+// CLASSNAME or INSTANCENAME, with whatever path stands around it.
 struct ObjectName {
-  std::string host;       ///< empty: none given
-  std::string nameSpace;  ///< empty: that of the request
+  std::string host;       // empty: none given
+  std::string nameSpace;  // empty: that of the request
   std::string className;
-  std::vector<KeyBinding> keys;  ///< none for a class
+  std::vector<KeyBinding> keys;  // none for a class
 };
 
-/// A key's value: a reference, or a text with the type that the client claims for it.
+// A key's value: a reference, or a text with the type that the client claims for it.
 struct KeyValue {
   enum class Kind { String, Boolean, Numeric, Reference };
 
   Kind kind = Kind::String;
   std::string text;
-  std::string type;  ///< the TYPE attribute; empty: none given
+  std::string type;  // the TYPE attribute; empty: none given
   std::shared_ptr<const ObjectName> reference;
 };
 
 struct KeyBinding {
-  std::string name;  ///< empty for a lone KEYVALUE, which DSP0201 allows where a class has one key
+  std::string name;  // empty for a lone KEYVALUE, which DSP0201 allows where a class has one key
   KeyValue value;
 };
 
-using Texts = std::vector<std::optional<std::string>>;  ///< an array's elements; one without a value is VALUE.NULL
+using Texts = std::vector<std::optional<std::string>>;  // an array's elements; one without a value is VALUE.NULL
 
-/// No value, VALUE, VALUE.ARRAY, a reference.
+// No value, VALUE, VALUE.ARRAY, a reference.
 using Value = std::variant<std::monostate, std::string, Texts, ObjectName>;
 
 struct Property {
   std::string name;
-  std::string type;  ///< "uint16", "string" …, "reference"; empty: none given
+  std::string type;  // "uint16", "string" …, "reference"; empty: none given
   bool isArray = false;
   Value value;
 };
 
 struct Instance {
-  ObjectName path;  ///< without keys where the client gave an INSTANCE alone
+  ObjectName path;  // without keys where the client gave an INSTANCE alone
   std::vector<Property> properties;
 };
 
 struct Parameter {
   std::string name;
-  std::string type;  ///< the PARAMTYPE attribute; empty: none given
+  std::string type;  // the PARAMTYPE attribute; empty: none given
   std::variant<std::monostate, std::string, Texts, ObjectName, Instance> value;
 };
 
 struct Request {
   std::string messageId;
   std::string protocolVersion;
-  bool isIntrinsic = true;  ///< IMETHODCALL; else METHODCALL, a method of a class
+  bool isIntrinsic = true;  // IMETHODCALL; else METHODCALL, a method of a class
   std::string method;
   std::string nameSpace;
-  ObjectName target;  ///< of a class's method: what it is called on
+  ObjectName target;  // of a class's method: what it is called on
   std::vector<Parameter> parameters;
 };
 
-}  // namespace Cimom::CimXml
+// Takes the body as it came. Throws TransportError: request-not-well-formed, request-not-valid,
+// multiple-requests-unsupported, unsupported-cim-version, unsupported-dtd-version or unsupported-protocol-version.
+Request readRequest(std::string_view xml);
 
-#endif  // CIMOM_CIMXML_REQUEST_H_
+}  // namespace Cimom::CimXml

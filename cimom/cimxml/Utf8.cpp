@@ -33,19 +33,27 @@ Decoded decode(std::string_view text) {
   const auto* const form = std::find_if(leadForms.begin(), leadForms.end(), [lead](const LeadForm& candidate) {
     return (lead & candidate.mask) == candidate.pattern;
   });
-  if (form == leadForms.end() || form->size > text.size()) return {0, 0};
+  if (form == leadForms.end() || form->size > text.size()) {
+    return {0, 0};
+  }
   char32_t codePoint = lead & static_cast<unsigned char>(~form->mask);
   for (std::size_t i = 1; i < form->size; ++i) {
     const auto byte = static_cast<unsigned char>(text[i]);
-    if ((byte & 0xC0) != 0x80) return {0, 0};
+    if ((byte & 0xC0) != 0x80) {
+      return {0, 0};
+    }
     codePoint = codePoint << 6 | (byte & 0x3F);
   }
-  if (codePoint < form->least || codePoint > 0x10FFFF || isSurrogate(codePoint)) return {0, 0};
+  if (codePoint < form->least || codePoint > 0x10FFFF || isSurrogate(codePoint)) {
+    return {0, 0};
+  }
   return {codePoint, form->size};
 }
 
 bool isXmlCharacter(char32_t codePoint) {
-  if (codePoint < 0x20) return codePoint == '\t' || codePoint == '\n' || codePoint == '\r';
+  if (codePoint < 0x20) {
+    return codePoint == '\t' || codePoint == '\n' || codePoint == '\r';
+  }
   return codePoint != 0xFFFE && codePoint != 0xFFFF;
 }
 
@@ -60,7 +68,9 @@ std::string toXmlText(std::string_view text) {
     const auto plain = static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), isPlain) - text.begin());
     result += text.substr(0, plain);
     text.remove_prefix(plain);
-    if (text.empty()) break;
+    if (text.empty()) {
+      break;
+    }
     const Decoded decoded = decode(text);
     const bool isGood = decoded.size > 0 && isXmlCharacter(decoded.codePoint);
     result += isGood ? text.substr(0, decoded.size) : replacement;
@@ -70,21 +80,33 @@ std::string toXmlText(std::string_view text) {
 }
 
 std::optional<char32_t> decodeOne(std::string_view text) {
-  if (text.empty()) return std::nullopt;
+  if (text.empty()) {
+    return std::nullopt;
+  }
   const Decoded decoded = decode(text);
-  if (decoded.size != text.size()) return std::nullopt;
+  if (decoded.size != text.size()) {
+    return std::nullopt;
+  }
   return decoded.codePoint;
 }
 
 std::string encode(char32_t codePoint) {
-  if (isSurrogate(codePoint) || codePoint > 0x10FFFF) return std::string(replacement);
+  if (isSurrogate(codePoint) || codePoint > 0x10FFFF) {
+    return std::string(replacement);
+  }
   const auto tail = [codePoint](unsigned shift) { return static_cast<char>(0x80 | (codePoint >> shift & 0x3F)); };
   const auto lead = [codePoint](unsigned pattern, unsigned shift) {
     return static_cast<char>(pattern | codePoint >> shift);
   };
-  if (codePoint < 0x80) return {static_cast<char>(codePoint)};
-  if (codePoint < 0x800) return {lead(0xC0, 6), tail(0)};
-  if (codePoint < 0x10000) return {lead(0xE0, 12), tail(6), tail(0)};
+  if (codePoint < 0x80) {
+    return {static_cast<char>(codePoint)};
+  }
+  if (codePoint < 0x800) {
+    return {lead(0xC0, 6), tail(0)};
+  }
+  if (codePoint < 0x10000) {
+    return {lead(0xE0, 12), tail(6), tail(0)};
+  }
   return {lead(0xF0, 18), tail(12), tail(6), tail(0)};
 }
 

@@ -14,8 +14,12 @@ const xmlChar* xmlChars(const char* text) { return reinterpret_cast<const xmlCha
 XmlWriter::XmlWriter(Prolog prolog)
     : buffer_(xmlBufferCreate(), &xmlBufferFree),
       writer_(xmlNewTextWriterMemory(buffer_.get(), 0), &xmlFreeTextWriter) {
-  if (!buffer_ || !writer_) throw std::bad_alloc();
-  if (prolog == Prolog::Declared) xmlTextWriterStartDocument(writer_.get(), nullptr, "UTF-8", nullptr);
+  if (!buffer_ || !writer_) {
+    throw std::bad_alloc();
+  }
+  if (prolog == Prolog::Declared) {
+    xmlTextWriterStartDocument(writer_.get(), nullptr, "UTF-8", nullptr);
+  }
 }
 
 XmlWriter::Scope::~Scope() { xmlTextWriterFullEndElement(writer_.writer_.get()); }

@@ -1,6 +1,5 @@
-/// Writes an XML document into memory.
-#ifndef CIMOM_CIMXML_XMLWRITER_H_
-#define CIMOM_CIMXML_XMLWRITER_H_
+// Writes an XML document into memory.
+#pragma once
 
 #include <libxml/tree.h>
 #include <libxml/xmlwriter.h>
@@ -11,14 +10,14 @@
 
 namespace Cimom::CimXml {
 
-/// Whatever text it is given, the document is well-formed: what XML cannot carry becomes U+FFFD.
+// Whatever text it is given, the document is well-formed: what XML cannot carry becomes U+FFFD.
 class XmlWriter {
  public:
   enum class Prolog { Declared, None };
 
   explicit XmlWriter(Prolog prolog = Prolog::Declared);
 
-  /// An element that ends with its scope.
+  // An element that ends with its scope.
   class [[nodiscard]] Scope {
    public:
     explicit Scope(XmlWriter& writer) : writer_(writer) {}
@@ -33,11 +32,11 @@ class XmlWriter {
   Scope element(const char* name);
   Scope element(const char* name, const char* attributeName, std::string_view attributeValue);
 
-  void attribute(const char* name, std::string_view value);  ///< of the element begun last
+  void attribute(const char* name, std::string_view value);  // of the element begun last
   void text(std::string_view text);
   void textElement(const char* name, std::string_view text);
 
-  /// The document so far; complete when every scope has ended.
+  // The document so far; complete when every scope has ended.
   std::string take();
 
  private:
@@ -46,5 +45,3 @@ class XmlWriter {
 };
 
 }  // namespace Cimom::CimXml
-
-#endif  // CIMOM_CIMXML_XMLWRITER_H_

@@ -13,10 +13,11 @@ std::optional<Configuration> readCommandLine(int argc, const char* const* argv) 
   std::string file;
   app.add_option("--config", file, "configuration file: the options below as \"key = value\" lines")->type_name("FILE");
   std::map<std::string, std::vector<std::string>> texts;
-  for (const Setting& setting : settings())
+  for (const Setting& setting : settings()) {
     app.add_option("--" + std::string(setting.name), texts[setting.name], setting.help)
         ->type_name(setting.valueName)
         ->allow_extra_args(setting.repeatable);
+  }
   try {
     app.parse(argc, argv);
   } catch (const CLI::Success& asked) {
@@ -26,12 +27,18 @@ std::optional<Configuration> readCommandLine(int argc, const char* const* argv) 
     throw UsageError(error.what());
   }
   GivenValues values;
-  if (!file.empty()) values = readConfigurationFile(file);
+  if (!file.empty()) {
+    values = readConfigurationFile(file);
+  }
   for (const auto& [name, given] : texts) {
-    if (given.empty()) continue;
+    if (given.empty()) {
+      continue;
+    }
     auto& taken = values[name];
     taken.clear();
-    for (const std::string& text : given) taken.push_back({text, "--" + name, {}});
+    for (const std::string& text : given) {
+      taken.push_back({text, "--" + name, {}});
+    }
   }
   return toConfiguration(values);
 }

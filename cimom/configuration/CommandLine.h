@@ -1,5 +1,4 @@
-#ifndef CIMOM_CONFIGURATION_COMMANDLINE_H_
-#define CIMOM_CONFIGURATION_COMMANDLINE_H_
+#pragma once
 
 #include <optional>
 
@@ -7,10 +6,8 @@
 
 namespace Cimom {
 
-/// Reads cimomd's command line and the configuration file that it names; what stands on the command line replaces what
-/// the file says. Gives nothing when help or the version was asked for, and has been printed. Throws UsageError.
+// Reads cimomd's command line and the configuration file that it names; what stands on the command line replaces what
+// the file says. Gives nothing when help or the version was asked for, and has been printed. Throws UsageError.
 std::optional<Configuration> readCommandLine(int argc, const char* const* argv);
 
 }  // namespace Cimom
-
-#endif  // CIMOM_CONFIGURATION_COMMANDLINE_H_

@@ -1,5 +1,4 @@
-#ifndef CIMOM_CONFIGURATION_CONFIGURATION_H_
-#define CIMOM_CONFIGURATION_CONFIGURATION_H_
+#pragma once
 
 #include <chrono>
 #include <cstddef>
@@ -11,28 +10,26 @@
 
 namespace Cimom {
 
-/// What cimomd is told by its command line and its configuration file.
+// What cimomd is told by its command line and its configuration file.
 struct Configuration {
   std::string address = "127.0.0.1";
   std::uint16_t port = 5988;
   std::vector<std::filesystem::path> schemas;
   std::vector<std::filesystem::path> registrations;
   std::vector<std::filesystem::path> providerDirectories;
-  std::size_t maxRequestSize = 4 << 20;  ///< bytes
+  std::size_t maxRequestSize = 4 << 20;  // bytes
   unsigned maxConnections = 64;
   std::chrono::seconds idleTimeout{60};
   std::chrono::seconds shutdownTimeout{20};
-  std::filesystem::path tlsCertificate;  ///< empty: plain HTTP
+  std::filesystem::path tlsCertificate;  // empty: plain HTTP
   std::filesystem::path tlsKey;
-  std::filesystem::path passwordFile;  ///< empty: everybody may
+  std::filesystem::path passwordFile;  // empty: everybody may
 };
 
-/// The command line or the configuration file is wrong; the text names the option, or file and line, and what is wrong.
+// The command line or the configuration file is wrong; the text names the option, or file and line, and what is wrong.
 class UsageError : public std::runtime_error {
  public:
   using std::runtime_error::runtime_error;
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_CONFIGURATION_CONFIGURATION_H_

@@ -1,5 +1,4 @@
-#ifndef CIMOM_CONFIGURATION_CONFIGURATIONFILE_H_
-#define CIMOM_CONFIGURATION_CONFIGURATIONFILE_H_
+#pragma once
 
 #include <filesystem>
 
@@ -7,11 +6,9 @@
 
 namespace Cimom {
 
-/// Reads an INI file of `key = value` lines without sections; comments begin with `;` or `#`. A key that may be given
-/// several times stands on several lines. A relative path in it is relative to the file's directory. Throws UsageError
-/// "FILE:LINE: what is wrong" for what is no setting, and "FILE: …" for a file that cannot be read.
+// Reads an INI file of `key = value` lines without sections; comments begin with `;` or `#`. A key that may be given
+// several times stands on several lines. A relative path in it is relative to the file's directory. Throws UsageError
+// "FILE:LINE: what is wrong" for what is no setting, and "FILE: …" for a file that cannot be read.
 GivenValues readConfigurationFile(const std::filesystem::path& file);
 
 }  // namespace Cimom
-
-#endif  // CIMOM_CONFIGURATION_CONFIGURATIONFILE_H_

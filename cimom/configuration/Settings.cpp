@@ -15,13 +15,17 @@ std::uint64_t parseNumber(const GivenValue& value, std::uint64_t least, std::uin
   std::uint64_t number = 0;
   const char* end = value.text.data() + value.text.size();
   const auto result = std::from_chars(value.text.data(), end, number);
-  if (result.ec == std::errc() && result.ptr == end && number >= least && number <= most) return number;
+  if (result.ec == std::errc() && result.ptr == end && number >= least && number <= most) {
+    return number;
+  }
   throw UsageError(value.origin + ": \"" + value.text + "\" is no number from " + std::to_string(least) + " to " +
                    std::to_string(most));
 }
 
 std::filesystem::path parsePath(const GivenValue& value) {
-  if (value.text.empty()) throw UsageError(value.origin + ": the path is empty");
+  if (value.text.empty()) {
+    throw UsageError(value.origin + ": the path is empty");
+  }
   return value.base / value.text;
 }
 
@@ -81,13 +85,19 @@ Configuration toConfiguration(const GivenValues& given) {
   Configuration configuration;
   for (const Setting& setting : settings()) {
     const auto values = given.find(std::string_view(setting.name));
-    if (values == given.end()) continue;
-    if (!setting.repeatable && values->second.size() > 1)
+    if (values == given.end()) {
+      continue;
+    }
+    if (!setting.repeatable && values->second.size() > 1) {
       throw UsageError(values->second[1].origin + " is given twice");
-    for (const GivenValue& value : values->second) setting.apply(configuration, value);
+    }
+    for (const GivenValue& value : values->second) {
+      setting.apply(configuration, value);
+    }
   }
-  if (configuration.tlsCertificate.empty() != configuration.tlsKey.empty())
+  if (configuration.tlsCertificate.empty() != configuration.tlsKey.empty()) {
     throw UsageError("tls-certificate and tls-key go together");
+  }
   return configuration;
 }
 

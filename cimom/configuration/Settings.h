@@ -1,5 +1,4 @@
-#ifndef CIMOM_CONFIGURATION_SETTINGS_H_
-#define CIMOM_CONFIGURATION_SETTINGS_H_
+#pragma once
 
 #include <functional>
 #include <map>
@@ -11,35 +10,33 @@
 
 namespace Cimom {
 
-/// A value as it was given.
+// A value as it was given.
 struct GivenValue {
   std::string text;
-  std::string origin;          ///< for messages: "--port", "cimomd.ini:12: port"
-  std::filesystem::path base;  ///< what a relative path is relative to; empty: the working directory
+  std::string origin;          // for messages: "--port", "cimomd.ini:12: port"
+  std::filesystem::path base;  // what a relative path is relative to; empty: the working directory
 };
 
-/// The values given for each setting, by its name.
+// The values given for each setting, by its name.
 using GivenValues = std::map<std::string, std::vector<GivenValue>, std::less<>>;
 
-/// One thing that can be configured: an option of the command line, and under the same name a key of the file.
+// One thing that can be configured: an option of the command line, and under the same name a key of the file.
 struct Setting {
   const char* name;
-  const char* valueName;  ///< what help calls the value
+  const char* valueName;  // what help calls the value
   const char* help;
   bool repeatable;
-  std::function<void(Configuration&, const GivenValue&)> apply;  ///< throws UsageError for a bad value
+  std::function<void(Configuration&, const GivenValue&)> apply;  // throws UsageError for a bad value
 };
 
-/// All settings, in the order of the help.
+// All settings, in the order of the help.
 const std::vector<Setting>& settings();
 
-/// The setting of that name, or null.
+// The setting of that name, or null.
 const Setting* findSetting(std::string_view name);
 
-/// Throws UsageError for a value that is bad, or given twice where one is wanted, and for values that do not go
-/// together.
+// Throws UsageError for a value that is bad, or given twice where one is wanted, and for values that do not go
+// together.
 Configuration toConfiguration(const GivenValues& values);
 
 }  // namespace Cimom
-
-#endif  // CIMOM_CONFIGURATION_SETTINGS_H_

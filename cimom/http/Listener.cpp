@@ -24,7 +24,9 @@ AddressList resolve(const std::string& address, std::uint16_t port) {
   hints.ai_socktype = SOCK_STREAM;
   addrinfo* list = nullptr;
   const int error = getaddrinfo(address.c_str(), std::to_string(port).c_str(), &hints, &list);
-  if (error != 0) throw ServerError("\"" + address + "\" is no IPv4 or IPv6 address: " + gai_strerror(error));
+  if (error != 0) {
+    throw ServerError("\"" + address + "\" is no IPv4 or IPv6 address: " + gai_strerror(error));
+  }
   return {list, &freeaddrinfo};
 }
 
@@ -57,7 +59,9 @@ Listener::~Listener() { close(); }
 int Listener::duplicate() const { return fcntl(descriptor_, F_DUPFD_CLOEXEC, 0); }
 
 void Listener::close() {
-  if (descriptor_ >= 0) ::close(std::exchange(descriptor_, -1));
+  if (descriptor_ >= 0) {
+    ::close(std::exchange(descriptor_, -1));
+  }
 }
 
 }  // namespace Cimom::Http

@@ -1,6 +1,5 @@
-/// A listening TCP socket.
-#ifndef CIMOM_HTTP_LISTENER_H_
-#define CIMOM_HTTP_LISTENER_H_
+// A listening TCP socket.
+#pragma once
 
 #include <cstdint>
 #include <stdexcept>
@@ -8,7 +7,7 @@
 
 namespace Cimom::Http {
 
-/// The server cannot be set up; the text names what failed and why.
+// The server cannot be set up; the text names what failed and why.
 class ServerError : public std::runtime_error {
  public:
   using std::runtime_error::runtime_error;
@@ -16,20 +15,20 @@ class ServerError : public std::runtime_error {
 
 class Listener {
  public:
-  /// address: a numeric IPv4 or IPv6 address of this host; port 0 takes a free one. Throws ServerError.
+  // address: a numeric IPv4 or IPv6 address of this host; port 0 takes a free one. Throws ServerError.
   Listener(const std::string& address, std::uint16_t port);
   ~Listener();
   Listener(const Listener&) = delete;
   Listener& operator=(const Listener&) = delete;
 
-  /// A descriptor of the same socket, owned by the caller.
+  // A descriptor of the same socket, owned by the caller.
   int duplicate() const;
 
-  /// "127.0.0.1:5988", "[::1]:5988"; with the port that was taken.
+  // "127.0.0.1:5988", "[::1]:5988"; with the port that was taken.
   const std::string& endpoint() const { return endpoint_; }
   std::uint16_t port() const { return port_; }
 
-  /// Gives up this descriptor of the socket.
+  // Gives up this descriptor of the socket.
   void close();
 
  private:
@@ -39,5 +38,3 @@ class Listener {
 };
 
 }  // namespace Cimom::Http
-
-#endif  // CIMOM_HTTP_LISTENER_H_

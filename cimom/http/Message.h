@@ -1,6 +1,7 @@
-/// The HTTP request and response as the handler of a server sees them.
-#ifndef CIMOM_HTTP_MESSAGE_H_
-#define CIMOM_HTTP_MESSAGE_H_
+// The HTTP request and response as the handler of a server sees them.
+#pragma once
+
+#include <strings.h>
 
 #include <functional>
 #include <string>
@@ -10,13 +11,20 @@
 
 namespace Cimom::Http {
 
-/// Header fields in their order; names are compared without regard to case (RFC 9110, 5.1).
+// Header fields in their order; names are compared without regard to case (RFC 9110, 5.1).
 class Headers {
  public:
   void add(std::string name, std::string value) { fields_.emplace_back(std::move(name), std::move(value)); }
 
-  /// The value of the first field of that name, or null.
-  const std::string* find(std::string_view name) const;
+  // The value of the first field of that name, or null.
+  const std::string* find(std::string_view name) const {
+    for (const auto& [field, value] : fields_) {
+      if (field.size() == name.size() && strncasecmp(field.data(), name.data(), name.size()) == 0) {
+        return &value;
+      }
+    }
+    return nullptr;
+  }
 
   auto begin() const { return fields_.begin(); }
   auto end() const { return fields_.end(); }
@@ -27,10 +35,10 @@ class Headers {
 
 struct Request {
   std::string method;
-  std::string path;  ///< as sent, without the query
+  std::string path;  // as sent, without the query
   Headers headers;
-  std::string body;  ///< complete, decoded from any transfer coding
-  std::string user;  ///< who has authenticated; empty where the server asks nobody
+  std::string body;  // complete, decoded from any transfer coding
+  std::string user;  // who has authenticated; empty where the server asks nobody
 };
 
 struct Response {
@@ -39,9 +47,7 @@ struct Response {
   std::string body;
 };
 
-/// Answers one request; called from several threads at once. An exception becomes a 500.
+// Answers one request; called from several threads at once. An exception becomes a 500.
 using Handler = std::function<Response(const Request&)>;
 
 }  // namespace Cimom::Http
-
-#endif  // CIMOM_HTTP_MESSAGE_H_

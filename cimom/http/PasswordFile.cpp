@@ -14,8 +14,9 @@ namespace {
 
 bool sameInConstantTime(const std::string& left, const std::string& right) {
   unsigned difference = left.size() == right.size() ? 0 : 1;
-  for (std::size_t i = 0; i < left.size() && i < right.size(); ++i)
+  for (std::size_t i = 0; i < left.size() && i < right.size(); ++i) {
     difference |= static_cast<unsigned>(left[i]) ^ static_cast<unsigned>(right[i]);
+  }
   return difference == 0;
 }
 
@@ -23,18 +24,26 @@ bool sameInConstantTime(const std::string& left, const std::string& right) {
 
 PasswordFile::PasswordFile(const std::filesystem::path& file) {
   std::ifstream stream(file);
-  if (!stream) throw ServerError(file.string() + ": " + std::strerror(errno));
+  if (!stream) {
+    throw ServerError(file.string() + ": " + std::strerror(errno));
+  }
   std::string line;
   for (unsigned number = 1; std::getline(stream, line); ++number) {
-    if (line.empty() || line[0] == '#') continue;
+    if (line.empty() || line[0] == '#') {
+      continue;
+    }
     const auto colon = line.find(':');
     const std::string hash = colon == std::string::npos ? "" : line.substr(colon + 1);
-    if (colon == 0 || crypt_checksalt(hash.c_str()) == CRYPT_SALT_INVALID)
+    if (colon == 0 || crypt_checksalt(hash.c_str()) == CRYPT_SALT_INVALID) {
       throw ServerError(file.string() + ":" + std::to_string(number) + ": is no \"user:hash\"");
-    if (!hashes_.emplace(line.substr(0, colon), hash).second)
+    }
+    if (!hashes_.emplace(line.substr(0, colon), hash).second) {
       throw ServerError(file.string() + ":" + std::to_string(number) + ": the user is there already");
+    }
   }
-  if (hashes_.empty()) throw ServerError(file.string() + ": names no user");
+  if (hashes_.empty()) {
+    throw ServerError(file.string() + ": names no user");
+  }
 }
 
 bool PasswordFile::accepts(const std::string& user, const std::string& password) const {

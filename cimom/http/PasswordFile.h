@@ -1,5 +1,4 @@
-#ifndef CIMOM_HTTP_PASSWORDFILE_H_
-#define CIMOM_HTTP_PASSWORDFILE_H_
+#pragma once
 
 #include <filesystem>
 #include <map>
@@ -7,14 +6,14 @@
 
 namespace Cimom::Http {
 
-/// Users and the hashes of their passwords: lines `user:hash` with a hash of crypt(5), as `openssl passwd -6` and
-/// `mkpasswd` make them. Empty lines and lines that begin with `#` mean nothing.
+// Users and the hashes of their passwords: lines `user:hash` with a hash of crypt(5), as `openssl passwd -6` and
+// `mkpasswd` make them. Empty lines and lines that begin with `#` mean nothing.
 class PasswordFile {
  public:
-  /// Throws ServerError "FILE:LINE: what is wrong", or "FILE: …" for a file that cannot be read.
+  // Throws ServerError "FILE:LINE: what is wrong", or "FILE: …" for a file that cannot be read.
   explicit PasswordFile(const std::filesystem::path& file);
 
-  /// Whether the password is that user's. Takes as long for a user that is not there.
+  // Whether the password is that user's. Takes as long for a user that is not there.
   bool accepts(const std::string& user, const std::string& password) const;
 
  private:
@@ -22,5 +21,3 @@ class PasswordFile {
 };
 
 }  // namespace Cimom::Http
-
-#endif  // CIMOM_HTTP_PASSWORDFILE_H_

@@ -29,14 +29,18 @@ class InFlight {
   // False once the server drains.
   bool enter() {
     const std::lock_guard lock(mutex_);
-    if (draining_) return false;
+    if (draining_) {
+      return false;
+    }
     ++count_;
     return true;
   }
 
   void leave() {
     const std::lock_guard lock(mutex_);
-    if (--count_ == 0) idle_.notify_all();
+    if (--count_ == 0) {
+      idle_.notify_all();
+    }
   }
 
   bool drain(std::chrono::milliseconds grace) {
@@ -62,9 +66,12 @@ MHD_Result send(MHD_Connection* connection, const Response& response) {
       MHD_create_response_from_buffer(response.body.size(), const_cast<char*>(response.body.data()),
                                       MHD_RESPMEM_MUST_COPY),
       &MHD_destroy_response);
-  if (!message) return MHD_NO;
-  for (const auto& [name, value] : response.headers)
+  if (!message) {
+    return MHD_NO;
+  }
+  for (const auto& [name, value] : response.headers) {
     MHD_add_response_header(message.get(), name.c_str(), value.c_str());
+  }
   return MHD_queue_response(connection, response.status, message.get());
 }
 
@@ -101,10 +108,14 @@ struct Server::State {
   // What the headers alone decide is decided before a byte of the body is asked for.
   MHD_Result begin(MHD_Connection* connection, Request& request) const {
     MHD_get_connection_values(connection, MHD_HEADER_KIND, &collectHeader, &request.headers);
-    if (options.authenticator && !authenticated(connection, request)) return challenge(connection);
+    if (options.authenticator && !authenticated(connection, request)) {
+      return challenge(connection);
+    }
     const std::string* length = request.headers.find(MHD_HTTP_HEADER_CONTENT_LENGTH);
     std::size_t bytes = 0;
-    if (length) std::from_chars(length->data(), length->data() + length->size(), bytes);
+    if (length) {
+      std::from_chars(length->data(), length->data() + length->size(), bytes);
+    }
     return bytes <= options.maxRequestSize ? MHD_YES : refuseSize(connection);
   }
 
@@ -112,7 +123,9 @@ struct Server::State {
     char* password = nullptr;
     char* user = MHD_basic_auth_get_username_password(connection, &password);
     const bool accepted = user && password && options.authenticator(user, password);
-    if (accepted) request.user = user;
+    if (accepted) {
+      request.user = user;
+    }
     MHD_free(user);
     MHD_free(password);
     return accepted;
@@ -134,9 +147,13 @@ struct Server::State {
   }
 
   MHD_Result answer(MHD_Connection* connection, Exchange& exchange) {
-    if (exchange.tooLarge) return refuseSize(connection);
+    if (exchange.tooLarge) {
+      return refuseSize(connection);
+    }
     exchange.counted = inFlight.enter();
-    if (!exchange.counted) return refuse(connection, MHD_HTTP_SERVICE_UNAVAILABLE, "the server is ending");
+    if (!exchange.counted) {
+      return refuse(connection, MHD_HTTP_SERVICE_UNAVAILABLE, "the server is ending");
+    }
     try {
       return send(connection, handler(exchange.request));
     } catch (const std::exception& error) {
@@ -160,7 +177,9 @@ struct Server::State {
 
   static void onCompleted(void* self, MHD_Connection*, void** handle, MHD_RequestTerminationCode) {
     const std::unique_ptr<Exchange> exchange(static_cast<Exchange*>(std::exchange(*handle, nullptr)));
-    if (exchange && exchange->counted) static_cast<State*>(self)->inFlight.leave();
+    if (exchange && exchange->counted) {
+      static_cast<State*>(self)->inFlight.leave();
+    }
   }
 
   void start() {
@@ -178,7 +197,9 @@ struct Server::State {
     settings.push_back({MHD_OPTION_END, 0, nullptr});
     daemon = MHD_start_daemon(flags, 0, nullptr, nullptr, &State::onRequest, this, MHD_OPTION_ARRAY, settings.data(),
                               MHD_OPTION_END);
-    if (daemon) return;
+    if (daemon) {
+      return;
+    }
     throw ServerError(options.tlsCertificate.empty() ? "the HTTP server does not start"
                                                      : "the HTTPS server does not start: certificate or key is no "
                                                        "usable PEM, or they do not belong together");
@@ -198,7 +219,9 @@ std::uint16_t Server::port() const { return state_->listener.port(); }
 
 bool Server::drain(std::chrono::milliseconds grace) {
   const int socket = MHD_quiesce_daemon(state_->daemon);
-  if (socket >= 0) ::close(socket);
+  if (socket >= 0) {
+    ::close(socket);
+  }
   state_->listener.close();
   return state_->inFlight.drain(grace);
 }

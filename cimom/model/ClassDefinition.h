@@ -1,5 +1,4 @@
-#ifndef CIMOM_SCHEMA_CLASSDEFINITION_H_
-#define CIMOM_SCHEMA_CLASSDEFINITION_H_
+#pragma once
 
 #include <string>
 #include <string_view>
@@ -9,32 +8,32 @@
 
 namespace Cimom {
 
-/// A qualifier with its value and flavor (DSP0004).
+// A qualifier with its value and flavor (DSP0004).
 struct Qualifier {
   std::string name;
   Value value;
-  bool toSubclass = true;     ///< false: Restricted
-  bool overridable = true;    ///< false: DisableOverride
-  bool translatable = false;  ///< Translatable
+  bool toSubclass = true;     // false: Restricted
+  bool overridable = true;    // false: DisableOverride
+  bool translatable = false;  // Translatable
 };
 
 using Qualifiers = std::vector<Qualifier>;
 
-/// The qualifier of that name; null where there is none.
+// The qualifier of that name; null where there is none.
 const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view name);
 
-/// Whether a boolean qualifier is there and true.
+// Whether a boolean qualifier is there and true.
 bool isQualified(const Qualifiers& qualifiers, std::string_view name);
 
-/// A property of a class, or a parameter of a method.
+// A property of a class, or a parameter of a method.
 struct PropertyDeclaration {
   std::string name;
-  CMPIType type = CMPI_null;   ///< arrays with the bit CMPI_ARRAY; CMPI_ref for a reference
-  std::string referenceClass;  ///< the class that a reference refers to, else empty
-  unsigned arraySize = 0;      ///< of a fixed-size array, else 0
-  Value defaultValue;          ///< null where the schema gives none
-  Qualifiers qualifiers;       ///< inherited ones included
-  std::string originClass;     ///< the class that declared it first
+  CMPIType type = CMPI_null;   // arrays with the bit CMPI_ARRAY; CMPI_ref for a reference
+  std::string referenceClass;  // the class that a reference refers to, else empty
+  unsigned arraySize = 0;      // of a fixed-size array, else 0
+  Value defaultValue;          // null where the schema gives none
+  Qualifiers qualifiers;       // inherited ones included
+  std::string originClass;     // the class that declared it first
 
   bool isKey() const { return isQualified(qualifiers, "Key"); }
   bool isReference() const { return !referenceClass.empty(); }
@@ -48,23 +47,21 @@ struct MethodDeclaration {
   std::string originClass;
 };
 
-/// A class with everything that it inherits: the superclass's features come first, in the superclass's order, an
-/// overriding one in the place of the one that it overrides.
+// A class with everything that it inherits: the superclass's features come first, in the superclass's order, an
+// overriding one in the place of the one that it overrides.
 struct ClassDefinition {
   std::string name;
   const ClassDefinition* superclass = nullptr;
   Qualifiers qualifiers;
   std::vector<PropertyDeclaration> properties;
   std::vector<MethodDeclaration> methods;
-  std::string declaredAt;  ///< "FILE:LINE"
+  std::string declaredAt;  // "FILE:LINE"
 
   const PropertyDeclaration* findProperty(std::string_view propertyName) const;
   const MethodDeclaration* findMethod(std::string_view methodName) const;
   bool isAssociation() const { return isQualified(qualifiers, "Association"); }
-  /// Whether this is the class of that name or one of its subclasses.
+  // Whether this is the class of that name or one of its subclasses.
   bool isA(std::string_view className) const;
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_SCHEMA_CLASSDEFINITION_H_

@@ -5,31 +5,33 @@
 #include <cstdio>
 #include <cstdlib>
 
-#include "cimom/broker/StatusError.h"
+#include "cimom/ground/Errors.h"
 
 namespace Cimom {
 namespace {
 
-constexpr std::uint64_t kSecond = 1'000'000;
-constexpr std::uint64_t kMinute = 60 * kSecond;
-constexpr std::uint64_t kHour = 60 * kMinute;
-constexpr std::uint64_t kDay = 24 * kHour;
+constexpr std::uint64_t perSecond = 1'000'000;
+constexpr std::uint64_t perMinute = 60 * perSecond;
+constexpr std::uint64_t perHour = 60 * perMinute;
+constexpr std::uint64_t perDay = 24 * perHour;
 
 [[noreturn]] void malformed(std::string_view text) {
   throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "not a CIM datetime: \"" + std::string(text) + "\"");
 }
 
-/// The digits [position, position + length) of a datetime text, at most `limit`.
+// The digits [position, position + length) of a datetime text, at most `limit`.
 unsigned field(std::string_view text, std::size_t position, std::size_t length, unsigned limit) {
   unsigned value = 0;
   const char* first = text.data() + position;
   const auto [end, error] = std::from_chars(first, first + length, value);
-  if (error != std::errc() || end != first + length || value > limit) malformed(text);
+  if (error != std::errc() || end != first + length || value > limit) {
+    malformed(text);
+  }
   return value;
 }
 
 std::uint64_t timeOfDay(std::string_view text) {
-  return field(text, 8, 2, 23) * kHour + field(text, 10, 2, 59) * kMinute + field(text, 12, 2, 59) * kSecond +
+  return field(text, 8, 2, 23) * perHour + field(text, 10, 2, 59) * perMinute + field(text, 12, 2, 59) * perSecond +
          field(text, 15, 6, 999'999);
 }
 
@@ -41,29 +43,40 @@ DateTime DateTime::now() {
 }
 
 DateTime DateTime::parse(std::string_view text) {
-  if (text.size() != 25 || text[14] != '.') malformed(text);
+  if (text.size() != 25 || text[14] != '.') {
+    malformed(text);
+  }
   const char kind = text[21];
   const unsigned offset = field(text, 22, 3, 999);
   if (kind == ':') {
-    if (offset != 0) malformed(text);
-    return {field(text, 0, 8, 99'999'999) * kDay + timeOfDay(text), true, 0};
+    if (offset != 0) {
+      malformed(text);
+    }
+    return {field(text, 0, 8, 99'999'999) * perDay + timeOfDay(text), true, 0};
   }
-  if (kind != '+' && kind != '-') malformed(text);
+  if (kind != '+' && kind != '-') {
+    malformed(text);
+  }
   using namespace std::chrono;
   const year_month_day date(year(static_cast<int>(field(text, 0, 4, 9999))), month(field(text, 4, 2, 12)),
                             day(field(text, 6, 2, 31)));
-  if (!date.ok()) malformed(text);
+  if (!date.ok()) {
+    malformed(text);
+  }
   const int minutes = kind == '+' ? static_cast<int>(offset) : -static_cast<int>(offset);
   const std::int64_t days = sys_days(date).time_since_epoch().count();
-  const std::int64_t utc = days * static_cast<std::int64_t>(kDay) + static_cast<std::int64_t>(timeOfDay(text)) -
-                           minutes * static_cast<std::int64_t>(kMinute);
-  if (utc < 0) malformed(text);
+  const std::int64_t utc = days * static_cast<std::int64_t>(perDay) + static_cast<std::int64_t>(timeOfDay(text)) -
+                           minutes * static_cast<std::int64_t>(perMinute);
+  if (utc < 0) {
+    malformed(text);
+  }
   return {static_cast<std::uint64_t>(utc), false, minutes};
 }
 
 std::string DateTime::format() const {
-  const std::uint64_t local = interval ? microseconds : microseconds + static_cast<std::uint64_t>(utcOffset) * kMinute;
-  const std::uint64_t days = local / kDay;
+  const std::uint64_t local =
+      interval ? microseconds : microseconds + static_cast<std::uint64_t>(utcOffset) * perMinute;
+  const std::uint64_t days = local / perDay;
   unsigned long date = static_cast<unsigned long>(days % 100'000'000);
   if (!interval) {
     using namespace std::chrono;
@@ -73,9 +86,9 @@ std::string DateTime::format() const {
   }
   char text[64];
   const int length = std::snprintf(
-      text, sizeof text, "%08lu%02u%02u%02u.%06u%c%03u", date, static_cast<unsigned>(local % kDay / kHour),
-      static_cast<unsigned>(local % kHour / kMinute), static_cast<unsigned>(local % kMinute / kSecond),
-      static_cast<unsigned>(local % kSecond), interval ? ':' : (utcOffset < 0 ? '-' : '+'),
+      text, sizeof text, "%08lu%02u%02u%02u.%06u%c%03u", date, static_cast<unsigned>(local % perDay / perHour),
+      static_cast<unsigned>(local % perHour / perMinute), static_cast<unsigned>(local % perMinute / perSecond),
+      static_cast<unsigned>(local % perSecond), interval ? ':' : (utcOffset < 0 ? '-' : '+'),
       static_cast<unsigned>(interval ? 0 : std::abs(utcOffset)));
   return std::string(text, static_cast<std::size_t>(length));
 }

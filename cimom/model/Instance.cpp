@@ -2,7 +2,9 @@
 
 #include <algorithm>
 
-#include "cimom/broker/StatusError.h"
+#include "cimom/ground/Errors.h"
+#include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom {
 
@@ -22,15 +24,19 @@ const Value* Instance::find(std::string_view name) const {
 
 void Instance::set(std::string_view name, Value value) {
   const PropertyDeclaration* property = definition_->findProperty(name);
-  if (!property) return;
+  if (!property) {
+    return;
+  }
   if (value.isNull()) {
     value = Value::null(property->type);
   } else if (value.type() != property->type) {
     throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, definition_->name + "." + property->name + " is a " +
-                                                         typeName(property->type) + ", not a " +
-                                                         typeName(value.type()));
+                                                         describeType(property->type) + ", not a " +
+                                                         describeType(value.type()));
   }
-  if (filter_ && !filter_->contains(property->name) && !property->isKey()) return;
+  if (filter_ && !filter_->contains(property->name) && !property->isKey()) {
+    return;
+  }
   values_[static_cast<std::size_t>(property - definition_->properties.data())] = std::move(value);
 }
 
@@ -43,9 +49,13 @@ ObjectPath Instance::path() const {
   for (std::size_t index = 0; index < size(); ++index) {
     const PropertyDeclaration& property = definition_->properties[index];
     const Value& value = (*this)[index];
-    if (!property.isKey() || value.isNull()) continue;
+    if (!property.isKey() || value.isNull()) {
+      continue;
+    }
     const Value* given = complete.keys.find(property.name);
-    if (!given || given->isNull()) complete.keys.set(property.name, value);
+    if (!given || given->isNull()) {
+      complete.keys.set(property.name, value);
+    }
   }
   return complete;
 }
@@ -62,7 +72,9 @@ void Instance::setPath(ObjectPath path) {
 Instance Instance::withoutDefaults() const {
   Instance bare = *this;
   for (std::size_t index = 0; index < size(); ++index) {
-    if (!bare.values_[index]) bare.values_[index] = Value::null(definition_->properties[index].type);
+    if (!bare.values_[index]) {
+      bare.values_[index] = Value::null(definition_->properties[index].type);
+    }
   }
   return bare;
 }
@@ -70,8 +82,12 @@ Instance Instance::withoutDefaults() const {
 void Instance::takeKeys() {
   for (const auto& [name, value] : path_.keys) {
     const PropertyDeclaration* property = definition_->findProperty(name);
-    if (!property || !property->isKey()) continue;
-    if (auto typed = value.as(property->type)) set(name, *std::move(typed));
+    if (!property || !property->isKey()) {
+      continue;
+    }
+    if (auto typed = value.as(property->type)) {
+      set(name, *std::move(typed));
+    }
   }
 }
 

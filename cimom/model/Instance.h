@@ -1,5 +1,4 @@
-#ifndef CIMOM_BROKER_INSTANCE_H_
-#define CIMOM_BROKER_INSTANCE_H_
+#pragma once
 
 #include <optional>
 #include <set>
@@ -8,40 +7,41 @@
 #include <vector>
 
 #include "cimom/model/ClassDefinition.h"
+#include "cimom/model/Names.h"
 #include "cimom/model/ObjectPath.h"
 
 namespace Cimom {
 
-/// An instance: a path, and a value for every property that its class declares. A property that nobody set shows the
-/// class's default.
+// An instance: a path, and a value for every property that its class declares. A property that nobody set shows the
+// class's default.
 class Instance {
  public:
-  /// Keys of the path become values of the key properties.
+  // Keys of the path become values of the key properties.
   Instance(const ClassDefinition& definition, ObjectPath path);
 
   const ClassDefinition& definition() const { return *definition_; }
 
-  /// How many properties the class declares.
+  // How many properties the class declares.
   std::size_t size() const { return values_.size(); }
-  /// The value of the class's property of that index.
+  // The value of the class's property of that index.
   const Value& operator[](std::size_t index) const;
-  /// The value of a property; null where the class declares none of that name.
+  // The value of a property; null where the class declares none of that name.
   const Value* find(std::string_view name) const;
 
-  /// Sets a property. A property that the class does not declare, or that the filter leaves out, is dropped.
-  /// @throws StatusError CMPI_RC_ERR_INVALID_DATA_TYPE where the value's type is not the declared one
+  // Sets a property. A property that the class does not declare, or that the filter leaves out, is dropped.
+  // Throws StatusError CMPI_RC_ERR_INVALID_DATA_TYPE where the value's type is not the declared one.
   void set(std::string_view name, Value value);
 
-  /// From now on only the named properties and the keys take a value.
+  // From now on only the named properties and the keys take a value.
   void setFilter(const std::vector<std::string>& properties);
 
-  /// The path with every key that has a value: one given with the path wins over the property's value.
+  // The path with every key that has a value: one given with the path wins over the property's value.
   ObjectPath path() const;
-  /// Gives the instance another path; its keys become values of the key properties.
-  /// @throws StatusError CMPI_RC_ERR_INVALID_PARAMETER where it is the path of another class
+  // Gives the instance another path; its keys become values of the key properties.
+  // Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER where it is the path of another class.
   void setPath(ObjectPath path);
 
-  /// The same instance, in which a property that nobody set is null, as ModifyInstance hands it to a provider.
+  // The same instance, in which a property that nobody set is null, as ModifyInstance hands it to a provider.
   Instance withoutDefaults() const;
 
  private:
@@ -54,5 +54,3 @@ class Instance {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_INSTANCE_H_

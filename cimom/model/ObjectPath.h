@@ -1,23 +1,35 @@
-#ifndef CIMOM_BROKER_OBJECTPATH_H_
-#define CIMOM_BROKER_OBJECTPATH_H_
+#pragma once
 
 #include <string>
 
-#include "cimom/broker/NamedValues.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 
-/// An object path: where an instance (or, without keys, a class) is. Host and namespace may be empty.
+// An object path: where an instance (or, without keys, a class) is. Host and namespace may be empty.
 struct ObjectPath {
   std::string host;
   std::string nameSpace;
   std::string className;
   NamedValues keys;
 
-  /// The path as an untyped WBEM URI (DSP0207): "//host/namespace:Class.Key=\"value\",…", the host where there is one.
-  std::string toString() const;
+  // The path as an untyped WBEM URI (DSP0207): "//host/namespace:Class.Key=\"value\",…", the host where there is one.
+  std::string toString() const {
+    std::string text;
+    if (!host.empty()) {
+      text += "//" + host + "/";
+    }
+    if (!nameSpace.empty()) {
+      text += nameSpace + ":";
+    }
+    text += className;
+    char separator = '.';
+    for (const auto& [name, value] : keys) {
+      text += separator + name + "=" + value.toString();
+      separator = ',';
+    }
+    return text;
+  }
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_OBJECTPATH_H_

@@ -1,12 +1,14 @@
-#ifndef CIMOM_BROKER_VALUE_H_
-#define CIMOM_BROKER_VALUE_H_
+// CIM values: single, in arrays, and by name.
+#pragma once
 
 #include <cmpidt.h>
 
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <variant>
+#include <vector>
 
 #include "cimom/model/DateTime.h"
 
@@ -16,11 +18,11 @@ struct Array;
 struct ObjectPath;
 class Instance;
 
-/// A typed CIM value, possibly null: what properties, keys, arguments and array elements hold. Values of object types
-/// are copies: nothing that happens to the object that they were taken from changes them.
+// A typed CIM value, possibly null: what properties, keys, arguments and array elements hold. Values of object types
+// are copies: nothing that happens to the object that they were taken from changes them.
 class Value {
  public:
-  /// Null, of no type.
+  // Null, of no type.
   Value() = default;
 
   static Value null(CMPIType type);
@@ -30,38 +32,38 @@ class Value {
   static Value sint64(CMPISint64 value);
   static Value real64(CMPIReal64 value);
   static Value char16(CMPIChar16 value);
+  // Of any type that CMPI passes by value.
+  static Value scalar(CMPIType type, const CMPIValue& value);
   static Value string(std::string value);
   static Value dateTime(DateTime value);
   static Value reference(ObjectPath value);
   static Value instance(Instance value);
   static Value array(Array value);
 
-  /// Takes what a provider passes: `value` as CMPI lays it down for `type` (for CMPI_chars the pointer is the C string
-  /// itself). A null pointer, or a null object in it, is a null value. Characters become a CMPI_string.
-  /// @throws StatusError CMPI_RC_ERR_INVALID_DATA_TYPE for a type that no CIM value has
-  static Value fromCmpi(const CMPIValue* value, CMPIType type);
-
-  /// The value as CMPI data; objects in it are made in the current request scope.
-  CMPIData toCmpi(CMPIValueState state = CMPI_goodValue) const;
-
   CMPIType type() const { return type_; }
   bool isNull() const { return std::holds_alternative<std::monostate>(content_); }
+  // Whether this is the boolean TRUE.
+  bool isTrue() const;
 
-  /// The text of a CMPI_string; null where the value is anything else.
+  // A value of a type that CMPI passes by value; null where the value is anything else.
+  const CMPIValue* scalar() const { return std::get_if<CMPIValue>(&content_); }
+  // The text of a CMPI_string; null where the value is anything else.
   const std::string* text() const { return std::get_if<std::string>(&content_); }
-  /// The path of a reference; null where the value is anything else.
+  // The time stamp or interval of a CMPI_dateTime; null where the value is anything else.
+  const DateTime* time() const { return std::get_if<DateTime>(&content_); }
+  // The path of a reference; null where the value is anything else.
   const ObjectPath* path() const;
-  /// The embedded instance, or the instance of a result; null where the value is anything else.
+  // The embedded instance, or the instance of a result; null where the value is anything else.
   const Instance* embedded() const;
-  /// The array; null where the value is anything else.
+  // The array; null where the value is anything else.
   const Array* elements() const;
 
-  /// The same number as another integer type; none where it is no integer or does not fit.
+  // The same number as another integer type; none where it is no integer or does not fit.
   std::optional<Value> asInteger(CMPIType type) const;
-  /// The same value as `type`: itself where it has that type, a null of it, or the same number; none otherwise.
+  // The same value as `type`: itself where it has that type, a null of it, or the same number; none otherwise.
   std::optional<Value> as(CMPIType type) const;
 
-  /// The value as a key of an untyped WBEM URI (DSP0207) writes it: numbers and TRUE/FALSE bare, all else in quotes.
+  // The value as a key of an untyped WBEM URI (DSP0207) writes it: numbers and TRUE/FALSE bare, all else in quotes.
   std::string toString() const;
 
  private:
@@ -74,15 +76,32 @@ class Value {
   Content content_;
 };
 
-/// The size in bytes of a scalar that CMPI passes by value; 0 for every other type.
-std::size_t scalarSize(CMPIType type);
+// A CIM array: elements of one type, each of which may be null.
+struct Array {
+  CMPIType elementType = CMPI_null;
+  std::vector<Value> elements;
+};
 
-/// Whether a type is one of the eight integer types.
-bool isInteger(CMPIType type);
+// Values by name in the order in which they came: the keys of a path, the arguments of a method, the entries of a
+// context. Names are looked up without regard to case and keep the spelling that they were first given with.
+class NamedValues {
+ public:
+  struct Entry {
+    std::string name;
+    Value value;
+  };
 
-/// The type's CIM name ("uint16", "string[]" …), for messages.
-std::string typeName(CMPIType type);
+  const Value* find(std::string_view name) const;
+  void set(std::string_view name, Value value);
+
+  std::size_t size() const { return entries_.size(); }
+  bool empty() const { return entries_.empty(); }
+  const Entry& operator[](std::size_t index) const { return entries_[index]; }
+  auto begin() const { return entries_.begin(); }
+  auto end() const { return entries_.end(); }
+
+ private:
+  std::vector<Entry> entries_;
+};
 
 }  // namespace Cimom
-
-#endif  // CIMOM_BROKER_VALUE_H_

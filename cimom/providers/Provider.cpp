@@ -1,8 +1,5 @@
 #include "cimom/providers/Provider.h"
 
-#include "cimom/broker/Handle.h"
-#include "cimom/broker/ProviderGuard.h"
-
 namespace Cimom {
 
 Provider::Provider(std::string name, std::string location, const std::vector<std::filesystem::path>& directories)
@@ -14,8 +11,12 @@ Provider::Provider(std::string name, InstanceFactory instanceFactory, Associatio
       associationFactory_(std::move(associationFactory)) {}
 
 void Provider::complete(InstanceFactory instanceFactory, AssociationFactory associationFactory) {
-  if (!instanceFactory_) instanceFactory_ = std::move(instanceFactory);
-  if (!associationFactory_) associationFactory_ = std::move(associationFactory);
+  if (!instanceFactory_) {
+    instanceFactory_ = std::move(instanceFactory);
+  }
+  if (!associationFactory_) {
+    associationFactory_ = std::move(associationFactory);
+  }
 }
 
 CMPIInstanceMI* Provider::instanceMi(const CMPIBroker* broker) {
@@ -26,14 +27,20 @@ CMPIAssociationMI* Provider::associationMi(const CMPIBroker* broker) {
   return make(associationMi_, associationFactory_, "Association", broker);
 }
 
-template <class Mi>
+template <typename Mi>
 Mi* Provider::make(Mi*& mi, Factory<Mi>& factory, const char* kind, const CMPIBroker* broker) {
   const std::lock_guard lock(mutex_);
-  if (mi) return mi;
+  if (mi) {
+    return mi;
+  }
   const std::string factoryName = name_ + "_Create_" + kind + "MI";
   if (!factory) {
-    if (isLinked()) throw StatusError(CMPI_RC_ERR_FAILED, "provider " + name_ + " has no " + factoryName);
-    if (!library_) library_ = ProviderLibrary(location_, *directories_);
+    if (isLinked()) {
+      throw StatusError(CMPI_RC_ERR_FAILED, "provider " + name_ + " has no " + factoryName);
+    }
+    if (!library_) {
+      library_ = ProviderLibrary(location_, *directories_);
+    }
     factory = library_.function<Mi*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>(factoryName);
   }
   RequestScope scope(broker);
@@ -43,18 +50,24 @@ Mi* Provider::make(Mi*& mi, Factory<Mi>& factory, const char* kind, const CMPIBr
     made = factory(broker, scope.context(), &status);
     return status;
   });
-  if (!made || !made->ft) throw StatusError(CMPI_RC_ERR_FAILED, factoryName + " gave no management interface");
+  if (!made || !made->ft) {
+    throw StatusError(CMPI_RC_ERR_FAILED, factoryName + " gave no management interface");
+  }
   return mi = made;
 }
 
 void Provider::cleanUp(const CMPIBroker* broker) {
   const auto clean = [&](auto*& mi) {
-    if (!mi) return;
+    if (!mi) {
+      return;
+    }
     RequestScope scope(broker);
     constexpr CMPIBoolean terminating = true;
     const CMPIStatus status = mi->ft->cleanup ? mi->ft->cleanup(mi, scope.context(), terminating) : CMPIStatus{};
     // The provider knows of something that still runs in its code.
-    if (status.rc == CMPI_RC_DO_NOT_UNLOAD || status.rc == CMPI_RC_NEVER_UNLOAD) library_.keep();
+    if (status.rc == CMPI_RC_DO_NOT_UNLOAD || status.rc == CMPI_RC_NEVER_UNLOAD) {
+      library_.keep();
+    }
     mi = nullptr;
   };
   clean(instanceMi_);

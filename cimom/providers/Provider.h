@@ -1,34 +1,52 @@
-#ifndef CIMOM_REGISTRY_PROVIDER_H_
-#define CIMOM_REGISTRY_PROVIDER_H_
+#pragma once
 
 #include <cmpift.h>
 
+#include <exception>
 #include <filesystem>
 #include <mutex>
 #include <string>
 #include <vector>
 
+#include "cimom/broker/Handle.h"
 #include "cimom/providers/ProviderLibrary.h"
 #include "cimom/providers/ProviderRegistration.h"
 
 namespace Cimom {
 
-/// A provider: its library and its management interfaces (MI), each made by its factory when it is first asked for
-/// and cleaned up once.
+// Runs a provider's function and turns both its status and what it throws into a StatusError: a provider's failure
+// ends its request, never the object manager.
+template <typename Call>
+void runProvider(const std::string& what, Call call) {
+  CMPIStatus status = {CMPI_RC_OK, nullptr};
+  try {
+    status = call();
+  } catch (const std::exception& error) {
+    throw StatusError(CMPI_RC_ERR_FAILED, what + " threw an exception: " + error.what());
+  } catch (...) {
+    throw StatusError(CMPI_RC_ERR_FAILED, what + " threw an exception of an unknown type");
+  }
+  if (status.rc != CMPI_RC_OK) {
+    throw StatusError(status.rc, status.msg && status.msg->hdl ? textOf(status.msg) : "");
+  }
+}
+
+// A provider: its library and its management interfaces (MI), each made by its factory when it is first asked for
+// and cleaned up once.
 class Provider {
  public:
-  /// A provider in lib<location>.so along `directories`, which must outlive it.
+  // A provider in lib<location>.so along `directories`, which must outlive it.
   Provider(std::string name, std::string location, const std::vector<std::filesystem::path>& directories);
-  /// A provider that is linked into the program.
+  // A provider that is linked into the program.
   Provider(std::string name, InstanceFactory instanceFactory, AssociationFactory associationFactory);
 
-  /// Gives a linked provider the factories that it does not have yet.
+  // Gives a linked provider the factories that it does not have yet.
   void complete(InstanceFactory instanceFactory, AssociationFactory associationFactory);
 
-  /// Cleans up every MI that was made; no call may be under way.
+  // Cleans up every MI that was made; no call may be under way.
   void cleanUp(const CMPIBroker* broker);
 
-  /// @throws StatusError CMPI_RC_ERR_FAILED where library, factory or MI cannot be had; the next call tries again
+  // Throws StatusError CMPI_RC_ERR_FAILED where library, factory or MI cannot be had; the next call tries again.
   CMPIInstanceMI* instanceMi(const CMPIBroker* broker);
   CMPIAssociationMI* associationMi(const CMPIBroker* broker);
 
@@ -37,10 +55,10 @@ class Provider {
   bool isLinked() const { return !directories_; }
 
  private:
-  template <class Mi>
+  template <typename Mi>
   using Factory = std::function<Mi*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
 
-  template <class Mi>
+  template <typename Mi>
   Mi* make(Mi*& mi, Factory<Mi>& factory, const char* kind, const CMPIBroker* broker);
 
   std::string name_;
@@ -55,5 +73,3 @@ class Provider {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_REGISTRY_PROVIDER_H_

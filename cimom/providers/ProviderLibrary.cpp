@@ -4,7 +4,7 @@
 
 #include <utility>
 
-#include "cimom/broker/StatusError.h"
+#include "cimom/ground/Errors.h"
 
 namespace Cimom {
 namespace {
@@ -14,7 +14,9 @@ std::filesystem::path locate(const std::string& name, const std::vector<std::fil
   for (const auto& directory : directories) {
     const auto file = directory / name;
     std::error_code ignored;
-    if (std::filesystem::exists(file, ignored)) return std::filesystem::absolute(file);
+    if (std::filesystem::exists(file, ignored)) {
+      return std::filesystem::absolute(file);
+    }
     searched += (searched.empty() ? "" : ", ") + directory.string();
   }
   throw StatusError(CMPI_RC_ERR_FAILED, name + " is in none of the provider directories (" + searched + ")");
@@ -27,11 +29,15 @@ ProviderLibrary::ProviderLibrary(const std::string& location, const std::vector<
   // Local: a provider's symbols serve nobody but the provider, and no two libraries can meet in a name that both
   // define. Now: what a library lacks shows when it is loaded, not in the middle of a request.
   handle_ = dlopen(file_.c_str(), RTLD_NOW | RTLD_LOCAL);
-  if (!handle_) throw StatusError(CMPI_RC_ERR_FAILED, file_ + " cannot be loaded: " + dlerror());
+  if (!handle_) {
+    throw StatusError(CMPI_RC_ERR_FAILED, file_ + " cannot be loaded: " + dlerror());
+  }
 }
 
 ProviderLibrary::~ProviderLibrary() {
-  if (handle_) dlclose(handle_);
+  if (handle_) {
+    dlclose(handle_);
+  }
 }
 
 ProviderLibrary::ProviderLibrary(ProviderLibrary&& other) noexcept

@@ -1,5 +1,4 @@
-#ifndef CIMOM_REGISTRY_PROVIDERLIBRARY_H_
-#define CIMOM_REGISTRY_PROVIDERLIBRARY_H_
+#pragma once
 
 #include <filesystem>
 #include <string>
@@ -7,12 +6,12 @@
 
 namespace Cimom {
 
-/// A provider's shared object, loaded as long as this lives.
+// A provider's shared object, loaded as long as this lives.
 class ProviderLibrary {
  public:
   ProviderLibrary() = default;
-  /// Loads the first lib<location>.so along the directories.
-  /// @throws StatusError CMPI_RC_ERR_FAILED with the library's name and what the loader says
+  // Loads the first lib<location>.so along the directories.
+  // Throws StatusError CMPI_RC_ERR_FAILED with the library's name and what the loader says.
   ProviderLibrary(const std::string& location, const std::vector<std::filesystem::path>& directories);
   ~ProviderLibrary();
   ProviderLibrary(ProviderLibrary&& other) noexcept;
@@ -20,14 +19,14 @@ class ProviderLibrary {
 
   explicit operator bool() const { return handle_; }
 
-  /// The function of that name.
-  /// @throws StatusError CMPI_RC_ERR_FAILED with the library's name and what the loader says
-  template <class Function>
+  // The function of that name.
+  // Throws StatusError CMPI_RC_ERR_FAILED with the library's name and what the loader says.
+  template <typename Function>
   Function* function(const std::string& name) const {
     return reinterpret_cast<Function*>(symbol(name));
   }
 
-  /// Leaves the library loaded for the life of the process.
+  // Leaves the library loaded for the life of the process.
   void keep() { handle_ = nullptr; }
 
  private:
@@ -38,5 +37,3 @@ class ProviderLibrary {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_REGISTRY_PROVIDERLIBRARY_H_

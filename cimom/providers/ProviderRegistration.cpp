@@ -13,18 +13,22 @@ namespace {
 std::string_view trimmed(std::string_view text) {
   constexpr std::string_view blanks = " \t\r\v\f";
   const std::size_t first = text.find_first_not_of(blanks);
-  if (first == std::string_view::npos) return {};
+  if (first == std::string_view::npos) {
+    return {};
+  }
   return text.substr(first, text.find_last_not_of(blanks) - first + 1);
 }
 
 std::vector<std::string> words(std::string_view text) {
   std::istringstream stream{std::string(text)};
   std::vector<std::string> result;
-  for (std::string word; stream >> word;) result.push_back(word);
+  for (std::string word; stream >> word;) {
+    result.push_back(word);
+  }
   return result;
 }
 
-/// Reads the stanzas line by line.
+// Reads the stanzas line by line.
 class StanzaReader {
  public:
   explicit StanzaReader(std::string file) : file_(std::move(file)) {}
@@ -32,12 +36,19 @@ class StanzaReader {
   void line(std::string_view text) {
     ++line_;
     text = trimmed(text.substr(0, text.find('#')));
-    if (text.empty()) return;
-    if (text.front() == '[') return open(text);
+    if (text.empty()) {
+      return;
+    }
+    if (text.front() == '[') {
+      return open(text);
+    }
     const std::size_t colon = text.find(':');
-    if (colon == std::string_view::npos)
+    if (colon == std::string_view::npos) {
       fail("expected \"[ClassName]\" or \"key: value\", not \"" + std::string(text) + "\"");
-    if (!stanza_) fail("expected \"[ClassName]\" before the first key");
+    }
+    if (!stanza_) {
+      fail("expected \"[ClassName]\" before the first key");
+    }
     assign(trimmed(text.substr(0, colon)), trimmed(text.substr(colon + 1)));
   }
 
@@ -54,7 +65,9 @@ class StanzaReader {
   void open(std::string_view text) {
     close();
     const std::string_view name = text.back() == ']' ? trimmed(text.substr(1, text.size() - 2)) : std::string_view();
-    if (name.empty()) fail("expected \"[ClassName]\", not \"" + std::string(text) + "\"");
+    if (name.empty()) {
+      fail("expected \"[ClassName]\", not \"" + std::string(text) + "\"");
+    }
     stanza_ = true;
     current_ = {};
     current_.className = name;
@@ -62,20 +75,32 @@ class StanzaReader {
   }
 
   void assign(std::string_view key, std::string_view value) {
-    if (value.empty()) fail("\"" + std::string(key) + "\" has no value");
-    if (key == "provider") return assignOnce(current_.provider, key, value);
-    if (key == "location") return assignOnce(current_.location, key, value);
+    if (value.empty()) {
+      fail("\"" + std::string(key) + "\" has no value");
+    }
+    if (key == "provider") {
+      return assignOnce(current_.provider, key, value);
+    }
+    if (key == "location") {
+      return assignOnce(current_.location, key, value);
+    }
     if (key == "namespace") {
-      for (std::string& name : words(value)) current_.namespaces.push_back(std::move(name));
+      for (std::string& name : words(value)) {
+        current_.namespaces.push_back(std::move(name));
+      }
     } else if (key == "type") {
-      for (const std::string& type : words(value)) assignType(type);
+      for (const std::string& type : words(value)) {
+        assignType(type);
+      }
     } else if (key != "group") {
       fail("unknown key \"" + std::string(key) + "\"; known are provider, location, type, namespace and group");
     }
   }
 
   void assignOnce(std::string& member, std::string_view key, std::string_view value) {
-    if (!member.empty()) fail("\"" + std::string(key) + "\" is there twice");
+    if (!member.empty()) {
+      fail("\"" + std::string(key) + "\" is there twice");
+    }
     member = value;
   }
 
@@ -90,7 +115,9 @@ class StanzaReader {
   }
 
   void close() {
-    if (!stanza_) return;
+    if (!stanza_) {
+      return;
+    }
     const auto require = [&](bool there, const char* key) {
       if (!there) {
         throw ConfigurationError(current_.registeredAt + ": [" + current_.className + "] lacks \"" + key + "\"");
@@ -116,8 +143,12 @@ class StanzaReader {
 std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& file) {
   std::ifstream stream(file);
   StanzaReader reader(file.string());
-  if (!stream || std::filesystem::is_directory(file)) throw ConfigurationError(file.string() + ": cannot be read");
-  for (std::string line; std::getline(stream, line);) reader.line(line);
+  if (!stream || std::filesystem::is_directory(file)) {
+    throw ConfigurationError(file.string() + ": cannot be read");
+  }
+  for (std::string line; std::getline(stream, line);) {
+    reader.line(line);
+  }
   return reader.finish();
 }
 

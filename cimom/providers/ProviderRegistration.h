@@ -1,5 +1,4 @@
-#ifndef CIMOM_REGISTRY_PROVIDERREGISTRATION_H_
-#define CIMOM_REGISTRY_PROVIDERREGISTRATION_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -10,34 +9,32 @@
 
 namespace Cimom {
 
-/// Which provider serves a class, and where.
+// Which provider serves a class, and where.
 struct ProviderRegistration {
   std::string className;
-  std::string provider;  ///< the name in the factory functions' names
-  std::string location;  ///< the library lib<location>.so; of no meaning for a provider linked into the program
+  std::string provider;  // the name in the factory functions' names
+  std::string location;  // the library lib<location>.so; of no meaning for a provider linked into the program
   bool instance = false;
   bool association = false;
   std::vector<std::string> namespaces;
-  std::string registeredAt;  ///< "FILE:LINE", for messages
+  std::string registeredAt;  // "FILE:LINE", for messages
 };
 
-/// A provider's factory functions, as CMPI defines them.
+// A provider's factory functions, as CMPI defines them.
 using InstanceFactory = std::function<CMPIInstanceMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
 using AssociationFactory = std::function<CMPIAssociationMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
 
-/// Reads a registration file: one stanza per class,
-///
-///     [ClassName]
-///        provider: ProviderName
-///        location: library
-///        type: instance association
-///        namespace: root/cimv2
-///     #
-///
-/// `#` starts a comment; `group`, which other object managers take for their processes, is accepted and means nothing.
-/// @throws ConfigurationError "FILE:LINE: what is wrong"
+// Reads a registration file: one stanza per class,
+//
+//     [ClassName]
+//        provider: ProviderName
+//        location: library
+//        type: instance association
+//        namespace: root/cimv2
+//     #
+//
+// `#` starts a comment; `group`, which other object managers take for their processes, is accepted and means nothing.
+// Throws ConfigurationError "FILE:LINE: what is wrong".
 std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& file);
 
 }  // namespace Cimom
-
-#endif  // CIMOM_REGISTRY_PROVIDERREGISTRATION_H_

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 
-#include "cimom/broker/StatusError.h"
 #include "cimom/ground/Errors.h"
 #include "cimom/model/Names.h"
 
@@ -23,7 +22,9 @@ void ProviderRegistry::add(const ProviderRegistration& registration) {
     return !provider->isLinked() && provider->name() == registration.provider &&
            provider->location() == registration.location;
   });
-  if (known != providers_.end()) return addEntry(registration, known->get());
+  if (known != providers_.end()) {
+    return addEntry(registration, known->get());
+  }
   auto provider = std::make_unique<Provider>(registration.provider, registration.location, directories_);
   addEntry(registration, provider.get());
   providers_.push_back(std::move(provider));
@@ -46,9 +47,13 @@ void ProviderRegistry::add(const ProviderRegistration& registration, InstanceFac
 
 void ProviderRegistry::addEntry(const ProviderRegistration& registration, Provider* provider) {
   for (const Entry& entry : entries_) {
-    if (!sameName(entry.registration.className, registration.className)) continue;
+    if (!sameName(entry.registration.className, registration.className)) {
+      continue;
+    }
     for (const std::string& nameSpace : registration.namespaces) {
-      if (!entry.serves(nameSpace)) continue;
+      if (!entry.serves(nameSpace)) {
+        continue;
+      }
       throw ConfigurationError(
           (registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") + "class " +
           registration.className + " has a provider in " + nameSpace + " already" +
@@ -61,8 +66,12 @@ void ProviderRegistry::addEntry(const ProviderRegistration& registration, Provid
 void ProviderRegistry::load() const {
   for (const auto& [registration, provider] : entries_) {
     try {
-      if (registration.instance) provider->instanceMi(broker_);
-      if (registration.association) provider->associationMi(broker_);
+      if (registration.instance) {
+        provider->instanceMi(broker_);
+      }
+      if (registration.association) {
+        provider->associationMi(broker_);
+      }
     } catch (const StatusError& error) {
       throw ConfigurationError((registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") +
                                "provider " + registration.provider + ": " + error.what());

@@ -1,5 +1,4 @@
-#ifndef CIMOM_REGISTRY_PROVIDERREGISTRY_H_
-#define CIMOM_REGISTRY_PROVIDERREGISTRY_H_
+#pragma once
 
 #include <filesystem>
 #include <memory>
@@ -11,7 +10,7 @@
 
 namespace Cimom {
 
-/// Which provider serves which class in which namespace.
+// Which provider serves which class in which namespace.
 class ProviderRegistry {
  public:
   struct Entry {
@@ -28,16 +27,16 @@ class ProviderRegistry {
 
   void addDirectory(const std::filesystem::path& directory) { directories_.push_back(directory); }
 
-  /// @throws ConfigurationError where the class has a provider in that namespace already
+  // Throws ConfigurationError where the class has a provider in that namespace already.
   void add(const ProviderRegistration& registration);
   void add(const ProviderRegistration& registration, InstanceFactory instanceFactory,
            AssociationFactory associationFactory);
 
-  /// Every registered class, in the order of registration.
+  // Every registered class, in the order of registration.
   const std::vector<Entry>& entries() const { return entries_; }
 
-  /// Makes every management interface now.
-  /// @throws ConfigurationError for the first one that cannot be had
+  // Makes every management interface now.
+  // Throws ConfigurationError for the first one that cannot be had.
   void load() const;
 
  private:
@@ -50,5 +49,3 @@ class ProviderRegistry {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_REGISTRY_PROVIDERREGISTRY_H_

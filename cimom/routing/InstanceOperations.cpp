@@ -1,7 +1,8 @@
-#include "cimom/routing/InstanceOperations.h"
-
 #include <algorithm>
 #include <iterator>
+
+#include "cimom/routing/ProviderCall.h"
+#include "cimom/routing/Router.h"
 
 namespace Cimom {
 namespace {
@@ -12,9 +13,9 @@ bool servesInstances(const Entry& entry, const Operation& operation) {
   return entry.registration.instance && entry.serves(operation.path.nameSpace);
 }
 
-/// The provider of exactly the operation's class; null where there is none.
-Provider* providerOf(const Operation& operation) {
-  for (const Entry& entry : operation.core.providers.entries()) {
+// The provider of exactly the operation's class; null where there is none.
+Provider* providerOf(const ProviderRegistry& providers, const Operation& operation) {
+  for (const Entry& entry : providers.entries()) {
     if (servesInstances(entry, operation) && sameName(entry.registration.className, operation.definition.name)) {
       return entry.provider;
     }
@@ -22,19 +23,23 @@ Provider* providerOf(const Operation& operation) {
   return nullptr;
 }
 
-Provider& writingProviderOf(const Operation& operation) {
-  if (Provider* provider = providerOf(operation)) return *provider;
+Provider& writingProviderOf(const ProviderRegistry& providers, const Operation& operation) {
+  if (Provider* provider = providerOf(providers, operation)) {
+    return *provider;
+  }
   throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED,
                     "class " + operation.definition.name + " has no provider in " + operation.path.nameSpace);
 }
 
-/// Calls `call` with the provider and the path of every class at or below the operation's that has a provider.
-template <class Call>
-std::vector<Value> forEachClass(const Operation& operation, Call call) {
+// Calls `call` with the provider and the path of every class at or below the operation's that has a provider.
+template <typename Call>
+std::vector<Value> forEachClass(const ProviderRegistry& providers, const Operation& operation, Call call) {
   std::vector<Value> all;
-  for (const Entry& entry : operation.core.providers.entries()) {
+  for (const Entry& entry : providers.entries()) {
     const ClassDefinition* served = operation.core.classes.find(entry.registration.className);
-    if (!served || !servesInstances(entry, operation) || !served->isA(operation.definition.name)) continue;
+    if (!served || !servesInstances(entry, operation) || !served->isA(operation.definition.name)) {
+      continue;
+    }
     const auto path = lend(ObjectPath{operation.path.host, operation.path.nameSpace, served->name, {}});
     std::vector<Value> some = call(*entry.provider, entry.provider->instanceMi(&operation.core.broker), &path);
     std::ranges::move(some, std::back_inserter(all));
@@ -44,31 +49,35 @@ std::vector<Value> forEachClass(const Operation& operation, Call call) {
 
 }  // namespace
 
-std::vector<Value> enumerateInstances(const Operation& operation, const char** properties) {
-  return forEachClass(operation, [&](const Provider& provider, CMPIInstanceMI* mi, const CMPIObjectPath* path) {
-    return callProvider(operation, provider, mi, CMPI_instance, mi->ft->enumerateInstances, path, properties);
-  });
+std::vector<Value> Router::enumerateInstances(const Operation& operation, const char** properties) {
+  return forEachClass(
+      providers_, operation, [&](const Provider& provider, CMPIInstanceMI* mi, const CMPIObjectPath* path) {
+        return callProvider(operation, provider, mi, CMPI_instance, mi->ft->enumerateInstances, path, properties);
+      });
 }
 
-std::vector<Value> enumerateInstanceNames(const Operation& operation) {
-  return forEachClass(operation, [&](const Provider& provider, CMPIInstanceMI* mi, const CMPIObjectPath* path) {
-    return callProvider(operation, provider, mi, CMPI_ref, mi->ft->enumerateInstanceNames, path);
-  });
+std::vector<Value> Router::enumerateInstanceNames(const Operation& operation) {
+  return forEachClass(providers_, operation,
+                      [&](const Provider& provider, CMPIInstanceMI* mi, const CMPIObjectPath* path) {
+                        return callProvider(operation, provider, mi, CMPI_ref, mi->ft->enumerateInstanceNames, path);
+                      });
 }
 
-Value getInstance(const Operation& operation, const char** properties) {
-  if (Provider* provider = providerOf(operation)) {
+Value Router::getInstance(const Operation& operation, const char** properties) {
+  if (Provider* provider = providerOf(providers_, operation)) {
     const auto path = lend(operation.path);
     CMPIInstanceMI* mi = provider->instanceMi(&operation.core.broker);
     std::vector<Value> found =
         callProvider(operation, *provider, mi, CMPI_instance, mi->ft->getInstance, &path, properties);
-    if (!found.empty()) return std::move(found.front());
+    if (!found.empty()) {
+      return std::move(found.front());
+    }
   }
   throw StatusError(CMPI_RC_ERR_NOT_FOUND, "no instance " + operation.path.toString());
 }
 
-Value createInstance(const Operation& operation, const Instance& instance) {
-  Provider& provider = writingProviderOf(operation);
+Value Router::createInstance(const Operation& operation, const Instance& instance) {
+  Provider& provider = writingProviderOf(providers_, operation);
   const auto path = lend(operation.path);
   const auto created = lend(instance);
   CMPIInstanceMI* mi = provider.instanceMi(&operation.core.broker);
@@ -76,11 +85,13 @@ Value createInstance(const Operation& operation, const Instance& instance) {
   return paths.empty() ? Value::reference(instance.path()) : std::move(paths.front());
 }
 
-void modifyInstance(const Operation& operation, const Instance& instance, const char** properties) {
-  Provider& provider = writingProviderOf(operation);
+void Router::modifyInstance(const Operation& operation, const Instance& instance, const char** properties) {
+  Provider& provider = writingProviderOf(providers_, operation);
   ObjectPath complete = operation.path;
   for (const auto& [name, value] : instance.path().keys) {
-    if (!complete.keys.find(name)) complete.keys.set(name, value);
+    if (!complete.keys.find(name)) {
+      complete.keys.set(name, value);
+    }
   }
   Instance modified = instance.withoutDefaults();
   modified.setPath(complete);
@@ -90,8 +101,8 @@ void modifyInstance(const Operation& operation, const Instance& instance, const 
   callProvider(operation, provider, mi, CMPI_null, mi->ft->modifyInstance, &path, &whole, properties);
 }
 
-void deleteInstance(const Operation& operation) {
-  Provider& provider = writingProviderOf(operation);
+void Router::deleteInstance(const Operation& operation) {
+  Provider& provider = writingProviderOf(providers_, operation);
   const auto path = lend(operation.path);
   CMPIInstanceMI* mi = provider.instanceMi(&operation.core.broker);
   callProvider(operation, provider, mi, CMPI_null, mi->ft->deleteInstance, &path);

@@ -3,26 +3,17 @@
 namespace Cimom {
 namespace {
 
-/// Far more than any stack of providers needs, and far less than a thread's stack holds.
-constexpr unsigned kDeepest = 32;
+// Far more than any stack of providers needs, and far less than a thread's stack holds.
+constexpr unsigned deepest = 32;
 
 thread_local unsigned depth = 0;
 
-const ClassDefinition& classFor(const BrokerCore& core, const ObjectPath& path) {
-  core.requireNamespace(path.nameSpace);
-  return core.requireClass(path.className);
-}
-
 }  // namespace
 
-Operation::Operation(const CMPIBroker* broker, const CMPIContext* callerContext, const CMPIObjectPath* requested)
-    : core(coreOf(broker)),
-      context(modelOf<Context>(callerContext)),
-      path(modelOf<ObjectPath>(requested)),
-      definition(classFor(core, path)) {}
-
 CallDepth::CallDepth() {
-  if (depth == kDeepest) throw StatusError(CMPI_RC_ERR_FAILED, "the providers' calls nest without end");
+  if (depth == deepest) {
+    throw StatusError(CMPI_RC_ERR_FAILED, "the providers' calls nest without end");
+  }
   ++depth;
 }
 
@@ -30,7 +21,9 @@ CallDepth::~CallDepth() { --depth; }
 
 Context providerContext(const Operation& operation) {
   Context context = operation.context;
-  if (!context.entries.find(CMPIInvocationFlags)) context.entries.set(CMPIInvocationFlags, Value::uint32(0));
+  if (!context.entries.find(CMPIInvocationFlags)) {
+    context.entries.set(CMPIInvocationFlags, Value::uint32(0));
+  }
   if (!context.entries.find(CMPIInitNameSpace)) {
     context.entries.set(CMPIInitNameSpace, Value::string(operation.path.nameSpace));
   }

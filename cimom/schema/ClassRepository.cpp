@@ -4,6 +4,7 @@
 
 #include "cimom/ground/Errors.h"
 #include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom {
 namespace {
@@ -12,45 +13,44 @@ namespace {
   throw ConfigurationError(declaration.own.declaredAt + ": class " + declaration.own.name + " " + what);
 }
 
-/// Adds the qualifiers that a feature takes over from the one that it overrides or inherits.
+// Adds the qualifiers that a feature takes over from the one that it overrides or inherits.
 void inheritQualifiers(Qualifiers& own, const Qualifiers& inherited) {
   for (const Qualifier& qualifier : inherited) {
-    if (qualifier.toSubclass && !findQualifier(own, qualifier.name)) own.push_back(qualifier);
+    if (qualifier.toSubclass && !findQualifier(own, qualifier.name)) {
+      own.push_back(qualifier);
+    }
   }
 }
 
-template <class Feature>
-Feature* findOverridden(std::vector<Feature>& features, const Feature& overriding) {
-  const auto found =
-      std::ranges::find_if(features, [&](const Feature& one) { return sameName(one.name, overriding.name); });
-  return found == features.end() ? nullptr : &*found;
-}
-
-/// Builds the resolved form of a class from its superclass's.
+// Builds the resolved form of a class from its superclass's.
 ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefinition* superclass) {
   ClassDefinition resolved = declaration.own;
   resolved.superclass = superclass;
-  if (!superclass) return resolved;
+  if (!superclass) {
+    return resolved;
+  }
   inheritQualifiers(resolved.qualifiers, superclass->qualifiers);
   resolved.properties = superclass->properties;
   resolved.methods = superclass->methods;
   for (PropertyDeclaration property : declaration.own.properties) {
-    PropertyDeclaration* overridden = findOverridden(resolved.properties, property);
+    PropertyDeclaration* overridden = findNamed(resolved.properties, property.name);
     if (!overridden) {
       resolved.properties.push_back(std::move(property));
       continue;
     }
     if (overridden->type != property.type) {
-      fail(declaration, "makes the " + typeName(overridden->type) + " " + property.name + " of " +
-                            overridden->originClass + " a " + typeName(property.type));
+      fail(declaration, "makes the " + describeType(overridden->type) + " " + property.name + " of " +
+                            overridden->originClass + " a " + describeType(property.type));
     }
     inheritQualifiers(property.qualifiers, overridden->qualifiers);
-    if (property.defaultValue.isNull()) property.defaultValue = overridden->defaultValue;
+    if (property.defaultValue.isNull()) {
+      property.defaultValue = overridden->defaultValue;
+    }
     property.originClass = overridden->originClass;
     *overridden = std::move(property);
   }
   for (MethodDeclaration method : declaration.own.methods) {
-    MethodDeclaration* overridden = findOverridden(resolved.methods, method);
+    MethodDeclaration* overridden = findNamed(resolved.methods, method.name);
     if (!overridden) {
       resolved.methods.push_back(std::move(method));
       continue;
@@ -71,7 +71,9 @@ const ClassDefinition* ClassRepository::find(std::string_view className) const {
 
 std::vector<const ClassDefinition*> ClassRepository::all() const {
   std::vector<const ClassDefinition*> result;
-  for (const auto& [name, definition] : classes_) result.push_back(&definition);
+  for (const auto& [name, definition] : classes_) {
+    result.push_back(&definition);
+  }
   return result;
 }
 
@@ -80,7 +82,9 @@ std::vector<const ClassDefinition*> ClassRepository::subclasses(std::string_view
   for (const auto& [name, definition] : classes_) {
     const bool direct = definition.superclass ? sameName(definition.superclass->name, className) : className.empty();
     const bool below = className.empty() || (definition.superclass && definition.superclass->isA(className));
-    if (deep ? below : direct) result.push_back(&definition);
+    if (deep ? below : direct) {
+      result.push_back(&definition);
+    }
   }
   return result;
 }
@@ -93,16 +97,22 @@ std::vector<std::string> ClassRepository::namespaces() const { return {namespace
 
 void ClassRepository::addNamespace(std::string_view nameSpace) {
   nameSpace = bareNamespace(nameSpace);
-  if (!nameSpace.empty()) namespaces_.emplace(nameSpace);
+  if (!nameSpace.empty()) {
+    namespaces_.emplace(nameSpace);
+  }
 }
 
 void ClassRepository::add(const MofDeclarations& declarations) {
   std::map<std::string_view, const ClassDeclaration*, NameLess> declared;
   for (const ClassDeclaration& declaration : declarations.classes) {
     const ClassDefinition* known = find(declaration.own.name);
-    if (known) fail(declaration, "is there already, declared at " + known->declaredAt);
+    if (known) {
+      fail(declaration, "is there already, declared at " + known->declaredAt);
+    }
     const auto [earlier, isNew] = declared.emplace(declaration.own.name, &declaration);
-    if (!isNew) fail(declaration, "is there already, declared at " + earlier->second->own.declaredAt);
+    if (!isNew) {
+      fail(declaration, "is there already, declared at " + earlier->second->own.declaredAt);
+    }
   }
 
   // The new classes are resolved beside the known ones and join them only when all is well. Map nodes keep their
@@ -117,7 +127,9 @@ void ClassRepository::add(const MofDeclarations& declarations) {
     std::vector<const ClassDeclaration*> pending;
     const ClassDeclaration* next = &declaration;
     while (next && !lookUp(next->own.name)) {
-      if (std::ranges::find(pending, next) != pending.end()) fail(*next, "is its own superclass");
+      if (std::ranges::find(pending, next) != pending.end()) {
+        fail(*next, "is its own superclass");
+      }
       pending.push_back(next);
       const auto superclass = declared.find(next->superclassName);
       if (superclass == declared.end() && !next->superclassName.empty() && !lookUp(next->superclassName)) {
@@ -132,7 +144,9 @@ void ClassRepository::add(const MofDeclarations& declarations) {
     }
   }
   classes_.merge(added);
-  for (const std::string& nameSpace : declarations.namespaces) addNamespace(nameSpace);
+  for (const std::string& nameSpace : declarations.namespaces) {
+    addNamespace(nameSpace);
+  }
 }
 
 }  // namespace Cimom

@@ -1,5 +1,4 @@
-#ifndef CIMOM_SCHEMA_CLASSREPOSITORY_H_
-#define CIMOM_SCHEMA_CLASSREPOSITORY_H_
+#pragma once
 
 #include <map>
 #include <set>
@@ -13,31 +12,31 @@
 
 namespace Cimom {
 
-/// Every class that the object manager knows, resolved: inherited features, keys and defaults in place. Names are
-/// found without regard to case.
-///
-/// Every class is known in every namespace, and a namespace is known when a registration, a `#pragma namespace` or
-/// the loader of a schema names it. That is all that an object manager needs whose instances come from providers
-/// only: where a class has no provider, it has no instances.
+// Every class that the object manager knows, resolved: inherited features, keys and defaults in place. Names are
+// found without regard to case.
+//
+// Every class is known in every namespace, and a namespace is known when a registration, a `#pragma namespace` or
+// the loader of a schema names it. That is all that an object manager needs whose instances come from providers
+// only: where a class has no provider, it has no instances.
 class ClassRepository {
  public:
-  /// The class of that name; null where there is none. The pointer stays good as long as the repository.
+  // The class of that name; null where there is none. The pointer stays good as long as the repository.
   const ClassDefinition* find(std::string_view className) const;
 
-  /// All classes, by name.
+  // All classes, by name.
   std::vector<const ClassDefinition*> all() const;
 
-  /// The direct subclasses, or all below where `deep` says so; an empty name stands for the root of all classes.
+  // The direct subclasses, or all below where `deep` says so; an empty name stands for the root of all classes.
   std::vector<const ClassDefinition*> subclasses(std::string_view className, bool deep) const;
 
   bool hasNamespace(std::string_view nameSpace) const;
-  /// All namespaces, by name.
+  // All namespaces, by name.
   std::vector<std::string> namespaces() const;
   void addNamespace(std::string_view nameSpace);
 
-  /// Adds what was read from MOF; the order of the classes does not matter.
-  /// @throws ConfigurationError for a class that is there already, a superclass that nowhere is, a circle of
-  ///         superclasses or a property that changes the type of the one that it overrides; nothing is added then
+  // Adds what was read from MOF; the order of the classes does not matter.
+  // Throws ConfigurationError for a class that is there already, a superclass that nowhere is, a circle of
+  //         superclasses or a property that changes the type of the one that it overrides; nothing is added then.
   void add(const MofDeclarations& declarations);
 
  private:
@@ -48,5 +47,3 @@ class ClassRepository {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_SCHEMA_CLASSREPOSITORY_H_

@@ -12,8 +12,8 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// The standard qualifiers (DSP0004, 5.6.3) that a subclass does not inherit or that are no booleans written without
-/// a value. A schema need not declare them to use them.
+// The standard qualifiers (DSP0004, 5.6.3) that a subclass does not inherit or that are no booleans written without
+// a value. A schema need not declare them to use them.
 Qualifiers standardQualifiers() {
   const auto restricted = [](const char* name, CMPIType type) { return Qualifier{name, Value::null(type), false}; };
   return {restricted("Abstract", CMPI_boolean), restricted("Deprecated", CMPI_stringA),
@@ -24,9 +24,13 @@ Qualifiers standardQualifiers() {
 std::vector<fs::path> mofFilesUnder(const fs::path& directory) {
   std::vector<fs::path> files;
   for (const auto& entry : fs::recursive_directory_iterator(directory)) {
-    if (entry.is_regular_file() && entry.path().extension() == ".mof") files.push_back(entry.path());
+    if (entry.is_regular_file() && entry.path().extension() == ".mof") {
+      files.push_back(entry.path());
+    }
   }
-  if (files.empty()) throw ConfigurationError(directory.string() + ": there is no *.mof in this directory");
+  if (files.empty()) {
+    throw ConfigurationError(directory.string() + ": there is no *.mof in this directory");
+  }
   std::ranges::sort(files);
   return files;
 }
@@ -39,7 +43,9 @@ MofDeclarations MofReader::readPath(const fs::path& fileOrDirectory) {
   MofDeclarations declarations;
   try {
     if (fs::is_directory(fileOrDirectory)) {
-      for (const fs::path& file : mofFilesUnder(fileOrDirectory)) readFile(file, declarations);
+      for (const fs::path& file : mofFilesUnder(fileOrDirectory)) {
+        readFile(file, declarations);
+      }
     } else {
       readFile(fileOrDirectory, declarations);
     }
@@ -60,9 +66,13 @@ void MofReader::readFile(const fs::path& file, MofDeclarations& declarations) {
   if (fs::is_directory(canonical)) {
     throw fs::filesystem_error("include", file, std::make_error_code(std::errc::is_a_directory));
   }
-  if (!files_.insert(canonical).second) return;
+  if (!files_.insert(canonical).second) {
+    return;
+  }
   std::ifstream stream(canonical, std::ios::binary);
-  if (!stream) throw fs::filesystem_error("open", file, std::make_error_code(std::errc::permission_denied));
+  if (!stream) {
+    throw fs::filesystem_error("open", file, std::make_error_code(std::errc::permission_denied));
+  }
   const std::string text{std::istreambuf_iterator<char>(stream), {}};
   MofParser(*this, declarations, text, file.string(), file.parent_path()).parse();
 }

@@ -1,5 +1,4 @@
-#ifndef CIMOM_SCHEMA_MOF_H_
-#define CIMOM_SCHEMA_MOF_H_
+#pragma once
 
 #include <filesystem>
 #include <set>
@@ -11,31 +10,31 @@
 
 namespace Cimom {
 
-/// A class as the MOF writes it: its own features only, its superclass by name.
+// A class as the MOF writes it: its own features only, its superclass by name.
 struct ClassDeclaration {
   ClassDefinition own;
   std::string superclassName;
 };
 
-/// What a schema in the Managed Object Format (DSP0004, annex A) declares.
+// What a schema in the Managed Object Format (DSP0004, annex A) declares.
 struct MofDeclarations {
   std::vector<ClassDeclaration> classes;
-  std::vector<std::string> namespaces;  ///< of `#pragma namespace`
+  std::vector<std::string> namespaces;  // of `#pragma namespace`
 };
 
-/// Reads classes, qualifier declarations and the pragmas include and namespace; other pragmas mean nothing here.
-/// A qualifier's declaration counts from there on, in later texts and files too. A file is read once, however often
-/// it is named or included.
+// Reads classes, qualifier declarations and the pragmas include and namespace; other pragmas mean nothing here.
+// A qualifier's declaration counts from there on, in later texts and files too. A file is read once, however often
+// it is named or included.
 class MofReader {
  public:
   MofReader();
 
-  /// A file, or every *.mof under a directory in the order of their names.
-  /// @throws ConfigurationError "FILE:LINE: what is wrong"
+  // A file, or every *.mof under a directory in the order of their names.
+  // Throws ConfigurationError "FILE:LINE: what is wrong".
   MofDeclarations readPath(const std::filesystem::path& fileOrDirectory);
 
-  /// @param origin what messages call the text; files that it includes are looked for from the working directory
-  /// @throws ConfigurationError "ORIGIN:LINE: what is wrong"
+  // @param origin what messages call the text; files that it includes are looked for from the working directory.
+  // Throws ConfigurationError "ORIGIN:LINE: what is wrong".
   MofDeclarations readText(std::string_view mof, const std::string& origin);
 
  private:
@@ -43,10 +42,8 @@ class MofReader {
 
   void readFile(const std::filesystem::path& file, MofDeclarations& declarations);
 
-  Qualifiers qualifierTypes_;  ///< the declared qualifiers, with their types, defaults and flavors
+  Qualifiers qualifierTypes_;  // the declared qualifiers, with their types, defaults and flavors
   std::set<std::filesystem::path> files_;
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_SCHEMA_MOF_H_

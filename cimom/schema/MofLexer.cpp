@@ -24,7 +24,7 @@ bool isBlank(char letter) {
   return letter == ' ' || letter == '\t' || letter == '\r' || letter == '\n' || letter == '\f' || letter == '\v';
 }
 
-/// Appends a UTF-16 code unit as UTF-8.
+// Appends a UTF-16 code unit as UTF-8.
 void appendUtf8(std::string& target, unsigned code) {
   if (code < 0x80) {
     target += static_cast<char>(code);
@@ -38,7 +38,7 @@ void appendUtf8(std::string& target, unsigned code) {
   }
 }
 
-/// The code of a text of one UTF-8 character of the basic plane; false where it is none.
+// The code of a text of one UTF-8 character of the basic plane; false where it is none.
 bool singleCharacter(const std::string& text, CMPIChar16& code) {
   const auto byte = [&](std::size_t index) { return static_cast<unsigned char>(text[index]); };
   if (text.size() == 1 && byte(0) < 0x80) {
@@ -55,13 +55,13 @@ bool singleCharacter(const std::string& text, CMPIChar16& code) {
 
 }  // namespace
 
-bool MofToken::isKeyword(std::string_view keyword) const { return kind == Kind::kName && sameName(text, keyword); }
+bool MofToken::isKeyword(std::string_view keyword) const { return kind == Kind::Name && sameName(text, keyword); }
 
 std::string MofToken::describe() const {
   switch (kind) {
-    case Kind::kEnd:
+    case Kind::End:
       return "the end of the text";
-    case Kind::kString:
+    case Kind::String:
       return "the string \"" + text + "\"";
     default:
       return "\"" + text + "\"";
@@ -69,7 +69,9 @@ std::string MofToken::describe() const {
 }
 
 MofLexer::MofLexer(std::string_view text, const std::string& origin) : text_(text), origin_(origin) {
-  if (text_.starts_with("\xEF\xBB\xBF")) text_.remove_prefix(3);
+  if (text_.starts_with("\xEF\xBB\xBF")) {
+    text_.remove_prefix(3);
+  }
 }
 
 void MofLexer::fail(unsigned line, const std::string& what) const {
@@ -83,15 +85,21 @@ char MofLexer::peek(std::size_t ahead) const {
 void MofLexer::skipBlanks() {
   while (!atEnd()) {
     if (isBlank(peek())) {
-      if (peek() == '\n') ++line_;
+      if (peek() == '\n') {
+        ++line_;
+      }
       ++position_;
     } else if (peek() == '/' && peek(1) == '/') {
       position_ = std::min(text_.find('\n', position_), text_.size());
     } else if (peek() == '/' && peek(1) == '*') {
       const unsigned start = line_;
       const std::size_t end = text_.find("*/", position_ + 2);
-      if (end == std::string_view::npos) fail(start, "the comment that begins here does not end");
-      for (; position_ < end + 2; ++position_) line_ += peek() == '\n';
+      if (end == std::string_view::npos) {
+        fail(start, "the comment that begins here does not end");
+      }
+      for (; position_ < end + 2; ++position_) {
+        line_ += peek() == '\n';
+      }
     } else {
       return;
     }
@@ -102,31 +110,37 @@ MofToken MofLexer::next() {
   skipBlanks();
   MofToken token;
   token.line = line_;
-  if (atEnd()) return token;
+  if (atEnd()) {
+    return token;
+  }
   const char first = peek();
   if (isNameStart(first)) {
     const std::size_t start = position_;
-    while (isNamePart(peek())) ++position_;
-    token.kind = Kind::kName;
+    while (isNamePart(peek())) {
+      ++position_;
+    }
+    token.kind = Kind::Name;
     token.text = text_.substr(start, position_ - start);
   } else if (first == '"') {
-    token.kind = Kind::kString;
+    token.kind = Kind::String;
     do {
       token.text += quoted('"');
       skipBlanks();
     } while (peek() == '"');
     token.value = Value::string(token.text);
   } else if (first == '\'') {
-    token.kind = Kind::kCharacter;
+    token.kind = Kind::Character;
     token.text = quoted('\'');
     CMPIChar16 code = 0;
-    if (!singleCharacter(token.text, code)) fail(token.line, "'" + token.text + "' is not one character");
+    if (!singleCharacter(token.text, code)) {
+      fail(token.line, "'" + token.text + "' is not one character");
+    }
     token.value = Value::char16(code);
   } else if (isDigit(first) ||
              ((first == '-' || first == '+' || first == '.') && (isDigit(peek(1)) || peek(1) == '.'))) {
     return number();
   } else if (std::string_view("{}[](),;:=#$").find(first) != std::string_view::npos) {
-    token.kind = Kind::kPunctuation;
+    token.kind = Kind::Punctuation;
     token.text = first;
     ++position_;
   } else {
@@ -153,7 +167,7 @@ std::string MofLexer::quoted(char quote) {
   fail(start, "the text that begins here does not end on its line");
 }
 
-/// Takes the escape sequence that the position is at, up to its last character.
+// Takes the escape sequence that the position is at, up to its last character.
 void MofLexer::escape(std::string& target) {
   constexpr std::string_view letters = "btnfr\"'\\";
   constexpr std::string_view meanings = "\b\t\n\f\r\"'\\";
@@ -174,7 +188,7 @@ void MofLexer::escape(std::string& target) {
   fail(line_, "unknown escape sequence in a text");
 }
 
-/// Decimal, octal (0…), hexadecimal (0x…), binary (…b) and real numbers.
+// Decimal, octal (0…), hexadecimal (0x…), binary (…b) and real numbers.
 MofToken MofLexer::number() {
   const std::size_t start = position_;
   while (isNamePart(peek()) || peek() == '.' ||
@@ -183,13 +197,15 @@ MofToken MofLexer::number() {
     ++position_;
   }
   MofToken token;
-  token.kind = Kind::kInteger;
+  token.kind = Kind::Integer;
   token.line = line_;
   token.text = text_.substr(start, position_ - start);
 
   std::string_view digits = token.text;
   const bool negative = digits.starts_with('-');
-  if (negative || digits.starts_with('+')) digits.remove_prefix(1);
+  if (negative || digits.starts_with('+')) {
+    digits.remove_prefix(1);
+  }
   int base = 10;
   if (digits.size() > 2 && digits[0] == '0' && lowerCase(digits[1]) == 'x') {
     base = 16;
@@ -200,8 +216,10 @@ MofToken MofLexer::number() {
   } else if (digits.find_first_of(".eE") != std::string_view::npos) {
     double real = 0;
     const auto [end, error] = std::from_chars(digits.data(), digits.data() + digits.size(), real);
-    if (error != std::errc() || end != digits.data() + digits.size()) fail(line_, token.describe() + " is no number");
-    token.kind = Kind::kReal;
+    if (error != std::errc() || end != digits.data() + digits.size()) {
+      fail(line_, token.describe() + " is no number");
+    }
+    token.kind = Kind::Real;
     token.value = Value::real64(negative ? -real : real);
     return token;
   } else if (digits.size() > 1 && digits[0] == '0') {

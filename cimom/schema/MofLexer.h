@@ -1,5 +1,4 @@
-#ifndef CIMOM_SCHEMA_MOFLEXER_H_
-#define CIMOM_SCHEMA_MOFLEXER_H_
+#pragma once
 
 #include <string>
 #include <string_view>
@@ -8,30 +7,30 @@
 
 namespace Cimom {
 
-/// What MOF texts are made of.
+// What MOF texts are made of.
 struct MofToken {
-  enum class Kind { kEnd, kName, kString, kInteger, kReal, kCharacter, kPunctuation };
+  enum class Kind { End, Name, String, Integer, Real, Character, Punctuation };
 
-  Kind kind = Kind::kEnd;
-  std::string text;  ///< a name or punctuation as written, a string without its quotes and escapes
-  Value value;       ///< of a string (CMPI_string), a number (CMPI_uint64, CMPI_sint64, CMPI_real64) or a character
+  Kind kind = Kind::End;
+  std::string text;  // a name or punctuation as written, a string without its quotes and escapes
+  Value value;       // of a string (CMPI_string), a number (CMPI_uint64, CMPI_sint64, CMPI_real64) or a character
   unsigned line = 0;
 
-  bool is(std::string_view punctuation) const { return kind == Kind::kPunctuation && text == punctuation; }
-  /// Keywords are found without regard to case.
+  bool is(std::string_view punctuation) const { return kind == Kind::Punctuation && text == punctuation; }
+  // Keywords are found without regard to case.
   bool isKeyword(std::string_view keyword) const;
-  /// The token as a message names it.
+  // The token as a message names it.
   std::string describe() const;
 };
 
-/// Cuts a MOF text into tokens. Comments and blanks are passed over, adjacent strings are one.
+// Cuts a MOF text into tokens. Comments and blanks are passed over, adjacent strings are one.
 class MofLexer {
  public:
-  /// Both must outlive the lexer.
+  // Both must outlive the lexer.
   MofLexer(std::string_view text, const std::string& origin);
 
-  /// The next token; kEnd for ever after the last.
-  /// @throws ConfigurationError "ORIGIN:LINE: what is wrong"
+  // The next token; End for ever after the last.
+  // Throws ConfigurationError "ORIGIN:LINE: what is wrong".
   MofToken next();
 
   [[noreturn]] void fail(unsigned line, const std::string& what) const;
@@ -51,5 +50,3 @@ class MofLexer {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_SCHEMA_MOFLEXER_H_

@@ -2,24 +2,14 @@
 
 #include <algorithm>
 
-#include "cimom/broker/Array.h"
-#include "cimom/broker/StatusError.h"
+#include "cimom/ground/Errors.h"
 #include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom {
 namespace {
 
 using Kind = MofToken::Kind;
-
-constexpr CMPIType kTypes[] = {CMPI_boolean, CMPI_char16, CMPI_real32, CMPI_real64,  CMPI_uint8,
-                               CMPI_uint16,  CMPI_uint32, CMPI_uint64, CMPI_sint8,   CMPI_sint16,
-                               CMPI_sint32,  CMPI_sint64, CMPI_string, CMPI_dateTime};
-
-/// The type of that MOF name; CMPI_null where there is none.
-CMPIType typeNamed(const MofToken& token) {
-  const auto found = std::ranges::find_if(kTypes, [&](CMPIType type) { return token.isKeyword(typeName(type)); });
-  return found == std::end(kTypes) ? CMPIType(CMPI_null) : *found;
-}
 
 }  // namespace
 
@@ -33,20 +23,32 @@ MofParser::MofParser(MofReader& reader, MofDeclarations& declarations, std::stri
 
 void MofParser::parse() {
   advance();
-  while (token_.kind != Kind::kEnd) production();
+  while (token_.kind != Kind::End) {
+    production();
+  }
 }
 
 void MofParser::production() {
-  if (accept("#")) return pragma();
-  if (acceptKeyword("Qualifier")) return qualifierDeclaration();
+  if (accept("#")) {
+    return pragma();
+  }
+  if (acceptKeyword("Qualifier")) {
+    return qualifierDeclaration();
+  }
   Qualifiers qualifiers = qualifierList();
-  if (acceptKeyword("class")) return classDeclaration(std::move(qualifiers));
-  if (token_.isKeyword("instance")) fail("instances are not supported: they come from providers");
+  if (acceptKeyword("class")) {
+    return classDeclaration(std::move(qualifiers));
+  }
+  if (token_.isKeyword("instance")) {
+    fail("instances are not supported: they come from providers");
+  }
   unexpected("a class, a qualifier declaration or a pragma");
 }
 
 void MofParser::pragma() {
-  if (!acceptKeyword("pragma")) unexpected("\"pragma\"");
+  if (!acceptKeyword("pragma")) {
+    unexpected("\"pragma\"");
+  }
   const std::string name = expectName("the pragma's name");
   expect("(");
   const std::string argument = expectString("the pragma's argument");
@@ -66,7 +68,7 @@ void MofParser::include(const std::string& file) {
   }
 }
 
-/// Qualifier NAME : TYPE [= VALUE], Scope(…) [, Flavor(…)];
+// Qualifier NAME : TYPE [= VALUE], Scope(…) [, Flavor(…)];
 void MofParser::qualifierDeclaration() {
   Qualifier declared;
   declared.name = expectName("the qualifier's name");
@@ -77,7 +79,9 @@ void MofParser::qualifierDeclaration() {
   declared.value = accept("=") ? initializer(value.type) : Value::null(value.type);
   while (accept(",")) {
     const bool flavor = token_.isKeyword("Flavor");
-    if (!flavor && !token_.isKeyword("Scope")) unexpected("\"Scope\" or \"Flavor\"");
+    if (!flavor && !token_.isKeyword("Scope")) {
+      unexpected("\"Scope\" or \"Flavor\"");
+    }
     advance();
     expect("(");
     if (flavor) {
@@ -97,22 +101,28 @@ void MofParser::qualifierDeclaration() {
 
 Qualifiers MofParser::qualifierList() {
   Qualifiers qualifiers;
-  if (!accept("[")) return qualifiers;
+  if (!accept("[")) {
+    return qualifiers;
+  }
   do {
     Qualifier one = qualifier();
-    if (findQualifier(qualifiers, one.name)) fail("the qualifier " + one.name + " is there twice");
+    if (findQualifier(qualifiers, one.name)) {
+      fail("the qualifier " + one.name + " is there twice");
+    }
     qualifiers.push_back(std::move(one));
   } while (accept(","));
   expect("]");
   return qualifiers;
 }
 
-/// NAME [(VALUE) | {VALUES}] [: FLAVORS]; without a value a boolean qualifier is true, another has its default.
+// NAME [(VALUE) | {VALUES}] [: FLAVORS]; without a value a boolean qualifier is true, another has its default.
 Qualifier MofParser::qualifier() {
   Qualifier result;
   result.name = expectName("a qualifier's name");
   const Qualifier* declared = findQualifier(reader_.qualifierTypes_, result.name);
-  if (declared) result = *declared;
+  if (declared) {
+    result = *declared;
+  }
   if (token_.is("{")) {
     result.value = initializer(declared ? declared->value.type() : CMPIType(CMPI_ARRAY));
   } else if (accept("(")) {
@@ -121,11 +131,13 @@ Qualifier MofParser::qualifier() {
   } else if (!declared || declared->value.type() == CMPI_boolean) {
     result.value = Value::boolean(true);
   }
-  if (accept(":")) flavors(result, ",]");
+  if (accept(":")) {
+    flavors(result, ",]");
+  }
   return result;
 }
 
-/// Flavors up to one of the closing marks; in a list of qualifiers blanks divide them, in a declaration commas.
+// Flavors up to one of the closing marks; in a list of qualifiers blanks divide them, in a declaration commas.
 void MofParser::flavors(Qualifier& target, std::string_view closing) {
   do {
     if (acceptKeyword("EnableOverride")) {
@@ -141,8 +153,10 @@ void MofParser::flavors(Qualifier& target, std::string_view closing) {
     } else {
       unexpected("a flavor");
     }
-    if (closing == ")") accept(",");
-  } while (token_.kind == Kind::kName);
+    if (closing == ")") {
+      accept(",");
+    }
+  } while (token_.kind == Kind::Name);
 }
 
 void MofParser::classDeclaration(Qualifiers qualifiers) {
@@ -151,15 +165,21 @@ void MofParser::classDeclaration(Qualifiers qualifiers) {
   own.declaredAt = origin_ + ":" + std::to_string(token_.line);
   own.name = expectName("the class's name");
   own.qualifiers = std::move(qualifiers);
-  if (token_.is("$") || token_.isKeyword("as")) fail("aliases of classes are not supported");
-  if (accept(":")) declaration.superclassName = expectName("the superclass's name");
+  if (token_.is("$") || token_.isKeyword("as")) {
+    fail("aliases of classes are not supported");
+  }
+  if (accept(":")) {
+    declaration.superclassName = expectName("the superclass's name");
+  }
   expect("{");
-  while (!accept("}")) feature(own);
+  while (!accept("}")) {
+    feature(own);
+  }
   expect(";");
   declarations_.classes.push_back(std::move(declaration));
 }
 
-/// [QUALIFIERS] TYPE NAME [ARRAY] [= DEFAULT]; or [QUALIFIERS] TYPE NAME (PARAMETERS);
+// [QUALIFIERS] TYPE NAME [ARRAY] [= DEFAULT]; or [QUALIFIERS] TYPE NAME (PARAMETERS);
 void MofParser::feature(ClassDefinition& definition) {
   PropertyDeclaration property;
   property.qualifiers = qualifierList();
@@ -169,7 +189,9 @@ void MofParser::feature(ClassDefinition& definition) {
   if (definition.findProperty(property.name) || definition.findMethod(property.name)) {
     fail(definition.name + "." + property.name + " is there twice");
   }
-  if (token_.is("(")) return method(definition, property.name, property.type, std::move(property.qualifiers));
+  if (token_.is("(")) {
+    return method(definition, property.name, property.type, std::move(property.qualifiers));
+  }
   arrayBounds(property);
   property.defaultValue = accept("=") ? initializer(property.type) : Value::null(property.type);
   expect(";");
@@ -199,32 +221,44 @@ PropertyDeclaration MofParser::parameter() {
   return declaration;
 }
 
-/// A type's name, or a class's name with REF.
+// A type's name, or a class's name with REF.
 void MofParser::type(PropertyDeclaration& target) {
-  target.type = typeNamed(token_);
-  if (target.type != CMPI_null) return advance();
+  target.type = token_.kind == Kind::Name ? typeOfMofName(token_.text) : CMPIType(CMPI_null);
+  if (target.type != CMPI_null) {
+    return advance();
+  }
   target.referenceClass = expectName("a type");
-  if (!acceptKeyword("ref")) unexpected("a known type, or \"REF\" after " + target.referenceClass);
+  if (!acceptKeyword("ref")) {
+    unexpected("a known type, or \"REF\" after " + target.referenceClass);
+  }
   target.type = CMPI_ref;
 }
 
 void MofParser::arrayBounds(PropertyDeclaration& target) {
-  if (!accept("[")) return;
-  if (token_.kind == Kind::kInteger) {
+  if (!accept("[")) {
+    return;
+  }
+  if (token_.kind == Kind::Integer) {
     const auto size = token_.value.asInteger(CMPI_uint32);
-    if (!size) fail("an array of " + token_.text + " elements is too large");
-    target.arraySize = size->toCmpi().value.uint32;
+    if (!size) {
+      fail("an array of " + token_.text + " elements is too large");
+    }
+    target.arraySize = size->scalar()->uint32;
     advance();
   }
   expect("]");
-  target.type = static_cast<CMPIType>(target.type | CMPI_ARRAY);
+  target.type = arrayOf(target.type);
 }
 
-/// A constant, or for an array constants in braces.
+// A constant, or for an array constants in braces.
 Value MofParser::initializer(CMPIType type) {
-  if (!(type & CMPI_ARRAY)) return constant(type);
-  if (acceptKeyword("null")) return Value::null(type);
-  const auto elementType = static_cast<CMPIType>(type & ~CMPI_ARRAY);
+  if (!isArray(type)) {
+    return constant(type);
+  }
+  if (acceptKeyword("null")) {
+    return Value::null(type);
+  }
+  const CMPIType elementType = elementTypeOf(type);
   Array array{elementType, {}};
   expect("{");
   if (!token_.is("}")) {
@@ -239,19 +273,19 @@ Value MofParser::initializer(CMPIType type) {
   return Value::array(std::move(array));
 }
 
-/// A constant of a type; of the type that its writing shows where none is given.
+// A constant of a type; of the type that its writing shows where none is given.
 Value MofParser::constant(CMPIType type) {
   std::optional<Value> result;
   if (token_.isKeyword("null")) {
     result = Value::null(type);
   } else if (token_.isKeyword("true") || token_.isKeyword("false")) {
     result = Value::boolean(token_.isKeyword("true"));
-  } else if (token_.kind != Kind::kName && token_.kind != Kind::kPunctuation && token_.kind != Kind::kEnd) {
+  } else if (token_.kind != Kind::Name && token_.kind != Kind::Punctuation && token_.kind != Kind::End) {
     result = token_.value;
   } else {
     unexpected("a value");
   }
-  if (type == CMPI_dateTime && token_.kind == Kind::kString) {
+  if (type == CMPI_dateTime && token_.kind == Kind::String) {
     try {
       result = Value::dateTime(DateTime::parse(token_.text));
     } catch (const StatusError& error) {
@@ -260,7 +294,9 @@ Value MofParser::constant(CMPIType type) {
   } else if (type != CMPI_null) {
     result = result->as(type);
   }
-  if (!result) fail(token_.describe() + " is no " + typeName(type));
+  if (!result) {
+    fail(token_.describe() + " is no " + describeType(type));
+  }
   advance();
   return *std::move(result);
 }
@@ -269,29 +305,39 @@ void MofParser::advance() { token_ = lexer_.next(); }
 
 bool MofParser::accept(std::string_view punctuation) {
   const bool there = token_.is(punctuation);
-  if (there) advance();
+  if (there) {
+    advance();
+  }
   return there;
 }
 
 bool MofParser::acceptKeyword(std::string_view keyword) {
   const bool there = token_.isKeyword(keyword);
-  if (there) advance();
+  if (there) {
+    advance();
+  }
   return there;
 }
 
 void MofParser::expect(std::string_view punctuation) {
-  if (!accept(punctuation)) unexpected("\"" + std::string(punctuation) + "\"");
+  if (!accept(punctuation)) {
+    unexpected("\"" + std::string(punctuation) + "\"");
+  }
 }
 
 std::string MofParser::expectName(const char* what) {
-  if (token_.kind != Kind::kName) unexpected(what);
+  if (token_.kind != Kind::Name) {
+    unexpected(what);
+  }
   std::string name = std::move(token_.text);
   advance();
   return name;
 }
 
 std::string MofParser::expectString(const char* what) {
-  if (token_.kind != Kind::kString) unexpected(std::string(what) + " in quotes");
+  if (token_.kind != Kind::String) {
+    unexpected(std::string(what) + " in quotes");
+  }
   std::string text = std::move(token_.text);
   advance();
   return text;

@@ -1,5 +1,4 @@
-#ifndef CIMOM_SCHEMA_MOFPARSER_H_
-#define CIMOM_SCHEMA_MOFPARSER_H_
+#pragma once
 
 #include <filesystem>
 #include <string>
@@ -10,14 +9,14 @@
 
 namespace Cimom {
 
-/// Parses one MOF text by recursive descent; the grammar is that of DSP0004, annex A, without instances.
+// Parses one MOF text by recursive descent; the grammar is that of DSP0004, annex A, without instances.
 class MofParser {
  public:
-  /// @param directory where the text's relative includes are
+  // @param directory where the text's relative includes are
   MofParser(MofReader& reader, MofDeclarations& declarations, std::string_view mof, std::string origin,
             std::filesystem::path directory);
 
-  /// @throws ConfigurationError "ORIGIN:LINE: what is wrong"
+  // Throws ConfigurationError "ORIGIN:LINE: what is wrong".
   void parse();
 
  private:
@@ -55,5 +54,3 @@ class MofParser {
 };
 
 }  // namespace Cimom
-
-#endif  // CIMOM_SCHEMA_MOFPARSER_H_

@@ -1,21 +1,23 @@
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
-class InstanceObject : public BrokerFixture {
+using namespace Cimom;
+using namespace Testing;
+
+class InstanceTest : public BrokerFixture {
  protected:
   std::string caption(const CMPIInstance* instance) {
-    return textOf(CMGetProperty(instance, "Caption", nullptr).value.string);
+    return shownText(CMGetProperty(instance, "Caption", nullptr).value.string);
   }
 };
 
-TEST_F(InstanceObject, CannotBeMadeOfAnUnknownClass) {
+TEST_F(InstanceTest, CannotBeMadeOfAnUnknownClass) {
   EXPECT_EQ(CMNewInstance(broker, path("TST_Nothing"), &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
 }
 
-TEST_F(InstanceObject, ShowsTheClassesDefaultsAndInheritedProperties) {
+TEST_F(InstanceTest, ShowsTheClassesDefaultsAndInheritedProperties) {
   const CMPIInstance* instance = CMNewInstance(broker, path("TST_Processor"), &status);
 
   EXPECT_EQ(CMGetPropertyCount(instance, nullptr), 13u);
@@ -25,28 +27,28 @@ TEST_F(InstanceObject, ShowsTheClassesDefaultsAndInheritedProperties) {
   EXPECT_EQ(state.value.uint16, 5);
 }
 
-TEST_F(InstanceObject, ListsItsPropertiesWithTheSchemasSpelling) {
+TEST_F(InstanceTest, ListsItsPropertiesWithTheSchemasSpelling) {
   const CMPIInstance* instance = CMNewInstance(broker, path("tst_processor"), nullptr);
   CMPIString* name = nullptr;
 
   const CMPIData last = CMGetPropertyAt(instance, 12, &name, &status);
 
   EXPECT_EQ(status.rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(name), "Vendor");
-  EXPECT_EQ(textOf(last.value.string), "nobody");
+  EXPECT_EQ(shownText(name), "Vendor");
+  EXPECT_EQ(shownText(last.value.string), "nobody");
   CMGetPropertyAt(instance, 13, &name, &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 }
 
-TEST_F(InstanceObject, ReadsCharsBackAsAString) {
+TEST_F(InstanceTest, ReadsCharsBackAsAString) {
   CMPIInstance* instance = system("one");
   EXPECT_EQ(CMSetProperty(instance, "caption", "text", CMPI_chars).rc, CMPI_RC_OK);
   const CMPIData data = CMGetProperty(instance, "CAPTION", &status);
   EXPECT_EQ(data.type, CMPI_string);
-  EXPECT_EQ(textOf(data.value.string), "text");
+  EXPECT_EQ(shownText(data.value.string), "text");
 }
 
-TEST_F(InstanceObject, HoldsAValueOfEveryType) {
+TEST_F(InstanceTest, HoldsAValueOfEveryType) {
   CMPIInstance* instance = system("one");
   const CMPIUint8 small = 255;
   const CMPIUint64 large = 0xFFFFFFFFFFFFFFFF;
@@ -71,13 +73,13 @@ TEST_F(InstanceObject, HoldsAValueOfEveryType) {
   EXPECT_EQ(CMGetProperty(instance, "Ready", nullptr).value.boolean, ready);
   EXPECT_EQ(CMGetProperty(instance, "Load", nullptr).value.real64, load);
   const CMPIData time = CMGetProperty(instance, "Installed", nullptr);
-  EXPECT_EQ(textOf(CMGetStringFormat(time.value.dateTime, nullptr)), "20240229120000.000000+060");
+  EXPECT_EQ(shownText(CMGetStringFormat(time.value.dateTime, nullptr)), "20240229120000.000000+060");
   const CMPIData array = CMGetProperty(instance, "Notes", nullptr);
   EXPECT_EQ(array.type, CMPI_stringA);
-  EXPECT_EQ(textOf(CMGetArrayElementAt(array.value.array, 0, nullptr).value.string), "note");
+  EXPECT_EQ(shownText(CMGetArrayElementAt(array.value.array, 0, nullptr).value.string), "note");
 }
 
-TEST_F(InstanceObject, DropsAnUndeclaredPropertyAndRefusesToReadIt) {
+TEST_F(InstanceTest, DropsAnUndeclaredPropertyAndRefusesToReadIt) {
   CMPIInstance* instance = system("one");
   EXPECT_EQ(CMSetProperty(instance, "Undeclared", "x", CMPI_chars).rc, CMPI_RC_OK);
   const CMPIData data = CMGetProperty(instance, "Undeclared", &status);
@@ -85,7 +87,7 @@ TEST_F(InstanceObject, DropsAnUndeclaredPropertyAndRefusesToReadIt) {
   EXPECT_TRUE(CMIsNullValue(data));
 }
 
-TEST_F(InstanceObject, RefusesAValueOfTheWrongTypeAndKeepsTheOldOne) {
+TEST_F(InstanceTest, RefusesAValueOfTheWrongTypeAndKeepsTheOldOne) {
   CMPIInstance* instance = system("one");
   const CMPIUint32 wide = 3;
   EXPECT_EQ(CMSetProperty(instance, "EnabledState", &wide, CMPI_uint32).rc, CMPI_RC_ERR_INVALID_DATA_TYPE);
@@ -94,7 +96,7 @@ TEST_F(InstanceObject, RefusesAValueOfTheWrongTypeAndKeepsTheOldOne) {
   EXPECT_EQ(caption(instance), "none");
 }
 
-TEST_F(InstanceObject, TakesANullForAnyProperty) {
+TEST_F(InstanceTest, TakesANullForAnyProperty) {
   CMPIInstance* instance = system("one");
   CMPIString* nothing = nullptr;
   EXPECT_EQ(CMSetProperty(instance, "Caption", nullptr, CMPI_chars).rc, CMPI_RC_OK);
@@ -107,11 +109,11 @@ TEST_F(InstanceObject, TakesANullForAnyProperty) {
   EXPECT_TRUE(CMIsNullValue(CMGetProperty(instance, "Small", nullptr))) << "declared, but never set";
 }
 
-TEST_F(InstanceObject, DerivesItsKeysFromTheCurrentValues) {
+TEST_F(InstanceTest, DerivesItsKeysFromTheCurrentValues) {
   CMPIInstance* instance = CMNewInstance(broker, path("TST_Processor"), nullptr);
   const auto shown = [&] {
     const CMPIObjectPath* current = CMGetObjectPath(instance, nullptr);
-    return textOf(CMObjectPathToString(current, nullptr));
+    return shownText(CMObjectPathToString(current, nullptr));
   };
   EXPECT_EQ(shown(), "root/test:TST_Processor") << "null keys are left out";
   CMSetProperty(instance, "Name", "one", CMPI_chars);
@@ -121,24 +123,24 @@ TEST_F(InstanceObject, DerivesItsKeysFromTheCurrentValues) {
   EXPECT_EQ(shown(), "root/test:TST_Processor.CreationClassName=\"C\",Name=\"two\"");
 }
 
-TEST_F(InstanceObject, KeepsTheKeysThatItsPathCameWith) {
+TEST_F(InstanceTest, KeepsTheKeysThatItsPathCameWith) {
   CMPIInstance* instance = system("one");
-  EXPECT_EQ(textOf(CMGetProperty(instance, "Name", nullptr).value.string), "one");
+  EXPECT_EQ(shownText(CMGetProperty(instance, "Name", nullptr).value.string), "one");
   CMSetProperty(instance, "Name", "two", CMPI_chars);
   const CMPIObjectPath* kept = CMGetObjectPath(instance, nullptr);
-  EXPECT_EQ(textOf(CMGetKey(kept, "Name", nullptr).value.string), "one");
+  EXPECT_EQ(shownText(CMGetKey(kept, "Name", nullptr).value.string), "one");
 }
 
-TEST_F(InstanceObject, FillsAKeyThatItsPathHasAsNull) {
+TEST_F(InstanceTest, FillsAKeyThatItsPathHasAsNull) {
   CMPIObjectPath* open = path("TST_Processor");
   CMAddKey(open, "Name", nullptr, CMPI_string);
   CMPIInstance* instance = CMNewInstance(broker, open, nullptr);
   CMSetProperty(instance, "Name", "one", CMPI_chars);
   const CMPIObjectPath* filled = CMGetObjectPath(instance, nullptr);
-  EXPECT_EQ(textOf(CMObjectPathToString(filled, nullptr)), "root/test:TST_Processor.Name=\"one\"");
+  EXPECT_EQ(shownText(CMObjectPathToString(filled, nullptr)), "root/test:TST_Processor.Name=\"one\"");
 }
 
-TEST_F(InstanceObject, TakesANumericKeyOfAnotherWidth) {
+TEST_F(InstanceTest, TakesANumericKeyOfAnotherWidth) {
   CMPIObjectPath* point = path("TST_Point");
   const CMPISint64 number = 4;
   CMAddKey(point, "Number", &number, CMPI_keyInteger);
@@ -149,7 +151,7 @@ TEST_F(InstanceObject, TakesANumericKeyOfAnotherWidth) {
   EXPECT_TRUE(CMIsKeyValue(data));
 }
 
-TEST_F(InstanceObject, KeepsOutWhatItsFilterDoesNotName) {
+TEST_F(InstanceTest, KeepsOutWhatItsFilterDoesNotName) {
   CMPIInstance* instance = CMNewInstance(broker, path("TST_Processor"), nullptr);
   const char* properties[] = {"vendor", nullptr};
   const char* keys[] = {"Name", nullptr};
@@ -160,25 +162,25 @@ TEST_F(InstanceObject, KeepsOutWhatItsFilterDoesNotName) {
   CMSetProperty(instance, "Name", "one", CMPI_chars);
 
   EXPECT_EQ(caption(instance), "none");
-  EXPECT_EQ(textOf(CMGetProperty(instance, "Vendor", nullptr).value.string), "kept");
-  EXPECT_EQ(textOf(CMGetProperty(instance, "Name", nullptr).value.string), "one");
+  EXPECT_EQ(shownText(CMGetProperty(instance, "Vendor", nullptr).value.string), "kept");
+  EXPECT_EQ(shownText(CMGetProperty(instance, "Name", nullptr).value.string), "one");
 }
 
-TEST_F(InstanceObject, ANullFilterHasNoEffect) {
+TEST_F(InstanceTest, ANullFilterHasNoEffect) {
   CMPIInstance* instance = system("one");
   EXPECT_EQ(CMSetPropertyFilter(instance, nullptr, nullptr).rc, CMPI_RC_OK);
   CMSetProperty(instance, "Caption", "set", CMPI_chars);
   EXPECT_EQ(caption(instance), "set");
 }
 
-TEST_F(InstanceObject, TakesAnotherPathOfItsClassOnly) {
+TEST_F(InstanceTest, TakesAnotherPathOfItsClassOnly) {
   CMPIInstance* instance = system("one");
   EXPECT_EQ(CMSetObjectPath(instance, systemPath("two")).rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(CMGetProperty(instance, "Name", nullptr).value.string), "two");
+  EXPECT_EQ(shownText(CMGetProperty(instance, "Name", nullptr).value.string), "two");
   EXPECT_EQ(CMSetObjectPath(instance, systemPath("two", "TST_Other")).rc, CMPI_RC_ERR_INVALID_PARAMETER);
 }
 
-TEST_F(InstanceObject, AClonedInstanceIsAnother) {
+TEST_F(InstanceTest, AClonedInstanceIsAnother) {
   CMPIInstance* instance = system("one");
   CMPIInstance* copy = CMClone(instance, &status);
   CMSetProperty(instance, "Caption", "changed", CMPI_chars);
@@ -188,14 +190,13 @@ TEST_F(InstanceObject, AClonedInstanceIsAnother) {
   EXPECT_EQ(CMRelease(copy).rc, CMPI_RC_OK);
 }
 
-TEST_F(InstanceObject, HoldsACopyOfAReferenceAndOfAnArray) {
+TEST_F(InstanceTest, HoldsACopyOfAReferenceAndOfAnArray) {
   CMPIObjectPath* antecedent = systemPath("one");
   CMPIInstance* association = CMNewInstance(broker, path("TST_Hosted"), nullptr);
   CMSetProperty(association, "Antecedent", &antecedent, CMPI_ref);
   CMSetNameSpace(antecedent, "root/elsewhere");
   const CMPIObjectPath* held = CMGetProperty(association, "Antecedent", nullptr).value.ref;
-  EXPECT_EQ(textOf(CMGetNameSpace(held, nullptr)), kNamespace);
+  EXPECT_EQ(shownText(CMGetNameSpace(held, nullptr)), testNamespace);
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -4,20 +4,22 @@
 #include "cimom/broker/Handle.h"
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
-class NullArguments : public BrokerFixture {
+using namespace Cimom;
+using namespace Testing;
+
+class NullArgumentsTest : public BrokerFixture {
  protected:
-  /// A slot that reports through its result.
+  // A slot that reports through its result.
   void refused(const char* slot, const CMPIStatus& outcome) {
     EXPECT_TRUE(outcome.rc == CMPI_RC_ERR_INVALID_HANDLE || outcome.rc == CMPI_RC_ERR_INVALID_PARAMETER)
         << slot << ": " << outcome.rc;
   }
 
-  /// A slot that reports through a status pointer: called with one and with a null one.
+  // A slot that reports through a status pointer: called with one and with a null one.
   void refused(const char* slot, const std::function<void(CMPIStatus*)>& call) {
-    CMPIStatus outcome = kOk;
+    CMPIStatus outcome = ok;
     call(&outcome);
     refused(slot, outcome);
     call(nullptr);
@@ -31,7 +33,7 @@ class NullArguments : public BrokerFixture {
 #define REFUSED(CALL) refused(#CALL, CALL)
 #define REFUSED_BY_STATUS(CALL) refused(#CALL, [&](CMPIStatus* st) { CALL; })
 
-TEST_F(NullArguments, InTheInstanceTable) {
+TEST_F(NullArgumentsTest, InTheInstanceTable) {
   const auto& ft = Abi<Instance>::table;
   for (CMPIInstance* none : {static_cast<CMPIInstance*>(nullptr), &emptyInstance}) {
     REFUSED(ft.release(none));
@@ -50,11 +52,11 @@ TEST_F(NullArguments, InTheInstanceTable) {
   REFUSED(ft.setProperty(instance, nullptr, nullptr, CMPI_string));
   REFUSED(ft.setObjectPath(instance, nullptr));
   REFUSED(ft.setObjectPath(instance, &emptyPath));
-  EXPECT_EQ(textOf(CMGetProperty(instance, "Name", nullptr).value.string), "one");
+  EXPECT_EQ(shownText(CMGetProperty(instance, "Name", nullptr).value.string), "one");
   CMGetPropertyAt(instance, 0, nullptr, nullptr);
 }
 
-TEST_F(NullArguments, InTheObjectPathTable) {
+TEST_F(NullArgumentsTest, InTheObjectPathTable) {
   const auto& ft = Abi<ObjectPath>::table;
   for (CMPIObjectPath* none : {static_cast<CMPIObjectPath*>(nullptr), &emptyPath}) {
     REFUSED(ft.release(none));
@@ -91,8 +93,8 @@ TEST_F(NullArguments, InTheObjectPathTable) {
   REFUSED_BY_STATUS(ft.getParameterQualifier(path, "Reset", nullptr, nullptr, st));
 }
 
-TEST_F(NullArguments, InTheTablesOfTheSmallerObjects) {
-  const auto objects = [&]<class Model>(Model*) {
+TEST_F(NullArgumentsTest, InTheTablesOfTheSmallerObjects) {
+  const auto objects = [&]<typename Model>(Model*) {
     const auto& ft = Abi<Model>::table;
     REFUSED(ft.release(nullptr));
     REFUSED_BY_STATUS(ft.clone(nullptr, st));
@@ -137,7 +139,7 @@ TEST_F(NullArguments, InTheTablesOfTheSmallerObjects) {
   REFUSED(Abi<Result>::table.returnError(nullptr, nullptr));
 }
 
-TEST_F(NullArguments, InTheErrorTable) {
+TEST_F(NullArgumentsTest, InTheErrorTable) {
   const auto& ft = Abi<Error>::table;
   REFUSED_BY_STATUS(ft.getErrorType(nullptr, st));
   REFUSED_BY_STATUS(ft.getOtherErrorType(nullptr, st));
@@ -169,7 +171,7 @@ TEST_F(NullArguments, InTheErrorTable) {
   }
 }
 
-TEST_F(NullArguments, InTheEncapsulationTable) {
+TEST_F(NullArgumentsTest, InTheEncapsulationTable) {
   const auto& eft = *broker->eft;
   const CMPIBroker emptyBroker = {nullptr, broker->bft, broker->eft, broker->xft, broker->mft};
   for (const CMPIBroker* none : {static_cast<const CMPIBroker*>(nullptr), &emptyBroker}) {
@@ -215,7 +217,7 @@ TEST_F(NullArguments, InTheEncapsulationTable) {
   EXPECT_NE(eft.newObjectPath(broker, nullptr, "Class", nullptr), nullptr) << "a path need not have a namespace";
 }
 
-TEST_F(NullArguments, InTheUpCallTable) {
+TEST_F(NullArgumentsTest, InTheUpCallTable) {
   const auto& bft = *broker->bft;
   CMPIObjectPath* path = systemPath("one");
   CMPIInstance* instance = system("one");
@@ -257,7 +259,7 @@ TEST_F(NullArguments, InTheUpCallTable) {
   EXPECT_EQ(bft.prepareAttachThread(broker, nullptr), nullptr);
 }
 
-TEST_F(NullArguments, InTheMemoryTable) {
+TEST_F(NullArgumentsTest, InTheMemoryTable) {
   const auto& mft = *broker->mft;
   REFUSED_BY_STATUS(mft.mark(nullptr, st));
   REFUSED(mft.release(broker, nullptr));
@@ -272,4 +274,3 @@ TEST_F(NullArguments, InTheMemoryTable) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

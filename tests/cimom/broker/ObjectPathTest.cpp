@@ -1,31 +1,33 @@
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
-class PathObject : public BrokerFixture {};
+using namespace Cimom;
+using namespace Testing;
 
-TEST_F(PathObject, MayBeOfAClassThatNobodyKnows) {
+class ObjectPathTest : public BrokerFixture {};
+
+TEST_F(ObjectPathTest, MayBeOfAClassThatNobodyKnows) {
   const CMPIObjectPath* unknown = CMNewObjectPath(broker, "root/far", "Far_Class", &status);
   EXPECT_EQ(status.rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(CMGetClassName(unknown, nullptr)), "Far_Class");
-  EXPECT_EQ(textOf(CMGetNameSpace(unknown, nullptr)), "root/far");
-  EXPECT_EQ(textOf(CMGetHostname(unknown, &status)), "");
+  EXPECT_EQ(shownText(CMGetClassName(unknown, nullptr)), "Far_Class");
+  EXPECT_EQ(shownText(CMGetNameSpace(unknown, nullptr)), "root/far");
+  EXPECT_EQ(shownText(CMGetHostname(unknown, &status)), "");
   EXPECT_EQ(status.rc, CMPI_RC_OK);
 }
 
-TEST_F(PathObject, ChangesItsParts) {
+TEST_F(ObjectPathTest, ChangesItsParts) {
   CMPIObjectPath* one = path("TST_Processor");
   CMPIObjectPath* other = CMNewObjectPath(broker, "root/other", "TST_Other", nullptr);
   EXPECT_EQ(CMSetHostname(other, "host").rc, CMPI_RC_OK);
   EXPECT_EQ(CMSetClassName(one, "TST_New").rc, CMPI_RC_OK);
   EXPECT_EQ(CMSetNameSpaceFromObjectPath(one, other).rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(CMObjectPathToString(one, nullptr)), "root/other:TST_New");
+  EXPECT_EQ(shownText(CMObjectPathToString(one, nullptr)), "root/other:TST_New");
   EXPECT_EQ(CMSetHostAndNameSpaceFromObjectPath(one, other).rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(CMObjectPathToString(one, nullptr)), "//host/root/other:TST_New");
+  EXPECT_EQ(shownText(CMObjectPathToString(one, nullptr)), "//host/root/other:TST_New");
 }
 
-TEST_F(PathObject, FindsKeysWithoutRegardToCaseAndReplacesThem) {
+TEST_F(ObjectPathTest, FindsKeysWithoutRegardToCaseAndReplacesThem) {
   CMPIObjectPath* one = path("TST_Processor");
   CMAddKey(one, "Name", "first", CMPI_chars);
   CMAddKey(one, "NAME", "second", CMPI_chars);
@@ -33,13 +35,13 @@ TEST_F(PathObject, FindsKeysWithoutRegardToCaseAndReplacesThem) {
   const CMPIData key = CMGetKey(one, "name", &status);
   EXPECT_EQ(key.type, CMPI_string);
   EXPECT_TRUE(CMIsKeyValue(key));
-  EXPECT_EQ(textOf(key.value.string), "second");
+  EXPECT_EQ(shownText(key.value.string), "second");
   CMPIString* name = nullptr;
   CMGetKeyAt(one, 0, &name, &status);
-  EXPECT_EQ(textOf(name), "Name");
+  EXPECT_EQ(shownText(name), "Name");
 }
 
-TEST_F(PathObject, ReportsAKeyThatIsNotThere) {
+TEST_F(ObjectPathTest, ReportsAKeyThatIsNotThere) {
   const CMPIObjectPath* one = path("TST_Processor");
   EXPECT_TRUE(CMIsNullValue(CMGetKey(one, "Name", &status)));
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
@@ -47,7 +49,7 @@ TEST_F(PathObject, ReportsAKeyThatIsNotThere) {
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 }
 
-TEST_F(PathObject, KeepsAKeyThatSomebodyAddsAsNull) {
+TEST_F(ObjectPathTest, KeepsAKeyThatSomebodyAddsAsNull) {
   CMPIObjectPath* one = path("TST_Processor");
   CMPIString* nothing = nullptr;
   EXPECT_EQ(CMAddKey(one, "Name", &nothing, CMPI_string).rc, CMPI_RC_OK);
@@ -55,7 +57,7 @@ TEST_F(PathObject, KeepsAKeyThatSomebodyAddsAsNull) {
   EXPECT_EQ(status.rc, CMPI_RC_OK);
 }
 
-TEST_F(PathObject, IsWrittenAsAnUntypedUri) {
+TEST_F(ObjectPathTest, IsWrittenAsAnUntypedUri) {
   CMPIObjectPath* inner = path("TST_Point");
   const CMPIUint16 number = 4;
   CMAddKey(inner, "Number", &number, CMPI_uint16);
@@ -66,13 +68,13 @@ TEST_F(PathObject, IsWrittenAsAnUntypedUri) {
   CMAddKey(one, "Flag", &yes, CMPI_boolean);
   CMAddKey(one, "Offset", &negative, CMPI_sint32);
   CMAddKey(one, "Point", &inner, CMPI_ref);
-  EXPECT_EQ(textOf(CMObjectPathToString(one, nullptr)),
+  EXPECT_EQ(shownText(CMObjectPathToString(one, nullptr)),
             R"(root/test:TST_Processor.Text="say \"a\\b\"",Flag=TRUE,Offset=-5,Point="root/test:TST_Point.Number=4")");
 }
 
-TEST_F(PathObject, ReadsTheQualifiersOfItsClass) {
+TEST_F(ObjectPathTest, ReadsTheQualifiersOfItsClass) {
   const CMPIObjectPath* one = path("TST_Processor");
-  const auto textQualifier = [&](const CMPIData& data) { return textOf(data.value.string); };
+  const auto textQualifier = [&](const CMPIData& data) { return shownText(data.value.string); };
   EXPECT_EQ(textQualifier(CMGetClassQualifier(one, "description", &status)), "A system");
   EXPECT_EQ(textQualifier(CMGetPropertyQualifier(one, "Caption", "Description", &status)), "What people call it");
   EXPECT_TRUE(CMGetPropertyQualifier(one, "Name", "Key", &status).value.boolean);
@@ -81,7 +83,7 @@ TEST_F(PathObject, ReadsTheQualifiersOfItsClass) {
   EXPECT_EQ(status.rc, CMPI_RC_OK);
 }
 
-TEST_F(PathObject, ReportsWhatIsNotQualifiedOrDeclared) {
+TEST_F(ObjectPathTest, ReportsWhatIsNotQualifiedOrDeclared) {
   const CMPIObjectPath* one = path("TST_Processor");
   CMGetClassQualifier(one, "Abstract", &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND) << "Abstract is not inherited";
@@ -95,7 +97,7 @@ TEST_F(PathObject, ReportsWhatIsNotQualifiedOrDeclared) {
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
 }
 
-TEST_F(PathObject, KnowsItsSuperclasses) {
+TEST_F(ObjectPathTest, KnowsItsSuperclasses) {
   EXPECT_TRUE(CMClassPathIsA(broker, path("TST_Processor"), "cim_element", &status));
   EXPECT_FALSE(CMClassPathIsA(broker, path("TST_Processor"), "CIM_Point", &status));
   EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -104,4 +106,3 @@ TEST_F(PathObject, KnowsItsSuperclasses) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

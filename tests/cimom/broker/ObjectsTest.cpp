@@ -1,26 +1,30 @@
 #include "cimom/broker/Handle.h"
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
-class Objects : public BrokerFixture {
+using namespace Cimom;
+using namespace Testing;
+
+class ObjectsTest : public BrokerFixture {
  protected:
   CMPIEnumeration* enumerationOf(std::vector<const char*> texts) {
     Enumeration model;
-    for (const char* text : texts) model.items.push_back(Value::string(text));
+    for (const char* text : texts) {
+      model.items.push_back(Value::string(text));
+    }
     return make(std::move(model));
   }
 };
 
-TEST_F(Objects, AStringShowsItsCharactersInBothWays) {
+TEST_F(ObjectsTest, AStringShowsItsCharactersInBothWays) {
   const CMPIString* string = CMNewString(broker, "text", &status);
   EXPECT_STREQ(CMGetCharsPtr(string, &status), "text");
   EXPECT_STREQ(CMGetCharPtr(string), "text");
   EXPECT_EQ(status.rc, CMPI_RC_OK);
 }
 
-TEST_F(Objects, AnArrayStartsWithNullsAndTakesItsTypeOnly) {
+TEST_F(ObjectsTest, AnArrayStartsWithNullsAndTakesItsTypeOnly) {
   CMPIArray* array = CMNewArray(broker, 2, CMPI_uint16, &status);
   const CMPIUint16 number = 14;
   const CMPIUint32 wide = 14;
@@ -35,42 +39,42 @@ TEST_F(Objects, AnArrayStartsWithNullsAndTakesItsTypeOnly) {
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 }
 
-TEST_F(Objects, AnArrayOfCharsIsOneOfStrings) {
+TEST_F(ObjectsTest, AnArrayOfCharsIsOneOfStrings) {
   CMPIArray* array = CMNewArray(broker, 1, CMPI_chars, &status);
   EXPECT_EQ(CMGetArrayType(array, nullptr), CMPI_string);
   EXPECT_EQ(CMSetArrayElementAt(array, 0, "text", CMPI_chars).rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(CMGetArrayElementAt(array, 0, nullptr).value.string), "text");
+  EXPECT_EQ(shownText(CMGetArrayElementAt(array, 0, nullptr).value.string), "text");
 }
 
-TEST_F(Objects, AnArrayNeedsAnElementType) {
+TEST_F(ObjectsTest, AnArrayNeedsAnElementType) {
   for (const CMPIType type : {CMPI_null, CMPI_uint16A, CMPI_args, 0x7777}) {
     EXPECT_EQ(CMNewArray(broker, 1, type, &status), nullptr) << type;
     EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_DATA_TYPE) << type;
   }
 }
 
-TEST_F(Objects, AnEnumerationEndsAndReportsStepsPastItsEnd) {
+TEST_F(ObjectsTest, AnEnumerationEndsAndReportsStepsPastItsEnd) {
   CMPIEnumeration* two = enumerationOf({"a", "b"});
   EXPECT_TRUE(CMHasNext(two, &status));
-  EXPECT_EQ(textOf(CMGetNext(two, &status).value.string), "a");
-  EXPECT_EQ(textOf(CMGetNext(two, &status).value.string), "b");
+  EXPECT_EQ(shownText(CMGetNext(two, &status).value.string), "a");
+  EXPECT_EQ(shownText(CMGetNext(two, &status).value.string), "b");
   EXPECT_FALSE(CMHasNext(two, &status));
   EXPECT_EQ(status.rc, CMPI_RC_OK) << "the end of a walk is no failure";
   EXPECT_TRUE(CMIsNullValue(CMGetNext(two, &status)));
   EXPECT_EQ(status.rc, 18);
 }
 
-TEST_F(Objects, AnEnumerationBecomesAnArrayWhereverItsWalkIs) {
+TEST_F(ObjectsTest, AnEnumerationBecomesAnArrayWhereverItsWalkIs) {
   CMPIEnumeration* two = enumerationOf({"a", "b"});
   CMGetNext(two, nullptr);
   const CMPIArray* array = CMToArray(two, &status);
   EXPECT_EQ(CMGetArrayCount(array, nullptr), 2u);
   EXPECT_EQ(CMGetArrayType(array, nullptr), CMPI_string);
-  EXPECT_EQ(textOf(CMGetNext(two, nullptr).value.string), "b");
+  EXPECT_EQ(shownText(CMGetNext(two, nullptr).value.string), "b");
   EXPECT_EQ(CMGetArrayCount(CMToArray(enumerationOf({}), &status), nullptr), 0u);
 }
 
-TEST_F(Objects, ArgumentsAndContextEntriesAreFoundByNameAndByIndex) {
+TEST_F(ObjectsTest, ArgumentsAndContextEntriesAreFoundByNameAndByIndex) {
   CMPIArgs* args = CMNewArgs(broker, &status);
   const CMPIUint32 number = 9;
   EXPECT_EQ(CMAddArg(args, "Count", &number, CMPI_uint32).rc, CMPI_RC_OK);
@@ -79,39 +83,39 @@ TEST_F(Objects, ArgumentsAndContextEntriesAreFoundByNameAndByIndex) {
   CMPIString* name = nullptr;
   EXPECT_EQ(CMGetArg(args, "count", nullptr).value.uint32, 9u);
   EXPECT_EQ(CMGetArgAt(args, 0, &name, nullptr).value.uint32, 9u);
-  EXPECT_EQ(textOf(name), "Count");
+  EXPECT_EQ(shownText(name), "Count");
   EXPECT_EQ(CMGetArgCount(args, nullptr), 1u);
-  EXPECT_EQ(textOf(CMGetContextEntryAt(request.context(), 0, &name, nullptr).value.string), "text");
-  EXPECT_EQ(textOf(name), "Entry");
+  EXPECT_EQ(shownText(CMGetContextEntryAt(request.context(), 0, &name, nullptr).value.string), "text");
+  EXPECT_EQ(shownText(name), "Entry");
   CMGetArg(args, "Other", &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
   CMGetContextEntryAt(request.context(), 1, nullptr, &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 }
 
-TEST_F(Objects, ATimeStampKeepsItsOffset) {
+TEST_F(ObjectsTest, ATimeStampKeepsItsOffset) {
   const CMPIDateTime* stamp = CMNewDateTimeFromChars(broker, "19700101013000.000001+060", &status);
   EXPECT_EQ(CMGetBinaryFormat(stamp, nullptr), 30u * 60 * 1'000'000 + 1);
   EXPECT_FALSE(CMIsInterval(stamp, nullptr));
-  EXPECT_EQ(textOf(CMGetStringFormat(stamp, nullptr)), "19700101013000.000001+060");
+  EXPECT_EQ(shownText(CMGetStringFormat(stamp, nullptr)), "19700101013000.000001+060");
 }
 
-TEST_F(Objects, AnIntervalCountsDays) {
+TEST_F(ObjectsTest, AnIntervalCountsDays) {
   const CMPIUint64 length = (2ull * 86'400 + 3'661) * 1'000'000 + 5;
   const CMPIDateTime* interval = CMNewDateTimeFromBinary(broker, length, true, &status);
   EXPECT_TRUE(CMIsInterval(interval, nullptr));
-  EXPECT_EQ(textOf(CMGetStringFormat(interval, nullptr)), "00000002010101.000005:000");
+  EXPECT_EQ(shownText(CMGetStringFormat(interval, nullptr)), "00000002010101.000005:000");
   const CMPIDateTime* same = CMNewDateTimeFromChars(broker, "00000002010101.000005:000", &status);
   EXPECT_EQ(CMGetBinaryFormat(same, nullptr), length);
 }
 
-TEST_F(Objects, TheCurrentTimeIsATimeStamp) {
+TEST_F(ObjectsTest, TheCurrentTimeIsATimeStamp) {
   const CMPIDateTime* now = CMNewDateTime(broker, &status);
   EXPECT_GT(CMGetBinaryFormat(now, nullptr), 1'600'000'000'000'000ull);
-  EXPECT_EQ(textOf(CMGetStringFormat(now, nullptr)).substr(21), "+000");
+  EXPECT_EQ(shownText(CMGetStringFormat(now, nullptr)).substr(21), "+000");
 }
 
-TEST_F(Objects, WhatIsNoDateTimeIsRefused) {
+TEST_F(ObjectsTest, WhatIsNoDateTimeIsRefused) {
   for (const char* text : {"", "now", "20240230120000.000000+000", "20241301120000.000000+000",
                            "20240101250000.000000+000", "2024010112000x.000000+000", "20240101120000,000000+000",
                            "20240101120000.000000*000", "00000001000000.000000:060", "19691231235959.000000+000",
@@ -121,7 +125,7 @@ TEST_F(Objects, WhatIsNoDateTimeIsRefused) {
   }
 }
 
-TEST_F(Objects, AnErrorHoldsWhatIsSetAndNothingElse) {
+TEST_F(ObjectsTest, AnErrorHoldsWhatIsSetAndNothingElse) {
   CMPIError* error = broker->eft->newCMPIError(broker, "owner", "ID7", "it broke", CMPIErrorSeverityUnknown,
                                                CMPIErrorProbableCauseUnknown, CMPI_RC_ERR_FAILED, &status);
   CMPIArray* actions = CMNewArray(broker, 1, CMPI_string, nullptr);
@@ -133,15 +137,15 @@ TEST_F(Objects, AnErrorHoldsWhatIsSetAndNothingElse) {
   EXPECT_EQ(ft.setRecommendedActions(error, actions).rc, CMPI_RC_OK);
   EXPECT_EQ(ft.setMessageArguments(error, actions).rc, CMPI_RC_OK);
 
-  EXPECT_EQ(textOf(ft.getOwningEntity(error, nullptr)), "owner");
-  EXPECT_EQ(textOf(ft.getMessageID(error, nullptr)), "ID7");
-  EXPECT_EQ(textOf(ft.getMessage(error, nullptr)), "it broke");
+  EXPECT_EQ(shownText(ft.getOwningEntity(error, nullptr)), "owner");
+  EXPECT_EQ(shownText(ft.getMessageID(error, nullptr)), "ID7");
+  EXPECT_EQ(shownText(ft.getMessage(error, nullptr)), "it broke");
   EXPECT_EQ(ft.getPerceivedSeverity(error, nullptr), CMPIErrorSeverityUnknown);
   EXPECT_EQ(ft.getProbableCause(error, nullptr), CMPIErrorProbableCauseUnknown);
   EXPECT_EQ(ft.getCIMStatusCode(error, nullptr), CMPI_RC_ERR_FAILED);
   EXPECT_EQ(ft.getErrorType(error, nullptr), CMPIErrorTypeOther);
   EXPECT_EQ(ft.getErrorSourceFormat(error, nullptr), CMPIErrorSrcFormatUnknown);
-  EXPECT_EQ(textOf(ft.getErrorSource(error, nullptr)), "disk");
+  EXPECT_EQ(shownText(ft.getErrorSource(error, nullptr)), "disk");
   EXPECT_EQ(CMGetArrayCount(ft.getRecommendedActions(error, nullptr), nullptr), 1u);
   EXPECT_EQ(CMGetArrayCount(ft.getMessageArguments(error, nullptr), nullptr), 1u);
   EXPECT_EQ(ft.getOtherErrorType(error, &status), nullptr);
@@ -149,4 +153,3 @@ TEST_F(Objects, AnErrorHoldsWhatIsSetAndNothingElse) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -1,18 +1,20 @@
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
+
 // Whether memory is freed, freed once and not used afterwards is what the address sanitizer's run of these tests says.
-class Memory : public testing::Test {
+class RequestScopeTest : public testing::Test {
  protected:
-  Memory() { manager.loadSchemaText(kSchema, kNamespace); }
+  RequestScopeTest() { manager.loadSchemaText(testSchema, testNamespace); }
 
   ObjectManager manager;
   const CMPIBroker* broker = manager.broker();
 };
 
-TEST_F(Memory, ScopesNest) {
+TEST_F(RequestScopeTest, ScopesNest) {
   EXPECT_EQ(RequestScope::current(), nullptr);
   const RequestScope outer(broker);
   {
@@ -23,35 +25,35 @@ TEST_F(Memory, ScopesNest) {
   EXPECT_EQ(RequestScope::current(), &outer);
 }
 
-TEST_F(Memory, AnObjectOutsideAnyScopeBelongsToItsMaker) {
+TEST_F(RequestScopeTest, AnObjectOutsideAnyScopeBelongsToItsMaker) {
   CMPIString* string = CMNewString(broker, "free", nullptr);
   EXPECT_EQ(CMRelease(string).rc, CMPI_RC_OK);
 }
 
-TEST_F(Memory, ReleasingAnObjectOfTheRequestDoesNoHarm) {
+TEST_F(RequestScopeTest, ReleasingAnObjectOfTheRequestDoesNoHarm) {
   const RequestScope scope(broker);
   CMPIString* string = CMNewString(broker, "scoped", nullptr);
   EXPECT_EQ(CMRelease(string).rc, CMPI_RC_OK);
   EXPECT_EQ(CMRelease(string).rc, CMPI_RC_OK);
-  EXPECT_EQ(textOf(string), "scoped");
+  EXPECT_EQ(shownText(string), "scoped");
 }
 
-TEST_F(Memory, ACloneOutlivesItsRequest) {
+TEST_F(RequestScopeTest, ACloneOutlivesItsRequest) {
   CMPIObjectPath* clone = nullptr;
   {
     const RequestScope scope(broker);
-    CMPIObjectPath* path = CMNewObjectPath(broker, kNamespace, "TST_Processor", nullptr);
+    CMPIObjectPath* path = CMNewObjectPath(broker, testNamespace, "TST_Processor", nullptr);
     CMAddKey(path, "Name", "one", CMPI_chars);
     clone = CMClone(path, nullptr);
   }
   {
     const RequestScope scope(broker);
-    EXPECT_EQ(textOf(CMObjectPathToString(clone, nullptr)), "root/test:TST_Processor.Name=\"one\"");
+    EXPECT_EQ(shownText(CMObjectPathToString(clone, nullptr)), "root/test:TST_Processor.Name=\"one\"");
   }
   EXPECT_EQ(CMRelease(clone).rc, CMPI_RC_OK);
 }
 
-TEST_F(Memory, EveryKindOfObjectButAResultCanBeCloned) {
+TEST_F(RequestScopeTest, EveryKindOfObjectButAResultCanBeCloned) {
   const RequestScope scope(broker);
   const auto cloned = [&](auto* object) {
     auto* clone = CMClone(object, nullptr);
@@ -67,7 +69,7 @@ TEST_F(Memory, EveryKindOfObjectButAResultCanBeCloned) {
                                    CMPI_RC_OK, nullptr));
 }
 
-TEST_F(Memory, AMarkEndsWithItsReleaseAndTakesLaterMarksWithIt) {
+TEST_F(RequestScopeTest, AMarkEndsWithItsReleaseAndTakesLaterMarksWithIt) {
   const RequestScope scope(broker);
   const CMPIGcStat* first = broker->mft->mark(broker, nullptr);
   const CMPIGcStat* second = broker->mft->mark(broker, nullptr);
@@ -78,7 +80,7 @@ TEST_F(Memory, AMarkEndsWithItsReleaseAndTakesLaterMarksWithIt) {
   EXPECT_EQ(broker->mft->release(broker, &scope).rc, CMPI_RC_ERR_INVALID_HANDLE);
 }
 
-TEST_F(Memory, AMarkThatNobodyReleasesEndsWithTheRequest) {
+TEST_F(RequestScopeTest, AMarkThatNobodyReleasesEndsWithTheRequest) {
   {
     const RequestScope scope(broker);
     broker->mft->mark(broker, nullptr);
@@ -87,7 +89,7 @@ TEST_F(Memory, AMarkThatNobodyReleasesEndsWithTheRequest) {
   EXPECT_EQ(RequestScope::current(), nullptr);
 }
 
-TEST_F(Memory, PlainMemoryIsTheCallers) {
+TEST_F(RequestScopeTest, PlainMemoryIsTheCallers) {
   const auto& mft = *broker->mft;
   char* text = mft.cmpiStrDup(broker, "text");
   text = static_cast<char*>(mft.cmpiRealloc(broker, text, 100));
@@ -99,9 +101,9 @@ TEST_F(Memory, PlainMemoryIsTheCallers) {
   mft.cmpiFree(broker, mft.cmpiMalloc(broker, 8));
 }
 
-TEST_F(Memory, ObjectsOutsideAnyScopeCanBeFreedThroughTheTable) {
+TEST_F(RequestScopeTest, ObjectsOutsideAnyScopeCanBeFreedThroughTheTable) {
   const auto& mft = *broker->mft;
-  CMPIObjectPath* path = CMNewObjectPath(broker, kNamespace, "TST_Processor", nullptr);
+  CMPIObjectPath* path = CMNewObjectPath(broker, testNamespace, "TST_Processor", nullptr);
   mft.freeInstance(broker, CMNewInstance(broker, path, nullptr));
   mft.freeObjectPath(broker, path);
   mft.freeArgs(broker, CMNewArgs(broker, nullptr));
@@ -111,7 +113,7 @@ TEST_F(Memory, ObjectsOutsideAnyScopeCanBeFreedThroughTheTable) {
   mft.freeSelectExp(broker, nullptr);
 }
 
-TEST_F(Memory, AnErrorOutsideAnyRequestHasNoMessageToLose) {
+TEST_F(RequestScopeTest, AnErrorOutsideAnyRequestHasNoMessageToLose) {
   CMPIStatus status = {CMPI_RC_OK, nullptr};
   CMNewString(broker, nullptr, &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
@@ -119,4 +121,3 @@ TEST_F(Memory, AnErrorOutsideAnyRequestHasNoMessageToLose) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -5,10 +5,12 @@
 
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
-class ThreadServices : public BrokerFixture {
+using namespace Cimom;
+using namespace Testing;
+
+class ThreadServicesTest : public BrokerFixture {
  protected:
   const CMPIBrokerExtFT& xft = *broker->xft;
 };
@@ -18,7 +20,7 @@ void* doubled(void* number) {
   return number;
 }
 
-TEST_F(ThreadServices, AThreadRunsAndGivesItsResult) {
+TEST_F(ThreadServicesTest, AThreadRunsAndGivesItsResult) {
   int number = 21;
   void* result = nullptr;
   CMPI_THREAD_TYPE thread = xft.newThread(doubled, &number, 0);
@@ -27,7 +29,7 @@ TEST_F(ThreadServices, AThreadRunsAndGivesItsResult) {
   EXPECT_EQ(number, 42);
 }
 
-TEST_F(ThreadServices, AThreadMayEndEarly) {
+TEST_F(ThreadServicesTest, AThreadMayEndEarly) {
   static const CMPIBrokerExtFT* services;
   services = &xft;
   void* result = nullptr;
@@ -42,7 +44,7 @@ TEST_F(ThreadServices, AThreadMayEndEarly) {
   EXPECT_EQ(result, &number);
 }
 
-TEST_F(ThreadServices, AThreadCanBeCancelled) {
+TEST_F(ThreadServicesTest, AThreadCanBeCancelled) {
 #ifdef __SANITIZE_ADDRESS__
   GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a cancelled thread";
 #endif
@@ -50,21 +52,25 @@ TEST_F(ThreadServices, AThreadCanBeCancelled) {
   services = &xft;
   CMPI_THREAD_TYPE thread = xft.newThread(
       [](void*) -> void* {
-        for (;;) services->threadSleep(1000);
+        for (;;) {
+          services->threadSleep(1000);
+        }
       },
       nullptr, 0);
   EXPECT_EQ(xft.cancelThread(thread), 0);
   EXPECT_EQ(xft.joinThread(thread, nullptr), 0);
 }
 
-TEST_F(ThreadServices, InitialisationRunsOnce) {
+TEST_F(ThreadServicesTest, InitialisationRunsOnce) {
   static int runs = 0;
   int once = 0;
-  for (int time = 0; time < 3; ++time) EXPECT_EQ(xft.threadOnce(&once, [] { ++runs; }), 0);
+  for (int time = 0; time < 3; ++time) {
+    EXPECT_EQ(xft.threadOnce(&once, [] { ++runs; }), 0);
+  }
   EXPECT_EQ(runs, 1);
 }
 
-TEST_F(ThreadServices, EachThreadHasItsOwnValueOfAKey) {
+TEST_F(ThreadServicesTest, EachThreadHasItsOwnValueOfAKey) {
   CMPI_THREAD_KEY_TYPE key;
   int here = 0;
   ASSERT_EQ(xft.createThreadKey(&key, nullptr), 0);
@@ -73,7 +79,7 @@ TEST_F(ThreadServices, EachThreadHasItsOwnValueOfAKey) {
   EXPECT_EQ(xft.destroyThreadKey(key), 0);
 }
 
-TEST_F(ThreadServices, AConditionWakesWhoWaitsForIt) {
+TEST_F(ThreadServicesTest, AConditionWakesWhoWaitsForIt) {
   struct Shared {
     const CMPIBrokerExtFT* xft;
     CMPI_MUTEX_TYPE mutex;
@@ -92,7 +98,9 @@ TEST_F(ThreadServices, AConditionWakesWhoWaitsForIt) {
         return nullptr;
       },
       &shared, 0);
-  while (!shared.ready) ASSERT_EQ(xft.condWait(shared.condition, shared.mutex), 0);
+  while (!shared.ready) {
+    ASSERT_EQ(xft.condWait(shared.condition, shared.mutex), 0);
+  }
   xft.unlockMutex(shared.mutex);
   EXPECT_EQ(xft.joinThread(thread, nullptr), 0);
 
@@ -104,7 +112,7 @@ TEST_F(ThreadServices, AConditionWakesWhoWaitsForIt) {
   xft.destroyMutex(shared.mutex);
 }
 
-TEST_F(ThreadServices, ARecursiveMutexCanBeLockedTwice) {
+TEST_F(ThreadServicesTest, ARecursiveMutexCanBeLockedTwice) {
   CMPI_MUTEX_TYPE mutex = xft.newMutex(1);
   xft.lockMutex(mutex);
   xft.lockMutex(mutex);
@@ -113,13 +121,13 @@ TEST_F(ThreadServices, ARecursiveMutexCanBeLockedTwice) {
   xft.destroyMutex(mutex);
 }
 
-TEST_F(ThreadServices, ALibrarysFileNameIsResolved) {
+TEST_F(ThreadServicesTest, ALibrarysFileNameIsResolved) {
   char* name = xft.resolveFileName("probe");
   EXPECT_STREQ(name, "libprobe.so");
   std::free(name);
 }
 
-TEST_F(ThreadServices, NullsAreRefused) {
+TEST_F(ThreadServicesTest, NullsAreRefused) {
   EXPECT_EQ(xft.resolveFileName(nullptr), nullptr);
   EXPECT_EQ(xft.newThread(nullptr, nullptr, 0), nullptr);
   EXPECT_EQ(xft.joinThread(nullptr, nullptr), EINVAL);
@@ -135,13 +143,13 @@ TEST_F(ThreadServices, NullsAreRefused) {
   xft.destroyCondition(nullptr);
 }
 
-TEST_F(ThreadServices, AnAttachedThreadMakesUpCallsWithMemoryOfItsOwn) {
+TEST_F(ThreadServicesTest, AnAttachedThreadMakesUpCallsWithMemoryOfItsOwn) {
   struct Shared {
     const CMPIBroker* broker;
     CMPIContext* context;
     CMPIStatus attached, detached, tooOften;
     std::string principal;
-  } shared = {broker, nullptr, kOk, kOk, kOk, {}};
+  } shared = {broker, nullptr, ok, ok, ok, {}};
   CMAddContextEntry(request.context(), CMPIPrincipal, "alice", CMPI_chars);
   shared.context = CBPrepareAttachThread(broker, request.context());
   ASSERT_NE(shared.context, nullptr);
@@ -151,7 +159,7 @@ TEST_F(ThreadServices, AnAttachedThreadMakesUpCallsWithMemoryOfItsOwn) {
         auto& all = *static_cast<Shared*>(given);
         all.attached = CBAttachThread(all.broker, all.context);
         all.tooOften = {CBAttachThread(all.broker, all.context).rc, nullptr};
-        all.principal = textOf(CMGetContextEntry(all.context, CMPIPrincipal, nullptr).value.string);
+        all.principal = shownText(CMGetContextEntry(all.context, CMPIPrincipal, nullptr).value.string);
         CMNewString(all.broker, "goes with the thread", nullptr);
         all.detached = CBDetachThread(all.broker, all.context);
         return nullptr;
@@ -167,4 +175,3 @@ TEST_F(ThreadServices, AnAttachedThreadMakesUpCallsWithMemoryOfItsOwn) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -8,7 +8,7 @@ using testing::AllOf;
 using testing::HasSubstr;
 using testing::Not;
 
-class ClassOperations : public EndpointTest {
+class ClassOperationsTest : public EndpointTest {
  protected:
   std::string getClass(const std::string& name, const std::string& options = {}) const {
     return returned("GetClass", className(name) + options);
@@ -21,7 +21,7 @@ std::string flag(const std::string& name, const std::string& value) {
 
 const std::string everything = flag("LocalOnly", "FALSE");
 
-TEST_F(ClassOperations, GetClassShowsEveryTypeOfProperty) {
+TEST_F(ClassOperationsTest, GetClassShowsEveryTypeOfProperty) {
   const std::string thing = getClass("test_thing", flag("IncludeQualifiers", "FALSE"));
   EXPECT_THAT(
       thing,
@@ -34,7 +34,7 @@ TEST_F(ClassOperations, GetClassShowsEveryTypeOfProperty) {
   EXPECT_THAT(getClass("TEST_Link"), HasSubstr("<PROPERTY.REFERENCE NAME=\"Whole\" REFERENCECLASS=\"TEST_Thing\""));
 }
 
-TEST_F(ClassOperations, GetClassShowsQualifiersWithTheirFlavors) {
+TEST_F(ClassOperationsTest, GetClassShowsQualifiersWithTheirFlavors) {
   EXPECT_THAT(
       getClass("TEST_Thing"),
       AllOf(HasSubstr("<QUALIFIER NAME=\"Description\" TYPE=\"string\" OVERRIDABLE=\"true\" TOSUBCLASS=\"true\" "
@@ -44,7 +44,7 @@ TEST_F(ClassOperations, GetClassShowsQualifiersWithTheirFlavors) {
             HasSubstr("<VALUE.ARRAY><VALUE>a</VALUE><VALUE>b</VALUE></VALUE.ARRAY>")));
 }
 
-TEST_F(ClassOperations, GetClassShowsMethodsWithTheirParameters) {
+TEST_F(ClassOperationsTest, GetClassShowsMethodsWithTheirParameters) {
   EXPECT_THAT(getClass("TEST_Thing"),
               AllOf(HasSubstr("<METHOD NAME=\"Reset\" TYPE=\"uint32\""),
                     HasSubstr("<PARAMETER NAME=\"Force\" TYPE=\"boolean\">"),
@@ -52,7 +52,7 @@ TEST_F(ClassOperations, GetClassShowsMethodsWithTheirParameters) {
                     HasSubstr("<PARAMETER.REFERENCE NAME=\"Other\" REFERENCECLASS=\"TEST_Thing\">")));
 }
 
-TEST_F(ClassOperations, GetClassShowsWhatIsInheritedOnlyWhenAsked) {
+TEST_F(ClassOperationsTest, GetClassShowsWhatIsInheritedOnlyWhenAsked) {
   EXPECT_THAT(getClass("TEST_Part"), AllOf(HasSubstr("<CLASS NAME=\"TEST_Part\" SUPERCLASS=\"TEST_Thing\">"),
                                            HasSubstr("NAME=\"Extra\""), Not(HasSubstr("NAME=\"U64\""))));
   EXPECT_THAT(getClass("TEST_Part", everything + flag("IncludeClassOrigin", "TRUE")),
@@ -60,13 +60,13 @@ TEST_F(ClassOperations, GetClassShowsWhatIsInheritedOnlyWhenAsked) {
                     HasSubstr("NAME=\"Extra\" TYPE=\"string\" CLASSORIGIN=\"TEST_Part\" PROPAGATED=\"false\"")));
 }
 
-TEST_F(ClassOperations, APropertyListTrimsTheClass) {
+TEST_F(ClassOperationsTest, APropertyListTrimsTheClass) {
   EXPECT_THAT(
       getClass("TEST_Part", everything + parameter("PropertyList", "<VALUE.ARRAY><VALUE>u64</VALUE></VALUE.ARRAY>")),
       AllOf(HasSubstr("NAME=\"U64\""), Not(HasSubstr("NAME=\"Extra\""))));
 }
 
-TEST_F(ClassOperations, EnumeratesTheClassesBelow) {
+TEST_F(ClassOperationsTest, EnumeratesTheClassesBelow) {
   const std::string all = flag("DeepInheritance", "TRUE");
   EXPECT_THAT(returned("EnumerateClassNames", ""),
               AllOf(HasSubstr("<CLASSNAME NAME=\"TEST_Thing\">"), Not(HasSubstr("TEST_Part"))));

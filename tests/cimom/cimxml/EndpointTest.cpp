@@ -17,8 +17,9 @@ using namespace Cimom;
 EndpointTest::EndpointTest() : endpoint_(manager_.broker(), manager_.classes(), "server") {
   std::ifstream mof(SOURCE_DIR "/tests/e2e/probe/Probe.mof");
   manager_.loadSchemaText(std::string{std::istreambuf_iterator<char>(mof), {}}, "root/test", "Probe.mof");
-  for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/e2e/probe/Probe.reg"))
+  for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/e2e/probe/Probe.reg")) {
     manager_.addProvider(registration, &ProbeProvider_Create_InstanceMI, &ProbeProvider_Create_AssociationMI);
+  }
 }
 
 Http::Request EndpointTest::request(const std::string& method, const std::string& body) {

@@ -1,5 +1,4 @@
-#ifndef TESTS_CIMOM_CIMXML_ENDPOINTTEST_H_
-#define TESTS_CIMOM_CIMXML_ENDPOINTTEST_H_
+#pragma once
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -12,20 +11,20 @@
 
 namespace Testing {
 
-/// The endpoint before an object manager with the probe provider, in root/test.
+// The endpoint before an object manager with the probe provider, in root/test.
 class EndpointTest : public testing::Test {
  protected:
   EndpointTest();
 
   Cimom::Http::Response post(const std::string& method, const std::string& body) const;
 
-  /// What the operation returns: the content of IMETHODRESPONSE.
+  // What the operation returns: the content of IMETHODRESPONSE.
   std::string returned(const std::string& method, const std::string& parameters) const;
 
-  /// The status code and the description of a failed operation: "5: …".
+  // The status code and the description of a failed operation: "5: …".
   std::string failed(const std::string& method, const std::string& parameters) const;
 
-  /// The content of a response message that answers the method; a failure otherwise.
+  // The content of a response message that answers the method; a failure otherwise.
   static std::string contentOf(const Cimom::Http::Response& response, const std::string& method);
 
   static Cimom::Http::Request request(const std::string& method, const std::string& body);
@@ -34,9 +33,7 @@ class EndpointTest : public testing::Test {
   Cimom::CimXml::Endpoint endpoint_;
 };
 
-/// The name of the first TEST_Thing.
+// The name of the first TEST_Thing.
 std::string thingName(const std::string& number = "1");
 
 }  // namespace Testing
-
-#endif  // TESTS_CIMOM_CIMXML_ENDPOINTTEST_H_

@@ -1,23 +1,22 @@
-#ifndef TESTS_CIMOM_CIMXML_MESSAGES_H_
-#define TESTS_CIMOM_CIMXML_MESSAGES_H_
+#pragma once
 
 #include <string>
 
 namespace Testing {
 
-/// A request message around a SIMPLEREQ's content.
+// A request message around a SIMPLEREQ's content.
 inline std::string messageOf(const std::string& call) {
   return "<?xml version=\"1.0\" encoding=\"utf-8\"?><CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\">"
          "<MESSAGE ID=\"4711\" PROTOCOLVERSION=\"1.0\"><SIMPLEREQ>" +
          call + "</SIMPLEREQ></MESSAGE></CIM>";
 }
 
-/// The path of the namespace "root/<name>".
+// The path of the namespace "root/<name>".
 inline std::string nameSpacePath(const std::string& name = "test") {
   return "<LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\"/><NAMESPACE NAME=\"" + name + "\"/></LOCALNAMESPACEPATH>";
 }
 
-/// An intrinsic method called in root/test.
+// An intrinsic method called in root/test.
 inline std::string intrinsicCall(const std::string& method, const std::string& parameters) {
   return messageOf("<IMETHODCALL NAME=\"" + method + "\">" + nameSpacePath() + parameters + "</IMETHODCALL>");
 }
@@ -40,5 +39,3 @@ inline std::string instanceName(const std::string& name, const std::string& keys
 }
 
 }  // namespace Testing
-
-#endif  // TESTS_CIMOM_CIMXML_MESSAGES_H_

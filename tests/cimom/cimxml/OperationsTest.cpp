@@ -13,11 +13,13 @@ using testing::MatchesRegex;
 using testing::Not;
 using testing::StartsWith;
 
-using Operations = EndpointTest;
+class OperationsTest : public EndpointTest {};
 
 std::string propertyList(const std::vector<std::string>& names) {
   std::string values;
-  for (const auto& name : names) values += "<VALUE>" + name + "</VALUE>";
+  for (const auto& name : names) {
+    values += "<VALUE>" + name + "</VALUE>";
+  }
   return parameter("PropertyList", "<VALUE.ARRAY>" + values + "</VALUE.ARRAY>");
 }
 
@@ -34,7 +36,9 @@ std::string modified(const std::string& name, const std::string& properties) {
 
 int count(const std::string& text, const std::string& part) {
   int found = 0;
-  for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) ++found;
+  for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) {
+    ++found;
+  }
   return found;
 }
 
@@ -45,14 +49,14 @@ constexpr const char* keysOfOne =
     "<KEYBINDING NAME=\"Name\"><KEYVALUE VALUETYPE=\"string\" TYPE=\"string\">thing</KEYVALUE></KEYBINDING>"
     "<KEYBINDING NAME=\"Number\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint16\">1</KEYVALUE></KEYBINDING>";
 
-TEST_F(Operations, EnumerateInstancesNamesEveryInstance) {
+TEST_F(OperationsTest, EnumerateInstancesNamesEveryInstance) {
   const std::string result = returned("EnumerateInstances", className("TEST_Thing"));
   EXPECT_EQ(count(result, "<VALUE.NAMEDINSTANCE>"), 3);
   EXPECT_THAT(result, HasSubstr("<VALUE.NAMEDINSTANCE><INSTANCENAME CLASSNAME=\"TEST_Thing\">" +
                                 std::string(keysOfOne) + "</INSTANCENAME><INSTANCE CLASSNAME=\"TEST_Thing\">"));
 }
 
-TEST_F(Operations, AnInstanceShowsEveryTypeOfProperty) {
+TEST_F(OperationsTest, AnInstanceShowsEveryTypeOfProperty) {
   const std::string result = returned("GetInstance", instanceOne);
   for (const std::string& expected :
        {property("Flag", "boolean", "TRUE"), property("Letter", "char16", "\xE2\x82\xAC"),
@@ -61,34 +65,36 @@ TEST_F(Operations, AnInstanceShowsEveryTypeOfProperty) {
         property("Text", "string", "&lt;plain&gt; &amp; &quot;quoted&quot; \xE2\x82\xAC"),
         property("WithDefault", "uint16", "5"), std::string("<PROPERTY NAME=\"Unset\" TYPE=\"string\"></PROPERTY>"),
         "<PROPERTY.ARRAY NAME=\"Numbers\" TYPE=\"uint16\"><VALUE.ARRAY>" + value("14") + value("15") +
-            "</VALUE.ARRAY></PROPERTY.ARRAY>"})
+            "</VALUE.ARRAY></PROPERTY.ARRAY>"}) {
     EXPECT_THAT(result, HasSubstr(expected));
+  }
   EXPECT_THAT(result, StartsWith("<IRETURNVALUE><INSTANCE CLASSNAME=\"TEST_Thing\">"));
 }
 
-TEST_F(Operations, AnArrayKeepsItsNulls) {
+TEST_F(OperationsTest, AnArrayKeepsItsNulls) {
   EXPECT_THAT(returned("EnumerateInstances", className("TEST_Numbered")),
               HasSubstr("<VALUE.ARRAY>" + value("one") + "<VALUE.NULL></VALUE.NULL>" + value("") + "</VALUE.ARRAY>"));
 }
 
-TEST_F(Operations, AReferenceIsAFullPath) {
+TEST_F(OperationsTest, AReferenceIsAFullPath) {
   const std::string result = returned("EnumerateInstances", className("TEST_Link"));
   const std::string path =
       "<VALUE.REFERENCE><INSTANCEPATH><NAMESPACEPATH><HOST>server</HOST>" + nameSpacePath() + "</NAMESPACEPATH>";
   std::string expected = path;
-  for (auto at = expected.find("/>"); at != std::string::npos; at = expected.find("/>"))
+  for (auto at = expected.find("/>"); at != std::string::npos; at = expected.find("/>")) {
     expected.replace(at, 2, "></NAMESPACE>");
+  }
   EXPECT_THAT(result, HasSubstr("<KEYBINDING NAME=\"Whole\">" + expected));
   EXPECT_THAT(result, HasSubstr("<PROPERTY.REFERENCE NAME=\"Whole\">" + expected));
 }
 
-TEST_F(Operations, EnumerateInstanceNamesNamesOnly) {
+TEST_F(OperationsTest, EnumerateInstanceNamesNamesOnly) {
   const std::string result = returned("EnumerateInstanceNames", className("test_thing"));
   EXPECT_EQ(count(result, "<INSTANCENAME "), 3);
   EXPECT_THAT(result, Not(HasSubstr("<INSTANCE ")));
 }
 
-TEST_F(Operations, APropertyListTrimsThePropertiesAndKeepsTheKeys) {
+TEST_F(OperationsTest, APropertyListTrimsThePropertiesAndKeepsTheKeys) {
   const std::string result =
       returned("EnumerateInstances", className("TEST_Thing") + propertyList({"flag", "Nothing"}));
   EXPECT_EQ(count(result, "<PROPERTY"), 3);
@@ -96,7 +102,7 @@ TEST_F(Operations, APropertyListTrimsThePropertiesAndKeepsTheKeys) {
   EXPECT_EQ(count(returned("GetInstance", instanceOne + propertyList({})), "<PROPERTY"), 0);
 }
 
-TEST_F(Operations, ShallowInheritanceHidesWhatASubclassAdds) {
+TEST_F(OperationsTest, ShallowInheritanceHidesWhatASubclassAdds) {
   const std::string shallow = parameter("DeepInheritance", value("FALSE"));
   EXPECT_THAT(returned("EnumerateInstances", className("TEST_Thing")), HasSubstr("NAME=\"Extra\""));
   EXPECT_THAT(returned("EnumerateInstances", className("TEST_Thing") + shallow),
@@ -106,14 +112,14 @@ TEST_F(Operations, ShallowInheritanceHidesWhatASubclassAdds) {
             3);
 }
 
-TEST_F(Operations, ModifyInstanceReachesTheProvider) {
+TEST_F(OperationsTest, ModifyInstanceReachesTheProvider) {
   EXPECT_EQ(returned("ModifyInstance", modified(thingName(), property("Text", "string", " changed "))), "");
   EXPECT_EQ(Probe::text(), "changed");
   EXPECT_EQ(returned("ModifyInstance", modified(thingName(), "<PROPERTY NAME=\"Text\" TYPE=\"string\"/>")), "");
   EXPECT_EQ(Probe::text(), "null");
 }
 
-TEST_F(Operations, ModifyInstanceTakesEveryTypeOfProperty) {
+TEST_F(OperationsTest, ModifyInstanceTakesEveryTypeOfProperty) {
   const std::string properties =
       property("Flag", "boolean", "false") + property("Letter", "char16", "x") + property("R64", "real64", "1e3") +
       property("Moment", "datetime", "20260102030405.000000+060") + property("S64", "sint64", "-1") +
@@ -122,7 +128,7 @@ TEST_F(Operations, ModifyInstanceTakesEveryTypeOfProperty) {
   EXPECT_EQ(returned("ModifyInstance", modified(thingName(), properties)), "");
 }
 
-TEST_F(Operations, ModifyInstanceNamesWhatDoesNotFitTheClass) {
+TEST_F(OperationsTest, ModifyInstanceNamesWhatDoesNotFitTheClass) {
   struct Case {
     std::string property;
     const char* expected;
@@ -139,21 +145,23 @@ TEST_F(Operations, ModifyInstanceNamesWhatDoesNotFitTheClass) {
       {"<PROPERTY.ARRAY NAME=\"Numbers\" TYPE=\"uint16\"><VALUE.ARRAY>" + value("1") + value("x") +
            "</VALUE.ARRAY></PROPERTY.ARRAY>",
        "13: element 1 of the property Numbers is no uint16: \"x\""}};
-  for (const Case& refused : cases)
+  for (const Case& refused : cases) {
     EXPECT_EQ(failed("ModifyInstance", modified(thingName(), refused.property)), refused.expected);
+  }
 }
 
-TEST_F(Operations, KeysTakeTheTypeOfTheirClass) {
+TEST_F(OperationsTest, KeysTakeTheTypeOfTheirClass) {
   const auto get = [this](const std::string& name) { return returned("GetInstance", parameter("InstanceName", name)); };
   const std::string name = keyBinding("name", "thing");
   for (const char* attributes :
-       {"VALUETYPE=\"numeric\"", "VALUETYPE=\"numeric\" TYPE=\"uint64\"", "", "TYPE=\"string\""})
+       {"VALUETYPE=\"numeric\"", "VALUETYPE=\"numeric\" TYPE=\"uint64\"", "", "TYPE=\"string\""}) {
     EXPECT_THAT(get(instanceName("test_thing", name + keyBinding("number", "1", attributes))), HasSubstr("<INSTANCE "));
+  }
   EXPECT_THAT(get(instanceName("TEST_Numbered", "<KEYVALUE VALUETYPE=\"numeric\">-7</KEYVALUE>")),
               HasSubstr("<INSTANCE "));
 }
 
-TEST_F(Operations, AKeyThatDoesNotFitItsClassIsNamed) {
+TEST_F(OperationsTest, AKeyThatDoesNotFitItsClassIsNamed) {
   const auto get = [this](const std::string& name) { return failed("GetInstance", parameter("InstanceName", name)); };
   EXPECT_EQ(get(thingName("x")), "4: the key Number is no uint16: \"x\"");
   EXPECT_EQ(get(thingName("65536")), "4: the key Number is no uint16: \"65536\"");
@@ -165,15 +173,17 @@ TEST_F(Operations, AKeyThatDoesNotFitItsClassIsNamed) {
             "4: the key Name is no reference");
 }
 
-TEST_F(Operations, AKeyThatNoClassDeclaresReachesTheBroker) {
-  for (const char* attributes : {"VALUETYPE=\"numeric\"", "VALUETYPE=\"boolean\"", "VALUETYPE=\"string\""})
-    for (const char* text : {"TRUE", "18446744073709551615", "-1", "0.5", "text"})
+TEST_F(OperationsTest, AKeyThatNoClassDeclaresReachesTheBroker) {
+  for (const char* attributes : {"VALUETYPE=\"numeric\"", "VALUETYPE=\"boolean\"", "VALUETYPE=\"string\""}) {
+    for (const char* text : {"TRUE", "18446744073709551615", "-1", "0.5", "text"}) {
       EXPECT_THAT(failed("GetInstance",
                          parameter("InstanceName", instanceName("TEST_Nowhere", keyBinding("K", text, attributes)))),
                   testing::AnyOf(StartsWith("5: "), HasSubstr("4: the key K is no boolean")));
+    }
+  }
 }
 
-TEST_F(Operations, AnInstanceIsFoundByItsReferenceKeys) {
+TEST_F(OperationsTest, AnInstanceIsFoundByItsReferenceKeys) {
   const std::string names = returned("EnumerateInstanceNames", className("TEST_Link"));
   const auto begin = names.find("<INSTANCENAME CLASSNAME=\"TEST_Link\">");
   const auto end = names.find("</IRETURNVALUE>");
@@ -181,7 +191,7 @@ TEST_F(Operations, AnInstanceIsFoundByItsReferenceKeys) {
               HasSubstr(property("Strength", "uint16", "9")));
 }
 
-TEST_F(Operations, CreateInstanceReturnsItsName) {
+TEST_F(OperationsTest, CreateInstanceReturnsItsName) {
   const std::string instance = "<INSTANCE CLASSNAME=\"TEST_Thing\">" + property("Name", "string", "thing") +
                                property("Number", "uint16", "1") + "</INSTANCE>";
   EXPECT_EQ(returned("CreateInstance", parameter("NewInstance", instance)),
@@ -189,9 +199,9 @@ TEST_F(Operations, CreateInstanceReturnsItsName) {
                 "</INSTANCENAME></IRETURNVALUE>");
 }
 
-TEST_F(Operations, DeleteInstanceReturnsNothing) { EXPECT_EQ(returned("DeleteInstance", instanceOne), ""); }
+TEST_F(OperationsTest, DeleteInstanceReturnsNothing) { EXPECT_EQ(returned("DeleteInstance", instanceOne), ""); }
 
-TEST_F(Operations, AssociatorsHaveFullPaths) {
+TEST_F(OperationsTest, AssociatorsHaveFullPaths) {
   EXPECT_THAT(returned("Associators", objectOne),
               StartsWith("<IRETURNVALUE><VALUE.OBJECTWITHPATH><INSTANCEPATH><NAMESPACEPATH><HOST>server</HOST>"));
   EXPECT_THAT(returned("AssociatorNames", objectOne),
@@ -203,29 +213,30 @@ TEST_F(Operations, AssociatorsHaveFullPaths) {
               AllOf(StartsWith("<IRETURNVALUE><OBJECTPATH>"), HasSubstr("CLASSNAME=\"TEST_Link\"")));
 }
 
-TEST_F(Operations, AssociationsOfAClassAreNotOffered) {
+TEST_F(OperationsTest, AssociationsOfAClassAreNotOffered) {
   EXPECT_THAT(failed("Associators", parameter("ObjectName", "<CLASSNAME NAME=\"TEST_Thing\"/>")), StartsWith("7: "));
 }
 
-TEST_F(Operations, TheProvidersErrorReachesTheClient) {
+TEST_F(OperationsTest, TheProvidersErrorReachesTheClient) {
   EXPECT_EQ(failed("EnumerateInstances", className("TEST_Failing")), "2: out of <order>");
 }
 
-TEST_F(Operations, AnInstanceThatIsNotThereIsNotFound) {
+TEST_F(OperationsTest, AnInstanceThatIsNotThereIsNotFound) {
   EXPECT_THAT(failed("GetInstance", parameter("InstanceName", thingName("9"))), StartsWith("6: "));
 }
 
-TEST_F(Operations, WhatIsNotKnownIsToldApart) {
+TEST_F(OperationsTest, WhatIsNotKnownIsToldApart) {
   EXPECT_THAT(failed("EnumerateInstances", className("TEST_Nowhere")), StartsWith("5: "));
   EXPECT_EQ(failed("GetClass", className("TEST_Nowhere")), "6: the class TEST_Nowhere is not known");
   EXPECT_EQ(failed("EnumerateClassNames", className("TEST_Nowhere")), "5: the class TEST_Nowhere is not known");
   EXPECT_EQ(failed("Frobnicate", ""), "7: this server does not offer the operation Frobnicate");
-  for (const char* method : {"CreateClass", "ModifyClass", "DeleteClass", "ExecQuery", "GetQualifier"})
+  for (const char* method : {"CreateClass", "ModifyClass", "DeleteClass", "ExecQuery", "GetQualifier"}) {
     EXPECT_EQ(failed(method, ""), std::string("7: this server does not offer the operation ") + method);
+  }
   EXPECT_EQ(returned("EnumerateInstances", className("TEST_Unserved")), "<IRETURNVALUE></IRETURNVALUE>");
 }
 
-TEST_F(Operations, ParametersAreCheckedByNameAndKind) {
+TEST_F(OperationsTest, ParametersAreCheckedByNameAndKind) {
   const std::string thing = className("TEST_Thing");
   EXPECT_EQ(failed("EnumerateInstances", ""), "4: the parameter ClassName is missing");
   EXPECT_EQ(failed("EnumerateInstances", parameter("ClassName", "")), "4: the parameter ClassName is missing");
@@ -247,7 +258,7 @@ TEST_F(Operations, ParametersAreCheckedByNameAndKind) {
             "4: the parameter ModifiedInstance is no instance");
 }
 
-TEST_F(Operations, GetPropertyAndSetPropertyGoToTheBroker) {
+TEST_F(OperationsTest, GetPropertyAndSetPropertyGoToTheBroker) {
   EXPECT_THAT(returned("GetProperty", instanceOne + parameter("PropertyName", value("U8"))), HasSubstr(value("255")));
   EXPECT_THAT(failed("GetProperty", instanceOne + parameter("PropertyName", value("Nothing"))), StartsWith("12: "));
   EXPECT_EQ(returned("SetProperty",
@@ -256,7 +267,7 @@ TEST_F(Operations, GetPropertyAndSetPropertyGoToTheBroker) {
   EXPECT_EQ(Probe::text(), "set");
 }
 
-TEST_F(Operations, AMethodOfAClassIsToldApart) {
+TEST_F(OperationsTest, AMethodOfAClassIsToldApart) {
   const auto call = [this](const std::string& method, const std::string& klass, const std::string& nameSpace) {
     Cimom::Http::Request sent =
         request(method, messageOf("<METHODCALL NAME=\"" + method + "\"><LOCALCLASSPATH>" + nameSpacePath(nameSpace) +

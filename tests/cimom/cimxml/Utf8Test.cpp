@@ -2,17 +2,19 @@
 
 #include "cimom/cimxml/Utf8.h"
 
-namespace Cimom::CimXml {
 namespace {
+
+using namespace Cimom::CimXml;
 
 constexpr const char* replacement = "\xEF\xBF\xBD";
 
-TEST(Utf8, KeepsWhatXmlCanCarry) {
-  for (const char* text : {"", "plain", "tab\tline\nreturn\r", "\x7F", "äöü€", "\xF0\x9F\x98\x80", "\xED\x9F\xBF"})
+TEST(Utf8Test, KeepsWhatXmlCanCarry) {
+  for (const char* text : {"", "plain", "tab\tline\nreturn\r", "\x7F", "äöü€", "\xF0\x9F\x98\x80", "\xED\x9F\xBF"}) {
     EXPECT_EQ(toXmlText(text), text);
+  }
 }
 
-TEST(Utf8, ReplacesControlCharacters) {
+TEST(Utf8Test, ReplacesControlCharacters) {
   EXPECT_EQ(toXmlText("a\x01"
                       "b\x1F"
                       "c"),
@@ -20,7 +22,7 @@ TEST(Utf8, ReplacesControlCharacters) {
   EXPECT_EQ(toXmlText(std::string_view("\0", 1)), replacement);
 }
 
-TEST(Utf8, ReplacesEveryByteOfWhatIsNoUtf8) {
+TEST(Utf8Test, ReplacesEveryByteOfWhatIsNoUtf8) {
   EXPECT_EQ(toXmlText("\xFF"), replacement);
   EXPECT_EQ(toXmlText("a\x80"), std::string("a") + replacement);
   EXPECT_EQ(toXmlText("\xE2\x82"), std::string(replacement) + replacement);  // cut off
@@ -29,13 +31,13 @@ TEST(Utf8, ReplacesEveryByteOfWhatIsNoUtf8) {
   EXPECT_EQ(toXmlText("\xE2(x"), std::string(replacement) + "(x");  // the next character stays
 }
 
-TEST(Utf8, ReplacesCodePointsThatAreNoCharacters) {
+TEST(Utf8Test, ReplacesCodePointsThatAreNoCharacters) {
   EXPECT_EQ(toXmlText("\xEF\xBF\xBE"), replacement);                                           // U+FFFE
   EXPECT_EQ(toXmlText("\xED\xA0\x80"), std::string(replacement) + replacement + replacement);  // a surrogate
   EXPECT_EQ(toXmlText("\xF4\x90\x80\x80").substr(0, 3), replacement);                          // beyond U+10FFFF
 }
 
-TEST(Utf8, DecodesExactlyOneCharacter) {
+TEST(Utf8Test, DecodesExactlyOneCharacter) {
   EXPECT_EQ(decodeOne("A"), U'A');
   EXPECT_EQ(decodeOne("€"), U'€');
   EXPECT_EQ(decodeOne(""), std::nullopt);
@@ -43,10 +45,9 @@ TEST(Utf8, DecodesExactlyOneCharacter) {
   EXPECT_EQ(decodeOne("\xFF"), std::nullopt);
 }
 
-TEST(Utf8, EncodesWhatItDecodes) {
+TEST(Utf8Test, EncodesWhatItDecodes) {
   for (const char32_t codePoint : {U'A', U'ä', U'€', U'\U0001F600'}) EXPECT_EQ(decodeOne(encode(codePoint)), codePoint);
   EXPECT_EQ(encode(0xD800), replacement);
 }
 
 }  // namespace
-}  // namespace Cimom::CimXml

@@ -3,10 +3,11 @@
 #include "cimom/cimxml/Document.h"
 #include "cimom/cimxml/XmlWriter.h"
 
-namespace Cimom::CimXml {
 namespace {
 
-TEST(XmlWriter, NestsElementsAsTheirScopesNest) {
+using namespace Cimom::CimXml;
+
+TEST(XmlWriterTest, NestsElementsAsTheirScopesNest) {
   XmlWriter xml;
   {
     const auto outer = xml.element("A", "X", "1");
@@ -16,13 +17,13 @@ TEST(XmlWriter, NestsElementsAsTheirScopesNest) {
   EXPECT_EQ(xml.take(), "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<A X=\"1\"><B>text</B><C></C></A>");
 }
 
-TEST(XmlWriter, WritesNoPrologWhereNoneIsWanted) {
+TEST(XmlWriterTest, WritesNoPrologWhereNoneIsWanted) {
   XmlWriter xml(XmlWriter::Prolog::None);
   xml.textElement("A", "");
   EXPECT_EQ(xml.take().substr(0, 2), "<A");
 }
 
-TEST(XmlWriter, WritesTextThatReadsBackAsItWas) {
+TEST(XmlWriterTest, WritesTextThatReadsBackAsItWas) {
   const std::string text = "<a b=\"c\">&amp; ]]> 'd' \t\r\n€ \xF0\x9F\x98\x80 end";
   XmlWriter xml;
   {
@@ -34,7 +35,7 @@ TEST(XmlWriter, WritesTextThatReadsBackAsItWas) {
   EXPECT_EQ(document.root().text(), text);
 }
 
-TEST(XmlWriter, StaysWellFormedWhateverTheText) {
+TEST(XmlWriterTest, StaysWellFormedWhateverTheText) {
   for (int byte = 0; byte < 256; ++byte) {
     const std::string text = std::string("a") + static_cast<char>(byte) + "b";
     XmlWriter xml;
@@ -47,4 +48,3 @@ TEST(XmlWriter, StaysWellFormedWhateverTheText) {
 }
 
 }  // namespace
-}  // namespace Cimom::CimXml

@@ -10,7 +10,7 @@
 #include "cimom/cimxml/Document.h"
 #include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/Operations.h"
-#include "cimom/cimxml/RequestReader.h"
+#include "cimom/cimxml/Request.h"
 
 namespace {
 

@@ -29,7 +29,9 @@ HttpClient::HttpClient(std::uint16_t port) : socket_(socket(AF_INET, SOCK_STREAM
   setsockopt(socket_, IPPROTO_TCP, TCP_NODELAY, &on, sizeof on);
   setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &patience, sizeof patience);
   setsockopt(socket_, SOL_SOCKET, SO_SNDTIMEO, &patience, sizeof patience);
-  if (connect(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0) return;
+  if (connect(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0) {
+    return;
+  }
   ::close(socket_);
   fail("connect");
 }
@@ -39,8 +41,12 @@ HttpClient::~HttpClient() { ::close(socket_); }
 bool HttpClient::send(std::string_view bytes) {
   while (!bytes.empty()) {
     const ssize_t sent = ::send(socket_, bytes.data(), bytes.size(), MSG_NOSIGNAL);
-    if (sent < 0 && (errno == EPIPE || errno == ECONNRESET)) return false;
-    if (sent < 0) fail("send");
+    if (sent < 0 && (errno == EPIPE || errno == ECONNRESET)) {
+      return false;
+    }
+    if (sent < 0) {
+      fail("send");
+    }
     bytes.remove_prefix(static_cast<std::size_t>(sent));
   }
   return true;
@@ -49,8 +55,12 @@ bool HttpClient::send(std::string_view bytes) {
 bool HttpClient::fill() {
   std::array<char, 65536> chunk{};
   const ssize_t received = recv(socket_, chunk.data(), chunk.size(), 0);
-  if (received < 0 && errno != ECONNRESET) fail("recv");
-  if (received <= 0) return false;
+  if (received < 0 && errno != ECONNRESET) {
+    fail("recv");
+  }
+  if (received <= 0) {
+    return false;
+  }
   buffer_.append(chunk.data(), static_cast<std::size_t>(received));
   return true;
 }
@@ -59,8 +69,11 @@ bool HttpClient::isClosed() { return buffer_.empty() && !fill(); }
 
 Cimom::Http::Response HttpClient::receive() {
   std::size_t end = 0;
-  while ((end = buffer_.find("\r\n\r\n")) == std::string::npos)
-    if (!fill()) throw std::runtime_error("the server closed the connection without a response");
+  while ((end = buffer_.find("\r\n\r\n")) == std::string::npos) {
+    if (!fill()) {
+      throw std::runtime_error("the server closed the connection without a response");
+    }
+  }
   std::string head = buffer_.substr(0, end + 2);
   buffer_.erase(0, end + 4);
   Cimom::Http::Response response;
@@ -72,8 +85,11 @@ Cimom::Http::Response HttpClient::receive() {
   }
   const std::string* length = response.headers.find("Content-Length");
   const std::size_t size = length ? std::stoul(*length) : 0;
-  while (buffer_.size() < size)
-    if (!fill()) throw std::runtime_error("the server closed the connection within a response");
+  while (buffer_.size() < size) {
+    if (!fill()) {
+      throw std::runtime_error("the server closed the connection within a response");
+    }
+  }
   response.body = buffer_.substr(0, size);
   buffer_.erase(0, size);
   return response;

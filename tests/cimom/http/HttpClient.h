@@ -1,5 +1,4 @@
-#ifndef TESTS_CIMOM_HTTP_HTTPCLIENT_H_
-#define TESTS_CIMOM_HTTP_HTTPCLIENT_H_
+#pragma once
 
 #include <cstdint>
 #include <string>
@@ -9,8 +8,8 @@
 
 namespace Testing {
 
-/// A client's end of a connection to 127.0.0.1, byte by byte, so that a test can send what no decent client would.
-/// Waits at most 10 s for anything; what fails throws std::runtime_error.
+// A client's end of a connection to 127.0.0.1, byte by byte, so that a test can send what no decent client would.
+// Waits at most 10 s for anything; what fails throws std::runtime_error.
 class HttpClient {
  public:
   explicit HttpClient(std::uint16_t port);
@@ -18,16 +17,16 @@ class HttpClient {
   HttpClient(const HttpClient&) = delete;
   HttpClient& operator=(const HttpClient&) = delete;
 
-  /// Gives false when the server has closed its end.
+  // Gives false when the server has closed its end.
   bool send(std::string_view bytes);
 
-  /// The next response; one with status 100 counts.
+  // The next response; one with status 100 counts.
   Cimom::Http::Response receive();
 
-  /// Whether the server closes the connection without another byte.
+  // Whether the server closes the connection without another byte.
   bool isClosed();
 
-  /// POST with a Content-Length, on this connection.
+  // POST with a Content-Length, on this connection.
   Cimom::Http::Response post(const std::string& path, const std::string& body, const std::string& moreHeaders = {});
 
  private:
@@ -38,5 +37,3 @@ class HttpClient {
 };
 
 }  // namespace Testing
-
-#endif  // TESTS_CIMOM_HTTP_HTTPCLIENT_H_

@@ -4,8 +4,10 @@
 #include "cimom/http/PasswordFile.h"
 #include "tests/support/TemporaryDirectory.h"
 
-namespace Cimom::Http {
 namespace {
+
+using namespace Cimom::Http;
+using namespace Testing;
 
 // Of "secret".
 constexpr const char* hash = "$5$saltsalt$0IyaXrmV7.sGNS6tirgqHLqX/G.FBvgkYA.lpPdS5sA";
@@ -23,7 +25,7 @@ class PasswordFileTest : public testing::Test {
     return "none";
   }
 
-  Testing::TemporaryDirectory directory_;
+  TemporaryDirectory directory_;
 };
 
 TEST_F(PasswordFileTest, AcceptsAUsersPasswordOnly) {
@@ -53,4 +55,3 @@ TEST_F(PasswordFileTest, NamesAFileThatIsNotThere) {
 }
 
 }  // namespace
-}  // namespace Cimom::Http

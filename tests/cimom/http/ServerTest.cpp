@@ -7,11 +7,11 @@
 #include "cimom/http/Server.h"
 #include "tests/cimom/http/HttpClient.h"
 
-namespace Cimom::Http {
 namespace {
 
+using namespace Cimom::Http;
+using namespace Testing;
 using namespace std::chrono_literals;
-using Testing::HttpClient;
 
 // Tells what arrived.
 Response echo(const Request& request) {
@@ -41,7 +41,7 @@ struct Gate {
   }
 };
 
-TEST(HttpServer, GivesTheHandlerMethodPathHeadersAndBody) {
+TEST(ServerTest, GivesTheHandlerMethodPathHeadersAndBody) {
   Server server({}, echo);
   HttpClient client(server.port());
   const Response response = client.post("/cimom?x=1", "hello", "X-Given: value\r\n");
@@ -50,28 +50,28 @@ TEST(HttpServer, GivesTheHandlerMethodPathHeadersAndBody) {
   EXPECT_EQ(*response.headers.find("X-Echo"), "value");
 }
 
-TEST(HttpServer, TakesAnyMethod) {
+TEST(ServerTest, TakesAnyMethod) {
   Server server({}, echo);
   HttpClient client(server.port());
   client.send("M-POST /cimom HTTP/1.1\r\nHost: localhost\r\nContent-Length: 2\r\n\r\nab");
   EXPECT_EQ(client.receive().body, "M-POST /cimom [ab]");
 }
 
-TEST(HttpServer, AnswersSeveralRequestsOnOneConnection) {
+TEST(ServerTest, AnswersSeveralRequestsOnOneConnection) {
   Server server({}, echo);
   HttpClient client(server.port());
   EXPECT_EQ(client.post("/a", "1").body, "POST /a [1]");
   EXPECT_EQ(client.post("/b", "2").body, "POST /b [2]");
 }
 
-TEST(HttpServer, JoinsAChunkedBody) {
+TEST(ServerTest, JoinsAChunkedBody) {
   Server server({}, echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2\r\nde\r\n0\r\n\r\n");
   EXPECT_EQ(client.receive().body, "POST / [abcde]");
 }
 
-TEST(HttpServer, AsksForTheBodyOfAClientThatExpectsIt) {
+TEST(ServerTest, AsksForTheBodyOfAClientThatExpectsIt) {
   Server server({}, echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nExpect: 100-continue\r\nContent-Length: 3\r\n\r\n");
@@ -80,26 +80,26 @@ TEST(HttpServer, AsksForTheBodyOfAClientThatExpectsIt) {
   EXPECT_EQ(client.receive().body, "POST / [abc]");
 }
 
-TEST(HttpServer, TakesABodyAsLargeAsItsLimit) {
+TEST(ServerTest, TakesABodyAsLargeAsItsLimit) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
   EXPECT_EQ(client.post("/", std::string(100, 'x')).status, 200u);
 }
 
-TEST(HttpServer, RefusesALargerBodyBeforeItIsSent) {
+TEST(ServerTest, RefusesALargerBodyBeforeItIsSent) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nExpect: 100-continue\r\nContent-Length: 101\r\n\r\n");
   EXPECT_EQ(client.receive().status, 413u);
 }
 
-TEST(HttpServer, RefusesALargerBodyThatIsSentAtOnce) {
+TEST(ServerTest, RefusesALargerBodyThatIsSentAtOnce) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
   EXPECT_EQ(client.post("/", std::string(101, 'x')).status, 413u);
 }
 
-TEST(HttpServer, RefusesALengthThatNoNumberHolds) {
+TEST(ServerTest, RefusesALengthThatNoNumberHolds) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nContent-Length: 99999999999999999999999\r\n\r\n");
@@ -107,7 +107,7 @@ TEST(HttpServer, RefusesALengthThatNoNumberHolds) {
   EXPECT_TRUE(status == 400 || status == 413) << status;
 }
 
-TEST(HttpServer, RefusesAChunkedBodyThatGrowsBeyondTheLimit) {
+TEST(ServerTest, RefusesAChunkedBodyThatGrowsBeyondTheLimit) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n");
@@ -115,17 +115,19 @@ TEST(HttpServer, RefusesAChunkedBodyThatGrowsBeyondTheLimit) {
   EXPECT_EQ(client.receive().status, 413u);
 }
 
-TEST(HttpServer, CutsOffAChunkedBodyThatNeverEnds) {
+TEST(ServerTest, CutsOffAChunkedBodyThatNeverEnds) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n");
   const std::string chunk = "400\r\n" + std::string(1024, 'x') + "\r\n";
   int sent = 0;
-  while (sent < 100000 && client.send(chunk)) ++sent;
+  while (sent < 100000 && client.send(chunk)) {
+    ++sent;
+  }
   EXPECT_LT(sent, 100000);
 }
 
-TEST(HttpServer, AnswersAnExceptionOfTheHandlerWithItsText) {
+TEST(ServerTest, AnswersAnExceptionOfTheHandlerWithItsText) {
   Server server({}, [](const Request&) -> Response { throw std::runtime_error("out of order"); });
   HttpClient client(server.port());
   const Response response = client.post("/", "");
@@ -133,19 +135,21 @@ TEST(HttpServer, AnswersAnExceptionOfTheHandlerWithItsText) {
   EXPECT_EQ(response.body, "out of order\n");
 }
 
-TEST(HttpServer, ServesOthersWhileOneRequestWaits) {
+TEST(ServerTest, ServesOthersWhileOneRequestWaits) {
   Gate gate;
   const Handler slow = gate.handler();
   Server server({}, [&](const Request& request) { return request.path == "/slow" ? slow(request) : echo(request); });
   HttpClient waiting(server.port());
   waiting.send("POST /slow HTTP/1.1\r\nHost: x\r\nContent-Length: 0\r\n\r\n");
   gate.reached.get_future().wait();
-  for (int i = 0; i < 8; ++i) EXPECT_EQ(HttpClient(server.port()).post("/fast", "").status, 200u);
+  for (int i = 0; i < 8; ++i) {
+    EXPECT_EQ(HttpClient(server.port()).post("/fast", "").status, 200u);
+  }
   gate.opened.set_value();
   EXPECT_EQ(waiting.receive().body, "late");
 }
 
-TEST(HttpServer, ClosesAnIdleConnection) {
+TEST(ServerTest, ClosesAnIdleConnection) {
   ServerOptions options;
   options.idleTimeout = 1s;
   Server server(options, echo);
@@ -153,17 +157,19 @@ TEST(HttpServer, ClosesAnIdleConnection) {
   EXPECT_TRUE(client.isClosed());
 }
 
-TEST(HttpServer, RepliesWithoutWaitingForAnAcknowledgement) {
+TEST(ServerTest, RepliesWithoutWaitingForAnAcknowledgement) {
   Server server({}, [](const Request&) { return Response{200, {}, std::string(20000, 'x')}; });
   HttpClient client(server.port());
   client.post("/", "");
   const auto start = std::chrono::steady_clock::now();
-  for (int i = 0; i < 20; ++i) client.post("/", "body");
+  for (int i = 0; i < 20; ++i) {
+    client.post("/", "body");
+  }
   // A delayed acknowledgement costs 40 ms each time.
   EXPECT_LT(std::chrono::steady_clock::now() - start, 400ms);
 }
 
-TEST(HttpServer, EndsAfterTheRequestsThatAreBeingAnswered) {
+TEST(ServerTest, EndsAfterTheRequestsThatAreBeingAnswered) {
   Gate gate;
   Server server({}, gate.handler());
   HttpClient client(server.port());
@@ -176,7 +182,7 @@ TEST(HttpServer, EndsAfterTheRequestsThatAreBeingAnswered) {
   EXPECT_TRUE(server.drain(10s));
 }
 
-TEST(HttpServer, RefusesNewRequestsWhileItEnds) {
+TEST(ServerTest, RefusesNewRequestsWhileItEnds) {
   Server server({}, echo);
   HttpClient client(server.port());
   client.post("/", "");
@@ -184,7 +190,7 @@ TEST(HttpServer, RefusesNewRequestsWhileItEnds) {
   EXPECT_EQ(client.post("/", "").status, 503u);
 }
 
-TEST(HttpServer, TellsWhichPortIsTaken) {
+TEST(ServerTest, TellsWhichPortIsTaken) {
   Server first({}, echo);
   ServerOptions options;
   options.port = first.port();
@@ -197,20 +203,20 @@ TEST(HttpServer, TellsWhichPortIsTaken) {
   }
 }
 
-TEST(HttpServer, RefusesAnAddressThatIsNone) {
+TEST(ServerTest, RefusesAnAddressThatIsNone) {
   ServerOptions options;
   options.address = "localhost";
   EXPECT_THROW(Server(options, echo), ServerError);
 }
 
-TEST(HttpServer, RefusesATlsKeyThatIsNone) {
+TEST(ServerTest, RefusesATlsKeyThatIsNone) {
   ServerOptions options;
   options.tlsCertificate = "no PEM";
   options.tlsKey = "no PEM";
   EXPECT_THROW(Server(options, echo), ServerError);
 }
 
-TEST(HttpServer, NamesAnIpv6EndpointInBrackets) {
+TEST(ServerTest, NamesAnIpv6EndpointInBrackets) {
   ServerOptions options;
   options.address = "::1";
   try {
@@ -221,7 +227,7 @@ TEST(HttpServer, NamesAnIpv6EndpointInBrackets) {
   }
 }
 
-class AuthenticatedHttpServer : public testing::Test {
+class AuthenticatedServerTest : public testing::Test {
  protected:
   static ServerOptions options() {
     ServerOptions options;
@@ -235,23 +241,22 @@ class AuthenticatedHttpServer : public testing::Test {
   HttpClient client_{server_.port()};
 };
 
-TEST_F(AuthenticatedHttpServer, ChallengesAClientWithoutCredentials) {
+TEST_F(AuthenticatedServerTest, ChallengesAClientWithoutCredentials) {
   const Response response = client_.post("/", "body");
   EXPECT_EQ(response.status, 401u);
   EXPECT_EQ(*response.headers.find("WWW-Authenticate"), "Basic realm=\"cimom\"");
 }
 
-TEST_F(AuthenticatedHttpServer, RefusesAWrongPassword) {
+TEST_F(AuthenticatedServerTest, RefusesAWrongPassword) {
   EXPECT_EQ(client_.post("/", "", "Authorization: Basic YWRtaW46d3Jvbmc=\r\n").status, 401u);
 }
 
-TEST_F(AuthenticatedHttpServer, RefusesCredentialsThatAreNone) {
+TEST_F(AuthenticatedServerTest, RefusesCredentialsThatAreNone) {
   EXPECT_EQ(client_.post("/", "", "Authorization: Basic !!!\r\n").status, 401u);
 }
 
-TEST_F(AuthenticatedHttpServer, TellsTheHandlerWhoItIs) {
+TEST_F(AuthenticatedServerTest, TellsTheHandlerWhoItIs) {
   EXPECT_EQ(client_.post("/", "b", "Authorization: Basic YWRtaW46c2VjcmV0\r\n").body, "POST / [b]admin");
 }
 
 }  // namespace
-}  // namespace Cimom::Http

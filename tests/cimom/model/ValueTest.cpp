@@ -3,13 +3,13 @@
 
 #include <limits>
 
-#include "cimom/broker/Array.h"
 #include "cimom/model/Value.h"
 
-namespace Cimom {
 namespace {
 
-TEST(IntegerConversion, KeepsTheNumberOrRefuses) {
+using namespace Cimom;
+
+TEST(ValueTest, KeepsTheNumberOrRefuses) {
   const auto fits = [](const Value& value, CMPIType type) { return value.asInteger(type).has_value(); };
   EXPECT_TRUE(fits(Value::uint64(255), CMPI_uint8));
   EXPECT_FALSE(fits(Value::uint64(256), CMPI_uint8));
@@ -20,11 +20,11 @@ TEST(IntegerConversion, KeepsTheNumberOrRefuses) {
   EXPECT_FALSE(fits(Value::uint64(std::numeric_limits<CMPIUint64>::max()), CMPI_sint64));
   EXPECT_FALSE(fits(Value::boolean(true), CMPI_uint8));
   EXPECT_FALSE(fits(Value::string("1"), CMPI_uint8));
-  EXPECT_EQ(Value::sint64(-2).asInteger(CMPI_sint16)->toCmpi().value.sint16, -2);
-  EXPECT_EQ(Value::uint64(65535).asInteger(CMPI_uint16)->toCmpi().value.uint16, 65535);
+  EXPECT_EQ(Value::sint64(-2).asInteger(CMPI_sint16)->scalar()->sint16, -2);
+  EXPECT_EQ(Value::uint64(65535).asInteger(CMPI_uint16)->scalar()->uint16, 65535);
 }
 
-TEST(ValueText, IsThatOfAnUntypedUri) {
+TEST(ValueTest, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value().toString(), "NULL");
   EXPECT_EQ(Value::sint64(std::numeric_limits<CMPISint64>::min()).toString(), "-9223372036854775808");
   EXPECT_EQ(Value::uint64(std::numeric_limits<CMPIUint64>::max()).toString(), "18446744073709551615");
@@ -33,11 +33,4 @@ TEST(ValueText, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value::array({CMPI_string, {Value::string("a"), Value::null(CMPI_string)}}).toString(), "{\"a\",NULL}");
 }
 
-TEST(TypeName, IsTheMofName) {
-  EXPECT_EQ(typeName(CMPI_uint16), "uint16");
-  EXPECT_EQ(typeName(CMPI_stringA), "string[]");
-  EXPECT_EQ(typeName(CMPI_dateTime), "datetime");
-}
-
 }  // namespace
-}  // namespace Cimom

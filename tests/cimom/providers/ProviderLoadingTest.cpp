@@ -1,17 +1,18 @@
 #include "tests/cimom/support/BrokerFixture.h"
 #include "tests/support/TemporaryDirectory.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::AllOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
 
-class ProviderLoading : public testing::Test {
+class ProviderLoadingTest : public testing::Test {
  protected:
-  ProviderLoading() {
-    manager.loadSchemaText(kSchema, kNamespace);
+  ProviderLoadingTest() {
+    manager.loadSchemaText(testSchema, testNamespace);
     manager.addProviderDirectory(directory.path());
     manager.addProviderDirectory(PROBE_DIRECTORY);
   }
@@ -23,14 +24,14 @@ class ProviderLoading : public testing::Test {
                                                                   "\nnamespace: root/test\n"));
   }
 
-  /// The message with which an enumeration fails and, the same in substance, the one of the check.
+  // The message with which an enumeration fails and, the same in substance, the one of the check.
   std::vector<std::string> complaints() {
     const RequestScope scope(manager.broker());
-    CMPIStatus status = kOk;
-    const auto* path = CMNewObjectPath(manager.broker(), kNamespace, "TST_Processor", nullptr);
+    CMPIStatus status = ok;
+    const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "TST_Processor", nullptr);
     EXPECT_EQ(CBEnumInstances(manager.broker(), RequestScope::current()->context(), path, nullptr, &status), nullptr);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    std::vector<std::string> result = {textOf(status.msg)};
+    std::vector<std::string> result = {shownText(status.msg)};
     try {
       manager.checkProviders();
     } catch (const ConfigurationError& error) {
@@ -39,15 +40,15 @@ class ProviderLoading : public testing::Test {
     return result;
   }
 
-  Testing::TemporaryDirectory directory;
+  TemporaryDirectory directory;
   ObjectManager manager;
 };
 
-TEST_F(ProviderLoading, ASharedObjectServesItsClass) {
+TEST_F(ProviderLoadingTest, ASharedObjectServesItsClass) {
   registerProvider("ProbeSystem", "probe");
   manager.checkProviders();
   const RequestScope scope(manager.broker());
-  const auto* path = CMNewObjectPath(manager.broker(), kNamespace, "CIM_System", nullptr);
+  const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "CIM_System", nullptr);
   CMPIContext* context = RequestScope::current()->context();
   const std::vector<std::string> expected = {
       "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"",
@@ -56,30 +57,30 @@ TEST_F(ProviderLoading, ASharedObjectServesItsClass) {
   EXPECT_EQ(pathsOf(CBEnumInstanceNames(manager.broker(), context, path, nullptr)), expected);
 }
 
-TEST_F(ProviderLoading, AMissingLibraryIsNamedWithWhereItWasLookedFor) {
+TEST_F(ProviderLoadingTest, AMissingLibraryIsNamedWithWhereItWasLookedFor) {
   registerProvider("ProbeSystem", "missing");
   EXPECT_THAT(complaints(),
               ElementsAre(AllOf(HasSubstr("libmissing.so"), HasSubstr(directory.path().string())),
                           AllOf(HasSubstr("providers.reg:1: provider ProbeSystem"), HasSubstr("libmissing.so"))));
 }
 
-TEST_F(ProviderLoading, AFileThatIsNoLibraryIsNamedWithTheLoadersReason) {
+TEST_F(ProviderLoadingTest, AFileThatIsNoLibraryIsNamedWithTheLoadersReason) {
   registerProvider("ProbeSystem", "garbage");
   EXPECT_THAT(complaints(), ElementsAre(HasSubstr("libgarbage.so cannot be loaded"), HasSubstr("libgarbage.so")));
 }
 
-TEST_F(ProviderLoading, AMissingFactoryIsNamed) {
+TEST_F(ProviderLoadingTest, AMissingFactoryIsNamed) {
   registerProvider("ProbeSystem", "nofactory");
   EXPECT_THAT(complaints(), ElementsAre(HasSubstr("libnofactory.so has no function ProbeSystem_Create_InstanceMI"),
                                         HasSubstr("ProbeSystem_Create_InstanceMI")));
 }
 
-TEST_F(ProviderLoading, AFactoryOfTheOtherTypeDoesNotDo) {
+TEST_F(ProviderLoadingTest, AFactoryOfTheOtherTypeDoesNotDo) {
   registerProvider("ProbeSystem", "probe", "TST_Hosted", "association");
   EXPECT_THROW(manager.checkProviders(), ConfigurationError);
 }
 
-TEST_F(ProviderLoading, AClassThatTheSchemaLacksIsFoundByTheCheck) {
+TEST_F(ProviderLoadingTest, AClassThatTheSchemaLacksIsFoundByTheCheck) {
   registerProvider("ProbeSystem", "probe", "TST_Nothing");
   try {
     manager.checkProviders();
@@ -89,10 +90,9 @@ TEST_F(ProviderLoading, AClassThatTheSchemaLacksIsFoundByTheCheck) {
   }
 }
 
-TEST_F(ProviderLoading, ALinkedProviderWithoutTheFactoryIsNamed) {
-  manager.addProvider({"TST_Processor", "Linked", "", true, false, {kNamespace}, ""}, nullptr, nullptr);
+TEST_F(ProviderLoadingTest, ALinkedProviderWithoutTheFactoryIsNamed) {
+  manager.addProvider({"TST_Processor", "Linked", "", true, false, {testNamespace}, ""}, nullptr, nullptr);
   EXPECT_THAT(complaints(), ElementsAre(HasSubstr("Linked_Create_InstanceMI"), HasSubstr("provider Linked")));
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -4,20 +4,21 @@
 #include "cimom/ObjectManager.h"
 #include "tests/support/TemporaryDirectory.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::SizeIs;
 
-class Registration : public testing::Test {
+class RegistrationTest : public testing::Test {
  protected:
   std::vector<ProviderRegistration> read(std::string_view text) {
     return readRegistration(directory.write("test.reg", text));
   }
 
-  /// What the reader says, without the directory.
+  // What the reader says, without the directory.
   std::string complaint(std::string_view text) {
     try {
       read(text);
@@ -27,10 +28,10 @@ class Registration : public testing::Test {
     return {};
   }
 
-  Testing::TemporaryDirectory directory;
+  TemporaryDirectory directory;
 };
 
-TEST_F(Registration, AStanzaNamesAClassAndItsProvider) {
+TEST_F(RegistrationTest, AStanzaNamesAClassAndItsProvider) {
   const auto all = read(
       "# the first\n[CIM_One]\n   provider: OneProvider\n   location: onelib\n   type: instance association\n"
       "   namespace: root/cimv2 root/other\n#\n\n[ CIM_Two ]\nprovider:TwoProvider # who\n  location:\ttwolib\r\n"
@@ -51,9 +52,9 @@ TEST_F(Registration, AStanzaNamesAClassAndItsProvider) {
   EXPECT_THAT(all[1].namespaces, ElementsAre("root/cimv2", "root/third"));
 }
 
-TEST_F(Registration, AnEmptyFileRegistersNothing) { EXPECT_THAT(read("# nothing\n\n"), SizeIs(0)); }
+TEST_F(RegistrationTest, AnEmptyFileRegistersNothing) { EXPECT_THAT(read("# nothing\n\n"), SizeIs(0)); }
 
-TEST_F(Registration, WhatIsWrongIsNamedWithItsLine) {
+TEST_F(RegistrationTest, WhatIsWrongIsNamedWithItsLine) {
   const std::string stanza = "[C]\nprovider: P\nlocation: l\ntype: instance\nnamespace: n\n";
   const struct {
     std::string text;
@@ -72,15 +73,17 @@ TEST_F(Registration, WhatIsWrongIsNamedWithItsLine) {
       {"[C]\nprovider: P\nlocation: l\nnamespace: n\n" + stanza, "test.reg:1: [C] lacks \"type\""},
       {stanza + "[D]\nprovider: P\nlocation: l\ntype: instance\n", "test.reg:6: [D] lacks \"namespace\""},
   };
-  for (const auto& row : rows) EXPECT_THAT(complaint(row.text), HasSubstr(row.says)) << row.text;
+  for (const auto& row : rows) {
+    EXPECT_THAT(complaint(row.text), HasSubstr(row.says)) << row.text;
+  }
 }
 
-TEST_F(Registration, AFileThatCannotBeReadIsNamed) {
+TEST_F(RegistrationTest, AFileThatCannotBeReadIsNamed) {
   EXPECT_THROW(readRegistration(directory.path() / "none.reg"), ConfigurationError);
   EXPECT_THROW(readRegistration(directory.path()), ConfigurationError);
 }
 
-TEST_F(Registration, AClassHasOneProviderInANamespace) {
+TEST_F(RegistrationTest, AClassHasOneProviderInANamespace) {
   ObjectManager manager;
   manager.loadRegistration(directory.write("one.reg",
                                            "[C]\nprovider: P\nlocation: l\ntype: instance\nnamespace: root/a\n"
@@ -98,4 +101,3 @@ TEST_F(Registration, AClassHasOneProviderInANamespace) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -1,18 +1,19 @@
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::SizeIs;
 
-class AssociationOperations : public BrokerFixture {
+class AssociationOperationsTest : public BrokerFixture {
  protected:
-  AssociationOperations() {
-    hosted->serve(manager, "TST_Hosted", kNamespace, true);
-    peers->serve(manager, "TST_Peers", kNamespace, true);
+  AssociationOperationsTest() {
+    hosted->serve(manager, "TST_Hosted", testNamespace, true);
+    peers->serve(manager, "TST_Peers", testNamespace, true);
   }
 
   CMPIEnumeration* associators(const CMPIObjectPath* source, const char* association) {
@@ -28,7 +29,7 @@ class AssociationOperations : public BrokerFixture {
   std::shared_ptr<ProbeProvider> peers = std::make_shared<ProbeProvider>();
 };
 
-TEST_F(AssociationOperations, TheNamedAssociationAloneIsAskedWithAllThatTheClientSays) {
+TEST_F(AssociationOperationsTest, TheNamedAssociationAloneIsAskedWithAllThatTheClientSays) {
   associators(systemPath("one"), "tst_hosted");
 
   EXPECT_EQ(status.rc, CMPI_RC_OK);
@@ -41,19 +42,19 @@ TEST_F(AssociationOperations, TheNamedAssociationAloneIsAskedWithAllThatTheClien
   EXPECT_THAT(peers->calls, IsEmpty());
 }
 
-TEST_F(AssociationOperations, TheNamedAssociationIsAskedEvenWhereTheSourceFitsNoReference) {
+TEST_F(AssociationOperationsTest, TheNamedAssociationIsAskedEvenWhereTheSourceFitsNoReference) {
   associators(systemPath("one"), "TST_Peers");
   EXPECT_THAT(peers->calls, SizeIs(1));
 }
 
-TEST_F(AssociationOperations, ASuperclassStandsForTheRegisteredSubclasses) {
+TEST_F(AssociationOperationsTest, ASuperclassStandsForTheRegisteredSubclasses) {
   associators(systemPath("one"), "CIM_Hosted");
   ASSERT_THAT(hosted->calls, SizeIs(1));
   EXPECT_EQ(hosted->calls[0].associationClass, "TST_Hosted") << "the concrete class is filled in";
   EXPECT_THAT(peers->calls, IsEmpty());
 }
 
-TEST_F(AssociationOperations, WithoutAClassEveryAssociationThatFitsTheSourceIsAskedOnce) {
+TEST_F(AssociationOperationsTest, WithoutAClassEveryAssociationThatFitsTheSourceIsAskedOnce) {
   associators(systemPath("one"), nullptr);
   ASSERT_THAT(hosted->calls, SizeIs(1));
   EXPECT_EQ(hosted->calls[0].associationClass, "TST_Hosted");
@@ -65,22 +66,24 @@ TEST_F(AssociationOperations, WithoutAClassEveryAssociationThatFitsTheSourceIsAs
   EXPECT_EQ(peers->calls[0].associationClass, "TST_Peers");
 }
 
-TEST_F(AssociationOperations, ReferencesGetTheAssociationClassAsResultClass) {
+TEST_F(AssociationOperationsTest, ReferencesGetTheAssociationClassAsResultClass) {
   references(systemPath("one"), nullptr);
   references(systemPath("one"), "CIM_Hosted");
   CBReferenceNames(broker, request.context(), systemPath("one"), nullptr, nullptr, &status);
   ASSERT_THAT(hosted->calls, SizeIs(3));
-  for (const Call& call : hosted->calls) EXPECT_EQ(call.resultClass, "TST_Hosted");
+  for (const Call& call : hosted->calls) {
+    EXPECT_EQ(call.resultClass, "TST_Hosted");
+  }
   EXPECT_EQ(hosted->calls[0].role, "Antecedent");
   EXPECT_EQ(hosted->calls[2].operation, "referenceNames");
 }
 
-TEST_F(AssociationOperations, AssociatorNamesReachTheProvider) {
+TEST_F(AssociationOperationsTest, AssociatorNamesReachTheProvider) {
   hosted->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMPIObjectPath* far = systemPath("far");
     CMSetHostname(far, "host");
     CMReturnObjectPath(result, far);
-    return kOk;
+    return ok;
   };
   CMPIEnumeration* found =
       CBAssociatorNames(broker, request.context(), systemPath("one"), nullptr, nullptr, nullptr, nullptr, &status);
@@ -88,29 +91,29 @@ TEST_F(AssociationOperations, AssociatorNamesReachTheProvider) {
               ElementsAre("//host/root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"far\""));
 }
 
-TEST_F(AssociationOperations, AnUnknownAssociationClassIsAWrongParameter) {
+TEST_F(AssociationOperationsTest, AnUnknownAssociationClassIsAWrongParameter) {
   EXPECT_EQ(associators(systemPath("one"), "TST_Nothing"), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
-  EXPECT_THAT(textOf(status.msg), HasSubstr("TST_Nothing"));
+  EXPECT_THAT(shownText(status.msg), HasSubstr("TST_Nothing"));
 }
 
-TEST_F(AssociationOperations, AnUnknownSourceClassOrNamespaceIsRefused) {
+TEST_F(AssociationOperationsTest, AnUnknownSourceClassOrNamespaceIsRefused) {
   EXPECT_EQ(associators(path("TST_Nothing"), nullptr), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
   EXPECT_EQ(associators(path("TST_Point", "root/nowhere"), nullptr), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_NAMESPACE);
 }
 
-TEST_F(AssociationOperations, OneProvidersFailureIsTheOperations) {
+TEST_F(AssociationOperationsTest, OneProvidersFailureIsTheOperations) {
   peers->answer = [this](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*,
                          const CMPIInstance*) -> CMPIStatus {
     CMReturnWithChars(broker, CMPI_RC_ERR_FAILED, "broken");
   };
   EXPECT_EQ(associators(path("TST_Point"), nullptr), nullptr);
-  EXPECT_EQ(textOf(status.msg), "broken");
+  EXPECT_EQ(shownText(status.msg), "broken");
 }
 
-TEST_F(AssociationOperations, AnAssociationInstanceMadeOnAKeylessPathGetsItsReferencesAsKeys) {
+TEST_F(AssociationOperationsTest, AnAssociationInstanceMadeOnAKeylessPathGetsItsReferencesAsKeys) {
   CMPIObjectPath* system = systemPath("one");
   CMPIObjectPath* point = path("TST_Point");
   const CMPIUint16 number = 4;
@@ -120,7 +123,7 @@ TEST_F(AssociationOperations, AnAssociationInstanceMadeOnAKeylessPathGetsItsRefe
     CMSetProperty(association, "Antecedent", &system, CMPI_ref);
     CMSetProperty(association, "Dependent", &point, CMPI_ref);
     CMReturnInstance(result, association);
-    return kOk;
+    return ok;
   };
   EXPECT_THAT(pathsOf(references(system, nullptr)),
               ElementsAre("root/test:TST_Hosted.Antecedent=\"root/test:TST_Processor.CreationClassName="
@@ -128,13 +131,13 @@ TEST_F(AssociationOperations, AnAssociationInstanceMadeOnAKeylessPathGetsItsRefe
   EXPECT_THAT(pathsOf(CBEnumInstances(broker, request.context(), path("CIM_Hosted"), nullptr, &status)), SizeIs(1));
 }
 
-TEST_F(AssociationOperations, AnAssociationThatIsRegisteredForInstancesOnlyIsNotTraversed) {
+TEST_F(AssociationOperationsTest, AnAssociationThatIsRegisteredForInstancesOnlyIsNotTraversed) {
   std::shared_ptr<ProbeProvider> quiet = std::make_shared<ProbeProvider>();
   ObjectManager other;
-  other.loadSchemaText(kSchema, kNamespace);
-  quiet->serve(other, "TST_Hosted", kNamespace, false);
+  other.loadSchemaText(testSchema, testNamespace);
+  quiet->serve(other, "TST_Hosted", testNamespace, false);
   const RequestScope scope(other.broker());
-  const auto* source = CMNewObjectPath(other.broker(), kNamespace, "TST_Processor", nullptr);
+  const auto* source = CMNewObjectPath(other.broker(), testNamespace, "TST_Processor", nullptr);
   EXPECT_NE(
       CBReferences(other.broker(), RequestScope::current()->context(), source, "TST_Hosted", nullptr, nullptr, &status),
       nullptr);
@@ -142,4 +145,3 @@ TEST_F(AssociationOperations, AnAssociationThatIsRegisteredForInstancesOnlyIsNot
 }
 
 }  // namespace
-}  // namespace Cimom::Test

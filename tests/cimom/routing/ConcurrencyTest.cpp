@@ -3,12 +3,14 @@
 
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
-/// A provider that keeps no state and answers with one system, whose name it takes from the request's context.
+using namespace Cimom;
+using namespace Testing;
+
+// A provider that keeps no state and answers with one system, whose name it takes from the request's context.
 struct StatelessProvider {
-  static CMPIStatus cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { return kOk; }
+  static CMPIStatus cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { return ok; }
 
   static CMPIStatus enumerateInstances(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
                                        const CMPIObjectPath* asked, const char**) {
@@ -17,7 +19,7 @@ struct StatelessProvider {
     const CMPIData name = CMGetContextEntry(context, CMPIPrincipal, nullptr);
     CMSetProperty(system, "Name", &name.value.string, CMPI_string);
     CMReturnInstance(result, system);
-    return kOk;
+    return ok;
   }
 
   static inline CMPIInstanceMIFT table = {CMPICurrentVersion,
@@ -35,11 +37,11 @@ struct StatelessProvider {
   static inline std::atomic<int> made = 0;
 };
 
-TEST(Concurrency, RequestsOnSeveralThreadsKeepApart) {
+TEST(ConcurrencyTest, RequestsOnSeveralThreadsKeepApart) {
   ObjectManager manager;
-  manager.loadSchemaText(kSchema, kNamespace);
+  manager.loadSchemaText(testSchema, testNamespace);
   manager.addProvider(
-      {"TST_Processor", "Stateless", "", true, false, {kNamespace}, ""},
+      {"TST_Processor", "Stateless", "", true, false, {testNamespace}, ""},
       [](const CMPIBroker* broker, const CMPIContext*, CMPIStatus*) {
         ++StatelessProvider::made;
         StatelessProvider::mi.hdl = broker;
@@ -53,17 +55,20 @@ TEST(Concurrency, RequestsOnSeveralThreadsKeepApart) {
       RequestScope scope(manager.broker());
       CMPIContext* context = scope.context();
       CMAddContextEntry(context, CMPIPrincipal, name.c_str(), CMPI_chars);
-      const auto* path = CMNewObjectPath(manager.broker(), kNamespace, "TST_Processor", nullptr);
+      const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "TST_Processor", nullptr);
       const auto found = pathsOf(CBEnumInstances(manager.broker(), context, path, nullptr, nullptr));
       wrong += found != std::vector<std::string>{expected};
     }
   };
   std::vector<std::thread> threads;
-  for (const char* name : {"a", "b", "c", "d"}) threads.emplace_back(work, name);
-  for (std::thread& thread : threads) thread.join();
+  for (const char* name : {"a", "b", "c", "d"}) {
+    threads.emplace_back(work, name);
+  }
+  for (std::thread& thread : threads) {
+    thread.join();
+  }
   EXPECT_EQ(wrong, 0);
   EXPECT_EQ(StatelessProvider::made, 1) << "the first requests make the provider once between them";
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -1,24 +1,27 @@
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::SizeIs;
 
-class InstanceOperations : public BrokerFixture {
+class InstanceOperationsTest : public BrokerFixture {
  protected:
-  InstanceOperations() { probe->serve(manager, "TST_Processor", kNamespace); }
+  InstanceOperationsTest() { probe->serve(manager, "TST_Processor", testNamespace); }
 
-  /// A provider that returns systems of these names, of the class that it is asked for.
+  // A provider that returns systems of these names, of the class that it is asked for.
   ProbeProvider::Answer returning(std::vector<std::string> names) {
     return
         [this, names](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* asked, const CMPIInstance*) {
-          const std::string className = textOf(CMGetClassName(asked, nullptr));
-          for (const std::string& name : names) CMReturnInstance(result, system(name.c_str(), className.c_str()));
-          return kOk;
+          const std::string className = shownText(CMGetClassName(asked, nullptr));
+          for (const std::string& name : names) {
+            CMReturnInstance(result, system(name.c_str(), className.c_str()));
+          }
+          return ok;
         };
   }
 
@@ -27,19 +30,19 @@ class InstanceOperations : public BrokerFixture {
   std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
 };
 
-TEST_F(InstanceOperations, AnUnknownNamespaceIsRefused) {
+TEST_F(InstanceOperationsTest, AnUnknownNamespaceIsRefused) {
   EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor", "root/nowhere"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_NAMESPACE);
-  EXPECT_THAT(textOf(status.msg), HasSubstr("root/nowhere"));
+  EXPECT_THAT(shownText(status.msg), HasSubstr("root/nowhere"));
 }
 
-TEST_F(InstanceOperations, AnUnknownClassIsRefused) {
+TEST_F(InstanceOperationsTest, AnUnknownClassIsRefused) {
   EXPECT_EQ(CBEnumInstanceNames(broker, context(), path("TST_Nothing"), &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
-  EXPECT_THAT(textOf(status.msg), HasSubstr("TST_Nothing"));
+  EXPECT_THAT(shownText(status.msg), HasSubstr("TST_Nothing"));
 }
 
-TEST_F(InstanceOperations, AClassWithoutAProviderHasNoInstances) {
+TEST_F(InstanceOperationsTest, AClassWithoutAProviderHasNoInstances) {
   CMPIEnumeration* found = CBEnumInstances(broker, context(), path("CIM_Point"), nullptr, &status);
 
   ASSERT_NE(found, nullptr);
@@ -47,10 +50,10 @@ TEST_F(InstanceOperations, AClassWithoutAProviderHasNoInstances) {
   EXPECT_FALSE(CMHasNext(found, nullptr));
 }
 
-TEST_F(InstanceOperations, AClassHasAProviderInItsRegisteredNamespacesOnly) {
+TEST_F(InstanceOperationsTest, AClassHasAProviderInItsRegisteredNamespacesOnly) {
   std::shared_ptr<ProbeProvider> other = std::make_shared<ProbeProvider>();
   ObjectManager second;
-  second.loadSchemaText(kSchema, "root/a");
+  second.loadSchemaText(testSchema, "root/a");
   other->serve(second, "TST_Processor", "root/b");
   const RequestScope scope(second.broker());
   CMPIContext* here = RequestScope::current()->context();
@@ -63,9 +66,9 @@ TEST_F(InstanceOperations, AClassHasAProviderInItsRegisteredNamespacesOnly) {
   EXPECT_THAT(other->calls, SizeIs(1));
 }
 
-TEST_F(InstanceOperations, EnumerationOfASuperclassCallsEachRegisteredSubclassWithItsName) {
+TEST_F(InstanceOperationsTest, EnumerationOfASuperclassCallsEachRegisteredSubclassWithItsName) {
   std::shared_ptr<ProbeProvider> other = std::make_shared<ProbeProvider>();
-  other->serve(manager, "TST_Other", kNamespace);
+  other->serve(manager, "TST_Other", testNamespace);
   probe->answer = returning({"one", "two"});
   other->answer = returning({"three"});
   const char* properties[] = {"Name", nullptr};
@@ -83,12 +86,12 @@ TEST_F(InstanceOperations, EnumerationOfASuperclassCallsEachRegisteredSubclassWi
   EXPECT_EQ(other->calls[0].path, "root/test:TST_Other");
 }
 
-TEST_F(InstanceOperations, NamesAreThePathsThatTheProviderReturns) {
+TEST_F(InstanceOperationsTest, NamesAreThePathsThatTheProviderReturns) {
   probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMPIObjectPath* homeless = systemPath("one");
     CMSetNameSpace(homeless, "");
     CMReturnObjectPath(result, homeless);
-    return kOk;
+    return ok;
   };
 
   CMPIEnumeration* found = CBEnumInstanceNames(broker, context(), path("tst_processor"), &status);
@@ -96,25 +99,25 @@ TEST_F(InstanceOperations, NamesAreThePathsThatTheProviderReturns) {
   EXPECT_THAT(pathsOf(found), ElementsAre("root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\""));
 }
 
-TEST_F(InstanceOperations, WhatWasReturnedDoesNotChangeWithTheProvidersObject) {
+TEST_F(InstanceOperationsTest, WhatWasReturnedDoesNotChangeWithTheProvidersObject) {
   probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMPIInstance* reused = system("one");
     CMSetProperty(reused, "Caption", "first", CMPI_chars);
     CMReturnInstance(result, reused);
     CMSetProperty(reused, "Caption", "second", CMPI_chars);
     CMReturnInstance(result, reused);
-    return kOk;
+    return ok;
   };
 
   CMPIEnumeration* found = CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status);
 
   for (const char* expected : {"first", "second"}) {
     const CMPIData item = CMGetNext(found, nullptr);
-    EXPECT_EQ(textOf(CMGetProperty(item.value.inst, "Caption", nullptr).value.string), expected);
+    EXPECT_EQ(shownText(CMGetProperty(item.value.inst, "Caption", nullptr).value.string), expected);
   }
 }
 
-TEST_F(InstanceOperations, AFailureAfterSomeResultsIsAllThatTheCallerGets) {
+TEST_F(InstanceOperationsTest, AFailureAfterSomeResultsIsAllThatTheCallerGets) {
   probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*,
                          const CMPIInstance*) -> CMPIStatus {
     CMReturnInstance(result, system("one"));
@@ -123,57 +126,57 @@ TEST_F(InstanceOperations, AFailureAfterSomeResultsIsAllThatTheCallerGets) {
 
   EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
-  EXPECT_EQ(textOf(status.msg), "not for you");
+  EXPECT_EQ(shownText(status.msg), "not for you");
 }
 
-TEST_F(InstanceOperations, AnErrorObjectThatTheProviderReturnsFailsTheOperation) {
+TEST_F(InstanceOperationsTest, AnErrorObjectThatTheProviderReturnsFailsTheOperation) {
   probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMReturnError(result, broker->eft->newCMPIError(broker, "owner", "ID1", "disk gone", CMPIErrorSeverityUnknown,
                                                     CMPIErrorProbableCauseUnknown, CMPI_RC_ERR_ACCESS_DENIED, nullptr));
-    return kOk;
+    return ok;
   };
 
   EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_ACCESS_DENIED);
-  EXPECT_EQ(textOf(status.msg), "disk gone");
+  EXPECT_EQ(shownText(status.msg), "disk gone");
 }
 
-TEST_F(InstanceOperations, GetInstanceGivesTheFirstThatIsReturned) {
+TEST_F(InstanceOperationsTest, GetInstanceGivesTheFirstThatIsReturned) {
   probe->answer = returning({"one", "two"});
 
   const CMPIInstance* found = CBGetInstance(broker, context(), systemPath("two"), nullptr, &status);
 
   ASSERT_NE(found, nullptr);
-  EXPECT_EQ(textOf(CMGetProperty(found, "Name", nullptr).value.string), "one");
+  EXPECT_EQ(shownText(CMGetProperty(found, "Name", nullptr).value.string), "one");
   EXPECT_EQ(probe->calls[0].path, "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"two\"");
 }
 
-TEST_F(InstanceOperations, GetInstanceThatReturnsNothingFindsNothing) {
+TEST_F(InstanceOperationsTest, GetInstanceThatReturnsNothingFindsNothing) {
   EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
-  EXPECT_THAT(textOf(status.msg), HasSubstr("Name=\"one\""));
+  EXPECT_THAT(shownText(status.msg), HasSubstr("Name=\"one\""));
 }
 
-TEST_F(InstanceOperations, GetInstanceOfAClassWithoutAProviderFindsNothing) {
+TEST_F(InstanceOperationsTest, GetInstanceOfAClassWithoutAProviderFindsNothing) {
   EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one", "CIM_System"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
   EXPECT_THAT(probe->calls, IsEmpty());
 }
 
-TEST_F(InstanceOperations, ModifyInstanceHandsOverTheWholeInstanceWithoutDefaults) {
+TEST_F(InstanceOperationsTest, ModifyInstanceHandsOverTheWholeInstanceWithoutDefaults) {
   CMPIInstance* sent = CMNewInstance(broker, path("TST_Processor"), nullptr);
   CMSetProperty(sent, "CreationClassName", "TST_Processor", CMPI_chars);
   CMSetProperty(sent, "Name", "one", CMPI_chars);
   CMSetProperty(sent, "Caption", "new", CMPI_chars);
   probe->answer = [&](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
-    EXPECT_EQ(textOf(CMGetProperty(instance, "Caption", nullptr).value.string), "new");
+    EXPECT_EQ(shownText(CMGetProperty(instance, "Caption", nullptr).value.string), "new");
     const CMPIData unsent = CMGetProperty(instance, "EnabledState", &status);
     EXPECT_TRUE(CMIsNullValue(unsent)) << "a class default is nothing that the client sent";
     EXPECT_EQ(status.rc, CMPI_RC_OK);
     CMGetProperty(instance, "Undeclared", &status);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
     EXPECT_EQ(CMGetKeyCount(CMGetObjectPath(instance, nullptr), nullptr), 2u);
-    return kOk;
+    return ok;
   };
 
   const CMPIStatus modified = CBModifyInstance(broker, context(), path("TST_Processor"), sent, nullptr);
@@ -184,22 +187,22 @@ TEST_F(InstanceOperations, ModifyInstanceHandsOverTheWholeInstanceWithoutDefault
   EXPECT_FALSE(probe->calls[0].hasProperties);
 }
 
-TEST_F(InstanceOperations, ModifyInstancePassesThePropertyListOn) {
+TEST_F(InstanceOperationsTest, ModifyInstancePassesThePropertyListOn) {
   const char* properties[] = {"Caption", "Vendor", nullptr};
   CBModifyInstance(broker, context(), systemPath("one"), system("one"), properties);
   ASSERT_THAT(probe->calls, SizeIs(1));
   EXPECT_THAT(probe->calls[0].properties, ElementsAre("Caption", "Vendor"));
 }
 
-TEST_F(InstanceOperations, ModifyInstanceRefusesAnInstanceOfAnotherClass) {
-  probe->serve(manager, "TST_Other", kNamespace);
+TEST_F(InstanceOperationsTest, ModifyInstanceRefusesAnInstanceOfAnotherClass) {
+  probe->serve(manager, "TST_Other", testNamespace);
   const CMPIStatus refused =
       CBModifyInstance(broker, context(), systemPath("one"), system("one", "TST_Other"), nullptr);
   EXPECT_EQ(refused.rc, CMPI_RC_ERR_INVALID_PARAMETER);
   EXPECT_THAT(probe->calls, IsEmpty());
 }
 
-TEST_F(InstanceOperations, WritingToAClassWithoutAProviderIsNotSupported) {
+TEST_F(InstanceOperationsTest, WritingToAClassWithoutAProviderIsNotSupported) {
   CMPIObjectPath* orphan = systemPath("one", "TST_Other");
   CMPIInstance* instance = system("one", "TST_Other");
   EXPECT_EQ(CBModifyInstance(broker, context(), orphan, instance, nullptr).rc, CMPI_RC_ERR_NOT_SUPPORTED);
@@ -208,34 +211,34 @@ TEST_F(InstanceOperations, WritingToAClassWithoutAProviderIsNotSupported) {
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
-TEST_F(InstanceOperations, CreateInstanceGivesTheProvidersPathElseTheInstances) {
+TEST_F(InstanceOperationsTest, CreateInstanceGivesTheProvidersPathElseTheInstances) {
   const CMPIObjectPath* own = CBCreateInstance(broker, context(), path("TST_Processor"), system("one"), &status);
-  EXPECT_EQ(textOf(CMObjectPathToString(own, nullptr)),
+  EXPECT_EQ(shownText(CMObjectPathToString(own, nullptr)),
             "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"");
   probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMReturnObjectPath(result, systemPath("given"));
-    return kOk;
+    return ok;
   };
   const CMPIObjectPath* given = CBCreateInstance(broker, context(), path("TST_Processor"), system("one"), &status);
-  EXPECT_THAT(textOf(CMObjectPathToString(given, nullptr)), HasSubstr("Name=\"given\""));
+  EXPECT_THAT(shownText(CMObjectPathToString(given, nullptr)), HasSubstr("Name=\"given\""));
 }
 
-TEST_F(InstanceOperations, DeleteInstanceReachesTheProvider) {
+TEST_F(InstanceOperationsTest, DeleteInstanceReachesTheProvider) {
   EXPECT_EQ(CBDeleteInstance(broker, context(), systemPath("one")).rc, CMPI_RC_OK);
   ASSERT_THAT(probe->calls, SizeIs(1));
   EXPECT_EQ(probe->calls[0].operation, "deleteInstance");
 }
 
-TEST_F(InstanceOperations, PropertyCallsAreInstanceCallsOfOneProperty) {
+TEST_F(InstanceOperationsTest, PropertyCallsAreInstanceCallsOfOneProperty) {
   probe->answer = returning({"one"});
-  EXPECT_EQ(textOf(CBGetProperty(broker, context(), systemPath("one"), "name", &status).value.string), "one");
+  EXPECT_EQ(shownText(CBGetProperty(broker, context(), systemPath("one"), "name", &status).value.string), "one");
   EXPECT_THAT(probe->calls[0].properties, ElementsAre("Name"));
   CBGetProperty(broker, context(), systemPath("one"), "Undeclared", &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 
   probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
-    EXPECT_EQ(textOf(CMGetProperty(instance, "Caption", nullptr).value.string), "set");
-    return kOk;
+    EXPECT_EQ(shownText(CMGetProperty(instance, "Caption", nullptr).value.string), "set");
+    return ok;
   };
   const CMPIStatus set = broker->bft->setProperty(broker, context(), systemPath("one"), "Caption",
                                                   reinterpret_cast<const CMPIValue*>("set"), CMPI_chars);
@@ -244,15 +247,14 @@ TEST_F(InstanceOperations, PropertyCallsAreInstanceCallsOfOneProperty) {
   EXPECT_THAT(probe->calls.back().properties, ElementsAre("Caption"));
 }
 
-TEST_F(InstanceOperations, QueriesMethodsAndIndicationsAreHonestlyRefused) {
+TEST_F(InstanceOperationsTest, QueriesMethodsAndIndicationsAreHonestlyRefused) {
   EXPECT_EQ(CBExecQuery(broker, context(), path("TST_Processor"), "select * from x", "WQL", &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
   CBInvokeMethod(broker, context(), systemPath("one"), "reset", nullptr, nullptr, &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_METHOD_NOT_AVAILABLE);
   CBInvokeMethod(broker, context(), systemPath("one"), "Explode", nullptr, nullptr, &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_METHOD_NOT_FOUND);
-  EXPECT_EQ(CBDeliverIndication(broker, context(), kNamespace, system("one")).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  EXPECT_EQ(CBDeliverIndication(broker, context(), testNamespace, system("one")).rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -2,23 +2,24 @@
 
 #include "tests/cimom/support/BrokerFixture.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::SizeIs;
 
-class ProviderCalls : public BrokerFixture {
+class ProviderCallsTest : public BrokerFixture {
  protected:
-  ProviderCalls() { probe->serve(manager, "TST_Processor", kNamespace); }
+  ProviderCallsTest() { probe->serve(manager, "TST_Processor", testNamespace); }
 
   CMPIContext* context() { return request.context(); }
 
   std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
 };
 
-TEST_F(ProviderCalls, AnEmptySlotOfAProviderIsNotSupported) {
+TEST_F(ProviderCallsTest, AnEmptySlotOfAProviderIsNotSupported) {
   static CMPIInstanceMIFT empty = {CMPICurrentVersion,
                                    CMPICurrentVersion,
                                    "instanceEmpty",
@@ -32,33 +33,33 @@ TEST_F(ProviderCalls, AnEmptySlotOfAProviderIsNotSupported) {
                                    nullptr};
   static CMPIInstanceMI mi = {&empty, &empty};
   manager.addProvider(
-      {"TST_Other", "empty", "", true, false, {kNamespace}, ""},
+      {"TST_Other", "empty", "", true, false, {testNamespace}, ""},
       [](const CMPIBroker*, const CMPIContext*, CMPIStatus*) { return &mi; }, nullptr);
   EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one", "TST_Other"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
-TEST_F(ProviderCalls, TheProviderGetsTheRequestsContext) {
+TEST_F(ProviderCallsTest, TheProviderGetsTheRequestsContext) {
   CMAddContextEntry(context(), CMPIPrincipal, "alice", CMPI_chars);
   probe->answer = [&](const CMPIContext* given, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) {
-    EXPECT_EQ(textOf(CMGetContextEntry(given, CMPIPrincipal, nullptr).value.string), "alice");
-    EXPECT_EQ(textOf(CMGetContextEntry(given, CMPIInitNameSpace, nullptr).value.string), kNamespace);
+    EXPECT_EQ(shownText(CMGetContextEntry(given, CMPIPrincipal, nullptr).value.string), "alice");
+    EXPECT_EQ(shownText(CMGetContextEntry(given, CMPIInitNameSpace, nullptr).value.string), testNamespace);
     const CMPIData flags = CMGetContextEntry(given, CMPIInvocationFlags, &status);
     EXPECT_EQ(flags.type, CMPI_uint32);
     EXPECT_EQ(flags.value.uint32, 0u);
-    return kOk;
+    return ok;
   };
   CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status);
   EXPECT_THAT(probe->calls, SizeIs(1));
   EXPECT_EQ(CMGetContextEntryCount(context(), nullptr), 1u) << "the caller's context stays its own";
 }
 
-TEST_F(ProviderCalls, AProviderReachesAnotherThroughUpCalls) {
+TEST_F(ProviderCallsTest, AProviderReachesAnotherThroughUpCalls) {
   std::shared_ptr<ProbeProvider> lower = std::make_shared<ProbeProvider>();
   lower->serve(manager, "TST_Other", "root/lower");
   lower->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMReturnInstance(result, system("low", "TST_Other"));
-    return kOk;
+    return ok;
   };
   probe->answer = [&](const CMPIContext* given, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMPIEnumeration* found = CBEnumInstances(probe->broker, given, path("TST_Other", "root/lower"), nullptr, nullptr);
@@ -67,27 +68,27 @@ TEST_F(ProviderCalls, AProviderReachesAnotherThroughUpCalls) {
       const CMPIData below = CMGetProperty(one, "Name", nullptr);
       CMReturnInstance(result, system(CMGetCharsPtr(below.value.string, nullptr)));
     }
-    return kOk;
+    return ok;
   };
   EXPECT_THAT(pathsOf(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status)),
               ElementsAre("root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"low\""));
 }
 
-TEST_F(ProviderCalls, UpCallsWithoutEndAreCutOff) {
+TEST_F(ProviderCallsTest, UpCallsWithoutEndAreCutOff) {
   probe->answer = [&](const CMPIContext* given, const CMPIResult*, const CMPIObjectPath* asked, const CMPIInstance*) {
-    CMPIStatus inner = kOk;
+    CMPIStatus inner = ok;
     CBEnumInstances(probe->broker, given, asked, nullptr, &inner);
     return inner;
   };
   EXPECT_EQ(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-  EXPECT_THAT(textOf(status.msg), HasSubstr("without end"));
+  EXPECT_THAT(shownText(status.msg), HasSubstr("without end"));
 }
 
-TEST_F(ProviderCalls, AFailingFactoryIsReportedAndTriedAgain) {
+TEST_F(ProviderCallsTest, AFailingFactoryIsReportedAndTriedAgain) {
   int tries = 0;
   manager.addProvider(
-      {"TST_Other", "late", "", true, false, {kNamespace}, ""},
+      {"TST_Other", "late", "", true, false, {testNamespace}, ""},
       [&](const CMPIBroker*, const CMPIContext*, CMPIStatus*) -> CMPIInstanceMI* {
         ++tries;
         return nullptr;
@@ -96,18 +97,18 @@ TEST_F(ProviderCalls, AFailingFactoryIsReportedAndTriedAgain) {
   for (int expected = 1; expected <= 2; ++expected) {
     EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one", "TST_Other"), nullptr, &status), nullptr);
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-    EXPECT_THAT(textOf(status.msg), HasSubstr("late_Create_InstanceMI"));
+    EXPECT_THAT(shownText(status.msg), HasSubstr("late_Create_InstanceMI"));
     EXPECT_EQ(tries, expected);
   }
 }
 
-TEST_F(ProviderCalls, AnExceptionOfTheProviderFailsTheRequestOnly) {
+TEST_F(ProviderCallsTest, AnExceptionOfTheProviderFailsTheRequestOnly) {
   probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) -> CMPIStatus {
     throw std::out_of_range("vector::_M_range_check");
   };
   EXPECT_EQ(CBGetInstance(broker, context(), systemPath("one"), nullptr, &status), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
-  EXPECT_THAT(textOf(status.msg), HasSubstr("vector::_M_range_check"));
+  EXPECT_THAT(shownText(status.msg), HasSubstr("vector::_M_range_check"));
 
   probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) -> CMPIStatus {
     throw 7;
@@ -116,14 +117,14 @@ TEST_F(ProviderCalls, AnExceptionOfTheProviderFailsTheRequestOnly) {
   EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
 }
 
-TEST_F(ProviderCalls, NullsReturnedToTheResultAreRefusedAndLoseNothing) {
-  CMPIStatus instanceStatus = kOk;
-  CMPIStatus pathStatus = kOk;
+TEST_F(ProviderCallsTest, NullsReturnedToTheResultAreRefusedAndLoseNothing) {
+  CMPIStatus instanceStatus = ok;
+  CMPIStatus pathStatus = ok;
   probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     instanceStatus = CMReturnInstance(result, nullptr);
     CMReturnInstance(result, system("one"));
     pathStatus = CMReturnObjectPath(result, systemPath("one"));
-    return kOk;
+    return ok;
   };
 
   CMPIEnumeration* found = CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status);
@@ -133,27 +134,29 @@ TEST_F(ProviderCalls, NullsReturnedToTheResultAreRefusedAndLoseNothing) {
   EXPECT_THAT(pathsOf(found), SizeIs(1));
 }
 
-TEST_F(ProviderCalls, ReturnDoneMakesNoDifferenceHoweverOftenItIsCalled) {
+TEST_F(ProviderCallsTest, ReturnDoneMakesNoDifferenceHoweverOftenItIsCalled) {
   for (int times = 0; times < 3; ++times) {
     probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
       CMReturnInstance(result, system("one"));
-      for (int time = 0; time < times; ++time) EXPECT_EQ(CMReturnDone(result).rc, CMPI_RC_OK);
-      return kOk;
+      for (int time = 0; time < times; ++time) {
+        EXPECT_EQ(CMReturnDone(result).rc, CMPI_RC_OK);
+      }
+      return ok;
     };
     EXPECT_THAT(pathsOf(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status)), SizeIs(1));
   }
 }
 
-TEST(ProviderLife, TheFactoryIsCalledOnceAndCleanupOncePerInterface) {
+TEST(ProviderLifeTest, TheFactoryIsCalledOnceAndCleanupOncePerInterface) {
   std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
   {
     ObjectManager manager;
-    manager.loadSchemaText(kSchema, kNamespace);
-    probe->serve(manager, "TST_Hosted", kNamespace, true);
+    manager.loadSchemaText(testSchema, testNamespace);
+    probe->serve(manager, "TST_Hosted", testNamespace, true);
     EXPECT_EQ(probe->factoryCalls, 0) << "providers are made when they are needed";
     const RequestScope scope(manager.broker());
-    const auto* path = CMNewObjectPath(manager.broker(), kNamespace, "TST_Hosted", nullptr);
-    const auto* source = CMNewObjectPath(manager.broker(), kNamespace, "CIM_System", nullptr);
+    const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "TST_Hosted", nullptr);
+    const auto* source = CMNewObjectPath(manager.broker(), testNamespace, "CIM_System", nullptr);
     for (int round = 0; round < 3; ++round) {
       CBEnumInstances(manager.broker(), RequestScope::current()->context(), path, nullptr, nullptr);
       CBReferenceNames(manager.broker(), RequestScope::current()->context(), source, nullptr, nullptr, nullptr);
@@ -166,4 +169,3 @@ TEST(ProviderLife, TheFactoryIsCalledOnceAndCleanupOncePerInterface) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -5,9 +5,10 @@
 #include "cimom/schema/ClassRepository.h"
 #include "tests/cimom/support/ManagedElements.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 
@@ -24,30 +25,34 @@ std::string complaint(ClassRepository& repository, std::string_view mof) {
 
 std::vector<std::string> namesOf(const std::vector<const ClassDefinition*>& classes) {
   std::vector<std::string> names;
-  for (const ClassDefinition* one : classes) names.push_back(one->name);
+  for (const ClassDefinition* one : classes) {
+    names.push_back(one->name);
+  }
   return names;
 }
 
 std::vector<std::string> propertiesOf(const ClassDefinition& definition) {
   std::vector<std::string> names;
-  for (const auto& property : definition.properties) names.push_back(property.name);
+  for (const auto& property : definition.properties) {
+    names.push_back(property.name);
+  }
   return names;
 }
 
-class Repository : public testing::Test {
+class ClassRepositoryTest : public testing::Test {
  protected:
   ClassRepository repository;
 };
 
-TEST_F(Repository, FindsClassesWithoutRegardToCase) {
-  load(repository, kSchema);
+TEST_F(ClassRepositoryTest, FindsClassesWithoutRegardToCase) {
+  load(repository, testSchema);
   ASSERT_NE(repository.find("tst_PROCESSOR"), nullptr);
   EXPECT_EQ(repository.find("tst_PROCESSOR")->name, "TST_Processor");
   EXPECT_EQ(repository.find("TST_Nothing"), nullptr);
 }
 
-TEST_F(Repository, InheritsPropertiesKeysAndMethods) {
-  load(repository, kSchema);
+TEST_F(ClassRepositoryTest, InheritsPropertiesKeysAndMethods) {
+  load(repository, testSchema);
   const ClassDefinition& processor = *repository.find("TST_Processor");
   EXPECT_EQ(processor.properties.front().name, "Caption");
   EXPECT_EQ(processor.properties.back().name, "Vendor");
@@ -59,8 +64,8 @@ TEST_F(Repository, InheritsPropertiesKeysAndMethods) {
   EXPECT_FALSE(repository.find("CIM_Element")->isA("TST_Processor"));
 }
 
-TEST_F(Repository, InheritsQualifiersButTheRestrictedOnes) {
-  load(repository, kSchema);
+TEST_F(ClassRepositoryTest, InheritsQualifiersButTheRestrictedOnes) {
+  load(repository, testSchema);
   EXPECT_TRUE(repository.find("TST_Hosted")->isAssociation());
   EXPECT_TRUE(isQualified(repository.find("CIM_Element")->qualifiers, "Abstract"));
   EXPECT_FALSE(isQualified(repository.find("CIM_System")->qualifiers, "Abstract"));
@@ -69,7 +74,7 @@ TEST_F(Repository, InheritsQualifiersButTheRestrictedOnes) {
             "\"A system\"");
 }
 
-TEST_F(Repository, AnOverridingPropertyTakesThePlaceAndTheQualifiersOfTheOther) {
+TEST_F(ClassRepositoryTest, AnOverridingPropertyTakesThePlaceAndTheQualifiersOfTheOther) {
   load(repository, R"(
       class Base { [Key, Description("base")] string Id = "b"; uint8 Other; string Kept = "k"; };
       class Derived : Base { [Description("derived")] string ID = "d"; string kept; uint8 Own; };)");
@@ -82,27 +87,27 @@ TEST_F(Repository, AnOverridingPropertyTakesThePlaceAndTheQualifiersOfTheOther) 
   EXPECT_EQ(findQualifier(derived.findProperty("id")->qualifiers, "Description")->value.toString(), "\"derived\"");
 }
 
-TEST_F(Repository, AReferenceMayBeNarrowedToASubclass) {
+TEST_F(ClassRepositoryTest, AReferenceMayBeNarrowedToASubclass) {
   load(repository,
-       std::string(kSchema) + "[Association] class TST_Own : CIM_Hosted { TST_Processor REF Antecedent; };");
+       std::string(testSchema) + "[Association] class TST_Own : CIM_Hosted { TST_Processor REF Antecedent; };");
   const PropertyDeclaration& narrowed = *repository.find("TST_Own")->findProperty("Antecedent");
   EXPECT_EQ(narrowed.referenceClass, "TST_Processor");
   EXPECT_TRUE(narrowed.isKey());
 }
 
-TEST_F(Repository, TheOrderOfDeclarationsDoesNotMatter) {
+TEST_F(ClassRepositoryTest, TheOrderOfDeclarationsDoesNotMatter) {
   load(repository, "class C : B {}; class B : A {}; class A { string P; };");
   EXPECT_THAT(propertiesOf(*repository.find("C")), ElementsAre("P"));
 }
 
-TEST_F(Repository, ClassesMayDeriveFromThoseLoadedBefore) {
+TEST_F(ClassRepositoryTest, ClassesMayDeriveFromThoseLoadedBefore) {
   load(repository, "class A { string P; };");
   load(repository, "class B : a {};");
   EXPECT_EQ(repository.find("B")->superclass, repository.find("A"));
 }
 
-TEST_F(Repository, ListsSubclasses) {
-  load(repository, kSchema);
+TEST_F(ClassRepositoryTest, ListsSubclasses) {
+  load(repository, testSchema);
   EXPECT_THAT(namesOf(repository.subclasses("cim_element", false)), ElementsAre("CIM_Point", "CIM_System"));
   EXPECT_THAT(namesOf(repository.subclasses("CIM_Element", true)),
               ElementsAre("CIM_Point", "CIM_System", "TST_Other", "TST_Point", "TST_Processor"));
@@ -111,7 +116,7 @@ TEST_F(Repository, ListsSubclasses) {
   EXPECT_THAT(namesOf(repository.subclasses("TST_Other", true)), ElementsAre());
 }
 
-TEST_F(Repository, KnowsTheNamespacesThatSomebodyNamed) {
+TEST_F(ClassRepositoryTest, KnowsTheNamespacesThatSomebodyNamed) {
   repository.addNamespace("/root/a/");
   repository.addNamespace("");
   load(repository, "#pragma namespace(\"root/b\")");
@@ -122,7 +127,7 @@ TEST_F(Repository, KnowsTheNamespacesThatSomebodyNamed) {
   EXPECT_THAT(repository.namespaces(), ElementsAre("root/a", "root/b"));
 }
 
-TEST_F(Repository, RefusesWhatCannotBeResolvedAndAddsNothing) {
+TEST_F(ClassRepositoryTest, RefusesWhatCannotBeResolvedAndAddsNothing) {
   load(repository, "class Known {};");
   EXPECT_EQ(complaint(repository, "class New {};\nclass known {};"),
             "text:2: class known is there already, declared at text:1");
@@ -140,4 +145,3 @@ TEST_F(Repository, RefusesWhatCannotBeResolvedAndAddsNothing) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -6,13 +6,14 @@
 #include "tests/cimom/support/ManagedElements.h"
 #include "tests/support/TemporaryDirectory.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-/// What the reader says of a text; empty where it accepts it.
+// What the reader says of a text; empty where it accepts it.
 std::string complaint(std::string_view mof) {
   try {
     MofReader().readText(mof, "text");
@@ -22,7 +23,7 @@ std::string complaint(std::string_view mof) {
   return {};
 }
 
-TEST(MofErrors, NameTheLineAndWhatWasExpected) {
+TEST(MofErrorsTest, NameTheLineAndWhatWasExpected) {
   const struct {
     const char* mof;
     const char* says;
@@ -80,15 +81,17 @@ TEST(MofErrors, NameTheLineAndWhatWasExpected) {
   }
 }
 
-TEST(MofErrors, ATextCutAnywhereIsAcceptedOrRefusedAndNoMore) {
-  const std::string whole = kSchema;
+TEST(MofErrorsTest, ATextCutAnywhereIsAcceptedOrRefusedAndNoMore) {
+  const std::string whole = testSchema;
   int refused = 0;
-  for (std::size_t length = 0; length < whole.size(); ++length) refused += !complaint(whole.substr(0, length)).empty();
+  for (std::size_t length = 0; length < whole.size(); ++length) {
+    refused += !complaint(whole.substr(0, length)).empty();
+  }
   EXPECT_GT(refused, 1000);
 }
 
-TEST(MofErrors, ATextWithABrokenByteAnywhereIsAcceptedOrRefusedAndNoMore) {
-  const std::string whole = kSchema;
+TEST(MofErrorsTest, ATextWithABrokenByteAnywhereIsAcceptedOrRefusedAndNoMore) {
+  const std::string whole = testSchema;
   for (const char wrong : {'\0', '"', '{', '\\', '\'', '\xFF', '['}) {
     for (std::size_t position = 0; position < whole.size(); position += 3) {
       std::string broken = whole;
@@ -98,8 +101,8 @@ TEST(MofErrors, ATextWithABrokenByteAnywhereIsAcceptedOrRefusedAndNoMore) {
   }
 }
 
-TEST(MofErrors, AFileIsNamedWithItsPath) {
-  const Testing::TemporaryDirectory directory;
+TEST(MofErrorsTest, AFileIsNamedWithItsPath) {
+  const TemporaryDirectory directory;
   const auto read = [](const std::filesystem::path& path) -> std::string {
     try {
       MofReader().readPath(path);
@@ -119,4 +122,3 @@ TEST(MofErrors, AFileIsNamedWithItsPath) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -1,36 +1,39 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "cimom/broker/Array.h"
 #include "cimom/ground/Errors.h"
+#include "cimom/model/Value.h"
 #include "cimom/schema/Mof.h"
 #include "tests/support/TemporaryDirectory.h"
 
-namespace Cimom::Test {
 namespace {
 
+using namespace Cimom;
+using namespace Testing;
 using testing::ElementsAre;
 using testing::SizeIs;
 
 std::vector<ClassDeclaration> classesOf(std::string_view mof) { return MofReader().readText(mof, "text").classes; }
 
-/// The declaration of the one property of a class.
+// The declaration of the one property of a class.
 PropertyDeclaration propertyOf(const std::string& declaration) {
   return classesOf("class A { " + declaration + " };").at(0).own.properties.at(0);
 }
 
 std::vector<std::string> namesOf(const MofDeclarations& declarations) {
   std::vector<std::string> names;
-  for (const auto& declaration : declarations.classes) names.push_back(declaration.own.name);
+  for (const auto& declaration : declarations.classes) {
+    names.push_back(declaration.own.name);
+  }
   return names;
 }
 
-TEST(Mof, ATextWithoutDeclarationsIsEmpty) {
+TEST(MofTest, ATextWithoutDeclarationsIsEmpty) {
   EXPECT_THAT(classesOf(""), SizeIs(0));
   EXPECT_THAT(classesOf("\xEF\xBB\xBF// nothing\n/* at\n all */"), SizeIs(0));
 }
 
-TEST(Mof, AClassHasANameAndASuperclass) {
+TEST(MofTest, AClassHasANameAndASuperclass) {
   const auto classes = classesOf("class A {};\n\nCLASS B : A\n{\n};");
   ASSERT_THAT(classes, SizeIs(2));
   EXPECT_EQ(classes[0].superclassName, "");
@@ -39,7 +42,7 @@ TEST(Mof, AClassHasANameAndASuperclass) {
   EXPECT_EQ(classes[1].own.declaredAt, "text:3");
 }
 
-TEST(Mof, PropertiesAreOfEveryType) {
+TEST(MofTest, PropertiesAreOfEveryType) {
   const struct {
     const char* declaration;
     CMPIType type;
@@ -49,13 +52,15 @@ TEST(Mof, PropertiesAreOfEveryType) {
               {"sint16 P;", CMPI_sint16},     {"sint32 P;", CMPI_sint32},     {"sint64 P;", CMPI_sint64},
               {"string P;", CMPI_string},     {"datetime P;", CMPI_dateTime}, {"string P[];", CMPI_stringA},
               {"uint16 P[3];", CMPI_uint16A}, {"B REF P;", CMPI_ref},         {"B ref P = NULL;", CMPI_ref}};
-  for (const auto& row : rows) EXPECT_EQ(propertyOf(row.declaration).type, row.type) << row.declaration;
+  for (const auto& row : rows) {
+    EXPECT_EQ(propertyOf(row.declaration).type, row.type) << row.declaration;
+  }
   EXPECT_EQ(propertyOf("uint16 P[3];").arraySize, 3u);
   EXPECT_EQ(propertyOf("B REF P;").referenceClass, "B");
   EXPECT_EQ(propertyOf("B REF P;").originClass, "A");
 }
 
-TEST(Mof, DefaultsAreValuesOfTheDeclaredType) {
+TEST(MofTest, DefaultsAreValuesOfTheDeclaredType) {
   const struct {
     const char* declaration;
     CMPIType type;
@@ -86,12 +91,12 @@ TEST(Mof, DefaultsAreValuesOfTheDeclaredType) {
   }
 }
 
-TEST(Mof, StringsUnderstandEscapes) {
+TEST(MofTest, StringsUnderstandEscapes) {
   EXPECT_EQ(*propertyOf(R"(string P = "\b\t\n\f\r\"\'\\\x41\x20AC";)").defaultValue.text(),
             "\b\t\n\f\r\"'\\A\xE2\x82\xAC");
 }
 
-TEST(Mof, QualifiersTakeTheDeclaredTypeDefaultAndFlavor) {
+TEST(MofTest, QualifiersTakeTheDeclaredTypeDefaultAndFlavor) {
   const auto classes = classesOf(R"(
       Qualifier MaxLen : uint32 = null, Scope(property, method), Flavor(DisableOverride, Restricted);
       Qualifier Tone : string = "plain", Scope(any), Flavor(Translatable);
@@ -111,12 +116,12 @@ TEST(Mof, QualifiersTakeTheDeclaredTypeDefaultAndFlavor) {
   EXPECT_FALSE(findQualifier(qualifiers, "Override")->toSubclass);
 }
 
-TEST(Mof, AKeyMayBeSaidNotToBeOne) {
+TEST(MofTest, AKeyMayBeSaidNotToBeOne) {
   EXPECT_TRUE(propertyOf("[Key(true)] string P;").isKey());
   EXPECT_FALSE(propertyOf("[Key(false)] string P;").isKey());
 }
 
-TEST(Mof, MethodsKeepTheirParameters) {
+TEST(MofTest, MethodsKeepTheirParameters) {
   const auto classes = classesOf(
       "class A { [Description(\"d\")] uint32 Go([In] string Where, [Out, In(false)] B REF What, uint8 How[]); "
       "boolean Stop(); };");
@@ -130,14 +135,14 @@ TEST(Mof, MethodsKeepTheirParameters) {
   EXPECT_THAT(methods[1].parameters, SizeIs(0));
 }
 
-TEST(Mof, PragmasNameNamespacesAndOthersAreIgnored) {
+TEST(MofTest, PragmasNameNamespacesAndOthersAreIgnored) {
   const auto declarations = MofReader().readText(
       "#pragma locale (\"en_US\")\n#pragma namespace(\"root/a\")\n#PRAGMA something(\"x\")", "text");
   EXPECT_THAT(declarations.namespaces, ElementsAre("root/a"));
 }
 
-TEST(MofFiles, ADirectoryIsReadWholeAndInOrder) {
-  const Testing::TemporaryDirectory directory;
+TEST(MofFilesTest, ADirectoryIsReadWholeAndInOrder) {
+  const TemporaryDirectory directory;
   directory.write("b.mof", "class B {};");
   directory.write("a.mof", "class A {};");
   directory.write("deep/c.mof", "class C {};");
@@ -145,8 +150,8 @@ TEST(MofFiles, ADirectoryIsReadWholeAndInOrder) {
   EXPECT_THAT(namesOf(MofReader().readPath(directory.path())), ElementsAre("A", "B", "C"));
 }
 
-TEST(MofFiles, IncludesAreRelativeToTheirFileAndReadOnce) {
-  const Testing::TemporaryDirectory directory;
+TEST(MofFilesTest, IncludesAreRelativeToTheirFileAndReadOnce) {
+  const TemporaryDirectory directory;
   directory.write("qualifiers.mof", "Qualifier Tone : uint8 = 1, Scope(any);");
   directory.write("part/a.mof", "#pragma include(\"../qualifiers.mof\")\nclass A { [Tone(2)] string P; };");
   const auto all = directory.write(
@@ -161,4 +166,3 @@ TEST(MofFiles, IncludesAreRelativeToTheirFileAndReadOnce) {
 }
 
 }  // namespace
-}  // namespace Cimom::Test

@@ -1,5 +1,4 @@
-#ifndef TESTS_CIMOM_SUPPORT_BROKERFIXTURE_H_
-#define TESTS_CIMOM_SUPPORT_BROKERFIXTURE_H_
+#pragma once
 
 #include <cmpimacs.h>
 #include <gmock/gmock.h>
@@ -12,18 +11,18 @@
 #include "tests/cimom/support/ManagedElements.h"
 #include "tests/cimom/support/ProbeProvider.h"
 
-namespace Cimom::Test {
+namespace Testing {
 
-/// An object manager with the schema of ManagedElements.h, and a request on the test's thread.
+// An object manager with the schema of ManagedElements.h, and a request on the test's thread.
 class BrokerFixture : public testing::Test {
  protected:
-  BrokerFixture() { manager.loadSchemaText(kSchema, kNamespace); }
+  BrokerFixture() { manager.loadSchemaText(testSchema, testNamespace); }
 
-  CMPIObjectPath* path(const char* className, const char* nameSpace = kNamespace) {
+  CMPIObjectPath* path(const char* className, const char* nameSpace = testNamespace) {
     return CMNewObjectPath(broker, nameSpace, className, nullptr);
   }
 
-  /// A path of TST_Processor or another CIM_System class with both keys.
+  // A path of TST_Processor or another CIM_System class with both keys.
   CMPIObjectPath* systemPath(const char* name, const char* className = "TST_Processor") {
     CMPIObjectPath* made = path(className);
     CMAddKey(made, "CreationClassName", className, CMPI_chars);
@@ -35,12 +34,10 @@ class BrokerFixture : public testing::Test {
     return CMNewInstance(broker, systemPath(name, className), nullptr);
   }
 
-  ObjectManager manager;
+  Cimom::ObjectManager manager;
   const CMPIBroker* broker = manager.broker();
-  RequestScope request{broker};
+  Cimom::RequestScope request{broker};
   CMPIStatus status = {CMPI_RC_ERROR, nullptr};
 };
 
-}  // namespace Cimom::Test
-
-#endif  // TESTS_CIMOM_SUPPORT_BROKERFIXTURE_H_
+}  // namespace Testing

@@ -1,11 +1,10 @@
-#ifndef TESTS_CIMOM_SUPPORT_MANAGEDELEMENTS_H_
-#define TESTS_CIMOM_SUPPORT_MANAGEDELEMENTS_H_
+#pragma once
 
-namespace Cimom::Test {
+namespace Testing {
 
-/// A small schema with what a real one has: an inheritance of three levels, keys, defaults, every kind of property, and
-/// associations.
-inline constexpr const char* kSchema = R"MOF(
+// A small schema with what a real one has: an inheritance of three levels, keys, defaults, every kind of property, and
+// associations.
+inline constexpr const char* testSchema = R"MOF(
 Qualifier Key : boolean = false, Scope(property, reference), Flavor(DisableOverride, ToSubclass);
 Qualifier Association : boolean = false, Scope(association), Flavor(DisableOverride, ToSubclass);
 Qualifier Description : string = null, Scope(any), Flavor(EnableOverride, ToSubclass, Translatable);
@@ -62,8 +61,6 @@ class TST_Peers {
 };
 )MOF";
 
-inline constexpr const char* kNamespace = "root/test";
+inline constexpr const char* testNamespace = "root/test";
 
-}  // namespace Cimom::Test
-
-#endif  // TESTS_CIMOM_SUPPORT_MANAGEDELEMENTS_H_
+}  // namespace Testing

@@ -1,6 +1,8 @@
 #include "tests/cimom/support/ProbeProvider.h"
 
-namespace Cimom::Test {
+namespace Testing {
+
+using namespace Cimom;
 
 struct ProbeProvider::Slots {
   static std::string shown(const char* text) { return text ? text : "(null)"; }
@@ -8,11 +10,13 @@ struct ProbeProvider::Slots {
   static CMPIStatus record(const void* handle, Call call, const CMPIContext* context, const CMPIResult* result,
                            const CMPIObjectPath* path, const CMPIInstance* instance, const char** properties) {
     auto& probe = *static_cast<ProbeProvider*>(const_cast<void*>(handle));
-    call.path = textOf(CMObjectPathToString(path, nullptr));
+    call.path = shownText(CMObjectPathToString(path, nullptr));
     call.hasProperties = properties != nullptr;
-    for (; properties && *properties; ++properties) call.properties.emplace_back(*properties);
+    for (; properties && *properties; ++properties) {
+      call.properties.emplace_back(*properties);
+    }
     probe.calls.push_back(std::move(call));
-    return probe.answer ? probe.answer(context, result, path, instance) : kOk;
+    return probe.answer ? probe.answer(context, result, path, instance) : ok;
   }
 
   static Call named(const char* operation) {
@@ -23,7 +27,7 @@ struct ProbeProvider::Slots {
 
   static CMPIStatus cleanup(CMPIInstanceMI* mi, const CMPIContext*, CMPIBoolean) {
     ++static_cast<ProbeProvider*>(const_cast<void*>(mi->hdl))->cleanups;
-    return kOk;
+    return ok;
   }
   static CMPIStatus enumerateInstanceNames(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
                                            const CMPIObjectPath* path) {
@@ -52,7 +56,7 @@ struct ProbeProvider::Slots {
 
   static CMPIStatus associationCleanup(CMPIAssociationMI* mi, const CMPIContext*, CMPIBoolean) {
     ++static_cast<ProbeProvider*>(mi->hdl)->cleanups;
-    return kOk;
+    return ok;
   }
   static CMPIStatus associators(CMPIAssociationMI* mi, const CMPIContext* context, const CMPIResult* result,
                                 const CMPIObjectPath* path, const char* association, const char* resultClass,
@@ -109,7 +113,7 @@ void ProbeProvider::serve(ObjectManager& manager, const std::string& className, 
       });
 }
 
-std::string textOf(const CMPIString* string) {
+std::string shownText(const CMPIString* string) {
   const char* characters = string ? CMGetCharsPtr(string, nullptr) : nullptr;
   return characters ? characters : "(null)";
 }
@@ -119,9 +123,9 @@ std::vector<std::string> pathsOf(CMPIEnumeration* enumeration) {
   while (enumeration && CMHasNext(enumeration, nullptr)) {
     const CMPIData item = CMGetNext(enumeration, nullptr);
     const CMPIObjectPath* path = item.type == CMPI_ref ? item.value.ref : CMGetObjectPath(item.value.inst, nullptr);
-    paths.push_back(textOf(CMObjectPathToString(path, nullptr)));
+    paths.push_back(shownText(CMObjectPathToString(path, nullptr)));
   }
   return paths;
 }
 
-}  // namespace Cimom::Test
+}  // namespace Testing

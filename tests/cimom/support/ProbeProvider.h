@@ -1,5 +1,4 @@
-#ifndef TESTS_CIMOM_SUPPORT_PROBEPROVIDER_H_
-#define TESTS_CIMOM_SUPPORT_PROBEPROVIDER_H_
+#pragma once
 
 #include <cmpimacs.h>
 
@@ -10,13 +9,13 @@
 
 #include "cimom/ObjectManager.h"
 
-namespace Cimom::Test {
+namespace Testing {
 
-/// What a provider was called with: the operation's name and all that came along, as text.
+// What a provider was called with: the operation's name and all that came along, as text.
 struct Call {
   std::string operation;
   std::string path;
-  std::string associationClass;  ///< "(null)" where null came
+  std::string associationClass;  // "(null)" where null came
   std::string resultClass;
   std::string role;
   std::string resultRole;
@@ -24,12 +23,12 @@ struct Call {
   bool hasProperties = false;
 };
 
-/// A provider linked into the test that records its calls and answers as the test tells it. What it answers with goes
-/// through the macros that any provider uses. It is shared with the object managers that it serves, which clean it up
-/// when they end.
+// A provider linked into the test that records its calls and answers as the test tells it. What it answers with goes
+// through the macros that any provider uses. It is shared with the object managers that it serves, which clean it up
+// when they end.
 class ProbeProvider : public std::enable_shared_from_this<ProbeProvider> {
  public:
-  /// Answers a call of the operation; the instance is null where the operation has none.
+  // Answers a call of the operation; the instance is null where the operation has none.
   using Answer =
       std::function<CMPIStatus(const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*)>;
 
@@ -37,12 +36,12 @@ class ProbeProvider : public std::enable_shared_from_this<ProbeProvider> {
   ProbeProvider(const ProbeProvider&) = delete;
   ProbeProvider& operator=(const ProbeProvider&) = delete;
 
-  /// Registers the probe for a class; the provider's name is the class's.
-  void serve(ObjectManager& manager, const std::string& className, const std::string& nameSpace,
+  // Registers the probe for a class; the provider's name is the class's.
+  void serve(Cimom::ObjectManager& manager, const std::string& className, const std::string& nameSpace,
              bool association = false);
 
-  const CMPIBroker* broker = nullptr;  ///< what the factory was given
-  Answer answer;                       ///< by default OK, and nothing returned
+  const CMPIBroker* broker = nullptr;  // what the factory was given
+  Answer answer;                       // by default OK, and nothing returned
   std::vector<Call> calls;
   int factoryCalls = 0;
   int cleanups = 0;
@@ -54,14 +53,12 @@ class ProbeProvider : public std::enable_shared_from_this<ProbeProvider> {
   CMPIAssociationMI associationMi_;
 };
 
-constexpr CMPIStatus kOk = {CMPI_RC_OK, nullptr};
+constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
-/// The text of a string, "(null)" where there is none.
-std::string textOf(const CMPIString* string);
+// The text of a string, "(null)" where there is none.
+std::string shownText(const CMPIString* string);
 
-/// The texts that the paths, or the instances' paths, of an enumeration show.
+// The texts that the paths, or the instances' paths, of an enumeration show.
 std::vector<std::string> pathsOf(CMPIEnumeration* enumeration);
 
-}  // namespace Cimom::Test
-
-#endif  // TESTS_CIMOM_SUPPORT_PROBEPROVIDER_H_
+}  // namespace Testing

@@ -30,7 +30,9 @@ CMPIStatus ProbeEnumInstanceNames(CMPIInstanceMI*, const CMPIContext*, const CMP
 
 CMPIStatus ProbeEnumInstances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result,
                               const CMPIObjectPath* asked, const char**) {
-  for (const char* name : {"one", "two"}) CMReturnInstance(result, makeSystem(asked, name));
+  for (const char* name : {"one", "two"}) {
+    CMReturnInstance(result, makeSystem(asked, name));
+  }
   CMReturnDone(result);
   CMReturn(CMPI_RC_OK);
 }

@@ -1,7 +1,60 @@
+// The function tables of what a provider answers with.
 #include "cimom/broker/Guard.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom {
 namespace {
+
+// CMPIResult.
+
+void deliver(const CMPIResult* result, Value item) {
+  Result& model = modelOf<Result>(result);
+  if (item.isNull()) {
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "null returned as a result");
+  }
+  if (model.kind != CMPI_null && item.type() != model.kind) {
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "the operation takes no " + describeType(item.type()) + ", but " +
+                                                     describeType(model.kind) + "s");
+  }
+  model.items.push_back(std::move(item));
+}
+
+// A result belongs to its operation, which alone reads it: a second one would deliver to nobody.
+CMPIResult* cloneResult(const CMPIResult* result, CMPIStatus* status) {
+  return guarded(status, static_cast<CMPIResult*>(nullptr), [&]() -> CMPIResult* {
+    modelOf<Result>(result);
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "a result cannot be cloned");
+  });
+}
+
+CMPIStatus returnData(const CMPIResult* result, const CMPIValue* value, const CMPIType type) {
+  return guarded([&] { deliver(result, fromCmpi(value, type)); });
+}
+
+CMPIStatus returnInstance(const CMPIResult* result, const CMPIInstance* instance) {
+  return guarded([&] { deliver(result, Value::instance(modelOf<Instance>(instance))); });
+}
+
+CMPIStatus returnObjectPath(const CMPIResult* result, const CMPIObjectPath* path) {
+  return guarded([&] { deliver(result, Value::reference(modelOf<ObjectPath>(path))); });
+}
+
+// The end of the provider's call says the same, so that a call without it, or with two, loses nothing.
+CMPIStatus returnDone(const CMPIResult* result) {
+  return guarded([&] { modelOf<Result>(result); });
+}
+
+CMPIStatus returnError(const CMPIResult* result, const CMPIError* error) {
+  return guarded([&] {
+    Result& model = modelOf<Result>(result);
+    const Error& returned = modelOf<Error>(error);
+    if (!model.error) {
+      model.error = returned;
+    }
+  });
+}
+
+// CMPIError.
 
 using OptionalText = std::optional<std::string> Error::*;
 using OptionalArray = std::optional<Array> Error::*;
@@ -36,17 +89,20 @@ CMPIStatus setMessageArguments(CMPIError* error, CMPIArray* array) {
   return setArray<&Error::messageArguments>(error, array);
 }
 
-template <class Number, Number Error::*member>
+template <typename Number, Number Error::*member>
 Number getNumber(const CMPIError* error, CMPIStatus* status) {
   return guarded(status, Number{}, [&] { return modelOf<Error>(error).*member; });
 }
 
-template <class Number, Number Error::*member>
+template <typename Number, Number Error::*member>
 CMPIStatus setNumber(CMPIError* error, const Number number) {
   return guarded([&] { modelOf<Error>(error).*member = number; });
 }
 
 }  // namespace
+
+CMPIResultFT Abi<Result>::table = {CMPICurrentVersion, release<Result>,  cloneResult, returnData,
+                                   returnInstance,     returnObjectPath, returnDone,  returnError};
 
 CMPIErrorFT Abi<Error>::table = {
     .ftVersion = CMPICurrentVersion,

@@ -1,16 +1,34 @@
-#ifndef CIMOM_BROKER_ERROR_H_
-#define CIMOM_BROKER_ERROR_H_
+// What stands behind those CMPI objects that are no CIM values themselves.
+#pragma once
 
 #include <cmpidt.h>
 
 #include <optional>
 #include <string>
+#include <vector>
 
-#include "cimom/broker/Array.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom {
 
-/// A CIM_Error that a provider fills in; texts that nobody set are absent.
+struct Text {
+  std::string characters;
+};
+
+struct Context {
+  NamedValues entries;
+};
+
+struct Args {
+  NamedValues arguments;
+};
+
+struct Enumeration {
+  std::vector<Value> items;
+  std::size_t next = 0;
+};
+
+// A CIM_Error that a provider fills in; texts that nobody set are absent.
 struct Error {
   std::optional<std::string> owningEntity;
   std::optional<std::string> messageId;
@@ -29,6 +47,11 @@ struct Error {
   std::optional<Array> messageArguments;
 };
 
-}  // namespace Cimom
+// What a provider delivers to one operation.
+struct Result {
+  CMPIType kind = CMPI_null;  // CMPI_instance or CMPI_ref where the operation takes only those; CMPI_null: anything
+  std::vector<Value> items;
+  std::optional<Error> error;  // the first error that the provider returned as a CMPIError
+};
 
-#endif  // CIMOM_BROKER_ERROR_H_
+}  // namespace Cimom

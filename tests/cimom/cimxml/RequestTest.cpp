@@ -2,12 +2,12 @@
 #include <gtest/gtest.h>
 
 #include "cimom/cimxml/Errors.h"
-#include "cimom/cimxml/RequestReader.h"
+#include "cimom/cimxml/Request.h"
 #include "tests/cimom/cimxml/Messages.h"
 
-namespace Cimom::CimXml {
 namespace {
 
+using namespace Cimom::CimXml;
 using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -24,7 +24,7 @@ Property propertyOf(const std::string& xml) {
   return valueOf<Instance>("<INSTANCE CLASSNAME=\"C\">" + xml + "</INSTANCE>").properties.at(0);
 }
 
-TEST(RequestReader, ReadsWhatIsCalledWhere) {
+TEST(RequestTest, ReadsWhatIsCalledWhere) {
   const Request request = readRequest(intrinsicCall("EnumerateInstances", className("CIM_Thing")));
   EXPECT_EQ(request.messageId, "4711");
   EXPECT_EQ(request.protocolVersion, "1.0");
@@ -36,7 +36,7 @@ TEST(RequestReader, ReadsWhatIsCalledWhere) {
   EXPECT_EQ(std::get<ObjectName>(request.parameters[0].value).className, "CIM_Thing");
 }
 
-TEST(RequestReader, ReadsTheTargetOfAClassesMethod) {
+TEST(RequestTest, ReadsTheTargetOfAClassesMethod) {
   const Request request = readRequest(messageOf(
       "<METHODCALL NAME=\"Reset\"><LOCALINSTANCEPATH>" + nameSpacePath() + instanceName("C", keyBinding("K", "1")) +
       "</LOCALINSTANCEPATH><PARAMVALUE NAME=\"Force\" PARAMTYPE=\"boolean\"><VALUE>TRUE</VALUE></PARAMVALUE>"
@@ -48,25 +48,25 @@ TEST(RequestReader, ReadsTheTargetOfAClassesMethod) {
   EXPECT_EQ(std::get<std::string>(request.parameters.at(0).value), "TRUE");
 }
 
-TEST(RequestReader, TakesAParameterWithoutAValueForNone) {
+TEST(RequestTest, TakesAParameterWithoutAValueForNone) {
   const Request request = readRequest(intrinsicCall("M", parameter("P", "")));
   EXPECT_TRUE(std::holds_alternative<std::monostate>(request.parameters.at(0).value));
 }
 
-TEST(RequestReader, ReadsATextWithoutOuterBlanks) {
+TEST(RequestTest, ReadsATextWithoutOuterBlanks) {
   EXPECT_EQ(valueOf<std::string>("<VALUE>\n  a &lt; b&#x20AC;<![CDATA[ & c]]>\t</VALUE>"), "a < b€ & c");
 }
 
-TEST(RequestReader, SeesNoCommentAndNoInstruction) {
+TEST(RequestTest, SeesNoCommentAndNoInstruction) {
   EXPECT_EQ(valueOf<std::string>("<!-- a --><?b?><VALUE>x<!-- c -->y<?d?></VALUE>"), "xy");
 }
 
-TEST(RequestReader, ReadsAnArrayWithItsNulls) {
+TEST(RequestTest, ReadsAnArrayWithItsNulls) {
   EXPECT_THAT(valueOf<Texts>("<VALUE.ARRAY><VALUE>a</VALUE><VALUE.NULL/><VALUE/></VALUE.ARRAY>"),
               ElementsAre("a", std::nullopt, ""));
 }
 
-TEST(RequestReader, ReadsEveryKindOfKey) {
+TEST(RequestTest, ReadsEveryKindOfKey) {
   const ObjectName name =
       nameOf(instanceName("C", keyBinding("S", "text") + keyBinding("B", "TRUE", "VALUETYPE=\"boolean\"") +
                                    keyBinding("N", "7", "VALUETYPE=\"numeric\" TYPE=\"uint16\"") +
@@ -83,14 +83,14 @@ TEST(RequestReader, ReadsEveryKindOfKey) {
   EXPECT_EQ(name.keys[4].value.reference->className, "Other");
 }
 
-TEST(RequestReader, ReadsALoneKeyValue) {
+TEST(RequestTest, ReadsALoneKeyValue) {
   const ObjectName name = nameOf(instanceName("C", "<KEYVALUE>x</KEYVALUE>"));
   ASSERT_EQ(name.keys.size(), 1u);
   EXPECT_EQ(name.keys[0].name, "");
   EXPECT_EQ(name.keys[0].value.text, "x");
 }
 
-TEST(RequestReader, ReadsEveryKindOfPath) {
+TEST(RequestTest, ReadsEveryKindOfPath) {
   const std::string full = "<NAMESPACEPATH><HOST>h:5988</HOST>" + nameSpacePath("far") + "</NAMESPACEPATH>";
   const std::string instance = instanceName("C", keyBinding("K", "1"));
   const std::string klass = "<CLASSNAME NAME=\"C\"/>";
@@ -117,7 +117,7 @@ TEST(RequestReader, ReadsEveryKindOfPath) {
   }
 }
 
-TEST(RequestReader, ReadsANamedInstance) {
+TEST(RequestTest, ReadsANamedInstance) {
   const auto instance = valueOf<Instance>("<VALUE.NAMEDINSTANCE>" + instanceName("C", keyBinding("K", "1")) +
                                           "<INSTANCE CLASSNAME=\"C\"><QUALIFIER NAME=\"Q\" TYPE=\"boolean\"/>"
                                           "<PROPERTY NAME=\"A\" TYPE=\"string\"><VALUE>x</VALUE></PROPERTY></INSTANCE>"
@@ -128,7 +128,7 @@ TEST(RequestReader, ReadsANamedInstance) {
   EXPECT_EQ(instance.properties[0].name, "A");
 }
 
-TEST(RequestReader, ReadsEveryKindOfProperty) {
+TEST(RequestTest, ReadsEveryKindOfProperty) {
   const Property scalar = propertyOf("<PROPERTY NAME=\"A\" TYPE=\"uint8\"><VALUE>1</VALUE></PROPERTY>");
   EXPECT_EQ(scalar.type, "uint8");
   EXPECT_EQ(std::get<std::string>(scalar.value), "1");
@@ -144,16 +144,18 @@ TEST(RequestReader, ReadsEveryKindOfProperty) {
   EXPECT_TRUE(std::holds_alternative<std::monostate>(null.value));
 }
 
-TEST(RequestReader, TakesADocumentTypeWithoutFetchingIt) {
+TEST(RequestTest, TakesADocumentTypeWithoutFetchingIt) {
   std::string message = intrinsicCall("M", "");
   message.insert(message.find("<CIM "), "<!DOCTYPE CIM SYSTEM \"http://localhost:1/cim.dtd\">");
   EXPECT_EQ(readRequest(message).method, "M");
 }
 
-TEST(RequestReader, ReadsUtf16) {
+TEST(RequestTest, ReadsUtf16) {
   std::u16string text = u"\uFEFF<?xml version=\"1.0\" encoding=\"utf-16\"?>";
   const std::string message = intrinsicCall("M", parameter("P", "<VALUE>x</VALUE>"));
-  for (const char letter : message.substr(message.find("<CIM"))) text += static_cast<char16_t>(letter);
+  for (const char letter : message.substr(message.find("<CIM"))) {
+    text += static_cast<char16_t>(letter);
+  }
   const Request request = readRequest({reinterpret_cast<const char*>(text.data()), text.size() * sizeof(char16_t)});
   EXPECT_EQ(std::get<std::string>(request.parameters.at(0).value), "x");
 }
@@ -169,9 +171,9 @@ struct Refusal {
 
 void PrintTo(const Refusal& refusal, std::ostream* stream) { *stream << refusal.name; }
 
-class RefusedRequest : public testing::TestWithParam<Refusal> {};
+class RefusedRequestTest : public testing::TestWithParam<Refusal> {};
 
-TEST_P(RefusedRequest, IsAnsweredWithTheWordForIt) {
+TEST_P(RefusedRequestTest, IsAnsweredWithTheWordForIt) {
   try {
     readRequest(GetParam().message);
     FAIL() << "the message was taken";
@@ -193,8 +195,9 @@ std::string withDocumentType(const std::string& subset, const std::string& value
 
 std::string nested(int depth) {
   std::string name = instanceName("C", keyBinding("K", "1"));
-  for (int i = 0; i < depth; ++i)
+  for (int i = 0; i < depth; ++i) {
     name = instanceName("C", "<KEYBINDING NAME=\"K\"><VALUE.REFERENCE>" + name + "</VALUE.REFERENCE></KEYBINDING>");
+  }
   return intrinsicCall("M", parameter("P", name));
 }
 
@@ -204,7 +207,7 @@ constexpr const char* notWellFormed = "request-not-well-formed";
 constexpr const char* notValid = "request-not-valid";
 
 INSTANTIATE_TEST_SUITE_P(
-    NotWellFormed, RefusedRequest,
+    NotWellFormed, RefusedRequestTest,
     testing::Values(
         Refusal{"Empty", "", 400, notWellFormed, ""}, Refusal{"Text", "hello", 400, notWellFormed, "line 1"},
         Refusal{"CutOff", good.substr(0, good.size() / 2), 400, notWellFormed, "line 1"},
@@ -229,7 +232,7 @@ INSTANTIATE_TEST_SUITE_P(
     [](const auto& test) { return test.param.name; });
 
 INSTANTIATE_TEST_SUITE_P(
-    NotValid, RefusedRequest,
+    NotValid, RefusedRequestTest,
     testing::Values(
         Refusal{"OtherRoot", "<HTML/>", 400, notValid, "HTML"},
         Refusal{"NoVersion", "<CIM/>", 400, notValid, "CIMVERSION"},
@@ -291,7 +294,7 @@ INSTANTIATE_TEST_SUITE_P(
     [](const auto& test) { return test.param.name; });
 
 INSTANTIATE_TEST_SUITE_P(
-    NotSupported, RefusedRequest,
+    NotSupported, RefusedRequestTest,
     testing::Values(Refusal{"SeveralRequests",
                             replaced(replaced(good, "<SIMPLEREQ>", "<MULTIREQ><SIMPLEREQ>"), "</SIMPLEREQ>",
                                      "</SIMPLEREQ></MULTIREQ>"),
@@ -305,4 +308,3 @@ INSTANTIATE_TEST_SUITE_P(
     [](const auto& test) { return test.param.name; });
 
 }  // namespace
-}  // namespace Cimom::CimXml
