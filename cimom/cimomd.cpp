@@ -2,7 +2,9 @@
 #include <unistd.h>
 
 #include <array>
+#include <cerrno>
 #include <cstdlib>
+#include <cstring>
 #include <fstream>
 #include <iostream>
 #include <iterator>
@@ -10,7 +12,7 @@
 
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Endpoint.h"
-#include "cimom/configuration/CommandLine.h"
+#include "cimom/configuration/Configuration.h"
 #include "cimom/http/PasswordFile.h"
 #include "cimom/http/Server.h"
 
@@ -62,7 +64,8 @@ std::string contentOf(const std::filesystem::path& file) {
   std::ifstream stream(file, std::ios::binary);
   std::string content{std::istreambuf_iterator<char>(stream), {}};
   if (content.empty()) {
-    throw Http::ServerError("cannot read " + file.string());
+    throw Http::ServerError("cannot read " + file.string() + ": " +
+                            (stream.is_open() ? "it is empty" : std::strerror(errno)));
   }
   return content;
 }
@@ -102,8 +105,8 @@ void serve(const Configuration& configuration, const EndSignals& endSignals) {
     return;
   }
   // A provider that is still at work can neither be cleaned up nor unloaded.
-  std::cerr << "cimomd: requests are still being answered after " << configuration.shutdownTimeout.count()
-            << " s: ending without the providers' cleanup" << std::endl;
+  std::cerr << "cimomd: shutting down without provider cleanup: requests still in progress after "
+            << configuration.shutdownTimeout.count() << " s" << std::endl;
   std::_Exit(failure);
 }
 

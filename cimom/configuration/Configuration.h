@@ -4,13 +4,14 @@
 #include <cstddef>
 #include <cstdint>
 #include <filesystem>
+#include <optional>
 #include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace Cimom {
 
-// What cimomd is told by its command line and its configuration file.
+// What cimomd works with, from its command line and its configuration file.
 struct Configuration {
   std::string address = "127.0.0.1";
   std::uint16_t port = 5988;
@@ -31,5 +32,11 @@ class UsageError : public std::runtime_error {
  public:
   using std::runtime_error::runtime_error;
 };
+
+// Reads cimomd's command line and the configuration file that it names: `key = value` lines, the keys named as the
+// options are; what the command line says replaces what the file says, and a relative path in the file is relative to
+// the file's directory. Returns nothing when help or the version was asked for, and has been printed.
+// Throws UsageError.
+std::optional<Configuration> readCommandLine(int argc, const char* const* argv);
 
 }  // namespace Cimom

@@ -45,23 +45,24 @@ TEST_F(CommandLine, ShowsTheVersion) { EXPECT_THAT(cimomd({"--version"}).output,
 TEST_F(CommandLine, IsRefusedWithStatusTwo) {
   expectRefused({"--nonsense"}, 2, "--nonsense");
   expectRefused({"--port"}, 2, "--port");
-  expectRefused({"--port", "65536"}, 2, "--port: \"65536\" is no number from 0 to 65535");
-  expectRefused({"--port", "http"}, 2, "--port: \"http\"");
+  expectRefused({"--port", "65536"}, 2, "--port: must be a number from 0 to 65535, not \"65536\"");
+  expectRefused({"--port", "http"}, 2, "--port: must be a number from 0 to 65535, not \"http\"");
   expectRefused({"--port", ""}, 2, "--port");
-  expectRefused({"--port", "1", "--port", "2"}, 2, "--port");
-  expectRefused({"--max-request-size", "1"}, 2, "--max-request-size: \"1\" is no number from 1024");
+  expectRefused({"--port", "1", "--port", "2"}, 2, "--port: duplicate");
+  expectRefused({"--max-request-size", "1"}, 2, "--max-request-size: must be a number from 1024");
   expectRefused({"--idle-timeout", "-1"}, 2, "--idle-timeout");
-  expectRefused({"--tls-key", "key.pem"}, 2, "tls-certificate and tls-key go together");
+  expectRefused({"--tls-key", "key.pem"}, 2, "tls-certificate and tls-key must be given together");
   expectRefused({"stray"}, 2, "stray");
   expectRefused({"--config", "/nowhere/cimomd.ini"}, 2, "/nowhere/cimomd.ini: No such file or directory");
 }
 
 TEST_F(CommandLine, IsRefusedForWhatTheFileSays) {
   expectRefused({"--config", file("port = 0\nnonsense = 1\n")}, 2, "cimomd.ini:2: unknown key \"nonsense\"");
-  expectRefused({"--config", file("; comment\n\nport = high\n")}, 2, "cimomd.ini:3: port: \"high\" is no number");
-  expectRefused({"--config", file("port = 0\nport = 0\n")}, 2, "cimomd.ini:2: port is given twice");
-  expectRefused({"--config", file("[http]\nport = 0\n")}, 2, "cimomd.ini:2: there is no section [http]");
-  expectRefused({"--config", file("port\n")}, 2, "cimomd.ini:1: is no \"key = value\"");
+  expectRefused({"--config", file("; comment\n\nport = high\n")}, 2, "cimomd.ini:3: port: must be a number");
+  expectRefused({"--config", file("port = 0\nport = 0\n")}, 2, "cimomd.ini:2: port: duplicate");
+  expectRefused({"--config", file("[http]\nport = 0\n")}, 2,
+                "cimomd.ini:2: there are no sections in this file, but \"port\" is in [http]");
+  expectRefused({"--config", file("port\n")}, 2, "cimomd.ini:1: expected \"key = value\"");
   expectRefused({"--config", file("# " + std::string(5000, 'x') + "\n")}, 2, "cimomd.ini:1: the line is longer");
   expectRefused({"--config", directory_.path().string()}, 2, "is a directory");
 }
@@ -95,6 +96,16 @@ TEST_F(CommandLine, TakesItsOptionsFromTheFileRelativeToIt) {
                                         "provider-dir = " BINARY_DIR "/lib ; where the build puts it\n")});
   const std::string classes = cimomd.wbemcli({"ecn"}, "").output;
   EXPECT_THAT(classes, AllOf(HasSubstr("TEST_Local"), HasSubstr("TEST_Thing")));
+}
+
+TEST_F(CommandLine, TakesIndentedKeysOfTheFile) {
+  // Indentation means nothing: neither a second value of the key above nor a line that is passed over.
+  expectRefused({"--config", file("address = 127.0.0.1\n  port = high\n")}, 2, "cimomd.ini:2: port: must be a number");
+  expectRefused({"--config", file("port = 0\n  nonsense = 1\n")}, 2, "cimomd.ini:2: unknown key \"nonsense\"");
+  const Cimomd cimomd({"--config", file("  schema = " SOURCE_DIR "/tests/e2e/probe/Probe.mof\n"
+                                        "\tregistration = " SOURCE_DIR "/tests/e2e/probe/Probe.reg\n"
+                                        "  provider-dir = " BINARY_DIR "/lib\n")});
+  EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
 }
 
 TEST_F(CommandLine, WinsOverTheFile) {

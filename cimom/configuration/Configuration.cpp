@@ -1,0 +1,190 @@
+#include "cimom/configuration/Configuration.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <cerrno>
+#include <charconv>
+#include <cstring>
+#include <fstream>
+#include <functional>
+#include <limits>
+#include <map>
+#include <string_view>
+#include <utility>
+
+#include "cimom/configuration/IniFile.h"
+
+namespace Cimom {
+namespace {
+
+// A value as it was given.
+struct GivenValue {
+  std::string text;
+  std::string origin;          // for messages: "--port", "cimomd.ini:12: port"
+  std::filesystem::path base;  // what a relative path is relative to; empty: the working directory
+};
+
+// The values given for each setting, by its name.
+using GivenValues = std::map<std::string, std::vector<GivenValue>, std::less<>>;
+
+using Apply = std::function<void(Configuration&, const GivenValue&)>;
+
+// One thing that can be configured: an option of the command line, and under the same name a key of the file.
+struct Setting {
+  const char* name;
+  const char* valueName;  // what help calls the value
+  const char* help;
+  bool repeatable;
+  Apply apply;  // throws UsageError for a bad value
+};
+
+std::uint64_t parseNumber(const GivenValue& value, std::uint64_t least, std::uint64_t most) {
+  std::uint64_t number = 0;
+  const char* end = value.text.data() + value.text.size();
+  const auto result = std::from_chars(value.text.data(), end, number);
+  if (result.ec == std::errc() && result.ptr == end && number >= least && number <= most) {
+    return number;
+  }
+  throw UsageError(value.origin + ": must be a number from " + std::to_string(least) + " to " + std::to_string(most) +
+                   ", not \"" + value.text + "\"");
+}
+
+std::filesystem::path parsePath(const GivenValue& value) {
+  if (value.text.empty()) {
+    throw UsageError(value.origin + ": must not be empty");
+  }
+  return value.base / value.text;
+}
+
+template <typename Number>
+Apply number(Number Configuration::*member, std::uint64_t least, std::uint64_t most) {
+  return [=](Configuration& configuration, const GivenValue& value) {
+    configuration.*member = Number(parseNumber(value, least, most));
+  };
+}
+
+Apply path(std::filesystem::path Configuration::*member) {
+  return [=](Configuration& configuration, const GivenValue& value) { configuration.*member = parsePath(value); };
+}
+
+Apply paths(std::vector<std::filesystem::path> Configuration::*member) {
+  return [=](Configuration& configuration, const GivenValue& value) {
+    (configuration.*member).push_back(parsePath(value));
+  };
+}
+
+// In the order of the help.
+const std::vector<Setting>& settings() {
+  constexpr std::uint64_t day = 86400;
+  static const std::vector<Setting> table = {
+      {"address", "ADDRESS", "numeric address to listen on (127.0.0.1)", false,
+       [](Configuration& configuration, const GivenValue& value) { configuration.address = value.text; }},
+      {"port", "N", "port to listen on; 0: any free port (5988)", false, number(&Configuration::port, 0, 65535)},
+      {"schema", "PATH", "MOF file, or directory of *.mof files, with the classes", true,
+       paths(&Configuration::schemas)},
+      {"registration", "FILE", "which provider serves which class", true, paths(&Configuration::registrations)},
+      {"provider-dir", "DIR", "directory with the providers' libraries", true,
+       paths(&Configuration::providerDirectories)},
+      {"max-request-size", "BYTES", "largest body of a request (4194304)", false,
+       number(&Configuration::maxRequestSize, 1024, std::numeric_limits<std::int32_t>::max())},
+      {"max-connections", "N", "connections served at once (64)", false,
+       number(&Configuration::maxConnections, 1, 4096)},
+      {"idle-timeout", "SECONDS", "close a connection after so long without traffic (60)", false,
+       number(&Configuration::idleTimeout, 1, day)},
+      {"shutdown-timeout", "SECONDS", "wait so long for requests in progress when shutting down (20)", false,
+       number(&Configuration::shutdownTimeout, 0, day)},
+      {"tls-certificate", "FILE", "PEM file with the certificate chain; with tls-key: HTTPS instead of HTTP", false,
+       path(&Configuration::tlsCertificate)},
+      {"tls-key", "FILE", "PEM file with the certificate's private key", false, path(&Configuration::tlsKey)},
+      {"password-file", "FILE", "user:hash lines (crypt(5)); only these users are served", false,
+       path(&Configuration::passwordFile)}};
+  return table;
+}
+
+bool isSetting(std::string_view name) {
+  return std::ranges::any_of(settings(), [name](const Setting& setting) { return setting.name == name; });
+}
+
+GivenValues readConfigurationFile(const std::filesystem::path& file) {
+  std::ifstream stream(file);
+  if (!stream || std::filesystem::is_directory(file)) {
+    throw UsageError(file.string() + ": " + (stream ? "is a directory" : std::strerror(errno)));
+  }
+  GivenValues values;
+  const auto take = [&](const IniEntry& entry) {
+    if (!entry.section.empty()) {
+      throw UsageError("there are no sections in this file, but \"" + entry.key + "\" is in [" + entry.section + "]");
+    }
+    if (!isSetting(entry.key)) {
+      throw UsageError("unknown key \"" + entry.key + "\"");
+    }
+    const std::string origin = file.string() + ":" + std::to_string(entry.line) + ": " + entry.key;
+    values[entry.key].push_back({entry.value, origin, file.parent_path()});
+  };
+  try {
+    readIni(stream, file.string(), take);
+  } catch (const std::runtime_error& error) {
+    throw UsageError(error.what());
+  }
+  return values;
+}
+
+Configuration toConfiguration(const GivenValues& given) {
+  Configuration configuration;
+  for (const Setting& setting : settings()) {
+    const auto values = given.find(std::string_view(setting.name));
+    if (values == given.end()) {
+      continue;
+    }
+    if (!setting.repeatable && values->second.size() > 1) {
+      throw UsageError(values->second[1].origin + ": duplicate");
+    }
+    for (const GivenValue& value : values->second) {
+      setting.apply(configuration, value);
+    }
+  }
+  if (configuration.tlsCertificate.empty() != configuration.tlsKey.empty()) {
+    throw UsageError("tls-certificate and tls-key must be given together");
+  }
+  return configuration;
+}
+
+}  // namespace
+
+std::optional<Configuration> readCommandLine(int argc, const char* const* argv) {
+  CLI::App app("A CIM object manager for CMPI 2.0 providers: serves CIM-XML over HTTP.", "cimomd");
+  app.set_version_flag("--version", "cimomd " CIMOMD_VERSION);
+  std::string file;
+  app.add_option("--config", file, "configuration file: the options below as \"key = value\" lines")->type_name("FILE");
+  std::map<std::string, std::vector<std::string>> texts;
+  for (const Setting& setting : settings()) {
+    app.add_option("--" + std::string(setting.name), texts[setting.name], setting.help)
+        ->type_name(setting.valueName)
+        ->allow_extra_args(setting.repeatable);
+  }
+  try {
+    app.parse(argc, argv);
+  } catch (const CLI::Success& asked) {
+    app.exit(asked);
+    return std::nullopt;
+  } catch (const CLI::ParseError& error) {
+    throw UsageError(error.what());
+  }
+  GivenValues values;
+  if (!file.empty()) {
+    values = readConfigurationFile(file);
+  }
+  for (const auto& [name, given] : texts) {
+    if (given.empty()) {
+      continue;
+    }
+    auto& taken = values[name];
+    taken.clear();
+    for (const std::string& text : given) {
+      taken.push_back({text, "--" + name, {}});
+    }
+  }
+  return toConfiguration(values);
+}
+
+}  // namespace Cimom
