@@ -28,20 +28,20 @@ BrokerCore::BrokerCore()
 const ClassDefinition& BrokerCore::requireClass(std::string_view className) const {
   const ClassDefinition* definition = classes.find(className);
   if (!definition) {
-    throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "no class \"" + std::string(className) + "\"");
+    throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + std::string(className) + "\"");
   }
   return *definition;
 }
 
 void BrokerCore::requireNamespace(std::string_view nameSpace) const {
   if (!classes.hasNamespace(nameSpace)) {
-    throw StatusError(CMPI_RC_ERR_INVALID_NAMESPACE, "no namespace \"" + std::string(nameSpace) + "\"");
+    throw StatusError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + std::string(nameSpace) + "\"");
   }
 }
 
 BrokerCore& coreOf(const CMPIBroker* broker) {
   if (!broker || !broker->hdl) {
-    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIBroker");
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "CMPIBroker must not be null");
   }
   return *static_cast<BrokerCore*>(broker->hdl);
 }

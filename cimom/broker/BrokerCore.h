@@ -31,7 +31,7 @@ struct BrokerCore {
   CMPIBroker broker;
 };
 
-// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the broker or its handle is null.
+// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the broker or its handle is null.
 BrokerCore& coreOf(const CMPIBroker* broker);
 
 // The broker's four function tables.

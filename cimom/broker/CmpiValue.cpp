@@ -28,7 +28,7 @@ Value arrayFromCmpi(const CMPIArray* array, CMPIType stored) {
   const Array& source = modelOf<Array>(array);
   if (source.elementType != elementTypeOf(stored)) {
     throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
-                      "an array of " + describeType(source.elementType) + " is no " + describeType(stored));
+                      "expected " + describeType(stored) + ", not " + describeType(arrayOf(source.elementType)));
   }
   return Value::array(source);
 }
@@ -39,7 +39,7 @@ Value fromCmpi(const CMPIValue* value, CMPIType type) {
   const CMPIType elementType = elementTypeOf(type);
   const CimType* row = findType(type);
   if (type != CMPI_null && !row) {
-    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, "no CIM value has the CMPI type " + std::to_string(type));
+    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, "CMPI type " + std::to_string(type) + " is not a CIM data type");
   }
   const CMPIType stored = isArray(type) ? arrayOf(storedType(elementType)) : storedType(elementType);
   if (!value || type == CMPI_null) {

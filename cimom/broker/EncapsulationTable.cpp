@@ -45,8 +45,7 @@ CMPIArray* newArray(const CMPIBroker* broker, CMPICount count, CMPIType type, CM
   return made(broker, status, [&] {
     const Value element = fromCmpi(nullptr, type);
     if (type == CMPI_null || isArray(type)) {
-      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
-                        "no array has elements of the CMPI type " + std::to_string(type));
+      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, "array elements cannot be of CMPI type " + std::to_string(type));
     }
     return make(Array{element.type(), std::vector<Value>(count, element)});
   });
@@ -66,9 +65,8 @@ CMPIDateTime* newDateTimeFromChars(const CMPIBroker* broker, const char* text, C
 }
 
 CMPISelectExp* newSelectExp(const CMPIBroker* broker, const char*, const char*, CMPIArray**, CMPIStatus* status) {
-  return made(broker, status, []() -> CMPISelectExp* {
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no query language");
-  });
+  return made(broker, status,
+              []() -> CMPISelectExp* { throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "queries are not supported"); });
 }
 
 CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, const char* className,
@@ -103,7 +101,7 @@ const Model& modelBehind(const void* object) {
   return modelOf<Model>(static_cast<const typename Abi<Model>::Type*>(object));
 }
 
-// The type of an object that a provider knows by its address only. An object tells it by its function table.
+// The type of an object that a provider knows by its address only. The object's function table identifies it.
 const ObjectType& typeOf(const void* object) {
   static const ObjectType types[] = {
       typeRow<Text>([](const void* any) { return std::string(textOf(static_cast<const CMPIString*>(any))); }),
@@ -171,7 +169,8 @@ std::string argumentText(std::va_list* arguments) {
     case CMPI_string:
       return textOf(va_arg(*arguments, const CMPIString*));
     default:
-      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, "no message argument has the CMPI type " + std::to_string(type));
+      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
+                        "message arguments cannot be of CMPI type " + std::to_string(type));
   }
 }
 
@@ -202,7 +201,7 @@ std::string messageText(const std::string& message, CMPICount count, std::va_lis
   return result;
 }
 
-// There are no message files: the text that the caller gives is the message, with its arguments put in.
+// There are no message files: the caller's text is the message, with its arguments put in.
 CMPIString* defaultMessage(const CMPIBroker* broker, const char* text, CMPIStatus* status, CMPICount count,
                            std::va_list arguments) {
   return made(broker, status,
@@ -233,7 +232,7 @@ CMPIStatus openMessageFile(const CMPIBroker* broker, const char*, CMPIMsgFileHan
     if (file) {
       *file = nullptr;
     }
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no message files");
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "message files are not supported");
   });
 }
 
@@ -241,7 +240,7 @@ CMPIStatus closeMessageFile(const CMPIBroker* broker, const CMPIMsgFileHandle) {
   return openMessageFile(broker, nullptr, nullptr);
 }
 
-// The text of a message comes as characters or as a string; the characters win where both are there.
+// The text of a message comes as characters or as a string; the characters win if both are there.
 CMPIStatus send(const CMPIBroker* broker, MessageSink BrokerCore::*sink, int level, const char* component,
                 const char* text, const CMPIString* string) {
   return guarded([&] {

@@ -79,7 +79,7 @@ int setThreadSpecific(CMPI_THREAD_KEY_TYPE key, void* value) {
   return pthread_setspecific(static_cast<pthread_key_t>(key), value);
 }
 
-// A mutex that its thread may lock again, where `recursive` says so.
+// A mutex that its thread may lock again, if `recursive` says so.
 CMPI_MUTEX_TYPE newMutex(int recursive) {
   auto mutex = std::unique_ptr<pthread_mutex_t>(new (std::nothrow) pthread_mutex_t);
   pthread_mutexattr_t attributes;

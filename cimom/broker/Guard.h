@@ -15,7 +15,7 @@ inline CMPIStatus makeStatus(CMPIrc code, const char* message) noexcept {
       status.msg = make(Text{message});
     }
   } catch (const std::exception&) {
-    // The code alone still tells what is wrong.
+    // The code alone still says what is wrong.
   }
   return status;
 }
@@ -33,7 +33,7 @@ CMPIStatus guarded(Operation operation) noexcept {
   }
 }
 
-// The same for a slot that gives a result and reports through a status pointer, which may be null.
+// The same for a slot that returns a result and reports through a status pointer, which may be null.
 template <typename Given, typename Operation>
 Given guarded(CMPIStatus* status, Given failure, Operation operation) noexcept {
   Given result = failure;
@@ -45,22 +45,22 @@ Given guarded(CMPIStatus* status, Given failure, Operation operation) noexcept {
 }
 
 // A name or text that a slot requires.
-// Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER where it is null.
+// Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER if it is null.
 inline const char* required(const char* text, const char* what) {
   if (!text) {
-    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string(what) + " is null");
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string(what) + " must not be null");
   }
   return text;
 }
 
-// What a slot gives that has no value to give.
+// What a slot returns that has no value to return.
 constexpr CMPIData noData = {CMPI_null, CMPI_nullValue | CMPI_notFound, {}};
 
 // The slots `release` and `clone`, the same for every object.
 template <typename Model>
 CMPIStatus release(typename Abi<Model>::Type* object) {
   if (!object || !object->hdl) {
-    return makeStatus(CMPI_RC_ERR_INVALID_HANDLE, "release of a null object");
+    return makeStatus(CMPI_RC_ERR_INVALID_HANDLE, "cannot release a null object");
   }
   auto* handle = static_cast<Handle<Model>*>(object);
   if (!handle->inScope) {
@@ -81,10 +81,10 @@ typename Abi<Model>::Type* clone(const typename Abi<Model>::Type* object, CMPISt
   });
 }
 
-// A string of the request; null where there is no text.
+// A string of the request; null if there is no text.
 inline CMPIString* makeText(const std::optional<std::string>& text) { return text ? make(Text{*text}) : nullptr; }
 
-// An entry of named values by index, as the slots get…At give it.
+// An entry of named values by index, as the slots get…At return it.
 // Throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY past the end.
 inline CMPIData entryAt(const NamedValues& values, CMPICount index, CMPIString** name,
                         CMPIValueState state = CMPI_goodValue) {
@@ -99,8 +99,8 @@ inline CMPIData entryAt(const NamedValues& values, CMPICount index, CMPIString**
   return data;
 }
 
-// An entry of named values by name, as the slots get… give it.
-// Throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY where there is none.
+// An entry of named values by name, as the slots get… return it.
+// Throws StatusError CMPI_RC_ERR_NO_SUCH_PROPERTY if there is none.
 inline CMPIData entryOf(const NamedValues& values, const char* name, CMPIValueState state = CMPI_goodValue) {
   const Value* value = values.find(required(name, "the name"));
   if (!value) {

@@ -63,26 +63,26 @@ Handle<Model> lend(Model model) {
 }
 
 // The model behind a CMPI object.
-// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the object or its handle is null.
+// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the object or its handle is null.
 template <typename Model>
 Model& modelOf(const typename Abi<Model>::Type* object) {
   static_assert(!std::is_same_v<Model, Text>, "textOf reads a string");
   if (!object || !object->hdl) {
-    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, std::string("a null ") + Abi<Model>::name);
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, std::string(Abi<Model>::name) + " must not be null");
   }
   return static_cast<Handle<Model>*>(object->hdl)->model;
 }
 
 // The characters of a CMPI string.
-// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE where the string or its handle is null.
+// Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the string or its handle is null.
 inline const char* textOf(const CMPIString* string) {
   if (!string || !string->hdl) {
-    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "a null CMPIString");
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "CMPIString must not be null");
   }
   return static_cast<const char*>(string->hdl);
 }
 
-// Makes a CMPI object, owned by the current request scope where there is one and else by the caller.
+// Makes a CMPI object, owned by the current request scope if there is one and else by the caller.
 template <typename Model>
 typename Abi<Model>::Type* make(Model model) {
   auto handle = std::make_unique<Handle<Model>>(std::move(model));

@@ -49,7 +49,7 @@ struct Error {
 
 // What a provider delivers to one operation.
 struct Result {
-  CMPIType kind = CMPI_null;  // CMPI_instance or CMPI_ref where the operation takes only those; CMPI_null: anything
+  CMPIType kind = CMPI_null;  // CMPI_instance or CMPI_ref if the operation takes only those; CMPI_null: anything
   std::vector<Value> items;
   std::optional<Error> error;  // the first error that the provider returned as a CMPIError
 };

@@ -56,7 +56,7 @@ const ClassDefinition& classOf(const CMPIObjectPath* path) {
   const std::string& name = modelOf<ObjectPath>(path).className;
   const CMPIBroker* broker = RequestScope::currentBroker();
   if (!broker) {
-    throw StatusError(CMPI_RC_ERR_FAILED, "qualifiers can be read within a request only");
+    throw StatusError(CMPI_RC_ERR_FAILED, "qualifiers can only be read within a request");
   }
   return coreOf(broker).requireClass(name);
 }
@@ -64,7 +64,7 @@ const ClassDefinition& classOf(const CMPIObjectPath* path) {
 template <typename Declaration>
 const Declaration& declared(const Declaration* declaration, CMPIrc code, const char* name) {
   if (!declaration) {
-    throw StatusError(code, std::string("not declared: \"") + name + "\"");
+    throw StatusError(code, "\"" + std::string(name) + "\" is not declared");
   }
   return *declaration;
 }
@@ -73,7 +73,7 @@ const MethodDeclaration& methodOf(const CMPIObjectPath* path, const char* name) 
   return declared(classOf(path).findMethod(required(name, "the method's name")), CMPI_RC_ERR_METHOD_NOT_FOUND, name);
 }
 
-// A qualifier's value; what is not qualified gives a null value with CMPI_RC_ERR_NOT_FOUND.
+// A qualifier's value; a null value with CMPI_RC_ERR_NOT_FOUND if it is not there.
 CMPIData qualifierOf(const Qualifiers& qualifiers, const char* name) {
   const Qualifier* qualifier = findQualifier(qualifiers, required(name, "the qualifier's name"));
   return toCmpi(declared(qualifier, CMPI_RC_ERR_NOT_FOUND, name).value);
@@ -105,7 +105,7 @@ CMPIData getParameterQualifier(const CMPIObjectPath* path, const char* method, c
         return qualifierOf(one.qualifiers, qualifier);
       }
     }
-    throw StatusError(CMPI_RC_ERR_NOT_FOUND, std::string("not declared: \"") + parameter + "\"");
+    throw StatusError(CMPI_RC_ERR_NOT_FOUND, "\"" + std::string(parameter) + "\" is not declared");
   });
 }
 

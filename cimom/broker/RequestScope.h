@@ -32,16 +32,16 @@ class RequestScope {
   // The request's context, at first without entries; it is made when first asked for.
   CMPIContext* context();
 
-  // The innermost scope of this thread; null where there is none.
+  // The innermost scope of this thread, or null.
   static RequestScope* current();
-  // The broker of the innermost scope of this thread; null where there is none.
+  // The broker of the innermost scope of this thread, or null.
   static const CMPIBroker* currentBroker();
 
   void adopt(std::unique_ptr<Object> object);
 
   // Opens a scope on this thread that a later call of `close`, or the end of an outer scope, ends.
   static RequestScope* open(const CMPIBroker* broker);
-  // Ends an opened scope and those inside it. Gives false where it is no opened scope of this thread.
+  // Ends an opened scope and those inside it. Returns false if it is not an open scope of this thread.
   static bool close(const RequestScope* opened);
 
  private:

@@ -10,11 +10,11 @@ namespace {
 void deliver(const CMPIResult* result, Value item) {
   Result& model = modelOf<Result>(result);
   if (item.isNull()) {
-    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "null returned as a result");
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "a result must not be null");
   }
   if (model.kind != CMPI_null && item.type() != model.kind) {
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "the operation takes no " + describeType(item.type()) + ", but " +
-                                                     describeType(model.kind) + "s");
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "a result of this operation must be of type " +
+                                                     describeType(model.kind) + ", not " + describeType(item.type()));
   }
   model.items.push_back(std::move(item));
 }

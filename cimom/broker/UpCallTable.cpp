@@ -70,7 +70,7 @@ CMPIStatus deleteInstance(const CMPIBroker* broker, const CMPIContext* context, 
 CMPIEnumeration* execQuery(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                            const char*, const char*, CMPIStatus* status) {
   return enumeration(broker, context, path, status, [](OperationHandler&, const Operation&) -> std::vector<Value> {
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager has no query language");
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "queries are not supported");
   });
 }
 
@@ -149,7 +149,7 @@ CMPIData getProperty(const CMPIBroker* broker, const CMPIContext* context, const
 CMPIStatus deliverIndication(const CMPIBroker* broker, const CMPIContext*, const char*, const CMPIInstance*) {
   return guarded([&] {
     coreOf(broker);
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "this object manager delivers no indications");
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "indications are not supported");
   });
 }
 
@@ -158,7 +158,7 @@ CMPIContext* prepareAttachThread(const CMPIBroker*, const CMPIContext* context) 
   return clone<Context>(context, nullptr);
 }
 
-// The memory of the thread that a provider has attached; null where it has not.
+// The memory of the thread that a provider has attached; null if it has not.
 thread_local RequestScope* attached = nullptr;
 
 CMPIStatus attachThread(const CMPIBroker* broker, const CMPIContext* context) {
@@ -166,7 +166,7 @@ CMPIStatus attachThread(const CMPIBroker* broker, const CMPIContext* context) {
     coreOf(broker);
     modelOf<Context>(context);
     if (attached) {
-      throw StatusError(CMPI_RC_ERR_FAILED, "the thread is attached already");
+      throw StatusError(CMPI_RC_ERR_FAILED, "the thread is already attached");
     }
     attached = RequestScope::open(broker);
   });

@@ -31,7 +31,8 @@ CMPIBoolean isInterval(const CMPIDateTime* dateTime, CMPIStatus* status) {
 
 void requireIndex(const Array& array, CMPICount index) {
   if (index >= array.elements.size()) {
-    throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, "index " + std::to_string(index) + " in an array of " +
+    throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, "index " + std::to_string(index) +
+                                                        " is past the end of an array of " +
                                                         std::to_string(array.elements.size()) + " elements");
   }
 }
@@ -61,7 +62,7 @@ CMPIStatus setElementAt(CMPIArray* array, CMPICount index, const CMPIValue* valu
       element = Value::null(model.elementType);
     } else if (element.type() != model.elementType) {
       throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
-                        "a " + describeType(element.type()) + " in an array of " + describeType(model.elementType));
+                        "expected " + describeType(model.elementType) + ", not " + describeType(element.type()));
     }
     model.elements[index] = std::move(element);
   });

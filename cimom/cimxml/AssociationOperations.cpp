@@ -14,7 +14,8 @@ struct Traversal {
         names(list) {
     const ObjectName& name = call.parameters.instanceName("ObjectName");
     if (name.keys.empty()) {
-      throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED, "associations are traversed from an instance, not from a class");
+      throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED,
+                           "association traversal from a class is not supported: name an instance");
     }
     source = call.objects.path(name);
   }

@@ -72,7 +72,7 @@ inline PropertyFilter filterOf(const std::optional<std::vector<std::string>>& na
   return names ? PropertyFilter(*names) : PropertyFilter();
 }
 
-// The operations on instances; each writes IRETURNVALUE where it returns something.
+// The operations on instances; each writes IRETURNVALUE if it returns something.
 void enumerateInstances(Call& call);
 void enumerateInstanceNames(Call& call);
 void getInstance(Call& call);

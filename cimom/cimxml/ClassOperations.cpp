@@ -8,13 +8,13 @@ void requireNamespace(const Call& call) {
   if (call.manager.classes.hasNamespace(call.request.nameSpace)) {
     return;
   }
-  throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "the namespace " + call.request.nameSpace + " is not known");
+  throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + call.request.nameSpace + "\"");
 }
 
 const ClassDefinition& requireClass(const Call& call, const std::string& name, CMPIrc whenUnknown) {
   const ClassDefinition* definition = call.manager.classes.find(name);
   if (!definition) {
-    throw OperationError(whenUnknown, "the class " + name + " is not known");
+    throw OperationError(whenUnknown, "unknown class \"" + name + "\"");
   }
   return *definition;
 }

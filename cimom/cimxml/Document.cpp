@@ -80,7 +80,7 @@ std::string Element::text() const {
     if (isText(*part)) {
       text += view(part->content);
     } else if (part->type == XML_ELEMENT_NODE || part->type == XML_ENTITY_REF_NODE) {
-      refuse("has " + std::string(view(part->name)) + " where only text may stand");
+      refuse("must contain only text, not " + std::string(view(part->name)));
     }
   }
   return trimmed(std::move(text));
@@ -96,7 +96,7 @@ Element Element::only() const {
     refuse("is empty");
   }
   if (const auto second = child->next()) {
-    refuse("has " + std::string(second->name()) + " where nothing more may stand");
+    refuse("must contain only one element, but " + std::string(second->name()) + " follows");
   }
   return *child;
 }
@@ -104,7 +104,7 @@ Element Element::only() const {
 Element Element::only(std::string_view childName) const {
   const Element child = only();
   if (!child.is(childName)) {
-    refuse("has " + std::string(child.name()) + " where " + std::string(childName) + " belongs");
+    refuse("must contain " + std::string(childName) + ", not " + std::string(child.name()));
   }
   return child;
 }

@@ -23,7 +23,8 @@ Http::Response plain(unsigned status, const std::string& text) {
 
 Http::Response refusedMethod(const std::string& method) {
   const bool isKnown = std::find(otherMethods.begin(), otherMethods.end(), method) != otherMethods.end();
-  Http::Response response = plain(isKnown ? 405 : 501, "CIM operations are sent with POST or M-POST, not " + method);
+  Http::Response response =
+      plain(isKnown ? 405 : 501, "CIM operations must be sent with POST or M-POST, not " + method);
   response.headers.add("Allow", "POST, M-POST");
   return response;
 }
@@ -59,7 +60,7 @@ Endpoint::Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std
 
 Http::Response Endpoint::handle(const Http::Request& request) const {
   if (request.path != "/cimom" && request.path != "/") {
-    return plain(404, "CIM operations are sent to /cimom");
+    return plain(404, "CIM operations must be sent to /cimom");
   }
   if (request.method != "POST" && request.method != "M-POST") {
     return refusedMethod(request.method);

@@ -10,11 +10,11 @@
 
 namespace Cimom::CimXml {
 
-// CIM operations over HTTP (DSP0200 1.4): takes POST and M-POST on /cimom and /. What is no CIM operation is answered
-// with an HTTP status, the CIMError header that DSP0200 has for it and a line of plain text that tells what is wrong.
+// CIM operations over HTTP (DSP0200 1.4): takes POST and M-POST on /cimom and /. Anything else is answered
+// with an HTTP status, the CIMError header that DSP0200 has for it and a line of plain text that says what is wrong.
 class Endpoint {
  public:
-  // @param host stands in paths that name no host
+  // `host` stands in paths that name no host.
   Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std::string host);
 
   // May be called from several threads at once.

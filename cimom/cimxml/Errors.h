@@ -49,7 +49,7 @@ inline void requireOk(const CMPIStatus& status) {
 inline void requireOk(const CMPIStatus& status, const void* object) {
   requireOk(status);
   if (!object) {
-    throw OperationError(CMPI_RC_ERR_FAILED, "the operation succeeded and gave nothing");
+    throw OperationError(CMPI_RC_ERR_FAILED, "the operation succeeded but returned nothing");
   }
 }
 

@@ -47,12 +47,13 @@ std::string loneKey(const ClassDefinition* definition, const ObjectName& name) {
       continue;
     }
     if (!key.empty()) {
-      throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has more than one key");
+      throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
+                           "class " + name.className + " has more than one key, so each must be named");
     }
     key = property.name;
   }
   if (key.empty()) {
-    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the class " + name.className + " has no key");
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "class " + name.className + " has no key");
   }
   return key;
 }
@@ -88,10 +89,10 @@ ObjectBuilder::TypedValue ObjectBuilder::keyValue(const KeyBinding& key, CMPITyp
     typed.value.ref = path(*key.value.reference);
   } else if (isReference || type == CMPI_ref) {
     throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
-                         "the key " + key.name + (isReference ? " is no reference" : " is a reference"));
+                         "key " + key.name + (isReference ? " must not be a reference" : " must be a reference"));
   } else if (!scalar(type, key.value.text, typed.value)) {
-    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
-                         "the key " + key.name + " is no " + describeType(type) + ": \"" + key.value.text + "\"");
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "key " + key.name + " must be of type " + describeType(type) +
+                                                            ", not \"" + key.value.text + "\"");
   }
   return typed;
 }
@@ -110,12 +111,12 @@ CMPIInstance* ObjectBuilder::instance(const Instance& instance) const {
 ObjectBuilder::TypedValue ObjectBuilder::propertyValue(const std::string& className, const Property& property) const {
   const ClassDefinition* definition = classes_.find(className);
   if (!definition) {
-    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
   }
   const PropertyDeclaration* declared = definition->findProperty(property.name);
   if (!declared) {
     throw OperationError(CMPI_RC_ERR_NO_SUCH_PROPERTY,
-                         "the class " + definition->name + " has no property " + property.name);
+                         "class " + definition->name + " has no property " + property.name);
   }
   return typed(property, declared->type);
 }
@@ -126,13 +127,13 @@ ObjectBuilder::TypedValue ObjectBuilder::typed(const Property& property, CMPITyp
   const std::string declaredName = describeType(type);
   TypedValue typed{{}, type, false};
   if (!property.type.empty() && (property.type != xmlTypeName(type) || property.isArray != isArray)) {
-    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "the property " + property.name + " is of type " + declaredName +
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "property " + property.name + " must be of type " + declaredName +
                                                         ", not " + property.type + (property.isArray ? "[]" : ""));
   }
   if (const auto* text = std::get_if<std::string>(&property.value); text && !isArray && type != CMPI_ref) {
     if (!scalar(type, *text, typed.value)) {
-      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH,
-                           "the property " + property.name + " is no " + declaredName + ": \"" + *text + "\"");
+      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "property " + property.name + " must be of type " + declaredName +
+                                                          ", not \"" + *text + "\"");
     }
   } else if (const auto* texts = std::get_if<Texts>(&property.value); texts && isArray) {
     typed.value.array = array(property, *texts, elementType);
@@ -141,7 +142,7 @@ ObjectBuilder::TypedValue ObjectBuilder::typed(const Property& property, CMPITyp
   } else if (std::holds_alternative<std::monostate>(property.value)) {
     typed.isNull = true;
   } else {
-    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "the property " + property.name + " is of type " + declaredName);
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "property " + property.name + " must be of type " + declaredName);
   }
   return typed;
 }
@@ -156,9 +157,9 @@ CMPIArray* ObjectBuilder::array(const Property& property, const Texts& texts, CM
     }
     CMPIValue value{};
     if (!scalar(elementType, *texts[i], value)) {
-      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "element " + std::to_string(i) + " of the property " +
-                                                          property.name + " is no " + describeType(elementType) +
-                                                          ": \"" + *texts[i] + "\"");
+      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "element " + std::to_string(i) + " of property " + property.name +
+                                                          " must be of type " + describeType(elementType) + ", not \"" +
+                                                          *texts[i] + "\"");
     }
     requireOk(CMSetArrayElementAt(array, i, &value, elementType));
   }

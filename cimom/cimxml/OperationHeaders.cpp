@@ -20,17 +20,17 @@ std::string prefixOf(const Http::Request& request) {
   const std::string* declaration = request.headers.find("Man");
   if (!declaration || declaration->find(extension) == std::string::npos) {
     throw TransportError(notExtended, "",
-                         "M-POST demands no extension that this server knows: it knows " + std::string(extension));
+                         "the Man header of an M-POST must name the extension " + std::string(extension));
   }
   const auto marker = declaration->find("ns=");
   const auto digits = marker == std::string::npos ? std::string() : declaration->substr(marker + 3, 2);
   if (digits.size() != 2 || digits.find_first_not_of("0123456789") != std::string::npos) {
-    throw TransportError(notExtended, "", "the Man header has no ns= with two digits");
+    throw TransportError(notExtended, "", "the Man header must contain ns= and two digits");
   }
   return digits + "-";
 }
 
-// %XX as its byte; what is no escape stays.
+// %XX as its byte; anything else stays.
 std::string unescape(std::string_view text) {
   std::string result;
   for (std::size_t i = 0; i < text.size(); ++i) {
@@ -58,15 +58,16 @@ OperationHeaders::OperationHeaders(const Http::Request& request)
     : headers_(request.headers), prefix_(prefixOf(request)) {
   const std::string* operation = find("CIMOperation");
   if (!operation || !sameName(*operation, "MethodCall")) {
-    throw TransportError(400, "unsupported-operation",
-                         operation ? "the header CIMOperation is not MethodCall" : "there is no header CIMOperation");
+    throw TransportError(
+        400, "unsupported-operation",
+        operation ? "the CIMOperation header must be MethodCall" : "the CIMOperation header is missing");
   }
   const std::string* version = find("CIMProtocolVersion");
   if (version && !version->starts_with("1.")) {
-    throw TransportError(501, "unsupported-protocol-version", "CIMProtocolVersion is " + *version + ", not 1.x");
+    throw TransportError(501, "unsupported-protocol-version", "CIMProtocolVersion must be 1.x, not " + *version);
   }
   if (find("CIMBatch")) {
-    throw TransportError(501, "multiple-requests-unsupported", "this server takes one request in a message");
+    throw TransportError(501, "multiple-requests-unsupported", "only one request per message is supported");
   }
 }
 
@@ -76,17 +77,17 @@ void OperationHeaders::requireMatch(const Request& message) const {
   const auto refuse = [](const std::string& what) { throw TransportError(400, "header-mismatch", what); };
   const std::string* method = find("CIMMethod");
   if (!method) {
-    return refuse("there is no header CIMMethod");
+    return refuse("the CIMMethod header is missing");
   }
   if (!sameName(unescape(*method), message.method)) {
-    refuse("the header CIMMethod says " + *method + ", the message " + message.method);
+    refuse("the CIMMethod header is " + *method + ", but the message calls " + message.method);
   }
   const std::string* object = find("CIMObject");
   if (!object) {
-    return refuse("there is no header CIMObject");
+    return refuse("the CIMObject header is missing");
   }
   if (!sameName(nameSpaceOf(*object, message.isIntrinsic), message.nameSpace)) {
-    refuse("the header CIMObject says " + *object + ", the message " + message.nameSpace);
+    refuse("the CIMObject header names " + *object + ", but the message names " + message.nameSpace);
   }
 }
 

@@ -11,11 +11,11 @@ namespace Cimom::CimXml {
 // digits, which the Man header declares; the reply's headers have the same.
 class OperationHeaders {
  public:
-  // Throws TransportError: unsupported-operation where this is no call of a method, unsupported-protocol-version, and
-  // 510 (Not Extended) where an M-POST demands another extension or none.
+  // Throws TransportError: unsupported-operation if this is not a method call, unsupported-protocol-version, and
+  // 510 (Not Extended) if an M-POST demands another extension or none.
   explicit OperationHeaders(const Http::Request& request);
 
-  // Throws TransportError header-mismatch where CIMMethod or CIMObject differ from what the message says.
+  // Throws TransportError header-mismatch if CIMMethod or CIMObject differ from what the message says.
   void requireMatch(const Request& message) const;
 
   // Adds what marks a reply as the response to a method call.

@@ -52,7 +52,7 @@ const Operation& findOperation(const std::string& name) {
   const auto operation = std::find_if(operations().begin(), operations().end(),
                                       [&name](const Operation& candidate) { return sameName(candidate.name, name); });
   if (operation == operations().end()) {
-    throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED, "this server does not offer the operation " + name);
+    throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED, "operation " + name + " is not supported");
   }
   return *operation;
 }
@@ -73,16 +73,16 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
 [[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
   const std::string& className = request.target.className;
   if (!manager.classes.hasNamespace(request.nameSpace)) {
-    throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "the namespace " + request.nameSpace + " is not known");
+    throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
   }
   const ClassDefinition* definition = manager.classes.find(className);
   if (!definition) {
-    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "the class " + className + " is not known");
+    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
   }
   if (!definition->findMethod(request.method)) {
-    throw OperationError(CMPI_RC_ERR_METHOD_NOT_FOUND, "the class " + className + " has no method " + request.method);
+    throw OperationError(CMPI_RC_ERR_METHOD_NOT_FOUND, "class " + className + " has no method " + request.method);
   }
-  throw OperationError(CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "no provider performs the method " + request.method);
+  throw OperationError(CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "method " + request.method + " has no provider");
 }
 
 }  // namespace

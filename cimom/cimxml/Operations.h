@@ -15,7 +15,7 @@ struct OperationContext {
   const CMPIBroker* broker;
   const ClassRepository& classes;
   const std::string& host;  // stands in a path that names none
-  const std::string& user;  // who has authenticated; empty where nobody was asked
+  const std::string& user;  // who has authenticated; empty if nobody was asked
 };
 
 // Performs a request's operation (DSP0200, 5.3) and writes what it returns as the content of IMETHODRESPONSE. All

@@ -12,7 +12,7 @@ namespace Cimom::CimXml {
 namespace {
 
 [[noreturn]] void refuse(std::string_view name, const char* what) {
-  throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "the parameter " + std::string(name) + " " + what);
+  throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter " + std::string(name) + " " + what);
 }
 
 // The value of a parameter that may be missing; null then.
@@ -34,11 +34,11 @@ Parameters::Parameters(const Request& request, const std::vector<std::string_vie
   for (auto parameter = request.parameters.begin(); parameter != request.parameters.end(); ++parameter) {
     const auto isSame = [parameter](const auto& other) { return sameName(parameter->name, other); };
     if (std::none_of(known.begin(), known.end(), isSame)) {
-      refuse(parameter->name, "is not known");
+      refuse(parameter->name, "is unknown");
     }
     if (std::any_of(request.parameters.begin(), parameter,
                     [&](const Parameter& other) { return isSame(other.name); })) {
-      refuse(parameter->name, "is given twice");
+      refuse(parameter->name, "is a duplicate");
     }
   }
 }
@@ -52,7 +52,7 @@ const Parameter* Parameters::find(std::string_view name) const {
 }
 
 std::optional<std::string> Parameters::text(std::string_view name) const {
-  const auto* text = valueOf<std::string>(find(name), "is no text");
+  const auto* text = valueOf<std::string>(find(name), "must be text");
   if (!text) {
     return std::nullopt;
   }
@@ -66,18 +66,18 @@ bool Parameters::flag(std::string_view name, bool whenMissing) const {
   }
   const auto parsed = parseScalar(CMPI_boolean, *value);
   if (!parsed) {
-    refuse(name, "is neither TRUE nor FALSE");
+    refuse(name, "must be TRUE or FALSE");
   }
   return parsed->boolean != 0;
 }
 
 std::string Parameters::className(std::string_view name) const {
-  const auto* value = valueOf<ObjectName>(find(name), "is no name of a class");
+  const auto* value = valueOf<ObjectName>(find(name), "must be a class name");
   if (!value) {
     return {};
   }
   if (!value->keys.empty()) {
-    refuse(name, "is no name of a class");
+    refuse(name, "must be a class name");
   }
   return value->className;
 }
@@ -91,7 +91,7 @@ std::string Parameters::requiredClassName(std::string_view name) const {
 }
 
 const ObjectName& Parameters::instanceName(std::string_view name) const {
-  const auto* value = valueOf<ObjectName>(find(name), "is no name of an instance");
+  const auto* value = valueOf<ObjectName>(find(name), "must be an instance name");
   if (!value) {
     refuse(name, "is missing");
   }
@@ -99,7 +99,7 @@ const ObjectName& Parameters::instanceName(std::string_view name) const {
 }
 
 const Instance& Parameters::instance(std::string_view name) const {
-  const auto* value = valueOf<Instance>(find(name), "is no instance");
+  const auto* value = valueOf<Instance>(find(name), "must be an instance");
   if (!value) {
     refuse(name, "is missing");
   }
@@ -107,7 +107,7 @@ const Instance& Parameters::instance(std::string_view name) const {
 }
 
 std::optional<std::vector<std::string>> Parameters::propertyList() const {
-  const auto* texts = valueOf<Texts>(find("PropertyList"), "is no list of names");
+  const auto* texts = valueOf<Texts>(find("PropertyList"), "must be a list of names");
   if (!texts) {
     return std::nullopt;
   }

@@ -13,24 +13,24 @@ namespace Cimom::CimXml {
 // is an OperationError CIM_ERR_INVALID_PARAMETER that names it. A parameter without a value counts as not given.
 class Parameters {
  public:
-  // @param known the names that the method has
+  // `known` are the names that the method has.
   Parameters(const Request& request, const std::vector<std::string_view>& known);
 
   bool flag(std::string_view name, bool whenMissing) const;
   std::optional<std::string> text(std::string_view name) const;
 
-  // The name of a class; empty where none is given.
+  // The name of a class; empty if none is given.
   std::string className(std::string_view name) const;
 
-  // Throws where it is missing, too.
+  // Throws if it is missing, too.
   std::string requiredClassName(std::string_view name) const;
   const ObjectName& instanceName(std::string_view name) const;
   const Instance& instance(std::string_view name) const;
 
-  // The names in a list of properties; nothing where no list is given, which means all of them.
+  // The names in a list of properties; nothing if no list is given, which means all of them.
   std::optional<std::vector<std::string>> propertyList() const;
 
-  // The parameter as it came; null where it is not given.
+  // The parameter as it came; null if it is not given.
   const Parameter* find(std::string_view name) const;
 
  private:

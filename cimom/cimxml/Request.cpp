@@ -16,7 +16,7 @@ std::string readLocalNameSpacePath(const Element& element) {
   std::string path;
   for (auto child = element.first(); child; child = child->next()) {
     if (!child->is("NAMESPACE")) {
-      child->refuse("is no NAMESPACE");
+      child->refuse("must be NAMESPACE");
     }
     if (!path.empty()) {
       path += '/';
@@ -24,7 +24,7 @@ std::string readLocalNameSpacePath(const Element& element) {
     path += child->requiredAttribute("NAME");
   }
   if (path.empty()) {
-    element.refuse("names no namespace");
+    element.refuse("must name a namespace");
   }
   return path;
 }
@@ -37,7 +37,7 @@ KeyValue readKeyValue(const Element& element) {
     return value;
   }
   if (!element.is("KEYVALUE")) {
-    element.refuse("is no value of a key");
+    element.refuse("is not a key value");
   }
   const std::string valueType = element.attribute("VALUETYPE").value_or("string");
   if (valueType == "boolean") {
@@ -61,7 +61,7 @@ ObjectName readInstanceName(const Element& element) {
     } else if (name.keys.empty() && !child->next()) {
       name.keys.push_back({"", readKeyValue(*child)});
     } else {
-      child->refuse("does not belong beside other keys");
+      child->refuse("must not stand beside other keys");
     }
   }
   return name;
@@ -72,7 +72,7 @@ ObjectName readName(const Element& element) {
     return readInstanceName(element);
   }
   if (!element.is("CLASSNAME")) {
-    element.refuse("is no name of a class or an instance");
+    element.refuse("is not a class or instance name");
   }
   ObjectName name;
   name.className = element.requiredAttribute("NAME");
@@ -84,7 +84,7 @@ ObjectName readPath(const Element& element) {
   const auto place = element.first();
   const auto local = place ? place->next() : std::nullopt;
   if (!local || local->next()) {
-    element.refuse("is no path of two parts");
+    element.refuse("must contain a namespace path and a name");
   }
   ObjectName name = readName(*local);
   if (place->is("LOCALNAMESPACEPATH")) {
@@ -94,7 +94,7 @@ ObjectName readPath(const Element& element) {
   const auto host = place->is("NAMESPACEPATH") ? place->first() : std::nullopt;
   const auto nameSpace = host && host->is("HOST") ? host->next() : std::nullopt;
   if (!nameSpace || !nameSpace->is("LOCALNAMESPACEPATH")) {
-    place->refuse("is no path of a namespace");
+    place->refuse("is not a namespace path");
   }
   name.host = host->text();
   name.nameSpace = readLocalNameSpacePath(*nameSpace);
@@ -110,7 +110,7 @@ bool isObjectName(const Element& element) {
 
 ObjectName readObjectName(const Element& element) {
   if (!isObjectName(element)) {
-    element.refuse("is no name of a class or an instance");
+    element.refuse("is not a class or instance name");
   }
   return element.is("CLASSNAME") || element.is("INSTANCENAME") ? readName(element) : readPath(element);
 }
@@ -124,7 +124,7 @@ Texts readArray(const Element& element) {
     } else if (child->is("VALUE.NULL")) {
       texts.emplace_back(std::nullopt);
     } else {
-      child->refuse("is no element of an array");
+      child->refuse("is not an array element");
     }
   }
   return texts;
@@ -142,7 +142,7 @@ Property readProperty(const Element& element) {
       continue;
     }
     if (!child->is(valueName) || property.value.index() != 0) {
-      child->refuse("does not belong in a " + std::string(element.name()));
+      child->refuse("is not allowed in " + std::string(element.name()));
     }
     if (isReference) {
       property.value = readObjectName(child->only());
@@ -167,7 +167,7 @@ Instance readPlainInstance(const Element& element) {
       continue;
     }
     if (!isProperty(*child)) {
-      child->refuse("is no property");
+      child->refuse("is not a property");
     }
     instance.properties.push_back(readProperty(*child));
   }
@@ -184,7 +184,7 @@ Instance readInstance(const Element& element) {
   const auto name = element.first();
   const auto content = name ? name->next() : std::nullopt;
   if (!content || content->next() || !name->is("INSTANCENAME") || !content->is("INSTANCE")) {
-    element.refuse("is not an INSTANCENAME and an INSTANCE");
+    element.refuse("must contain an INSTANCENAME and an INSTANCE");
   }
   Instance instance = readPlainInstance(*content);
   instance.path = readInstanceName(*name);
@@ -197,8 +197,7 @@ void requireMajorVersion(const Element& element, std::string_view attribute, cha
   if (version.size() > 1 && version[0] == major && version[1] == '.') {
     return;
   }
-  throw TransportError(501, cimError,
-                       std::string(attribute) + " is \"" + version + "\", this server speaks " + major + ".x");
+  throw TransportError(501, cimError, std::string(attribute) + " must be " + major + ".x, not \"" + version + "\"");
 }
 
 // IPARAMVALUE and PARAMVALUE: nothing or one value.
@@ -221,7 +220,7 @@ Parameter readParameter(const Element& element) {
   } else if (isInstance(value)) {
     parameter.value = readInstance(value);
   } else {
-    value.refuse("is no value of the parameter \"" + parameter.name + "\"");
+    value.refuse("is not a value for the parameter \"" + parameter.name + "\"");
   }
   return parameter;
 }
@@ -230,7 +229,7 @@ Parameter readParameter(const Element& element) {
 void readParameters(std::optional<Element> element, std::string_view elementName, Request& request) {
   for (; element; element = element->next()) {
     if (!element->is(elementName)) {
-      element->refuse("is no " + std::string(elementName));
+      element->refuse("must be " + std::string(elementName));
     }
     request.parameters.push_back(readParameter(*element));
   }
@@ -239,7 +238,7 @@ void readParameters(std::optional<Element> element, std::string_view elementName
 void readIntrinsicCall(const Element& call, Request& request) {
   const auto nameSpace = call.first();
   if (!nameSpace || !nameSpace->is("LOCALNAMESPACEPATH")) {
-    call.refuse("does not begin with LOCALNAMESPACEPATH");
+    call.refuse("must begin with LOCALNAMESPACEPATH");
   }
   request.nameSpace = readLocalNameSpacePath(*nameSpace);
   readParameters(nameSpace->next(), "IPARAMVALUE", request);
@@ -248,7 +247,7 @@ void readIntrinsicCall(const Element& call, Request& request) {
 void readExtrinsicCall(const Element& call, Request& request) {
   const auto target = call.first();
   if (!target || !(target->is("LOCALCLASSPATH") || target->is("LOCALINSTANCEPATH"))) {
-    call.refuse("does not begin with LOCALCLASSPATH or LOCALINSTANCEPATH");
+    call.refuse("must begin with LOCALCLASSPATH or LOCALINSTANCEPATH");
   }
   request.isIntrinsic = false;
   request.target = readObjectName(*target);
@@ -262,7 +261,7 @@ Request readRequest(std::string_view xml) {
   const Document document(xml);
   const Element root = document.root();
   if (!root.is("CIM")) {
-    root.refuse("is the root where CIM belongs");
+    root.refuse("must be CIM");
   }
   requireMajorVersion(root, "CIMVERSION", '2', "unsupported-cim-version");
   requireMajorVersion(root, "DTDVERSION", '2', "unsupported-dtd-version");
@@ -272,7 +271,7 @@ Request readRequest(std::string_view xml) {
   request.protocolVersion = message.requiredAttribute("PROTOCOLVERSION");
   requireMajorVersion(message, "PROTOCOLVERSION", '1', "unsupported-protocol-version");
   if (message.only().is("MULTIREQ")) {
-    throw TransportError(501, "multiple-requests-unsupported", "this server takes one request in a message");
+    throw TransportError(501, "multiple-requests-unsupported", "only one request per message is supported");
   }
   const Element call = message.only("SIMPLEREQ").only();
   request.method = call.requiredAttribute("NAME");
@@ -281,7 +280,7 @@ Request readRequest(std::string_view xml) {
   } else if (call.is("METHODCALL")) {
     readExtrinsicCall(call, request);
   } else {
-    call.refuse("is no call of a method");
+    call.refuse("is not a method call");
   }
   return request;
 }

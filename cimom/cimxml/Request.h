@@ -30,7 +30,7 @@ struct KeyValue {
 };
 
 struct KeyBinding {
-  std::string name;  // empty for a lone KEYVALUE, which DSP0201 allows where a class has one key
+  std::string name;  // empty for a lone KEYVALUE, which DSP0201 allows if a class has one key
   KeyValue value;
 };
 
@@ -47,7 +47,7 @@ struct Property {
 };
 
 struct Instance {
-  ObjectName path;  // without keys where the client gave an INSTANCE alone
+  ObjectName path;  // without keys if the client gave an INSTANCE alone
   std::vector<Property> properties;
 };
 

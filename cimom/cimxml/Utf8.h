@@ -7,7 +7,7 @@
 
 namespace Cimom::CimXml {
 
-// The text with every byte sequence that is no UTF-8, and every character that XML 1.0 (2.2) has no way to write (most
+// The text with every byte sequence that is not UTF-8, and every character that XML 1.0 (2.2) has no way to write (most
 // control characters, surrogates, U+FFFE and U+FFFF), replaced by U+FFFD.
 std::string toXmlText(std::string_view text);
 

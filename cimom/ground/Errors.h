@@ -8,7 +8,7 @@
 namespace Cimom {
 
 // What the object manager was given to work with (schema, registration, providers) is wrong. The text names the file,
-// the line where there is one, and what is wrong.
+// the line if there is one, and what is wrong.
 class ConfigurationError : public std::runtime_error {
  public:
   using std::runtime_error::runtime_error;

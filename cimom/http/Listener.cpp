@@ -25,7 +25,8 @@ AddressList resolve(const std::string& address, std::uint16_t port) {
   addrinfo* list = nullptr;
   const int error = getaddrinfo(address.c_str(), std::to_string(port).c_str(), &hints, &list);
   if (error != 0) {
-    throw ServerError("\"" + address + "\" is no IPv4 or IPv6 address: " + gai_strerror(error));
+    throw ServerError("cannot listen on \"" + address + "\": must be a numeric IPv4 or IPv6 address (" +
+                      gai_strerror(error) + ")");
   }
   return {list, &freeaddrinfo};
 }

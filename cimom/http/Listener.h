@@ -28,7 +28,7 @@ class Listener {
   const std::string& endpoint() const { return endpoint_; }
   std::uint16_t port() const { return port_; }
 
-  // Gives up this descriptor of the socket.
+  // Closes this descriptor of the socket.
   void close();
 
  private:

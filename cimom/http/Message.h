@@ -38,7 +38,7 @@ struct Request {
   std::string path;  // as sent, without the query
   Headers headers;
   std::string body;  // complete, decoded from any transfer coding
-  std::string user;  // who has authenticated; empty where the server asks nobody
+  std::string user;  // who has authenticated; empty if the server asks nobody
 };
 
 struct Response {

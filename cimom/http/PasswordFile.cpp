@@ -35,14 +35,16 @@ PasswordFile::PasswordFile(const std::filesystem::path& file) {
     const auto colon = line.find(':');
     const std::string hash = colon == std::string::npos ? "" : line.substr(colon + 1);
     if (colon == 0 || crypt_checksalt(hash.c_str()) == CRYPT_SALT_INVALID) {
-      throw ServerError(file.string() + ":" + std::to_string(number) + ": is no \"user:hash\"");
+      throw ServerError(file.string() + ":" + std::to_string(number) +
+                        ": expected \"user:hash\" with a hash of crypt(5)");
     }
     if (!hashes_.emplace(line.substr(0, colon), hash).second) {
-      throw ServerError(file.string() + ":" + std::to_string(number) + ": the user is there already");
+      throw ServerError(file.string() + ":" + std::to_string(number) + ": duplicate user \"" + line.substr(0, colon) +
+                        "\"");
     }
   }
   if (hashes_.empty()) {
-    throw ServerError(file.string() + ": names no user");
+    throw ServerError(file.string() + ": contains no users");
   }
 }
 

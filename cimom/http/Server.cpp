@@ -83,7 +83,7 @@ MHD_Result refuse(MHD_Connection* connection, unsigned status, const char* reaso
 }
 
 MHD_Result refuseSize(MHD_Connection* connection) {
-  return refuse(connection, MHD_HTTP_CONTENT_TOO_LARGE, "the request is larger than this server takes");
+  return refuse(connection, MHD_HTTP_CONTENT_TOO_LARGE, "the request is too large");
 }
 
 MHD_Result challenge(MHD_Connection* connection) {
@@ -131,8 +131,8 @@ struct Server::State {
     return accepted;
   }
 
-  // A chunked body tells its size only by being read: what is beyond the limit is dropped, and a client that goes on
-  // for as long again is cut off.
+  // The size of a chunked body is known only once it has been read: what is beyond the limit is dropped, and a client
+  // that goes on for as long again is cut off.
   MHD_Result receive(Exchange& exchange, const char* data, std::size_t& size) const {
     std::string& body = exchange.request.body;
     if (!exchange.tooLarge && size <= options.maxRequestSize - body.size()) {
@@ -152,7 +152,7 @@ struct Server::State {
     }
     exchange.counted = inFlight.enter();
     if (!exchange.counted) {
-      return refuse(connection, MHD_HTTP_SERVICE_UNAVAILABLE, "the server is ending");
+      return refuse(connection, MHD_HTTP_SERVICE_UNAVAILABLE, "the server is shutting down");
     }
     try {
       return send(connection, handler(exchange.request));
@@ -200,9 +200,9 @@ struct Server::State {
     if (daemon) {
       return;
     }
-    throw ServerError(options.tlsCertificate.empty() ? "the HTTP server does not start"
-                                                     : "the HTTPS server does not start: certificate or key is no "
-                                                       "usable PEM, or they do not belong together");
+    throw ServerError(options.tlsCertificate.empty() ? "cannot start the HTTP server"
+                                                     : "cannot start the HTTPS server: certificate and key must be "
+                                                       "unencrypted PEM and belong together");
   }
 };
 

@@ -43,7 +43,7 @@ class Server {
   std::uint16_t port() const;
 
   // Takes no new connection or request (503) and waits for those that are being answered until their replies are sent.
-  // Gives false when some are still running after the grace period; they go on.
+  // Returns false if some are still running after the grace period; they go on.
   bool drain(std::chrono::milliseconds grace);
 
  private:

@@ -19,7 +19,7 @@ struct Qualifier {
 
 using Qualifiers = std::vector<Qualifier>;
 
-// The qualifier of that name; null where there is none.
+// The qualifier of that name, or null.
 const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view name);
 
 // Whether a boolean qualifier is there and true.
@@ -31,7 +31,7 @@ struct PropertyDeclaration {
   CMPIType type = CMPI_null;   // arrays with the bit CMPI_ARRAY; CMPI_ref for a reference
   std::string referenceClass;  // the class that a reference refers to, else empty
   unsigned arraySize = 0;      // of a fixed-size array, else 0
-  Value defaultValue;          // null where the schema gives none
+  Value defaultValue;          // null if the schema has none
   Qualifiers qualifiers;       // inherited ones included
   std::string originClass;     // the class that declared it first
 

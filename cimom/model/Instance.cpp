@@ -30,8 +30,8 @@ void Instance::set(std::string_view name, Value value) {
   if (value.isNull()) {
     value = Value::null(property->type);
   } else if (value.type() != property->type) {
-    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, definition_->name + "." + property->name + " is a " +
-                                                         describeType(property->type) + ", not a " +
+    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, definition_->name + "." + property->name + " must be of type " +
+                                                         describeType(property->type) + ", not " +
                                                          describeType(value.type()));
   }
   if (filter_ && !filter_->contains(property->name) && !property->isKey()) {
@@ -63,7 +63,7 @@ ObjectPath Instance::path() const {
 void Instance::setPath(ObjectPath path) {
   if (!sameName(path.className, definition_->name)) {
     throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER,
-                      "a path of " + path.className + " cannot be that of an instance of " + definition_->name);
+                      "an instance of " + definition_->name + " cannot have a path of " + path.className);
   }
   path_ = std::move(path);
   takeKeys();

@@ -25,11 +25,11 @@ class Instance {
   std::size_t size() const { return values_.size(); }
   // The value of the class's property of that index.
   const Value& operator[](std::size_t index) const;
-  // The value of a property; null where the class declares none of that name.
+  // The value of a property; null if the class declares none of that name.
   const Value* find(std::string_view name) const;
 
   // Sets a property. A property that the class does not declare, or that the filter leaves out, is dropped.
-  // Throws StatusError CMPI_RC_ERR_INVALID_DATA_TYPE where the value's type is not the declared one.
+  // Throws StatusError CMPI_RC_ERR_INVALID_DATA_TYPE if the value's type is not the declared one.
   void set(std::string_view name, Value value);
 
   // From now on only the named properties and the keys take a value.
@@ -37,8 +37,8 @@ class Instance {
 
   // The path with every key that has a value: one given with the path wins over the property's value.
   ObjectPath path() const;
-  // Gives the instance another path; its keys become values of the key properties.
-  // Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER where it is the path of another class.
+  // Replaces the path; its keys become values of the key properties.
+  // Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER if it is the path of another class.
   void setPath(ObjectPath path);
 
   // The same instance, in which a property that nobody set is null, as ModifyInstance hands it to a provider.

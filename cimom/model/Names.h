@@ -27,7 +27,7 @@ inline bool sameName(std::string_view left, std::string_view right) {
                     [](char a, char b) { return lowerCase(a) == lowerCase(b); });
 }
 
-// The first element with that name; null where there is none.
+// The first element with that name, or null.
 template <typename Range>
 auto* findNamed(Range& range, std::string_view name) {
   const auto found = std::ranges::find_if(range, [name](const auto& element) { return sameName(element.name, name); });

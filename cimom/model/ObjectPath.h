@@ -13,7 +13,7 @@ struct ObjectPath {
   std::string className;
   NamedValues keys;
 
-  // The path as an untyped WBEM URI (DSP0207): "//host/namespace:Class.Key=\"value\",…", the host where there is one.
+  // The path as an untyped WBEM URI (DSP0207): "//host/namespace:Class.Key=\"value\",…", the host if there is one.
   std::string toString() const {
     std::string text;
     if (!host.empty()) {

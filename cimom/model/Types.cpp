@@ -38,7 +38,7 @@ constexpr CimType types[] = {
     {CMPI_ptr, "pointer", nullptr, nullptr, sizeof(CMPIValuePtr)},
 };
 
-// The first type for which the test holds; CMPI_null where there is none.
+// The first type for which the test holds, or CMPI_null.
 template <typename Test>
 CMPIType firstType(Test test) {
   const auto* const found = std::ranges::find_if(types, test);

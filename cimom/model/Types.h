@@ -13,24 +13,24 @@ namespace Cimom {
 struct CimType {
   CMPIType code;
   const char* name;     // in messages: "uint16", "instance"
-  const char* mofName;  // as MOF declares it; null where it has no word for it
-  const char* xmlName;  // in a TYPE attribute (DSP0201); null where CIM-XML has no form for it
-  std::size_t size;     // in bytes where CMPI passes the value itself, else 0
+  const char* mofName;  // as MOF declares it; null if it has no word for it
+  const char* xmlName;  // in a TYPE attribute (DSP0201); null if CIM-XML has no form for it
+  std::size_t size;     // in bytes if CMPI passes the value itself, else 0
 };
 
-// The row of a type, of its elements' type where it is an array's; null where no value can have it.
+// The row of a type, of its elements' type if it is an array's; null if no value can have it.
 const CimType* findType(CMPIType code);
 
-// The first type that MOF calls so, without regard to case; CMPI_null where there is none.
+// The first type that MOF calls so, without regard to case, or CMPI_null.
 CMPIType typeOfMofName(std::string_view name);
 
-// The first type that CIM-XML calls so (exactly, as in the DTD); CMPI_null where there is none.
+// The first type that CIM-XML calls so (exactly, as in the DTD), or CMPI_null.
 CMPIType typeOfXmlName(std::string_view name);
 
 // What messages call a type: "uint16", "string[]" …
 std::string describeType(CMPIType type);
 
-// A type's TYPE attribute, of an array that of its elements; null where CIM-XML has no form for it.
+// A type's TYPE attribute, of an array that of its elements; null if CIM-XML has no form for it.
 const char* xmlTypeName(CMPIType type);
 
 constexpr bool isArray(CMPIType type) { return (type & CMPI_ARRAY) != 0; }

@@ -45,22 +45,22 @@ class Value {
   // Whether this is the boolean TRUE.
   bool isTrue() const;
 
-  // A value of a type that CMPI passes by value; null where the value is anything else.
+  // A value of a type that CMPI passes by value, or null.
   const CMPIValue* scalar() const { return std::get_if<CMPIValue>(&content_); }
-  // The text of a CMPI_string; null where the value is anything else.
+  // The text of a CMPI_string, or null.
   const std::string* text() const { return std::get_if<std::string>(&content_); }
-  // The time stamp or interval of a CMPI_dateTime; null where the value is anything else.
+  // The time stamp or interval of a CMPI_dateTime, or null.
   const DateTime* time() const { return std::get_if<DateTime>(&content_); }
-  // The path of a reference; null where the value is anything else.
+  // The path of a reference, or null.
   const ObjectPath* path() const;
-  // The embedded instance, or the instance of a result; null where the value is anything else.
+  // The embedded instance, or the instance of a result, or null.
   const Instance* embedded() const;
-  // The array; null where the value is anything else.
+  // The array, or null.
   const Array* elements() const;
 
-  // The same number as another integer type; none where it is no integer or does not fit.
+  // The same number as another integer type; none if it is no integer or does not fit.
   std::optional<Value> asInteger(CMPIType type) const;
-  // The same value as `type`: itself where it has that type, a null of it, or the same number; none otherwise.
+  // The same value as `type`: itself if it has that type, a null of it, or the same number; none otherwise.
   std::optional<Value> as(CMPIType type) const;
 
   // The value as a key of an untyped WBEM URI (DSP0207) writes it: numbers and TRUE/FALSE bare, all else in quotes.

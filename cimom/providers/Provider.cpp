@@ -51,7 +51,7 @@ Mi* Provider::make(Mi*& mi, Factory<Mi>& factory, const char* kind, const CMPIBr
     return status;
   });
   if (!made || !made->ft) {
-    throw StatusError(CMPI_RC_ERR_FAILED, factoryName + " gave no management interface");
+    throw StatusError(CMPI_RC_ERR_FAILED, factoryName + " returned no management interface");
   }
   return mi = made;
 }

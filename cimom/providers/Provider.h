@@ -40,13 +40,13 @@ class Provider {
   // A provider that is linked into the program.
   Provider(std::string name, InstanceFactory instanceFactory, AssociationFactory associationFactory);
 
-  // Gives a linked provider the factories that it does not have yet.
+  // Adds the factories that a linked provider does not have yet.
   void complete(InstanceFactory instanceFactory, AssociationFactory associationFactory);
 
   // Cleans up every MI that was made; no call may be under way.
   void cleanUp(const CMPIBroker* broker);
 
-  // Throws StatusError CMPI_RC_ERR_FAILED where library, factory or MI cannot be had; the next call tries again.
+  // Throws StatusError CMPI_RC_ERR_FAILED if library, factory or MI cannot be had; the next call tries again.
   CMPIInstanceMI* instanceMi(const CMPIBroker* broker);
   CMPIAssociationMI* associationMi(const CMPIBroker* broker);
 

@@ -19,7 +19,9 @@ std::filesystem::path locate(const std::string& name, const std::vector<std::fil
     }
     searched += (searched.empty() ? "" : ", ") + directory.string();
   }
-  throw StatusError(CMPI_RC_ERR_FAILED, name + " is in none of the provider directories (" + searched + ")");
+  throw StatusError(CMPI_RC_ERR_FAILED, name + " not found, " +
+                                            (searched.empty() ? "no provider directory is configured"
+                                                              : "provider directories searched: " + searched));
 }
 
 }  // namespace
@@ -30,7 +32,7 @@ ProviderLibrary::ProviderLibrary(const std::string& location, const std::vector<
   // define. Now: what a library lacks shows when it is loaded, not in the middle of a request.
   handle_ = dlopen(file_.c_str(), RTLD_NOW | RTLD_LOCAL);
   if (!handle_) {
-    throw StatusError(CMPI_RC_ERR_FAILED, file_ + " cannot be loaded: " + dlerror());
+    throw StatusError(CMPI_RC_ERR_FAILED, "cannot load " + file_ + ": " + dlerror());
   }
 }
 

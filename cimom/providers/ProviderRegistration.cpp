@@ -1,6 +1,7 @@
 #include "cimom/providers/ProviderRegistration.h"
 
-#include <algorithm>
+#include <cerrno>
+#include <cstring>
 #include <fstream>
 #include <sstream>
 #include <string_view>
@@ -93,13 +94,13 @@ class StanzaReader {
         assignType(type);
       }
     } else if (key != "group") {
-      fail("unknown key \"" + std::string(key) + "\"; known are provider, location, type, namespace and group");
+      fail("unknown key \"" + std::string(key) + "\": must be provider, location, type, namespace or group");
     }
   }
 
   void assignOnce(std::string& member, std::string_view key, std::string_view value) {
     if (!member.empty()) {
-      fail("\"" + std::string(key) + "\" is there twice");
+      fail("duplicate \"" + std::string(key) + "\"");
     }
     member = value;
   }
@@ -110,7 +111,7 @@ class StanzaReader {
     } else if (type == "association") {
       current_.association = true;
     } else {
-      fail("unknown type \"" + type + "\"; providers of the types instance and association are served");
+      fail("unknown type \"" + type + "\": must be instance or association");
     }
   }
 
@@ -120,7 +121,7 @@ class StanzaReader {
     }
     const auto require = [&](bool there, const char* key) {
       if (!there) {
-        throw ConfigurationError(current_.registeredAt + ": [" + current_.className + "] lacks \"" + key + "\"");
+        throw ConfigurationError(current_.registeredAt + ": [" + current_.className + "]: \"" + key + "\" is missing");
       }
     };
     require(!current_.provider.empty(), "provider");
@@ -144,7 +145,7 @@ std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& 
   std::ifstream stream(file);
   StanzaReader reader(file.string());
   if (!stream || std::filesystem::is_directory(file)) {
-    throw ConfigurationError(file.string() + ": cannot be read");
+    throw ConfigurationError(file.string() + ": " + (stream ? "is a directory" : std::strerror(errno)));
   }
   for (std::string line; std::getline(stream, line);) {
     reader.line(line);

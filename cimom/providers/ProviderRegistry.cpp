@@ -56,8 +56,8 @@ void ProviderRegistry::addEntry(const ProviderRegistration& registration, Provid
       }
       throw ConfigurationError(
           (registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") + "class " +
-          registration.className + " has a provider in " + nameSpace + " already" +
-          (entry.registration.registeredAt.empty() ? "" : ", by " + entry.registration.registeredAt));
+          registration.className + " already has a provider in " + nameSpace +
+          (entry.registration.registeredAt.empty() ? "" : ", registered at " + entry.registration.registeredAt));
     }
   }
   entries_.push_back({registration, provider});

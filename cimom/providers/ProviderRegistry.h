@@ -27,7 +27,7 @@ class ProviderRegistry {
 
   void addDirectory(const std::filesystem::path& directory) { directories_.push_back(directory); }
 
-  // Throws ConfigurationError where the class has a provider in that namespace already.
+  // Throws ConfigurationError if the class has a provider in that namespace already.
   void add(const ProviderRegistration& registration);
   void add(const ProviderRegistration& registration, InstanceFactory instanceFactory,
            AssociationFactory associationFactory);

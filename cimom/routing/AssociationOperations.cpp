@@ -26,7 +26,7 @@ template <typename Call>
 std::vector<Value> forEachAssociation(const ProviderRegistry& providers, const Operation& operation, const char* named,
                                       Call call) {
   if (named && !operation.core.classes.find(named)) {
-    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string("no association class \"") + named + "\"");
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string("unknown association class \"") + named + "\"");
   }
   const auto path = lend(operation.path);
   std::vector<Value> all;

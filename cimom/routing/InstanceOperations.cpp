@@ -13,7 +13,7 @@ bool servesInstances(const Entry& entry, const Operation& operation) {
   return entry.registration.instance && entry.serves(operation.path.nameSpace);
 }
 
-// The provider of exactly the operation's class; null where there is none.
+// The provider of exactly the operation's class, or null.
 Provider* providerOf(const ProviderRegistry& providers, const Operation& operation) {
   for (const Entry& entry : providers.entries()) {
     if (servesInstances(entry, operation) && sameName(entry.registration.className, operation.definition.name)) {

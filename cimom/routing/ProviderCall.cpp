@@ -12,7 +12,7 @@ thread_local unsigned depth = 0;
 
 CallDepth::CallDepth() {
   if (depth == deepest) {
-    throw StatusError(CMPI_RC_ERR_FAILED, "the providers' calls nest without end");
+    throw StatusError(CMPI_RC_ERR_FAILED, "provider calls nest more than " + std::to_string(deepest) + " levels deep");
   }
   ++depth;
 }

@@ -22,7 +22,7 @@ class CallDepth {
 };
 
 // The context that a provider gets: the caller's entries, and the invocation flags and the namespace of the request
-// where the caller says nothing of them.
+// if the caller says nothing of them.
 Context providerContext(const Operation& operation);
 
 // Puts the operation's namespace into a delivered item that names none.
@@ -31,12 +31,12 @@ void completeNamespace(Value& item, const std::string& nameSpace);
 // Calls one slot of a provider. The call has its own memory, of which only what was delivered lives on.
 // `kind` is what the operation takes, CMPI_instance or CMPI_ref; `slot` the function of the MI's table; `arguments`
 // what follows the MI, the context and the result. Throws StatusError with what the provider reports or throws;
-// CMPI_RC_ERR_NOT_SUPPORTED where the slot is empty.
+// CMPI_RC_ERR_NOT_SUPPORTED if the slot is empty.
 template <typename Mi, typename Slot, typename... Arguments>
 std::vector<Value> callProvider(const Operation& operation, const Provider& provider, Mi* mi, CMPIType kind, Slot slot,
                                 const Arguments&... arguments) {
   if (!slot) {
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "provider " + provider.name() + " has no such operation");
+    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "provider " + provider.name() + " does not support this operation");
   }
   const CallDepth depth;
   const RequestScope scope(&operation.core.broker);

@@ -39,8 +39,8 @@ ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefiniti
       continue;
     }
     if (overridden->type != property.type) {
-      fail(declaration, "makes the " + describeType(overridden->type) + " " + property.name + " of " +
-                            overridden->originClass + " a " + describeType(property.type));
+      fail(declaration, "cannot change " + property.name + " of " + overridden->originClass + " from " +
+                            describeType(overridden->type) + " to " + describeType(property.type));
     }
     inheritQualifiers(property.qualifiers, overridden->qualifiers);
     if (property.defaultValue.isNull()) {
@@ -107,11 +107,11 @@ void ClassRepository::add(const MofDeclarations& declarations) {
   for (const ClassDeclaration& declaration : declarations.classes) {
     const ClassDefinition* known = find(declaration.own.name);
     if (known) {
-      fail(declaration, "is there already, declared at " + known->declaredAt);
+      fail(declaration, "is already declared at " + known->declaredAt);
     }
     const auto [earlier, isNew] = declared.emplace(declaration.own.name, &declaration);
     if (!isNew) {
-      fail(declaration, "is there already, declared at " + earlier->second->own.declaredAt);
+      fail(declaration, "is already declared at " + earlier->second->own.declaredAt);
     }
   }
 
@@ -133,7 +133,7 @@ void ClassRepository::add(const MofDeclarations& declarations) {
       pending.push_back(next);
       const auto superclass = declared.find(next->superclassName);
       if (superclass == declared.end() && !next->superclassName.empty() && !lookUp(next->superclassName)) {
-        fail(*next, "has the superclass " + next->superclassName + ", which is not declared anywhere");
+        fail(*next, "has the undeclared superclass " + next->superclassName);
       }
       next = superclass == declared.end() ? nullptr : superclass->second;
     }

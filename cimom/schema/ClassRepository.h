@@ -17,16 +17,16 @@ namespace Cimom {
 //
 // Every class is known in every namespace, and a namespace is known when a registration, a `#pragma namespace` or
 // the loader of a schema names it. That is all that an object manager needs whose instances come from providers
-// only: where a class has no provider, it has no instances.
+// only: if a class has no provider, it has no instances.
 class ClassRepository {
  public:
-  // The class of that name; null where there is none. The pointer stays good as long as the repository.
+  // The class of that name, or null. The pointer stays good as long as the repository.
   const ClassDefinition* find(std::string_view className) const;
 
   // All classes, by name.
   std::vector<const ClassDefinition*> all() const;
 
-  // The direct subclasses, or all below where `deep` says so; an empty name stands for the root of all classes.
+  // The direct subclasses, or all below if `deep` says so; an empty name stands for the root of all classes.
   std::vector<const ClassDefinition*> subclasses(std::string_view className, bool deep) const;
 
   bool hasNamespace(std::string_view nameSpace) const;

@@ -12,7 +12,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-// The standard qualifiers (DSP0004, 5.6.3) that a subclass does not inherit or that are no booleans written without
+// The standard qualifiers (DSP0004, 5.6.3) that a subclass does not inherit or that are not booleans written without
 // a value. A schema need not declare them to use them.
 Qualifiers standardQualifiers() {
   const auto restricted = [](const char* name, CMPIType type) { return Qualifier{name, Value::null(type), false}; };
@@ -29,7 +29,7 @@ std::vector<fs::path> mofFilesUnder(const fs::path& directory) {
     }
   }
   if (files.empty()) {
-    throw ConfigurationError(directory.string() + ": there is no *.mof in this directory");
+    throw ConfigurationError(directory.string() + ": contains no *.mof file");
   }
   std::ranges::sort(files);
   return files;

@@ -33,7 +33,7 @@ class MofReader {
   // Throws ConfigurationError "FILE:LINE: what is wrong".
   MofDeclarations readPath(const std::filesystem::path& fileOrDirectory);
 
-  // @param origin what messages call the text; files that it includes are looked for from the working directory.
+  // `origin` is what messages call the text; files that it includes are looked for from the working directory.
   // Throws ConfigurationError "ORIGIN:LINE: what is wrong".
   MofDeclarations readText(std::string_view mof, const std::string& origin);
 

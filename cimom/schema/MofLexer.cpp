@@ -38,7 +38,7 @@ void appendUtf8(std::string& target, unsigned code) {
   }
 }
 
-// The code of a text of one UTF-8 character of the basic plane; false where it is none.
+// The code of a text of one UTF-8 character of the basic plane; false for any other text.
 bool singleCharacter(const std::string& text, CMPIChar16& code) {
   const auto byte = [&](std::size_t index) { return static_cast<unsigned char>(text[index]); };
   if (text.size() == 1 && byte(0) < 0x80) {
@@ -60,7 +60,7 @@ bool MofToken::isKeyword(std::string_view keyword) const { return kind == Kind::
 std::string MofToken::describe() const {
   switch (kind) {
     case Kind::End:
-      return "the end of the text";
+      return "end of text";
     case Kind::String:
       return "the string \"" + text + "\"";
     default:
@@ -95,7 +95,7 @@ void MofLexer::skipBlanks() {
       const unsigned start = line_;
       const std::size_t end = text_.find("*/", position_ + 2);
       if (end == std::string_view::npos) {
-        fail(start, "the comment that begins here does not end");
+        fail(start, "unterminated comment");
       }
       for (; position_ < end + 2; ++position_) {
         line_ += peek() == '\n';
@@ -133,7 +133,7 @@ MofToken MofLexer::next() {
     token.text = quoted('\'');
     CMPIChar16 code = 0;
     if (!singleCharacter(token.text, code)) {
-      fail(token.line, "'" + token.text + "' is not one character");
+      fail(token.line, "'" + token.text + "' must be one character");
     }
     token.value = Value::char16(code);
   } else if (isDigit(first) ||
@@ -164,7 +164,7 @@ std::string MofLexer::quoted(char quote) {
       result += peek();
     }
   }
-  fail(start, "the text that begins here does not end on its line");
+  fail(start, quote == '"' ? "unterminated string" : "unterminated character");
 }
 
 // Takes the escape sequence that the position is at, up to its last character.
@@ -185,7 +185,7 @@ void MofLexer::escape(std::string& target) {
       return;
     }
   }
-  fail(line_, "unknown escape sequence in a text");
+  fail(line_, "unknown escape sequence");
 }
 
 // Decimal, octal (0…), hexadecimal (0x…), binary (…b) and real numbers.
@@ -217,7 +217,7 @@ MofToken MofLexer::number() {
     double real = 0;
     const auto [end, error] = std::from_chars(digits.data(), digits.data() + digits.size(), real);
     if (error != std::errc() || end != digits.data() + digits.size()) {
-      fail(line_, token.describe() + " is no number");
+      fail(line_, token.describe() + " is not a number");
     }
     token.kind = Kind::Real;
     token.value = Value::real64(negative ? -real : real);
@@ -229,7 +229,7 @@ MofToken MofLexer::number() {
   const auto [end, error] = std::from_chars(digits.data(), digits.data() + digits.size(), magnitude, base);
   constexpr std::uint64_t lowest = std::uint64_t(1) << 63;
   if (error != std::errc() || end != digits.data() + digits.size() || (negative && magnitude > lowest)) {
-    fail(line_, token.describe() + " is no number of at most 64 bits");
+    fail(line_, token.describe() + " is not a 64-bit number");
   }
   token.value = negative ? Value::sint64(static_cast<CMPISint64>(0 - magnitude)) : Value::uint64(magnitude);
   return token;

@@ -107,7 +107,7 @@ Qualifiers MofParser::qualifierList() {
   do {
     Qualifier one = qualifier();
     if (findQualifier(qualifiers, one.name)) {
-      fail("the qualifier " + one.name + " is there twice");
+      fail("duplicate qualifier " + one.name);
     }
     qualifiers.push_back(std::move(one));
   } while (accept(","));
@@ -166,7 +166,7 @@ void MofParser::classDeclaration(Qualifiers qualifiers) {
   own.name = expectName("the class's name");
   own.qualifiers = std::move(qualifiers);
   if (token_.is("$") || token_.isKeyword("as")) {
-    fail("aliases of classes are not supported");
+    fail("class aliases are not supported");
   }
   if (accept(":")) {
     declaration.superclassName = expectName("the superclass's name");
@@ -187,7 +187,7 @@ void MofParser::feature(ClassDefinition& definition) {
   property.name = expectName("the name of a property or method");
   property.originClass = definition.name;
   if (definition.findProperty(property.name) || definition.findMethod(property.name)) {
-    fail(definition.name + "." + property.name + " is there twice");
+    fail("duplicate " + definition.name + "." + property.name);
   }
   if (token_.is("(")) {
     return method(definition, property.name, property.type, std::move(property.qualifiers));
@@ -273,7 +273,7 @@ Value MofParser::initializer(CMPIType type) {
   return Value::array(std::move(array));
 }
 
-// A constant of a type; of the type that its writing shows where none is given.
+// A constant of a type; of the type that its notation shows if `type` is CMPI_null.
 Value MofParser::constant(CMPIType type) {
   std::optional<Value> result;
   if (token_.isKeyword("null")) {
@@ -295,7 +295,7 @@ Value MofParser::constant(CMPIType type) {
     result = result->as(type);
   }
   if (!result) {
-    fail(token_.describe() + " is no " + describeType(type));
+    fail("expected " + describeType(type) + ", not " + token_.describe());
   }
   advance();
   return *std::move(result);

@@ -12,7 +12,7 @@ namespace Cimom {
 // Parses one MOF text by recursive descent; the grammar is that of DSP0004, annex A, without instances.
 class MofParser {
  public:
-  // @param directory where the text's relative includes are
+  // `directory` is where the text's relative includes are.
   MofParser(MofReader& reader, MofDeclarations& declarations, std::string_view mof, std::string origin,
             std::filesystem::path directory);
 

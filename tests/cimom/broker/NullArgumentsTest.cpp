@@ -1,4 +1,4 @@
-// Every slot of every table, given a null where an object, a name or a status belongs: a code, and never a crash.
+// Every slot of every table, with a null in the place of an object, a name or a status: a code, never a crash.
 #include <functional>
 
 #include "cimom/broker/Handle.h"

@@ -115,7 +115,7 @@ TEST_F(ObjectsTest, TheCurrentTimeIsATimeStamp) {
   EXPECT_EQ(shownText(CMGetStringFormat(now, nullptr)).substr(21), "+000");
 }
 
-TEST_F(ObjectsTest, WhatIsNoDateTimeIsRefused) {
+TEST_F(ObjectsTest, RefusesMalformedDateTimes) {
   for (const char* text : {"", "now", "20240230120000.000000+000", "20241301120000.000000+000",
                            "20240101250000.000000+000", "2024010112000x.000000+000", "20240101120000,000000+000",
                            "20240101120000.000000*000", "00000001000000.000000:060", "19691231235959.000000+000",

@@ -20,7 +20,7 @@ void* doubled(void* number) {
   return number;
 }
 
-TEST_F(ThreadServicesTest, AThreadRunsAndGivesItsResult) {
+TEST_F(ThreadServicesTest, AThreadRunsAndReturnsItsResult) {
   int number = 21;
   void* result = nullptr;
   CMPI_THREAD_TYPE thread = xft.newThread(doubled, &number, 0);

@@ -73,7 +73,7 @@ TEST_F(TransportTest, RefusesHeadersWithoutThePrefixThatTheManHeaderDeclares) {
                 "unsupported-operation");
 }
 
-TEST_F(TransportTest, TellsWhichHttpMethodsItTakes) {
+TEST_F(TransportTest, NamesTheHttpMethodsItAllows) {
   for (const auto& [method, status] : {std::pair("GET", 405u), {"PUT", 405u}, {"OPTIONS", 405u}, {"BREW", 501u}}) {
     const Http::Response response = withHeader("X", "", method);
     EXPECT_EQ(response.status, status) << method;
@@ -81,7 +81,7 @@ TEST_F(TransportTest, TellsWhichHttpMethodsItTakes) {
   }
 }
 
-TEST_F(TransportTest, RefusesWhatIsNoMethodCall) {
+TEST_F(TransportTest, RefusesAnythingButAMethodCall) {
   expectRefused(withHeader("CIMOperation", ""), 400, "unsupported-operation");
   expectRefused(withHeader("CIMOperation", "MethodResponse"), 400, "unsupported-operation");
 }
@@ -112,7 +112,7 @@ TEST_F(TransportTest, RefusesABatch) {
   expectRefused(withHeader("CIMBatch", "CIMBatch"), 501, "multiple-requests-unsupported");
 }
 
-TEST_F(TransportTest, RefusesABodyThatIsNoRequest) {
+TEST_F(TransportTest, RefusesABodyThatIsNotARequest) {
   expectRefused(post("EnumerateInstanceNames", "<CIM"), 400, "request-not-well-formed");
   expectRefused(post("EnumerateInstanceNames", "<HTML/>"), 400, "request-not-valid");
 }

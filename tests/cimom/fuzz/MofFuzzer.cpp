@@ -1,4 +1,5 @@
-// Feeds the MOF reader any bytes: it gives classes or a ConfigurationError that names the text, and nothing else.
+// Feeds the MOF reader any bytes: it returns classes or throws a ConfigurationError that names the text, and nothing
+// else.
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
@@ -9,7 +10,7 @@
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   const std::string_view text(reinterpret_cast<const char*>(data), size);
-  // What a text includes is read from the file system, which is no part of the input.
+  // What a text includes is read from the file system, which is not part of the input.
   if (text.find("include") != std::string_view::npos) {
     return -1;
   }

@@ -17,7 +17,7 @@ class HttpClient {
   HttpClient(const HttpClient&) = delete;
   HttpClient& operator=(const HttpClient&) = delete;
 
-  // Gives false when the server has closed its end.
+  // Returns false if the server has closed its end.
   bool send(std::string_view bytes);
 
   // The next response; one with status 100 counts.

@@ -37,18 +37,18 @@ TEST_F(PasswordFileTest, AcceptsAUsersPasswordOnly) {
   EXPECT_FALSE(passwords.accepts("", ""));
 }
 
-TEST_F(PasswordFileTest, NamesTheLineThatIsNoUserAndHash) {
-  EXPECT_EQ(errorOf("# comment\nadmin\n"), "passwords:2: is no \"user:hash\"");
-  EXPECT_EQ(errorOf("admin:plain:text\n"), "passwords:1: is no \"user:hash\"");
-  EXPECT_EQ(errorOf(":" + std::string(hash)), "passwords:1: is no \"user:hash\"");
+TEST_F(PasswordFileTest, NamesAMalformedLine) {
+  EXPECT_EQ(errorOf("# comment\nadmin\n"), "passwords:2: expected \"user:hash\" with a hash of crypt(5)");
+  EXPECT_EQ(errorOf("admin:plain:text\n"), "passwords:1: expected \"user:hash\" with a hash of crypt(5)");
+  EXPECT_EQ(errorOf(":" + std::string(hash)), "passwords:1: expected \"user:hash\" with a hash of crypt(5)");
 }
 
-TEST_F(PasswordFileTest, RefusesAUserThatIsThereTwice) {
+TEST_F(PasswordFileTest, RefusesADuplicateUser) {
   const std::string line = "admin:" + std::string(hash) + "\n";
-  EXPECT_EQ(errorOf(line + line), "passwords:2: the user is there already");
+  EXPECT_EQ(errorOf(line + line), "passwords:2: duplicate user \"admin\"");
 }
 
-TEST_F(PasswordFileTest, RefusesAFileWithoutUsers) { EXPECT_EQ(errorOf("# none\n"), "passwords: names no user"); }
+TEST_F(PasswordFileTest, RefusesAFileWithoutUsers) { EXPECT_EQ(errorOf("# none\n"), "passwords: contains no users"); }
 
 TEST_F(PasswordFileTest, NamesAFileThatIsNotThere) {
   EXPECT_THROW(PasswordFile(directory_.path() / "missing"), ServerError);

@@ -13,7 +13,7 @@ using namespace Cimom::Http;
 using namespace Testing;
 using namespace std::chrono_literals;
 
-// Tells what arrived.
+// Replies with what arrived.
 Response echo(const Request& request) {
   Response response{200, {}, request.method + " " + request.path + " [" + request.body + "]" + request.user};
   response.headers.add("X-Echo", request.headers.find("X-Given") ? *request.headers.find("x-given") : "none");
@@ -26,7 +26,7 @@ ServerOptions limitedTo(std::size_t bytes) {
   return options;
 }
 
-// A handler that waits until it is let go, and tells when it has been reached.
+// A handler that waits until it is let go, and says when it has been reached.
 struct Gate {
   std::promise<void> reached;
   std::promise<void> opened;
@@ -41,7 +41,7 @@ struct Gate {
   }
 };
 
-TEST(ServerTest, GivesTheHandlerMethodPathHeadersAndBody) {
+TEST(ServerTest, PassesMethodPathHeadersAndBodyToTheHandler) {
   Server server({}, echo);
   HttpClient client(server.port());
   const Response response = client.post("/cimom?x=1", "hello", "X-Given: value\r\n");
@@ -64,7 +64,7 @@ TEST(ServerTest, AnswersSeveralRequestsOnOneConnection) {
   EXPECT_EQ(client.post("/b", "2").body, "POST /b [2]");
 }
 
-TEST(ServerTest, JoinsAChunkedBody) {
+TEST(ServerTest, AssemblesAChunkedBody) {
   Server server({}, echo);
   HttpClient client(server.port());
   client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2\r\nde\r\n0\r\n\r\n");
@@ -169,7 +169,7 @@ TEST(ServerTest, RepliesWithoutWaitingForAnAcknowledgement) {
   EXPECT_LT(std::chrono::steady_clock::now() - start, 400ms);
 }
 
-TEST(ServerTest, EndsAfterTheRequestsThatAreBeingAnswered) {
+TEST(ServerTest, WaitsForRequestsInProgressWhenShuttingDown) {
   Gate gate;
   Server server({}, gate.handler());
   HttpClient client(server.port());
@@ -182,7 +182,7 @@ TEST(ServerTest, EndsAfterTheRequestsThatAreBeingAnswered) {
   EXPECT_TRUE(server.drain(10s));
 }
 
-TEST(ServerTest, RefusesNewRequestsWhileItEnds) {
+TEST(ServerTest, RefusesNewRequestsWhileShuttingDown) {
   Server server({}, echo);
   HttpClient client(server.port());
   client.post("/", "");
@@ -190,7 +190,7 @@ TEST(ServerTest, RefusesNewRequestsWhileItEnds) {
   EXPECT_EQ(client.post("/", "").status, 503u);
 }
 
-TEST(ServerTest, TellsWhichPortIsTaken) {
+TEST(ServerTest, NamesThePortThatIsTaken) {
   Server first({}, echo);
   ServerOptions options;
   options.port = first.port();
@@ -203,13 +203,13 @@ TEST(ServerTest, TellsWhichPortIsTaken) {
   }
 }
 
-TEST(ServerTest, RefusesAnAddressThatIsNone) {
+TEST(ServerTest, RefusesAHostNameAsAddress) {
   ServerOptions options;
   options.address = "localhost";
   EXPECT_THROW(Server(options, echo), ServerError);
 }
 
-TEST(ServerTest, RefusesATlsKeyThatIsNone) {
+TEST(ServerTest, RefusesAMalformedTlsKey) {
   ServerOptions options;
   options.tlsCertificate = "no PEM";
   options.tlsKey = "no PEM";
@@ -251,11 +251,11 @@ TEST_F(AuthenticatedServerTest, RefusesAWrongPassword) {
   EXPECT_EQ(client_.post("/", "", "Authorization: Basic YWRtaW46d3Jvbmc=\r\n").status, 401u);
 }
 
-TEST_F(AuthenticatedServerTest, RefusesCredentialsThatAreNone) {
+TEST_F(AuthenticatedServerTest, RefusesMalformedCredentials) {
   EXPECT_EQ(client_.post("/", "", "Authorization: Basic !!!\r\n").status, 401u);
 }
 
-TEST_F(AuthenticatedServerTest, TellsTheHandlerWhoItIs) {
+TEST_F(AuthenticatedServerTest, PassesTheUserToTheHandler) {
   EXPECT_EQ(client_.post("/", "b", "Authorization: Basic YWRtaW46c2VjcmV0\r\n").body, "POST / [b]admin");
 }
 

@@ -66,12 +66,12 @@ TEST_F(RegistrationTest, WhatIsWrongIsNamedWithItsLine) {
       {"[C]\nnonsense\n", "test.reg:2: expected \"[ClassName]\" or \"key: value\", not \"nonsense\""},
       {"[C]\ncolour: red\n", "test.reg:2: unknown key \"colour\""},
       {"[C]\nprovider:\n", "test.reg:2: \"provider\" has no value"},
-      {"[C]\nprovider: a\nprovider: b\n", "test.reg:3: \"provider\" is there twice"},
+      {"[C]\nprovider: a\nprovider: b\n", "test.reg:3: duplicate \"provider\""},
       {"[C]\ntype: instance method\n", "test.reg:2: unknown type \"method\""},
-      {"\n[C]\nlocation: l\ntype: instance\nnamespace: n\n", "test.reg:2: [C] lacks \"provider\""},
-      {"[C]\nprovider: P\ntype: instance\nnamespace: n\n", "test.reg:1: [C] lacks \"location\""},
-      {"[C]\nprovider: P\nlocation: l\nnamespace: n\n" + stanza, "test.reg:1: [C] lacks \"type\""},
-      {stanza + "[D]\nprovider: P\nlocation: l\ntype: instance\n", "test.reg:6: [D] lacks \"namespace\""},
+      {"\n[C]\nlocation: l\ntype: instance\nnamespace: n\n", "test.reg:2: [C]: \"provider\" is missing"},
+      {"[C]\nprovider: P\ntype: instance\nnamespace: n\n", "test.reg:1: [C]: \"location\" is missing"},
+      {"[C]\nprovider: P\nlocation: l\nnamespace: n\n" + stanza, "test.reg:1: [C]: \"type\" is missing"},
+      {stanza + "[D]\nprovider: P\nlocation: l\ntype: instance\n", "test.reg:6: [D]: \"namespace\" is missing"},
   };
   for (const auto& row : rows) {
     EXPECT_THAT(complaint(row.text), HasSubstr(row.says)) << row.text;
@@ -95,7 +95,7 @@ TEST_F(RegistrationTest, AClassHasOneProviderInANamespace) {
     manager.loadRegistration(second);
     FAIL();
   } catch (const ConfigurationError& error) {
-    EXPECT_THAT(error.what(), HasSubstr("two.reg:1: class c has a provider in /root/B already, by "));
+    EXPECT_THAT(error.what(), HasSubstr("two.reg:1: class c already has a provider in /root/B, registered at "));
     EXPECT_THAT(error.what(), HasSubstr("one.reg:6"));
   }
 }

@@ -141,7 +141,7 @@ TEST_F(InstanceOperationsTest, AnErrorObjectThatTheProviderReturnsFailsTheOperat
   EXPECT_EQ(shownText(status.msg), "disk gone");
 }
 
-TEST_F(InstanceOperationsTest, GetInstanceGivesTheFirstThatIsReturned) {
+TEST_F(InstanceOperationsTest, GetInstanceReturnsTheFirstThatIsReturned) {
   probe->answer = returning({"one", "two"});
 
   const CMPIInstance* found = CBGetInstance(broker, context(), systemPath("two"), nullptr, &status);
@@ -211,7 +211,7 @@ TEST_F(InstanceOperationsTest, WritingToAClassWithoutAProviderIsNotSupported) {
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
-TEST_F(InstanceOperationsTest, CreateInstanceGivesTheProvidersPathElseTheInstances) {
+TEST_F(InstanceOperationsTest, CreateInstanceReturnsTheProvidersPathElseTheInstances) {
   const CMPIObjectPath* own = CBCreateInstance(broker, context(), path("TST_Processor"), system("one"), &status);
   EXPECT_EQ(shownText(CMObjectPathToString(own, nullptr)),
             "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"");

@@ -130,16 +130,15 @@ TEST_F(ClassRepositoryTest, KnowsTheNamespacesThatSomebodyNamed) {
 TEST_F(ClassRepositoryTest, RefusesWhatCannotBeResolvedAndAddsNothing) {
   load(repository, "class Known {};");
   EXPECT_EQ(complaint(repository, "class New {};\nclass known {};"),
-            "text:2: class known is there already, declared at text:1");
-  EXPECT_EQ(complaint(repository, "class New {};\nclass NEW {};"),
-            "text:2: class NEW is there already, declared at text:1");
+            "text:2: class known is already declared at text:1");
+  EXPECT_EQ(complaint(repository, "class New {};\nclass NEW {};"), "text:2: class NEW is already declared at text:1");
   EXPECT_EQ(complaint(repository, "class New {};\nclass B : Missing {};"),
-            "text:2: class B has the superclass Missing, which is not declared anywhere");
+            "text:2: class B has the undeclared superclass Missing");
   EXPECT_THAT(complaint(repository, "class New {}; class A : B {}; class B : A {};"),
               HasSubstr("is its own superclass"));
   EXPECT_THAT(complaint(repository, "class Self : Self {};"), HasSubstr("is its own superclass"));
   EXPECT_EQ(complaint(repository, "class New { string P; };\nclass B : New { uint8 P; };"),
-            "text:2: class B makes the string P of New a uint8");
+            "text:2: class B cannot change P of New from string to uint8");
   EXPECT_EQ(repository.find("New"), nullptr);
   EXPECT_THAT(namesOf(repository.all()), ElementsAre("Known"));
 }

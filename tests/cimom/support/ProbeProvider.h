@@ -15,7 +15,7 @@ namespace Testing {
 struct Call {
   std::string operation;
   std::string path;
-  std::string associationClass;  // "(null)" where null came
+  std::string associationClass;  // "(null)" if null came
   std::string resultClass;
   std::string role;
   std::string resultRole;
@@ -23,12 +23,12 @@ struct Call {
   bool hasProperties = false;
 };
 
-// A provider linked into the test that records its calls and answers as the test tells it. What it answers with goes
-// through the macros that any provider uses. It is shared with the object managers that it serves, which clean it up
-// when they end.
+// A provider linked into the test that records its calls and answers as the test has set it up to. What it answers with
+// goes through the macros that any provider uses. It is shared with the object managers that it serves, which clean it
+// up when they end.
 class ProbeProvider : public std::enable_shared_from_this<ProbeProvider> {
  public:
-  // Answers a call of the operation; the instance is null where the operation has none.
+  // Answers a call of the operation; the instance is null if the operation has none.
   using Answer =
       std::function<CMPIStatus(const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*)>;
 
@@ -55,7 +55,7 @@ class ProbeProvider : public std::enable_shared_from_this<ProbeProvider> {
 
 constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};
 
-// The text of a string, "(null)" where there is none.
+// The text of a string, "(null)" if there is none.
 std::string shownText(const CMPIString* string);
 
 // The texts that the paths, or the instances' paths, of an enumeration show.
