@@ -4,6 +4,7 @@
 
 #include "tests/e2e/support/CompositeObjects.h"
 #include "tests/e2e/support/CompositeStack.h"
+#include "tests/e2e/support/FactoryState.h"
 
 namespace {
 
@@ -14,99 +15,6 @@ using testing::HasSubstr;
 using testing::IsSupersetOf;
 using testing::Not;
 using testing::SizeIs;
-
-using Values = std::map<std::string, std::string>;
-
-// A class, the objects that it has, and what each of them shows. Values that the schema gives by default show too.
-struct ClassCase {
-  std::string className;
-  std::vector<std::string> objects;
-  std::vector<Values> values;
-};
-
-void PrintTo(const ClassCase& row, std::ostream* stream) { *stream << row.className; }
-
-Values endpointValues(const std::string& name, const Values& more) {
-  Values values = {{"Name", quoted(name)},
-                   {"ElementName", quoted("BMC IP endpoint " + name)},
-                   {"SystemCreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
-                   {"SystemName", R"("BMC")"},
-                   {"CreationClassName", R"("YRNx_MgmtHwIPProtocolEndPoint")"},
-                   {"NameFormat", R"("Interface name")"},
-                   {"SubnetMask", R"("255.255.255.0")"},
-                   {"AddressType", "1"},
-                   {"EnabledState", "2"},
-                   {"RequestedState", "12"},
-                   {"EnabledDefault", "2"},
-                   {"TransitioningToState", "12"}};
-  values.insert(more.begin(), more.end());
-  return values;
-}
-
-Values accessPointValues(const std::string& name, const std::string& info, const std::string& context,
-                         const std::string& format) {
-  return {{"Name", quoted(name)},        {"SystemCreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
-          {"SystemName", R"("BMC")"},    {"CreationClassName", R"("YRNx_RemoteAccessPoint")"},
-          {"AccessInfo", quoted(info)},  {"AccessContext", context},
-          {"InfoFormat", format},        {"EnabledState", "5"},
-          {"RequestedState", "12"},      {"EnabledDefault", "2"},
-          {"TransitioningToState", "12"}};
-}
-
-Values settingValues(const std::string& id, const std::string& elementName, const std::string& origin) {
-  return {{"InstanceID", quoted("BMC:" + id)}, {"ElementName", quoted(elementName)}, {"AddressOrigin", origin}};
-}
-
-Values dhcpValues(const std::string& interface) {
-  Values values = settingValues(interface, "DHCP settings of " + interface, "4");
-  values["Caption"] = R"("DNS Configuration Setting")";
-  return values;
-}
-
-std::vector<ClassCase> classCases() {
-  return {
-      {"YRNx_MgmtHwComputerSystem",
-       {computerSystem()},
-       {{{"Name", R"("BMC")"},
-         {"CreationClassName", R"("YRNx_MgmtHwComputerSystem")"},
-         {"Description", R"("Simulated management processor")"},
-         {"NameFormat", R"("Other")"},
-         {"Dedicated", "14,28"},
-         {"Index", "1"},
-         {"EnabledState", "5"},
-         {"RequestedState", "12"},
-         {"EnabledDefault", "2"},
-         {"TransitioningToState", "12"}}}},
-      {"YRNx_MgmtHwIPProtocolEndPoint",
-       {endpoint("eth0"), endpoint("eth1")},
-       {endpointValues("eth0", {{"IPv4Address", R"("192.0.2.10")"},
-                                {"IPv6Address", R"("2001:db8::10")"},
-                                {"PrefixLength", "64"},
-                                {"ProtocolIFType", "4098"},
-                                {"IPVersionSupport", "3"},
-                                {"AddressOrigin", "3"}}),
-        endpointValues("eth1", {{"IPv4Address", R"("198.51.100.23")"},
-                                {"ProtocolIFType", "4096"},
-                                {"IPVersionSupport", "1"},
-                                {"AddressOrigin", "4"}})}},
-      {"YRNx_MgmtHwIPAssignmentSettingSequence",
-       {sequence("eth0:static"), sequence("eth0:dhcp"), sequence("eth1:static"), sequence("eth1:dhcp")},
-       {settingValues("eth0:static", "Static addresses of eth0", "3"),
-        settingValues("eth0:dhcp", "DHCP addresses of eth0", "4"),
-        settingValues("eth1:static", "Static addresses of eth1", "3"),
-        settingValues("eth1:dhcp", "DHCP addresses of eth1", "4")}},
-      {"YRNx_MgmtHwStaticIPAssignmentSettingData",
-       {staticSetting("eth0"), staticSetting("eth1")},
-       {settingValues("eth0", "Static settings of eth0", "3"), settingValues("eth1", "Static settings of eth1", "3")}},
-      {"YRNx_MgmtHwDHCPAssignmentSettingData",
-       {dhcpSetting("eth0"), dhcpSetting("eth1")},
-       {dhcpValues("eth0"), dhcpValues("eth1")}},
-      {"YRNx_MgmtHwRemoteServiceAccessPoint",
-       {remoteAccessPoint("Gateway:eth0"), remoteAccessPoint("DNS:1"), remoteAccessPoint("DNS:2")},
-       {accessPointValues("Gateway:eth0", "192.0.2.1", "2", "3"), accessPointValues("DNS:1", "192.0.2.53", "3", "3"),
-        accessPointValues("DNS:2", "2001:db8::53", "3", "4")}},
-  };
-}
 
 class Composite {
  public:

@@ -1,20 +1,19 @@
 #ifndef TESTS_E2E_SUPPORT_COMPOSITESTACK_H_
 #define TESTS_E2E_SUPPORT_COMPOSITESTACK_H_
 
-#include <map>
 #include <memory>
 #include <string>
 #include <vector>
 
 #include "tests/e2e/support/Cimomd.h"
-#include "tests/e2e/support/Wbem.h"
+#include "tests/e2e/support/WbemClient.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace Testing {
 
 /// The whole product as it is installed: cimomd with the product's classes and registration, the composite and the
 /// underlying provider, and an agent.ini of its own. The managed system is called managed.example.
-class CompositeStack {
+class CompositeStack : public WbemClient {
  public:
   /// @param processor the sections of agent.ini that say how the management processor is reached
   /// @param logThreshold the least level that reaches log()
@@ -25,32 +24,7 @@ class CompositeStack {
 
   Cimomd& cimomd() { return *cimomd_; }
 
-  /// Where it listens for the objects of a namespace: "http://127.0.0.1:PORT/NAMESPACE:OBJECT".
-  std::string url(const std::string& object, const std::string& nameSpace = "root/cimv2") const {
-    return cimomd_->url(object, nameSpace);
-  }
-
-  /// Runs wbemcli; a space is what `operation` is split at.
-  Completed wbemcli(const std::string& operation, const std::string& object, const std::vector<std::string>& more = {},
-                    const std::string& nameSpace = "root/cimv2") const;
-
-  /// What a wbemcli that must succeed answers: paths as they are printed; paths without host and namespace; instances.
-  std::vector<std::string> paths(const std::string& operation, const std::string& object,
-                                 const std::string& nameSpace = "root/cimv2") const;
-  std::vector<std::string> names(const std::string& operation, const std::string& object,
-                                 const std::string& nameSpace = "root/cimv2") const;
-  std::vector<Printed> instances(const std::string& operation, const std::string& object,
-                                 const std::string& properties = {}, const std::string& nameSpace = "root/cimv2") const;
-
-  /// The properties that have a value of the one instance that GetInstance answers.
-  std::map<std::string, std::string> get(const std::string& object, const std::string& nameSpace = "root/cimv2") const;
-
-  /// ModifyInstance of "Name=value,..." pairs, which must succeed.
-  void modify(const std::string& object, const std::string& values) const;
-
-  /// What a wbemcli that must fail says.
-  std::string failure(const std::string& operation, const std::string& object,
-                      const std::vector<std::string>& more = {}, const std::string& nameSpace = "root/cimv2") const;
+  std::uint16_t port() const override { return cimomd_->port(); }
 
   std::string log() const;
 

@@ -1,0 +1,89 @@
+// The product on a BMC that answers real IPMI over the network; ipmitool tells what the BMC itself holds.
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "tests/agent/ipmi/SimulatedBmc.h"
+#include "tests/e2e/support/CompositeObjects.h"
+#include "tests/e2e/support/FactoryState.h"
+#include "tests/e2e/support/Poll.h"
+#include "tests/hosts/HostTest.h"
+
+namespace {
+
+using namespace Testing;
+using IpmiFixture::SimulatedBmc;
+using testing::AllOf;
+
+using testing::HasSubstr;
+
+class HostBmc : public HostTest {
+ protected:
+  void SetUp() override {
+    QV::BackEndSettings settings = bmc_.settings();
+    // As an administrator has it, who leaves the key out.
+    settings.erase("cache");
+    std::string processor = "[processor]\nbackend = ipmi\n[ipmi]\n";
+    for (const auto& [key, value] : settings) processor += key + " = " + value + '\n';
+    serve(processor);
+  }
+
+  std::string heldAddress() const { return bmc_.witness("IP Address") + '/' + bmc_.witness("Subnet Mask"); }
+
+  static std::string shownAddress() {
+    const auto shown = host().get(endpoint("lan1"));
+    std::string text = shown.at("IPv4Address") + '/' + shown.at("SubnetMask");
+    std::erase(text, '"');
+    return text;
+  }
+
+  SimulatedBmc bmc_;
+};
+
+TEST_F(HostBmc, IsShownAsItIs) {
+  EXPECT_EQ(canonical(host().names("ein", "YRNx_MgmtHwIPProtocolEndPoint")), canonical(Objects{endpoint("lan1")}));
+  EXPECT_EQ(shownAddress(), heldAddress());
+  EXPECT_EQ(host().get(endpoint("lan1")).at("AddressOrigin"), "4");
+  EXPECT_EQ(bmc_.witness("IP Address Source"), "DHCP Address");
+  EXPECT_EQ(host().get(remoteAccessPoint("Gateway:lan1")).at("AccessInfo"), quoted(bmc_.witness("Default Gateway IP")));
+  EXPECT_EQ(canonical(host().names("ain -ac YRNx_MgmtHwClientAccess", endpoint("lan1"))),
+            canonical(Objects{remoteAccessPoint("Gateway:lan1")}));
+}
+
+TEST_F(HostBmc, ShowsChangesAtOnce) {
+  for (int i = 1; i <= 6; ++i) {
+    const std::string address = "192.0.2." + std::to_string(100 + i);
+    const std::string mask = i % 2 == 0 ? "255.255.255.0" : "255.255.255.128";
+    host().modify(i % 3 == 0 ? staticSetting("lan1") : endpoint("lan1"),
+                  "IPv4Address=" + address + ",SubnetMask=" + mask);
+    EXPECT_EQ(shownAddress(), address + '/' + mask);
+    EXPECT_EQ(heldAddress(), address + '/' + mask);
+  }
+  EXPECT_EQ(bmc_.witness("IP Address Source"), "Static Address");
+  EXPECT_EQ(host().get(endpoint("lan1")).at("AddressOrigin"), "3");
+  EXPECT_EQ(host().log(), "");
+}
+
+TEST_F(HostBmc, StaysAsItIsWhereAChangeIsRefused) {
+  const std::string before = heldAddress();
+  host().modify(endpoint("lan1"), "IPv4Address=127.0.0.1");
+  host().modify(endpoint("lan1"), "SubnetMask=255.0.255.0");
+  bmc_.hook("check", "exit 1");
+  host().modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
+  bmc_.removeHook("check");
+  EXPECT_EQ(heldAddress(), before);
+  EXPECT_EQ(shownAddress(), before);
+  EXPECT_THAT(host().log(), AllOf(HasSubstr("127.0.0.1"), HasSubstr("255.0.255.0"), HasSubstr("192.0.2.77")));
+}
+
+TEST_F(HostBmc, IsFoundAgainAfterItWasAway) {
+  const std::string before = shownAddress();
+  bmc_.kill();
+  EXPECT_TRUE(poll([] { return host().wbemcli("ei", "YRNx_MgmtHwIPProtocolEndPoint").status != 0; }));
+  const std::string failure = host().failure("ei", "YRNx_MgmtHwIPProtocolEndPoint");
+  EXPECT_THAT(failure, HasSubstr("(1) CIM_ERR_FAILED"));
+  EXPECT_TRUE(host().guide().explains(failure)) << failure;
+  bmc_.restart();
+  EXPECT_EQ(shownAddress(), before);
+}
+
+}  // namespace
