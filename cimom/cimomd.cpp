@@ -63,13 +63,6 @@ std::string contentOf(const std::filesystem::path& file) {
   }
   std::ifstream stream(file, std::ios::binary);
   std::string content{std::istreambuf_iterator<char>(stream), {}};
-<<<<<<< HEAD
-  if (content.empty()) {
-    throw Http::ServerError("cannot read " + file.string() + ": " +
-                            (stream.is_open() ? "it is empty" : std::strerror(errno)));
-  }
-  return content;
-=======
   if (!content.empty()) {
     return content;
   }
@@ -77,7 +70,6 @@ std::string contentOf(const std::filesystem::path& file) {
     throw Http::ServerError(file.string() + ": " + std::strerror(errno));
   }
   throw Http::ServerError(file.string() + (std::filesystem::is_directory(file) ? ": is a directory" : ": is empty"));
->>>>>>> w-cimom
 }
 
 Http::ServerOptions serverOptions(const Configuration& configuration) {

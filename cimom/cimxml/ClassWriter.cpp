@@ -3,10 +3,6 @@
 #include <cmpimacs.h>
 
 #include "cimom/broker/CmpiValue.h"
-<<<<<<< HEAD
-=======
-#include "cimom/model/Names.h"
->>>>>>> w-cimom
 #include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
@@ -49,7 +45,6 @@ void ClassWriter::write(const ClassDefinition& definition) {
   }
   qualifiers(definition.qualifiers);
   for (const auto& declaration : definition.properties) {
-<<<<<<< HEAD
     if (isShown(declaration.propagated) && view_.properties.includes(declaration.name.c_str())) {
       property(declaration);
     }
@@ -78,46 +73,6 @@ void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
     xml_.attribute("TRANSLATABLE", truth(qualifier.translatable));
     values_.value(toCmpi(qualifier.value));
   }
-=======
-    if (isShown(definition, declaration.originClass) && view_.properties.includes(declaration.name.c_str())) {
-      property(definition, declaration);
-    }
-  }
-  for (const auto& declaration : definition.methods) {
-    if (isShown(definition, declaration.originClass)) {
-      method(definition, declaration);
-    }
-  }
-}
-
-bool ClassWriter::isShown(const ClassDefinition& definition, const std::string& originClass) const {
-  return !view_.localOnly || sameName(definition.name, originClass);
-}
-
-void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
-  if (!view_.includeQualifiers) {
-    return;
-  }
-  for (const Qualifier& qualifier : qualifiers) {
-    const char* type = xmlTypeName(qualifier.value.type());
-    const auto scope = xml_.element("QUALIFIER", "NAME", qualifier.name);
-    if (type) {
-      xml_.attribute("TYPE", type);
-    }
-    xml_.attribute("OVERRIDABLE", truth(qualifier.overridable));
-    xml_.attribute("TOSUBCLASS", truth(qualifier.toSubclass));
-    xml_.attribute("TRANSLATABLE", truth(qualifier.translatable));
-    values_.value(toCmpi(qualifier.value));
-  }
-}
-
-void ClassWriter::property(const ClassDefinition& definition, const PropertyDeclaration& property) {
-  const auto scope = xml_.element(propertyElement(property), "NAME", property.name);
-  writeType(xml_, property);
-  origin(definition, property.originClass);
-  qualifiers(property.qualifiers);
-  values_.value(toCmpi(property.defaultValue));
->>>>>>> w-cimom
 }
 
 void ClassWriter::property(const PropertyDeclaration& property) {
@@ -133,11 +88,7 @@ void ClassWriter::method(const MethodDeclaration& method) {
   if (const char* type = xmlTypeName(method.returnType)) {
     xml_.attribute("TYPE", type);
   }
-<<<<<<< HEAD
   origin(method.originClass, method.propagated);
-=======
-  origin(definition, method.originClass);
->>>>>>> w-cimom
   qualifiers(method.qualifiers);
   for (const auto& declaration : method.parameters) {
     parameter(declaration);
@@ -150,19 +101,11 @@ void ClassWriter::parameter(const PropertyDeclaration& parameter) {
   qualifiers(parameter.qualifiers);
 }
 
-<<<<<<< HEAD
 void ClassWriter::origin(const std::string& originClass, bool propagated) {
   if (view_.includeClassOrigin) {
     xml_.attribute("CLASSORIGIN", originClass);
   }
   xml_.attribute("PROPAGATED", truth(propagated));
-=======
-void ClassWriter::origin(const ClassDefinition& definition, const std::string& originClass) {
-  if (view_.includeClassOrigin) {
-    xml_.attribute("CLASSORIGIN", originClass);
-  }
-  xml_.attribute("PROPAGATED", truth(!sameName(definition.name, originClass)));
->>>>>>> w-cimom
 }
 
 }  // namespace Cimom::CimXml

@@ -7,11 +7,7 @@ namespace Cimom::CimXml {
 
 // What of a class a client wants to see (DSP0200, GetClass).
 struct ClassView {
-<<<<<<< HEAD
   bool localOnly = true;  // leaves out what the class inherits and does not override
-=======
-  bool localOnly = true;  // leaves out what the class inherits
->>>>>>> w-cimom
   bool includeQualifiers = true;
   bool includeClassOrigin = false;
   PropertyFilter properties;

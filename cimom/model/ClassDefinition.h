@@ -34,10 +34,7 @@ struct PropertyDeclaration {
   Value defaultValue;          // null if the schema has none
   Qualifiers qualifiers;       // inherited ones included
   std::string originClass;     // the class that declared it first
-<<<<<<< HEAD
   bool propagated = false;     // inherited as it is; false if this class declares or overrides it
-=======
->>>>>>> w-cimom
 
   bool isKey() const { return isQualified(qualifiers, "Key"); }
   bool isReference() const { return !referenceClass.empty(); }
@@ -49,10 +46,7 @@ struct MethodDeclaration {
   std::vector<PropertyDeclaration> parameters;
   Qualifiers qualifiers;
   std::string originClass;
-<<<<<<< HEAD
   bool propagated = false;
-=======
->>>>>>> w-cimom
 };
 
 // A class with everything that it inherits: the superclass's features come first, in the superclass's order, an
