@@ -174,14 +174,27 @@ TEST_F(ModifyOperationTest, EmptyFieldsOfAnIdentifierVanish) {
 }
 
 TEST_F(ModifyOperationTest, WithoutAnIdentifierNothingIsReadOrWritten) {
-  const CMPIStatus answer = modifyStatic(makePath(staticClass, {{"Other", "x"}}), addressAndMask);
-  EXPECT_NE(answer.rc, CMPI_RC_OK) << "the code of the key's read is the answer";
+  constexpr CMPIData null = {CMPI_string, CMPI_keyValue | CMPI_nullValue, {}};
+  const CMPIObjectPath* const path = withKey(makePath(staticClass), "InstanceID", null, CMPI_RC_ERR_NOT_FOUND);
+  const CMPIStatus answer = modifyStatic(path, addressAndMask);
+  EXPECT_EQ(answer.rc, CMPI_RC_ERR_NOT_FOUND) << "the code of the key's read is the answer";
   EXPECT_EQ(answer.msg, nullptr);
   EXPECT_EQ(result.order, Calls{"done"});
   EXPECT_TRUE(instrumentation().calls.empty());
   EXPECT_EQ(linesOf("modifyStaticIPCMPIInstance"),
             (Calls{"ENTERING: modifyStaticIPCMPIInstance() in IPConfigObjectFactory [Line: 408]",
                    "EXITING: modifyStaticIPCMPIInstance() in IPConfigObjectFactory [Line: 444]"}));
+}
+
+TEST_F(ModifyOperationTest, AnIdentifierThatIsNotThereIsNullOrNamesTheEmptyInterface) {
+  const CMPIStatus answer = modifyStatic(makePath(staticClass, {{"Other", "x"}}), addressAndMask);
+  EXPECT_EQ(result.order, Calls{"done"});
+  EXPECT_TRUE(instrumentation().nodes[0].values.empty());
+  EXPECT_TRUE(instrumentation().nodes[1].values.empty());
+  // sfcb says of a key that it was not found, and not that it is null, which is what the operation goes by.
+  const bool isNull = (personality().absentState & CMPI_nullValue) != 0;
+  EXPECT_EQ(answer.rc, isNull ? personality().absentKeyCode : CMPI_RC_OK);
+  EXPECT_EQ(instrumentation().calls.empty(), isNull);
 }
 
 TEST_F(ModifyOperationTest, WronglyTypedValuesCountAsEmpty) {

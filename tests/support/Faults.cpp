@@ -2,6 +2,8 @@
 
 #include <memory>
 
+#include "Personality.h"
+
 namespace Testing {
 
 namespace {
@@ -31,11 +33,17 @@ CMPIBoolean hasNext(const CMPIEnumeration* enumeration, CMPIStatus* status) {
 }
 
 CMPIData getNext(const CMPIEnumeration* enumeration, CMPIStatus* status) {
-  set(status, CMPI_RC_OK);
+  if (!hasNext(enumeration, status)) {
+    set(status, personality().pastTheEndCode);
+    return {CMPI_instance, CMPI_nullValue, {}};
+  }
   return scripted(enumeration).items.at(scripted(enumeration).position++);
 }
 
-CMPIEnumerationFT enumerationTable = {CMPICurrentVersion, nullptr, nullptr, getNext, hasNext, nullptr};
+CMPIEnumerationFT& enumerationTable() {
+  static CMPIEnumerationFT table = {personality().tableVersion, nullptr, nullptr, getNext, hasNext, nullptr};
+  return table;
+}
 
 std::vector<std::unique_ptr<ScriptedEnumeration>>& enumerations() {
   static std::vector<std::unique_ptr<ScriptedEnumeration>> made;
@@ -109,12 +117,14 @@ void recordCalls(CMPIInstance* instance, std::vector<std::string>& calls) {
   alteration.table.setPropertyFilter = recordedSetPropertyFilter;
 }
 
+// The keys that have a value.
 std::string keysOf(const CMPIObjectPath* path) {
   std::string list;
   for (CMPICount i = 0; i < CMGetKeyCount(path, nullptr); ++i) {
     CMPIString* name = nullptr;
-    CMGetKeyAt(path, i, &name, nullptr);
-    list += (list.empty() ? "" : ", ") + text(name);
+    if (!CMIsNullValue(CMGetKeyAt(path, i, &name, nullptr))) {
+      list += (list.empty() ? "" : ", ") + text(name);
+    }
   }
   return list;
 }
@@ -134,7 +144,10 @@ CMPIObjectPath* countedPath(const CMPIInstance* instance, CMPIStatus* status) {
 }  // namespace
 
 FaultyBroker::FaultyBroker(const CMPIBroker* real)
-    : real_(real), broker_(*real), upCallTable_(*real->bft), encapsulation_(*real->eft) {
+    : personal_(real),
+      broker_(*personal_.broker()),
+      upCallTable_(*personal_.broker()->bft),
+      encapsulation_(*personal_.broker()->eft) {
   upCallTable_.enumerateInstances = enumerateInstances;
   encapsulation_.newObjectPath = newObjectPath;
   encapsulation_.newInstance = newInstance;
@@ -164,13 +177,13 @@ CMPIEnumeration* FaultyBroker::enumerateInstances(const CMPIBroker*, const CMPIC
   if (status != nullptr) {
     *status = script.status;
   }
-  if (script.nullEnumeration) {
+  if (script.nullEnumeration || (script.status.rc != CMPI_RC_OK && personality().failedUpCallIsNull)) {
     return nullptr;
   }
   auto enumeration = std::make_unique<ScriptedEnumeration>();
-  enumeration->base = {enumeration.get(), &enumerationTable};
+  enumeration->base = {enumeration.get(), &enumerationTable()};
   for (CMPIInstance* const instance : script.instances) {
-    CMPIData item = {CMPI_instance, CMPI_goodValue, {}};
+    CMPIData item = {CMPI_instance, personality().itemState, {}};
     item.value.inst = instance;
     enumeration->items.push_back(item);
   }
@@ -186,7 +199,7 @@ CMPIObjectPath* FaultyBroker::newObjectPath(const CMPIBroker*, const char* nameS
     set(status, CMPI_RC_ERR_FAILED);
     return current->unmadePath;
   }
-  return CMNewObjectPath(current->real_, nameSpace, className, status);
+  return CMNewObjectPath(current->real(), nameSpace, className, status);
 }
 
 CMPIInstance* FaultyBroker::newInstance(const CMPIBroker*, const CMPIObjectPath* path, CMPIStatus* status) {
@@ -196,7 +209,7 @@ CMPIInstance* FaultyBroker::newInstance(const CMPIBroker*, const CMPIObjectPath*
     set(status, CMPI_RC_ERR_FAILED);
     return current->unmadeInstance;
   }
-  CMPIInstance* const instance = CMNewInstance(current->real_, path, status);
+  CMPIInstance* const instance = CMNewInstance(current->real(), path, status);
   if (instance != nullptr) {
     std::vector<std::string>& calls = current->instanceCalls[className];
     calls.push_back("newInstance(" + keysOf(path) + ")");
@@ -213,18 +226,18 @@ CMPIArray* FaultyBroker::newArray(const CMPIBroker*, CMPICount count, CMPIType t
     set(status, CMPI_RC_ERROR_SYSTEM);
     return nullptr;
   }
-  return CMNewArray(current->real_, count, type, status);
+  return CMNewArray(current->real(), count, type, status);
 }
 
 CMPIString* FaultyBroker::newString(const CMPIBroker*, const char* characters, CMPIStatus* status) {
   current->strings.push_back(characters);
-  return CMNewString(current->real_, characters, status);
+  return CMNewString(current->real(), characters, status);
 }
 
 CMPIStatus FaultyBroker::trace(const CMPIBroker*, int level, const char* component, const char* message,
                                const CMPIString* string) {
   current->traces.push_back({level, component, string == nullptr ? message : "unexpected string"});
-  return {CMPI_RC_ERR_NOT_SUPPORTED, nullptr};  // as a real object manager answers
+  return {personality().traceCode, nullptr};
 }
 
 CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc) {
@@ -291,13 +304,17 @@ CMPIData recordedKey(const CMPIObjectPath* path, const char* name, CMPIStatus* s
   return alteration.original->getKey(path, name, status);
 }
 
-CMPIObjectPath* withGetKey(CMPIObjectPath* path, KeyAlteration alteration,
-                           CMPIData (*getKey)(const CMPIObjectPath*, const char*, CMPIStatus*)) {
+CMPIObjectPath* withAlteration(CMPIObjectPath* path, KeyAlteration alteration) {
   auto owned = std::make_unique<KeyAlteration>(std::move(alteration));
-  owned->table.getKey = getKey;
   path->ft = &owned->table;
   keyAlterations()[path] = std::move(owned);
   return path;
+}
+
+CMPIObjectPath* withGetKey(CMPIObjectPath* path, KeyAlteration alteration,
+                           CMPIData (*getKey)(const CMPIObjectPath*, const char*, CMPIStatus*)) {
+  alteration.table.getKey = getKey;
+  return withAlteration(path, std::move(alteration));
 }
 
 struct CodedString {
@@ -332,6 +349,15 @@ CMPIString* withCode(CMPIString* string, CMPIrc rc) {
 
 CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data, CMPIrc rc) {
   return withGetKey(path, {*path->ft, path->ft, name, data, rc}, alteredKey);
+}
+
+CMPIObjectPath* countingNoKeys(CMPIObjectPath* path) {
+  KeyAlteration alteration = {*path->ft, path->ft, {}, {}, CMPI_RC_OK};
+  alteration.table.getKeyCount = [](const CMPIObjectPath*, CMPIStatus* status) -> CMPICount {
+    set(status, CMPI_RC_OK);
+    return 0;
+  };
+  return withAlteration(path, std::move(alteration));
 }
 
 CMPIObjectPath* withKeysRecorded(CMPIObjectPath* path, std::vector<std::string>& names) {
