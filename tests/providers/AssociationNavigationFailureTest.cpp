@@ -63,6 +63,11 @@ class AssociationNavigationFailureTest : public Testing::AssociationDirectionTes
     return result;
   }
 
+  static std::ptrdiff_t usable(const Answer& answer) {
+    return std::count_if(answer.instances.begin(), answer.instances.end(),
+                         [](const CMPIInstance* instance) { return !CMIsNullObject(instance); });
+  }
+
   void spoilFar(CMPIInstance* unusable) {
     // Every reading counts on from the one before: the second of each three.
     faults.unmadeInstance = unusable;
@@ -189,6 +194,29 @@ TEST_P(AssociationNavigationFailureTest, WithoutAPathForTheAssociationNoReferenc
   faults.failNewObjectPath = [this](const std::string& className, int) { return className == model().className; };
   EXPECT_EQ(answered(Navigation::References), (Strings{"null", "null", "null"}));
   EXPECT_EQ(answered(Navigation::ReferenceNames), Strings{});
+}
+
+TEST_P(AssociationNavigationFailureTest, AFarEndWhoseClassTheObjectManagerDoesNotKnowHasNoNames) {
+  const CMPIObjectPath* const path = source();
+  faults.forgetClass(farClass());
+  // sfcb makes the instances all the same.
+  const bool hasInstances = Testing::personality().unknownClass == Testing::UnknownClass::HasNoInstancePath;
+  EXPECT_EQ(usable(navigate(Navigation::Associators, path)), hasInstances ? 3 : 0);
+  EXPECT_TRUE(navigate(Navigation::AssociatorNames, path).order.empty());
+  EXPECT_TRUE(navigate(Navigation::ReferenceNames, path).order.empty());
+  for (const CMPIInstance* const reference : navigate(Navigation::References, path).instances) {
+    EXPECT_EQ(Testing::reference(reference, referenceToFar()), nullptr);
+  }
+}
+
+TEST_P(AssociationNavigationFailureTest, AnAssociationWhoseClassTheObjectManagerDoesNotKnowHasNoNames) {
+  const CMPIObjectPath* const path = source();
+  faults.forgetClass(model().className);
+  const bool hasInstances = Testing::personality().unknownClass == Testing::UnknownClass::HasNoInstancePath;
+  EXPECT_EQ(usable(navigate(Navigation::Associators, path)), 3);
+  EXPECT_EQ(navigate(Navigation::AssociatorNames, path).paths.size(), 3U);
+  EXPECT_EQ(usable(navigate(Navigation::References, path)), hasInstances ? 3 : 0);
+  EXPECT_TRUE(navigate(Navigation::ReferenceNames, path).order.empty());
 }
 
 INSTANTIATE_DIRECTIONS(AssociationNavigationFailureTest);

@@ -33,6 +33,19 @@ TEST_P(AssociationNavigationTest, AssociatorNamesAnswerTheirPaths) {
   EXPECT_EQ(answer.order, (Strings{"path", "path", "path"}));
 }
 
+TEST_P(AssociationNavigationTest, AnAssociationThatTheClientDoesNotNameIsAnsweredWhereTheObjectManagerNamesIt) {
+  // sfcb calls the provider once without the class, OpenPegasus once for each of its classes with the class's name.
+  const bool named = Testing::personality().namesTheAssociation;
+  const char* const associationClass = named ? model().className.c_str() : nullptr;
+  for (const Navigation navigation : navigations) {
+    SCOPED_TRACE(nameOf(navigation));
+    const Answer answer = navigate(navigation, source(), associationClass);
+    EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
+    const bool asks = navigation == Navigation::Associators || navigation == Navigation::AssociatorNames;
+    EXPECT_EQ(answer.order.size(), named || !asks ? 3U : 0U);
+  }
+}
+
 TEST_P(AssociationNavigationTest, ReferencesTieTheSourceAsReceivedToEveryFarInstance) {
   const Answer answer = navigate(Navigation::References, source());
   EXPECT_EQ(answer.status.rc, CMPI_RC_OK);

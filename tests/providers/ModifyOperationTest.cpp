@@ -1,4 +1,5 @@
 // ModifyInstance of the endpoint, the static settings and the remote access point, down to the instrumentation.
+#include "cimom/broker/Handle.h"
 #include "support/Samples.h"
 
 namespace {
@@ -12,18 +13,27 @@ class ModifyOperationTest : public CompositeTest {
 
   CMPIStatus modify(const std::string& className, const CMPIObjectPath* path, const CMPIInstance* instance,
                     const CMPIBroker* unitBroker) {
+    const char* sent[] = {"IPv4Address", "SubnetMask", nullptr};
     CMPIInstanceMI* const mi = unitOf(className).createInstanceMI(unitBroker, nullptr, nullptr);
-    return mi->ft->modifyInstance(mi, context(), result.result(), path, instance, nullptr);
+    return mi->ft->modifyInstance(mi, context(), result.result(), path, instance,
+                                  personality().listsModifiedProperties ? sent : nullptr);
   }
   CMPIStatus modify(const std::string& className, const CMPIObjectPath* path, const CMPIInstance* instance) {
     return modify(className, path, instance, broker());
   }
 
   CMPIStatus modifyEndpoint(const CMPIObjectPath* path, const Properties& properties) {
-    return modify(endpointClass, path, makeInstance(requestNameSpace, endpointClass, properties));
+    return modify(endpointClass, path, makeSent(endpointClass, properties));
   }
   CMPIStatus modifyStatic(const CMPIObjectPath* path, const Properties& properties) {
-    return modify(staticClass, path, makeInstance(requestNameSpace, staticClass, properties));
+    return modify(staticClass, path, makeSent(staticClass, properties));
+  }
+  // An instance as it reaches a provider from a client: all that its class declares, null where it was not sent.
+  CMPIInstance* makeSent(const std::string& className, const Properties& properties) {
+    CMPIInstance* const instance = makeInstance(requestNameSpace, className, properties);
+    auto& model = Cimom::modelOf<Cimom::Instance>(instance);
+    model = model.withoutDefaults();
+    return instance;
   }
   CMPIObjectPath* endpointPath(const std::string& name) { return makePath(endpointClass, {{"Name", name}}); }
   CMPIObjectPath* staticPath(const std::string& id) { return makePath(staticClass, {{"InstanceID", id}}); }
@@ -92,6 +102,29 @@ TEST_F(ModifyOperationTest, TheEntryIsFramedTracesBothPathsAndMarksNoExit) {
   EXPECT_NE(own[1].find("' at line 330 in IPProtocolEndpointProvider"), std::string::npos);
   EXPECT_TRUE(messagesWith("EXITING: IPProtocolendpt_ModifyInstance").empty());
   EXPECT_EQ(lineWith(own[0]).component, "Tarnwick.IPProtocolEndpointProvider");
+}
+
+TEST_F(ModifyOperationTest, WhatTheClientDidNotSendStaysAsItIs) {
+  const CMPIInstance* const instance = makeSent(endpointClass, {{"IPv4Address", "192.0.2.7"}});
+  EXPECT_TRUE(CMIsNullValue(CMGetProperty(instance, "SubnetMask", &status)));
+  EXPECT_TRUE(CMIsNullValue(CMGetProperty(instance, "EnabledState", &status))) << "its default is not sent";
+  EXPECT_EQ(modify(endpointClass, endpointPath("eth0"), instance).rc, CMPI_RC_OK);
+  EXPECT_EQ(instrumentation().nodes[0].values, (std::map<int, std::string>{{25, "192.0.2.7"}}));
+}
+
+TEST_F(ModifyOperationTest, ThePropertyListPlaysNoPart) {
+  const char* none[] = {nullptr};
+  const char* another[] = {"ElementName", nullptr};
+  CMPIInstanceMI* const mi = unitOf(endpointClass).createInstanceMI(broker(), nullptr, nullptr);
+  for (const char** const properties : {static_cast<const char**>(nullptr), none, another}) {
+    instrumentation().nodes[0].values.clear();
+    EXPECT_EQ(mi->ft
+                  ->modifyInstance(mi, context(), result.result(), endpointPath("eth0"),
+                                   makeSent(endpointClass, addressAndMask), properties)
+                  .rc,
+              CMPI_RC_OK);
+    EXPECT_EQ(instrumentation().nodes[0].values.size(), 2u);
+  }
 }
 
 TEST_F(ModifyOperationTest, AMissingPropertyIsNotWrittenAndItsCodeIsTheAnswerOnlyWhenReadLast) {

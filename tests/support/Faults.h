@@ -9,6 +9,7 @@
 #include <string>
 #include <vector>
 
+#include "Alterations.h"
 #include "PersonalBroker.h"
 
 namespace Testing {
@@ -57,6 +58,7 @@ class FaultyBroker {
   // Called before an up-call is answered; may change the script.
   std::function<void(const UpCall&)> onUpCall;
   std::vector<UpCall> upCalls;
+  int readsPastTheEnd = 0;  // of enumerations
   std::vector<BrokerTrace> traces;
   std::vector<std::string> strings;  // the texts that newString was asked for
 
@@ -89,27 +91,6 @@ class FaultyBroker {
   std::map<std::string, int> newObjectPathCalls_;
   std::map<std::string, int> newInstanceCalls_;
 };
-
-// The instance, with its table replaced in part: getProperty answers `data` with the code `rc` for the name.
-CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
-// The instance, with its table replaced in part: getObjectPath answers `path`.
-CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path);
-// The instance, with its table replaced in part: counts the calls of getObjectPath.
-CMPIInstance* withPathsCounted(CMPIInstance* instance, int& count);
-// The instance, with its table replaced in part: getObjectPath answers null.
-CMPIInstance* withoutPath(CMPIInstance* instance);
-// An instance whose handle is null.
-CMPIInstance* withoutHandle();
-// A path whose handle is null.
-CMPIObjectPath* pathWithoutHandle();
-// The path, with its table replaced in part: getKey answers `data` with the code `rc` for the name.
-CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
-// The path, with its table replaced in part: getKeyCount answers 0.
-CMPIObjectPath* countingNoKeys(CMPIObjectPath* path);
-// The path, with its table replaced in part: the names that getKey is asked for are appended to `names`.
-CMPIObjectPath* withKeysRecorded(CMPIObjectPath* path, std::vector<std::string>& names);
-// A string of the broker whose characters are read with the code `rc`.
-CMPIString* withCode(CMPIString* string, CMPIrc rc);
 
 // Keeps what a provider delivers.
 class RecordingResult {
