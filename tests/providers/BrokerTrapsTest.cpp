@@ -199,17 +199,21 @@ TEST_P(UnitTest, APathWithoutKeysIsKeylessUnlessItCountsThoseOfItsClass) {
   EXPECT_EQ(answer.rc, personality().countsUnsetKeys || isAssociation ? CMPI_RC_OK : CMPI_RC_ERR_FAILED);
 }
 
-TEST_P(UnitTest, AClassThatTheObjectManagerDoesNotKnowHasNoNames) {
+TEST_P(UnitTest, AClassThatTheObjectManagerDoesNotKnowIsAnsweredAsFarAsItsInstancesCanBeMade) {
   CMPIObjectPath* const path = makePath(className(), {{"InstanceID", "BMC:eth1"}});
   faults.forgetClass(className());
   EXPECT_EQ(enumInstances(path).rc, CMPI_RC_OK);
   const auto usable = std::count_if(result.instances.begin(), result.instances.end(),
                                     [](const CMPIInstance* instance) { return !CMIsNullObject(instance); });
-  // sfcb makes the instance all the same, and tells when it is asked for its path.
-  const bool hasInstance = personality().unknownClass == UnknownClass::HasNoInstancePath;
-  EXPECT_EQ(usable, hasInstance ? 1 : 0);
-  EXPECT_EQ(enumInstanceNames(path).rc, hasInstance ? CMPI_RC_ERR_INVALID_CLASS : CMPI_RC_OK);
-  EXPECT_TRUE(result.paths.empty());
+  EXPECT_EQ(usable, personality().unknownClass == UnknownClass::HasNoInstance ? 0 : 1);
+  const CMPIStatus answer = enumInstanceNames(path);
+  // sfcb tells only when it is asked for the instance's path.
+  EXPECT_EQ(answer.rc,
+            personality().unknownClass == UnknownClass::HasNoInstancePath ? CMPI_RC_ERR_INVALID_CLASS : CMPI_RC_OK);
+  ASSERT_EQ(result.paths.size(), personality().unknownClass == UnknownClass::HasKeylessPaths ? 1u : 0u);
+  for (const CMPIObjectPath* const name : result.paths) {
+    EXPECT_EQ(keysWithValues(name), GetParam().provider == "IPConfigClientAccessProvider" ? 2u : 0u);
+  }
   result.order.clear();
   getInstance(path);
   EXPECT_EQ(result.order, (Strings{"done"}));

@@ -109,12 +109,14 @@ CMPIEnumeration* FaultyBroker::enumerateInstances(const CMPIBroker*, const CMPIC
   }
   auto enumeration = std::make_unique<ScriptedEnumeration>();
   enumeration->base = {enumeration.get(), &enumerationTable()};
-  for (CMPIInstance* const instance : script.instances) {
-    CMPIData item = {CMPI_instance, personality().itemState, {}};
-    item.value.inst = instance;
-    enumeration->items.push_back(item);
+  if (script.status.rc == CMPI_RC_OK) {
+    for (CMPIInstance* const instance : script.instances) {
+      CMPIData item = {CMPI_instance, personality().itemState, {}};
+      item.value.inst = instance;
+      enumeration->items.push_back(item);
+    }
+    enumeration->items.insert(enumeration->items.end(), script.items.begin(), script.items.end());
   }
-  enumeration->items.insert(enumeration->items.end(), script.items.begin(), script.items.end());
   enumerations().push_back(std::move(enumeration));
   return &enumerations().back()->base;
 }

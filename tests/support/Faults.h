@@ -18,7 +18,7 @@ namespace Testing {
 struct UpCallScript {
   std::vector<CMPIInstance*> instances;  // null elements are answered as they are
   std::vector<CMPIData> items;           // answered after the instances, as they are
-  // An error comes with the enumeration or without it, as the personality has it.
+  // An error comes with an empty enumeration or without one, as the personality has it.
   CMPIStatus status = {CMPI_RC_OK, nullptr};
   bool nullEnumeration = false;
 };

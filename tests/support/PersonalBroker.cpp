@@ -18,14 +18,6 @@ const Cimom::ClassDefinition* classOf(const CMPIBroker* broker, const char* name
   return !name || current->unknownClasses.contains(name) ? nullptr : Cimom::coreOf(broker).classes.find(name);
 }
 
-template <typename Object>
-Object* refused(CMPIStatus* status) {
-  if (status) {
-    *status = {CMPI_RC_ERR_INVALID_CLASS, nullptr};
-  }
-  return nullptr;
-}
-
 }  // namespace
 
 PersonalBroker::PersonalBroker(const CMPIBroker* real)
@@ -58,9 +50,6 @@ PersonalBroker::~PersonalBroker() {
 CMPIObjectPath* PersonalBroker::newObjectPath(const CMPIBroker* broker, const char* nameSpace, const char* className,
                                               CMPIStatus* status) {
   const Cimom::ClassDefinition* const definition = classOf(broker, className);
-  if (!definition && personality().unknownClass == UnknownClass::HasNoPath) {
-    return refused<CMPIObjectPath>(status);
-  }
   CMPIObjectPath* const path = Cimom::encapsulationTable.newObjectPath(broker, nameSpace, className, status);
   personalize(status);
   if (path && definition && personality().countsUnsetKeys) {
@@ -75,13 +64,11 @@ CMPIInstance* PersonalBroker::newInstance(const CMPIBroker* broker, const CMPIOb
   }
   const auto& given = Cimom::modelOf<Cimom::ObjectPath>(path);
   if (!classOf(broker, given.className.c_str())) {
-    if (personality().unknownClass != UnknownClass::HasNoInstancePath) {
-      return refused<CMPIInstance>(status);
-    }
+    const bool made = personality().unknownClass != UnknownClass::HasNoInstance;
     if (status) {
-      *status = {CMPI_RC_OK, nullptr};
+      *status = {made ? CMPI_RC_OK : CMPI_RC_ERR_INVALID_CLASS, nullptr};
     }
-    return instanceOfUnknownClass(given);
+    return made ? instanceOfUnknownClass(given) : nullptr;
   }
   const auto kept = Cimom::lend(personality().instancesKeepTheirHost ? given : withoutHost(given));
   CMPIInstance* const instance = personal(Cimom::encapsulationTable.newInstance(broker, &kept, status));

@@ -216,9 +216,9 @@ CMPIData getPropertyAt(const CMPIInstance* instance, CMPICount index, CMPIString
 }
 
 // Whether the value is kept beside the object manager's own instance, which would drop or refuse it.
-bool isKeptAside(const PropertyDeclaration* declaration, CMPIType type) {
+bool isKeptAside(const Extras* extras, const PropertyDeclaration* declaration, CMPIType type) {
   if (!declaration) {
-    return personality().keepsUndeclared;
+    return personality().keepsUndeclared || (extras && extras->unknownClass);
   }
   return personality().takesIntegersOfAnyType && declaration->type != type && Cimom::isInteger(declaration->type) &&
          Cimom::isInteger(type);
@@ -230,7 +230,7 @@ CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMP
     return {CMPI_RC_OK, nullptr};
   }
   const KeptValue kept(value, type);
-  if (isKeptAside(declaration, type)) {
+  if (isKeptAside(extrasOf(instance), declaration, type)) {
     allExtras()[instance].values.insert_or_assign(name, Value::fromCmpi(kept.get(), type));
     return {CMPI_RC_OK, nullptr};
   }
@@ -251,7 +251,7 @@ CMPIStatus setPropertyWithOrigin(const CMPIInstance* instance, const char* name,
 
 CMPIObjectPath* getObjectPath(const CMPIInstance* instance, CMPIStatus* status) {
   const Extras* const extras = extrasOf(instance);
-  if (extras && extras->unknownClass) {
+  if (extras && extras->unknownClass && personality().unknownClass == UnknownClass::HasNoInstancePath) {
     set(status, CMPI_RC_ERR_INVALID_CLASS);
     return nullptr;
   }

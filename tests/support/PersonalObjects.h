@@ -23,7 +23,7 @@ Cimom::ObjectPath withoutHost(const Cimom::ObjectPath& path);
 // Adds the keys of the class that the path lacks, as nulls.
 void addUnsetKeys(Cimom::ObjectPath& path, const Cimom::ClassDefinition& definition);
 
-// An instance of a class that the object manager does not know: it has no path.
+// An instance of a class that the object manager does not know.
 CMPIInstance* instanceOfUnknownClass(const Cimom::ObjectPath& path);
 // Sets the keys of the path that the instance's class does not declare, where undeclared properties are kept.
 void keepUndeclaredKeys(const CMPIInstance* instance, const Cimom::ObjectPath& path);

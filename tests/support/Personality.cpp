@@ -1,6 +1,7 @@
 #include "Personality.h"
 
 #include <cmpimacs.h>
+#include <dlfcn.h>
 
 #include <cstdlib>
 #include <stdexcept>
@@ -15,6 +16,7 @@ const Personality personalities[] = {
     // The CMPI 2.0 standard as cimomd reads it: its broker, unchanged.
     {
         .name = "standard",
+        .loadFlags = RTLD_NOW | RTLD_LOCAL,
         .brokerVersion = CMPIVersion200,
         .tableVersion = CMPIVersion200,
         .hasMemoryServices = true,
@@ -42,10 +44,12 @@ const Personality personalities[] = {
         .failedUpCallIsNull = true,
         .pastTheEndCode = pastTheEnd,
         .namesTheAssociation = true,
+        .sendsDefaults = false,
         .listsModifiedProperties = false,
     },
     {
         .name = "sfcb",
+        .loadFlags = RTLD_NOW | RTLD_GLOBAL,
         .brokerVersion = 0,
         .tableVersion = 1,
         .hasMemoryServices = true,
@@ -73,10 +77,12 @@ const Personality personalities[] = {
         .failedUpCallIsNull = false,
         .pastTheEndCode = CMPI_RC_OK,
         .namesTheAssociation = false,
+        .sendsDefaults = true,
         .listsModifiedProperties = false,
     },
     {
         .name = "OpenPegasus",
+        .loadFlags = RTLD_LAZY | RTLD_GLOBAL,
         .brokerVersion = CMPIVersion200,
         .tableVersion = CMPIVersion200,
         .hasMemoryServices = false,
@@ -99,11 +105,12 @@ const Personality personalities[] = {
         .keepsUndeclared = false,
         .takesIntegersOfAnyType = false,
         .wrongTypeCode = CMPI_RC_ERR_INVALID_DATA_TYPE,
-        .unknownClass = UnknownClass::HasNoPath,
+        .unknownClass = UnknownClass::HasKeylessPaths,
         .itemState = CMPI_nullValue,
         .failedUpCallIsNull = true,
         .pastTheEndCode = pastTheEnd,
         .namesTheAssociation = true,
+        .sendsDefaults = true,
         .listsModifiedProperties = true,
     },
 };

@@ -8,15 +8,16 @@
 
 namespace Testing {
 
-// What becomes of a class that the object manager does not know in the namespace.
+// What becomes of a class that the object manager does not know in the namespace. Its paths can be made everywhere.
 enum class UnknownClass {
-  HasNoInstance,      // a path can be made, an instance cannot
-  HasNoInstancePath,  // both can be made, but such an instance has no path
-  HasNoPath,          // neither can be made
+  HasNoInstance,      // an instance cannot be made
+  HasNoInstancePath,  // it can, but has no path
+  HasKeylessPaths,    // it can; no property is a key
 };
 
 struct Personality {
   std::string name;  // as BROKER_PERSONALITY gives it
+  int loadFlags;     // of dlopen, for the library
 
   // The broker.
   unsigned int brokerVersion;  // that the up-call table reports
@@ -53,11 +54,12 @@ struct Personality {
 
   // Up-calls.
   CMPIValueState itemState;  // of the items of an enumeration
-  bool failedUpCallIsNull;   // else it is an enumeration beside its error, with what was read before
+  bool failedUpCallIsNull;   // else an empty enumeration comes with the error
   CMPIrc pastTheEndCode;     // what getNext answers there
 
   // Requests.
-  bool namesTheAssociation;      // a client that names no association class: the provider is told its own, else null
+  bool namesTheAssociation;  // a client that names no association class: the provider is told its own, else null
+  bool sendsDefaults;        // a property that the client did not send has its class's default, if any; else it is null
   bool listsModifiedProperties;  // ModifyInstance always comes with a property list; else with the client's, if any
 };
 
