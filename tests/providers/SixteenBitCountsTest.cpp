@@ -1,47 +1,23 @@
 // The interface counts in 16 bits: of 65537 instances a walk visits one. Once for every loop of the library that walks
 // over instances. What an object manager is like plays no part, so that these run under the standard personality alone.
-#include <AssociationOperations.h>
-
 #include <algorithm>
 
 #include "AssociationTest.h"
 
 namespace {
 
-using QV::IPConfigComposite::AssociationCall;
-using QV::IPConfigComposite::AssociationUnit;
 using Testing::Answer;
 using Testing::Navigation;
+using Testing::Reading;
 using Testing::Strings;
 namespace Classes = Testing::Classes;
 
 constexpr int tooMany = 65537;
 
-// What a stand-in for a builder makes.
-std::vector<CMPIInstance*>& built() {
-  static std::vector<CMPIInstance*> instances;
-  return instances;
-}
-
-int buildBuilt(const CMPIObjectPath*, const char**, const CMPIContext*, std::vector<CMPIInstance*>& out) {
-  out = built();
-  return 0;
-}
-
-const std::string component = "Tarnwick.Test";
-
-const AssociationUnit unitOfBuilt = {
-    .component = component,
-    .file = "Unit",
-    .associationClass = Classes::hostedAccessPoint,
-    .endA = {},
-    .endB = {},
-    .referenceToA = "Antecedent",
-    .referenceToB = "Dependent",
-    .kindWords = nullptr,
-};
-
 class SixteenBitCountsTest : public Testing::AssociationTest {
+ private:
+  Testing::UnrecordedLog unrecorded_;
+
  protected:
   // Composites of the class under one name, of which those of the given numbers, from 1, can be made. Their number
   // follows the paths that the class has been asked for before them.
@@ -51,7 +27,6 @@ class SixteenBitCountsTest : public Testing::AssociationTest {
     std::vector<CMPIInstance*>& underlying = faults.upCallScripts[Testing::underlyingClassOf(compositeClass)].instances;
     underlying.resize(tooMany, underlying.front());
     faults.failNewObjectPath = [=](const std::string& className, int call) {
-      Testing::logLines().clear();
       return className == compositeClass && call > pathsBefore &&
              std::find(made.begin(), made.end(), call - pathsBefore) == made.end();
     };
@@ -61,8 +36,26 @@ class SixteenBitCountsTest : public Testing::AssociationTest {
     return Testing::unitOf(Classes::endpoint).createInstanceMI(broker(), context(), nullptr);
   }
 
-  AssociationCall callOf(const char* function) { return {unitOfBuilt, broker(), function}; }
+  // Two endpoints with 32769 sequences, which make 65538 associations, two more than are counted. What is made of each
+  // class is one and the same, but for those of the given numbers, which cannot be made.
+  void addTooManyAssociations(const std::vector<int>& unmade = {}) {
+    attach(Testing::modelOf(Classes::elementSettingData));
+    addEnds({"eth0", "eth1"}, {"BMC:eth0:static"});
+    std::vector<CMPIInstance*>& sequences =
+        faults.upCallScripts[Testing::underlyingClassOf(Classes::sequence)].instances;
+    sequences.resize(32769, sequences.front());
+    CMPIInstance* const sequence = makeInstance(Testing::requestNameSpace, Classes::sequence, {});
+    CMPIInstance* const association = makeInstance(Testing::requestNameSpace, model().className, {});
+    Testing::withPath(association, associationPath);
+    faults.failNewInstance = [=, this](const std::string& className, int call) {
+      const bool isUnmade = std::find(unmade.begin(), unmade.end(), call) != unmade.end();
+      faults.unmadeInstance = className == Classes::sequence ? sequence : isUnmade ? nullptr : association;
+      return className != Classes::endpoint;
+    };
+  }
 
+  CMPIObjectPath* const associationPath =
+      makePath(Classes::elementSettingData, {{"ManagedElement", "a"}, {"SettingData", "b"}});
   Testing::RecordingResult result;
 };
 
@@ -92,28 +85,18 @@ TEST_F(SixteenBitCountsTest, OfGetInstance) {
 }
 
 TEST_F(SixteenBitCountsTest, OfAnAssociationsEnumInstances) {
-  built().assign(tooMany, makeInstance(Testing::requestNameSpace, Classes::hostedAccessPoint, {}));
-  enumAssociations(callOf("EnumInstances"), buildBuilt, context(), result.result(),
-                   makePath(Classes::hostedAccessPoint), nullptr);
-  EXPECT_EQ(result.order, (Strings{"instance", "done"}));
+  addTooManyAssociations();
+  EXPECT_EQ(read(Reading::EnumInstances, associationPath).order, (Strings{"instance", "instance", "done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfAnAssociationsEnumInstanceNames) {
-  built().assign(tooMany, makeInstance(Testing::requestNameSpace, Classes::hostedAccessPoint, {}));
-  enumAssociationNames(callOf("EnumInstanceNames"), buildBuilt, context(), result.result(),
-                       makePath(Classes::hostedAccessPoint));
-  EXPECT_EQ(result.order, (Strings{"path", "done"}));
+  addTooManyAssociations();
+  EXPECT_EQ(read(Reading::EnumInstanceNames, associationPath).order, (Strings{"path", "path", "done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfAnAssociationsGetInstance) {
-  CMPIObjectPath* const path = makePath(Classes::hostedAccessPoint, {{"Antecedent", "a"}, {"Dependent", "b"}});
-  CMPIInstance* const instance = makeInstance(Testing::requestNameSpace, Classes::hostedAccessPoint, {});
-  built().assign(tooMany, Testing::withPath(instance, path));
-  getAssociation(callOf("GetInstance"), buildBuilt, context(), result.result(), path, nullptr);
-  EXPECT_EQ(result.order, (Strings{"instance", "done"}));
-  built().front() = nullptr;
-  getAssociation(callOf("GetInstance"), buildBuilt, context(), result.result(), path, nullptr);
-  EXPECT_EQ(result.order, (Strings{"instance", "done", "done"}));
+  addTooManyAssociations({1, 2});
+  EXPECT_EQ(read(Reading::GetInstance, associationPath).order, (Strings{"done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfTheFarEndOfAnAssociation) {
