@@ -193,7 +193,7 @@ CMPIData getProperty(const CMPIInstance* instance, const char* name, CMPIStatus*
     const auto found = extras->values.find(name);
     if (found != extras->values.end()) {
       set(status, CMPI_RC_OK);
-      return personalData(found->second.toCmpi(), false);
+      return personalData(Cimom::toCmpi(found->second), false);
     }
     if (isLeftOut(extras, name, declarationOf(instance, name))) {
       return absent(status, CMPI_RC_ERR_NO_SUCH_PROPERTY);
@@ -215,13 +215,15 @@ CMPIData getPropertyAt(const CMPIInstance* instance, CMPICount index, CMPIString
   return personalData(data, personality().marksKeyProperties);
 }
 
+bool isInteger(CMPIType type) { return type >= CMPI_uint8 && type <= CMPI_sint64; }
+
 // Whether the value is kept beside the object manager's own instance, which would drop or refuse it.
 bool isKeptAside(const Extras* extras, const PropertyDeclaration* declaration, CMPIType type) {
   if (!declaration) {
     return personality().keepsUndeclared || (extras && extras->unknownClass);
   }
-  return personality().takesIntegersOfAnyType && declaration->type != type && Cimom::isInteger(declaration->type) &&
-         Cimom::isInteger(type);
+  return personality().takesIntegersOfAnyType && declaration->type != type && isInteger(declaration->type) &&
+         isInteger(type);
 }
 
 CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
@@ -231,7 +233,7 @@ CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMP
   }
   const KeptValue kept(value, type);
   if (isKeptAside(extrasOf(instance), declaration, type)) {
-    allExtras()[instance].values.insert_or_assign(name, Value::fromCmpi(kept.get(), type));
+    allExtras()[instance].values.insert_or_assign(name, Cimom::fromCmpi(kept.get(), type));
     return {CMPI_RC_OK, nullptr};
   }
   const CMPIStatus status = Abi<Instance>::table.setProperty(instance, name, kept.get(), type);

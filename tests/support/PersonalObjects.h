@@ -3,7 +3,7 @@
 
 #include <cmpift.h>
 
-#include "cimom/schema/ClassDefinition.h"
+#include "cimom/model/ClassDefinition.h"
 
 namespace Testing {
 
