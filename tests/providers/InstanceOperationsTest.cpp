@@ -224,12 +224,13 @@ TEST_P(InstanceOperationsTest, GetInstanceWithoutKeysAndBrokerHasNoMessage) {
 }
 
 // Of each class two properties that are copied from the underlying instance and are no keys.
+// The first has a default in the DMTF's class where one of the two has: a default shows also when nothing was set.
 const std::map<std::string, std::pair<std::string, std::string>> copiedBesideTheKeys = {
     {"YRNx_MgmtHwComputerSystem", {"Description", "NameFormat"}},
     {"YRNx_MgmtHwIPProtocolEndPoint", {"IPv4Address", "SubnetMask"}},
-    {"YRNx_MgmtHwIPAssignmentSettingSequence", {"ElementName", "AddressOrigin"}},
-    {"YRNx_MgmtHwStaticIPAssignmentSettingData", {"ElementName", "AddressOrigin"}},
-    {"YRNx_MgmtHwDHCPAssignmentSettingData", {"ElementName", "AddressOrigin"}},
+    {"YRNx_MgmtHwIPAssignmentSettingSequence", {"AddressOrigin", "ElementName"}},
+    {"YRNx_MgmtHwStaticIPAssignmentSettingData", {"AddressOrigin", "ElementName"}},
+    {"YRNx_MgmtHwDHCPAssignmentSettingData", {"AddressOrigin", "ElementName"}},
     {"YRNx_MgmtHwRemoteServiceAccessPoint", {"AccessInfo", "OtherAccessContext"}},
 };
 
