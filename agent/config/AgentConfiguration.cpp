@@ -1,4 +1,4 @@
-#include "config/AgentConfiguration.h"
+#include "agent/config/AgentConfiguration.h"
 
 #include <algorithm>
 #include <array>
@@ -12,7 +12,7 @@
 #include <utility>
 #include <vector>
 
-#include "config/IniFile.h"
+#include "agent/config/IniFile.h"
 
 namespace QV {
 namespace {

@@ -1,4 +1,4 @@
-#include "config/IniFile.h"
+#include "agent/config/IniFile.h"
 
 #include <ini.h>
 

@@ -1,9 +1,9 @@
+#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
 #include <optional>
 
-#include "QV/ProviderHelper.h"
-#include "helper/Conversion.h"
+#include "agent/helper/Conversion.h"
 
 namespace QV {
 namespace {

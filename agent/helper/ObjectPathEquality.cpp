@@ -1,3 +1,4 @@
+#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
 #include <algorithm>
@@ -5,8 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "QV/ProviderHelper.h"
-#include "helper/Conversion.h"
+#include "agent/helper/Conversion.h"
 
 namespace QV {
 namespace {

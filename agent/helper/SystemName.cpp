@@ -1,10 +1,10 @@
+#include <QV/ProviderHelper.h>
 #include <unistd.h>
 
 #include <array>
 #include <exception>
 
-#include "QV/ProviderHelper.h"
-#include "config/AgentConfiguration.h"
+#include "agent/config/AgentConfiguration.h"
 
 namespace QV {
 namespace {

@@ -1,4 +1,4 @@
-#include "QV/ProviderHelper.h"
+#include <QV/ProviderHelper.h>
 
 namespace QV {
 namespace {

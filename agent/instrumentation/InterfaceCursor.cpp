@@ -1,9 +1,9 @@
-#include "instrumentation/InterfaceCursor.h"
+#include "agent/instrumentation/InterfaceCursor.h"
 
 #include <stdexcept>
 #include <utility>
 
-#include "instrumentation/AddressValidation.h"
+#include "agent/processor/AddressValidation.h"
 
 namespace QV {
 namespace {

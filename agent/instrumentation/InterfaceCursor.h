@@ -2,14 +2,15 @@
 // which gathers the address and the mask of one change into one exchange with the processor.
 #pragma once
 
+#include <QV/Instrumentation.h>
+
 #include <cstddef>
 #include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
-#include "QV/Instrumentation.h"
-#include "instrumentation/BackEnd.h"
+#include "agent/processor/BackEnd.h"
 
 namespace QV {
 

@@ -1,4 +1,4 @@
-#include "log/Channel.h"
+#include "agent/log/Channel.h"
 
 #include <syslog.h>
 #include <unistd.h>

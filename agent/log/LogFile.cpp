@@ -1,4 +1,4 @@
-#include "log/LogFile.h"
+#include "agent/log/LogFile.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>

@@ -1,9 +1,9 @@
-#include "TWLog/TWLog.h"
+#include <TWLog/TWLog.h>
 
 #include <exception>
 #include <utility>
 
-#include "log/Channel.h"
+#include "agent/log/Channel.h"
 
 namespace TWLog {
 namespace {

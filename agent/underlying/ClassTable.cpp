@@ -1,10 +1,11 @@
-#include "underlying/ClassTable.h"
+#include "agent/underlying/ClassTable.h"
+
+#include <QV/ProviderHelper.h>
 
 #include <iterator>
 
-#include "QV/ProviderHelper.h"
-#include "instrumentation/SharedBackEnd.h"
-#include "underlying/Host.h"
+#include "agent/backends/SharedBackEnd.h"
+#include "agent/underlying/Host.h"
 
 namespace QV {
 namespace {

@@ -1,5 +1,6 @@
-#include "underlying/Host.h"
+#include "agent/underlying/Host.h"
 
+#include <QV/ProviderHelper.h>
 #include <arpa/inet.h>
 #include <ifaddrs.h>
 #include <net/if.h>
@@ -14,8 +15,6 @@
 #include <fstream>
 #include <memory>
 #include <sstream>
-
-#include "QV/ProviderHelper.h"
 
 namespace QV {
 namespace {

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "instrumentation/ManagementProcessor.h"
+#include "agent/processor/ManagementProcessor.h"
 
 namespace QV {
 

@@ -1,4 +1,4 @@
-#include "underlying/InstanceBuilders.h"
+#include "agent/underlying/InstanceBuilders.h"
 
 #include <optional>
 #include <utility>

@@ -3,9 +3,9 @@
 
 #include <sstream>
 
-#include "agent/support/Throws.h"
-#include "config/AgentConfiguration.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/config/AgentConfiguration.h"
+#include "tests/agent/support/Throws.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {

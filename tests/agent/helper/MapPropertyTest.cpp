@@ -1,3 +1,4 @@
+#include <QV/ProviderHelper.h>
 #include <gtest/gtest.h>
 
 #include <cstdint>
@@ -5,8 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "QV/ProviderHelper.h"
-#include "agent/helper/BrokerFixture.h"
+#include "tests/agent/helper/BrokerFixture.h"
 
 namespace QV {
 namespace {

@@ -1,11 +1,11 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "agent/instrumentation/RecordingBackEnd.h"
-#include "agent/support/Throws.h"
-#include "instrumentation/InterfaceCursor.h"
-#include "instrumentation/simulated/StateText.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/backends/simulated/StateText.h"
+#include "agent/instrumentation/InterfaceCursor.h"
+#include "tests/agent/instrumentation/RecordingBackEnd.h"
+#include "tests/agent/support/Throws.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "instrumentation/simulated/SimulatedBackEnd.h"
+#include "agent/backends/simulated/SimulatedBackEnd.h"
 
 namespace QV {
 

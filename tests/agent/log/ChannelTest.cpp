@@ -11,9 +11,9 @@
 #include <utility>
 #include <vector>
 
-#include "agent/support/AllocationCount.h"
-#include "log/Channel.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/log/Channel.h"
+#include "tests/agent/support/AllocationCount.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace {
 std::vector<std::pair<int, std::string>> sentToSyslog;

@@ -7,8 +7,8 @@
 #include <thread>
 #include <vector>
 
-#include "log/LogFile.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/log/LogFile.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace TWLog {
 namespace {

@@ -1,5 +1,6 @@
 // The logging library as its callers have it: the shared library behind its contract. agent.ini is read once in a
 // process, so each case that needs one of its own runs in a child.
+#include <TWLog/TWLog.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -9,8 +10,7 @@
 #include <thread>
 #include <vector>
 
-#include "TWLog/TWLog.h"
-#include "support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace {
 

@@ -1,4 +1,4 @@
-#include "agent/support/AllocationCount.h"
+#include "tests/agent/support/AllocationCount.h"
 
 #include <atomic>
 #include <cstdlib>

@@ -1,3 +1,4 @@
+#include <QV/ProviderHelper.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <net/if.h>
@@ -7,8 +8,7 @@
 #include <set>
 #include <sstream>
 
-#include "QV/ProviderHelper.h"
-#include "underlying/Host.h"
+#include "agent/underlying/Host.h"
 
 namespace QV {
 namespace {

@@ -1,8 +1,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "instrumentation/simulated/SimulatedBackEnd.h"
-#include "underlying/InstanceBuilders.h"
+#include "agent/backends/simulated/SimulatedBackEnd.h"
+#include "agent/underlying/InstanceBuilders.h"
 
 namespace QV {
 namespace {

@@ -1,5 +1,6 @@
 // The underlying provider as an object manager has it: the shared library behind its factory, loaded into a real
 // broker, on the simulated processor.
+#include <QV/Instrumentation.h>
 #include <cmpimacs.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -9,10 +10,9 @@
 #include <string>
 #include <vector>
 
-#include "QV/Instrumentation.h"
-#include "agent/support/AgentEnvironment.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
+#include "tests/agent/support/AgentEnvironment.h"
 
 extern "C" CMPIInstanceMI* UnderlyingIPConfigProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*,
                                                                         CMPIStatus*);

@@ -1,0 +1,53 @@
+// The LAN configuration parameters of a channel (IPMI 2.0, 23.1 and 23.2, table 23-4), as raw requests.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "agent/backends/ipmi/session/IpmiTransport.h"
+
+namespace QV::Ipmi {
+
+enum class LanParameter : std::uint8_t {
+  SetInProgress = 0,
+  IpAddress = 3,        // 4 bytes, network order
+  AddressSource = 4,    // low nibble, see AddressSource
+  MacAddress = 5,       // 6 bytes
+  SubnetMask = 6,       // 4 bytes, network order
+  DefaultGateway = 12,  // 4 bytes, network order
+  Ipv6StaticAddress = 56,
+  Ipv6DynamicAddress = 59
+};
+
+// Parameter 0.
+enum class SetProgress : std::uint8_t { Complete = 0, InProgress = 1, CommitWrite = 2 };
+
+// Parameter 4.
+enum class AddressSource : std::uint8_t { Unspecified = 0, Static = 1, Dhcp = 2, Bios = 3, Other = 4 };
+
+using Ipv4Octets = std::array<std::uint8_t, 4>;
+
+using ParameterData = std::vector<std::uint8_t>;
+
+// The data of a parameter, without the revision byte before it; nothing where the processor does not support the
+// parameter. Throws IpmiError that names channel and parameter where the processor refuses the request otherwise.
+std::optional<ParameterData> getParameter(IpmiTransport& transport, std::uint8_t channel, LanParameter parameter);
+
+// Writes a parameter; the answer's completion code is the caller's to judge.
+IpmiResponse setParameter(IpmiTransport& transport, std::uint8_t channel, LanParameter parameter,
+                          const ParameterData& data, Repetition repetition);
+
+// The leading octets of a parameter's data as an address; nothing where there are fewer than four.
+std::optional<Ipv4Octets> toOctets(const std::optional<ParameterData>& data);
+
+// Dotted decimal text to octets and back. The text has been validated; another is refused with std::invalid_argument.
+Ipv4Octets parseOctets(const std::string& text);
+std::string toText(const Ipv4Octets& octets);
+
+// "IP address", "subnet mask"
+std::string describe(LanParameter parameter);
+
+}  // namespace QV::Ipmi

@@ -1,0 +1,65 @@
+#include "agent/backends/simulated/SimulatedBackEnd.h"
+
+#include <algorithm>
+#include <stdexcept>
+
+#include "agent/backends/simulated/StateText.h"
+
+namespace QV {
+
+ManagementProcessor SimulatedBackEnd::read() {
+  if (const auto text = file_.read()) return parse(*text);
+  ManagementProcessor processor;
+  file_.update([&](const std::optional<std::string>& current) {
+    processor = current ? parse(*current) : factoryConfiguration();
+    return current ? *current : writeState(processor);
+  });
+  return processor;
+}
+
+void SimulatedBackEnd::change(const std::string& interfaceName, const AddressChange& change) {
+  file_.update([&](const std::optional<std::string>& current) {
+    ManagementProcessor processor = current ? parse(*current) : factoryConfiguration();
+    const auto interface =
+        std::find_if(processor.interfaces.begin(), processor.interfaces.end(),
+                     [&](const NetworkInterface& candidate) { return candidate.name == interfaceName; });
+    if (interface == processor.interfaces.end())
+      throw std::runtime_error(file_.path().string() + ": there is no interface '" + interfaceName + '\'');
+    if (change.ipv4Address) interface->ipv4Address = change.ipv4Address;
+    if (change.ipv4SubnetMask) interface->ipv4SubnetMask = change.ipv4SubnetMask;
+    interface->ipv4Origin = AddressOrigin::Static;
+    return writeState(processor);
+  });
+}
+
+ManagementProcessor SimulatedBackEnd::parse(const std::string& text) const {
+  try {
+    return parseState(text);
+  } catch (const std::runtime_error& error) {
+    throw std::runtime_error(file_.path().string() + ": " + error.what());
+  }
+}
+
+ManagementProcessor factoryConfiguration() {
+  NetworkInterface fixed;
+  fixed.name = "eth0";
+  fixed.macAddress = "02:00:00:00:00:01";
+  fixed.ipv4Address = "192.0.2.10";
+  fixed.ipv4SubnetMask = "255.255.255.0";
+  fixed.ipv4Gateway = "192.0.2.1";
+  fixed.ipv4Origin = AddressOrigin::Static;
+  fixed.ipv6Address = "2001:db8::10";
+  fixed.ipv6PrefixLength = std::uint8_t{64};
+  fixed.ipv6Origin = AddressOrigin::Static;
+
+  NetworkInterface leased;
+  leased.name = "eth1";
+  leased.macAddress = "02:00:00:00:00:02";
+  leased.ipv4Address = "198.51.100.23";
+  leased.ipv4SubnetMask = "255.255.255.0";
+  leased.ipv4Origin = AddressOrigin::Dhcp;
+
+  return {"BMC", "Simulated management processor", {"192.0.2.53", "2001:db8::53"}, {fixed, leased}};
+}
+
+}  // namespace QV
