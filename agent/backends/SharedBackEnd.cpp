@@ -14,37 +14,42 @@
 namespace QV {
 namespace {
 
-constexpr const char* ipmiLibrary = "libqvbmc-ipmi.so";
-
-// The IPMI back end lies beside this library; the plain name lets the loader's own search find it elsewhere.
-std::string ipmiLibraryPath() {
+// A back end's library lies beside this one; the plain name lets the loader's own search find it elsewhere.
+std::string pathOf(const std::string& libraryName) {
   Dl_info self{};
   if (::dladdr(reinterpret_cast<const void*>(&sharedBackEnd), &self) != 0 && self.dli_fname) {
-    const auto neighbour = std::filesystem::absolute(self.dli_fname).parent_path() / ipmiLibrary;
+    const auto neighbour = std::filesystem::absolute(self.dli_fname).parent_path() / libraryName;
     std::error_code unreadable;
-    if (std::filesystem::exists(neighbour, unreadable)) return neighbour;
+    if (std::filesystem::exists(neighbour, unreadable)) {
+      return neighbour;
+    }
   }
-  return ipmiLibrary;
+  return libraryName;
 }
 
-// Only an installation that talks IPMI needs the library behind it, which is why it is loaded and not linked.
-std::shared_ptr<BackEnd> loadIpmi(const BackEndSettings& settings) {
-  const std::shared_ptr<void> library(::dlopen(ipmiLibraryPath().c_str(), RTLD_NOW | RTLD_LOCAL),
+// Only an installation that uses a back end needs the libraries behind it, which is why it is loaded and not linked.
+std::shared_ptr<BackEnd> load(const std::string& name, const BackEndSettings& settings) {
+  const std::string libraryName = "libqvbmc-" + name + ".so";
+  const std::shared_ptr<void> library(::dlopen(pathOf(libraryName).c_str(), RTLD_NOW | RTLD_LOCAL),
                                       [](void* handle) { handle ? ::dlclose(handle) : 0; });
-  if (!library) throw std::runtime_error("the IPMI back end cannot be loaded: " + std::string(::dlerror()));
+  if (!library) {
+    throw std::runtime_error("the back end " + name + " cannot be loaded: " + ::dlerror() + "; install " + libraryName +
+                             ", or correct backend in [processor] of agent.ini");
+  }
   auto* create = reinterpret_cast<CreateBackEnd*>(::dlsym(library.get(), "qvCreateBackEnd"));
-  if (!create) throw std::runtime_error("the IPMI back end cannot be used: " + std::string(::dlerror()));
+  if (!create) {
+    throw std::runtime_error("the back end " + name + " cannot be used: " + ::dlerror());
+  }
   // The deleter holds the library, so its code outlives the object.
   return {create(settings), [library](BackEnd* backEnd) { delete backEnd; }};
 }
 
 std::shared_ptr<BackEnd> createBackEnd() {
   const AgentConfiguration configuration = readAgentConfiguration();
-  std::shared_ptr<BackEnd> backEnd;
-  if (configuration.backEnd == AgentConfiguration::BackEndKind::Ipmi)
-    backEnd = loadIpmi(configuration.ipmi);
-  else
-    backEnd = std::make_shared<SimulatedBackEnd>(configuration.simulatedState);
+  const BackEndSettings& settings = configuration.backEndSettings;
+  const std::shared_ptr<BackEnd> backEnd = configuration.backEnd == "simulated"
+                                               ? std::make_shared<SimulatedBackEnd>(parseSimulatedSettings(settings))
+                                               : load(configuration.backEnd, settings);
   return std::make_shared<NamedProcessor>(backEnd, configuration.processorName, configuration.processorDescription);
 }
 
@@ -54,7 +59,9 @@ std::shared_ptr<BackEnd> sharedBackEnd() {
   static std::mutex mutex;
   static std::shared_ptr<BackEnd> backEnd;
   const std::lock_guard lock(mutex);
-  if (!backEnd) backEnd = createBackEnd();
+  if (!backEnd) {
+    backEnd = createBackEnd();
+  }
   return backEnd;
 }
 

@@ -28,8 +28,8 @@ class BackEnd {
 // back end's constructor with a std::runtime_error that names it.
 using BackEndSettings = std::map<std::string, std::string>;
 
-// What a back end in a shared object of its own exports, with C linkage, under the name "qvCreateBackEnd". The caller
-// owns the result. Throws as a constructor does.
+// What the back end NAME exports from its library, libqvbmc-NAME.so, with C linkage, under the name "qvCreateBackEnd".
+// The caller owns the result. Throws as a constructor does.
 using CreateBackEnd = BackEnd*(const BackEndSettings& settings);
 
 }  // namespace QV

@@ -4,6 +4,7 @@
 #include <stdexcept>
 
 #include "agent/backends/simulated/StateText.h"
+#include "ground/Settings.h"
 
 namespace QV {
 
@@ -38,6 +39,18 @@ ManagementProcessor SimulatedBackEnd::parse(const std::string& text) const {
   } catch (const std::runtime_error& error) {
     throw std::runtime_error(file_.path().string() + ": " + error.what());
   }
+}
+
+std::string parseSimulatedSettings(const BackEndSettings& section) {
+  const Ground::Settings settings("agent.ini, [simulated]", section);
+  for (const auto& [key, value] : section) {
+    if (key != "state") {
+      settings.refuse(key, value, "there is no such key");
+    }
+  }
+  std::string state = "/var/lib/compositeipconfig/management-processor.json";
+  settings.absolutePath("state", state);
+  return state;
 }
 
 ManagementProcessor factoryConfiguration() {

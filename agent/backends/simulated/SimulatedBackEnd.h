@@ -24,6 +24,10 @@ class SimulatedBackEnd : public BackEnd {
   const StateFile file_;
 };
 
+// The state file that the section [simulated] names, or the usual one. Throws std::runtime_error that names the key and
+// what is wrong with it.
+std::string parseSimulatedSettings(const BackEndSettings& section);
+
 // What a new simulated processor has: an interface with static addresses, one that is configured by DHCP, and two name
 // servers, all of the address blocks that are set aside for documentation (RFC 5737, RFC 3849).
 ManagementProcessor factoryConfiguration();

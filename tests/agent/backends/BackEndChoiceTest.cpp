@@ -79,13 +79,13 @@ TEST_F(ABackEndChoice, passesOnWhyTheIpmiBackEndRefusesItsSettings) {
 TEST_F(ABackEndChoice, tellsWhyTheIpmiBackEndCannotBeLoaded) {
   Testing::writeFile(ipmi_, "no library");
   choose("[processor]\nbackend = ipmi\n");
-  expect(describe, "^the IPMI back end cannot be loaded: .*libqvbmc-ipmi.so: ");
+  expect(describe, "^the back end ipmi cannot be loaded: .*libqvbmc-ipmi.so: ");
 }
 
 TEST_F(ABackEndChoice, tellsThatALibraryIsNoBackEnd) {
   std::filesystem::copy_file(INSTRUMENTATION, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
-  expect(describe, "^the IPMI back end cannot be used: .*qvCreateBackEnd");
+  expect(describe, "^the back end ipmi cannot be used: .*qvCreateBackEnd");
 }
 
 TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
@@ -96,7 +96,15 @@ TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
         choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
         return first + "; then " + describe(sharedBackEnd);
       },
-      "agent.ini:2: .processor. backend: 'magic' is not one of simulated | ipmi; then BMC: Simulated");
+      "^the back end magic cannot be loaded: libqvbmc-magic.so: .*; install libqvbmc-magic.so, or correct backend in "
+      ".processor. of agent.ini; then BMC: Simulated");
+}
+
+TEST_F(ABackEndChoice, tellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
+  choose("[simulated]\nstate = here\n");
+  expect(describe, "^agent.ini, .simulated.: state = here: must be an absolute path$");
+  choose("[simulated]\nstatus = /here\n");
+  expect(describe, "^agent.ini, .simulated.: status = /here: there is no such key$");
 }
 
 TEST_F(ABackEndChoice, isMadeOnceAndShared) {

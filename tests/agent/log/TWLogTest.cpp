@@ -81,7 +81,7 @@ TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
     std::exit(0);
   };
   EXPECT_EXIT(report(), ExitedWithCode(0),
-              "^management agent: [^\n]*agent.ini:2: .log. destination: 'mail' is not one of [^\n]*; logging with the "
+              "^management agent: [^\n]*agent.ini:2: .log. destination = mail: must be one of [^\n]*; logging with the "
               "defaults\n$");
   ::unsetenv("QV_AGENT_INI");
 }

@@ -128,7 +128,7 @@ TEST_F(IpmiSettingsTest, RefuseBadValuesByNameAndReason) {
                         {"workarounds", "opensesspriv,magic", "must be one of authcap"},
                         {"channels", "0", "from 1 to 11"},
                         {"channels", "1,12", "from 1 to 11"},
-                        {"channels", ", ", "the list is empty"},
+                        {"channels", ", ", "must not be an empty list"},
                         {"ipv6", "both", "must be one of off, static, dynamic"},
                         {"operation_timeout", "0", "seconds from 0.1 to 60"},
                         {"operation_timeout", "nan", "seconds from 0.1 to 60"},
@@ -138,7 +138,7 @@ TEST_F(IpmiSettingsTest, RefuseBadValuesByNameAndReason) {
                         {"retransmission_timeout", "2", "seconds from 0.01 to 1.5"},
                         {"cache", "-1", "seconds from 0 to 60"},
                         {"generation_file", "generation", "must be an absolute path"},
-                        {"generation_file", "", "is missing"},
+                        {"generation_file", "", "must be an absolute path"},
                         {"password_file", "/nowhere/password", "cannot be read: No such file"}};
   for (const auto& [key, value, reason] : cases)
     EXPECT_THAT([&] { parseSettings(lan({{key, value}})); }, refusal(key, reason)) << key << " = " << value;

@@ -1,11 +1,11 @@
-// Reads INI text. It knows nothing of what the keys mean, nor of any other part of the project.
+// Reads INI text: agent.ini and cimomd's configuration file. It knows nothing of what the keys mean.
 #pragma once
 
 #include <functional>
 #include <istream>
 #include <string>
 
-namespace Cimom {
+namespace Ground {
 
 struct IniEntry {
   std::string section;  // empty before the first [section]
@@ -19,4 +19,4 @@ struct IniEntry {
 // the first line that is not INI, is too long, or for which `take` throws.
 void readIni(std::istream& text, const std::string& fileName, const std::function<void(const IniEntry&)>& take);
 
-}  // namespace Cimom
+}  // namespace Ground

@@ -5,11 +5,11 @@
 #include <stdexcept>
 #include <vector>
 
-#include "cimom/configuration/IniFile.h"
+#include "ground/IniFile.h"
 
 namespace {
 
-using namespace Cimom;
+using namespace Ground;
 using testing::ElementsAre;
 
 // "LINE [SECTION] KEY=VALUE" for every entry of the text.
@@ -49,11 +49,11 @@ TEST(IniFileTest, TakesAnIndentedLineForAKeyOfItsOwn) {
 TEST(IniFileTest, TakesTheLineEndsOfAnySystem) { EXPECT_THAT(entriesOf("a = 1\r\n\r\n"), ElementsAre("1 [] a=1")); }
 
 TEST(IniFileTest, NamesTheFirstLineThatIsWrong) {
-  EXPECT_EQ(complaintAbout("a = 1\nb\nbad = 1\n"), "test.ini:2: expected \"key = value\"");
-  EXPECT_EQ(complaintAbout("a = 1\n  b\n"), "test.ini:2: expected \"key = value\"");
+  EXPECT_EQ(complaintAbout("a = 1\nb\nbad = 1\n"), "test.ini:2: must be a [section] or a key = value");
+  EXPECT_EQ(complaintAbout("a = 1\n  b\n"), "test.ini:2: must be a [section] or a key = value");
   EXPECT_EQ(complaintAbout("a = 1\n  bad = 1\nb\n"), "test.ini:2: unknown key \"bad\"");
-  EXPECT_EQ(complaintAbout("a = 1\n[s\n"), "test.ini:2: expected \"key = value\"");
-  EXPECT_EQ(complaintAbout("\n# " + std::string(5000, 'x')), "test.ini:2: the line is longer than 199 characters");
+  EXPECT_EQ(complaintAbout("a = 1\n[s\n"), "test.ini:2: must be a [section] or a key = value");
+  EXPECT_EQ(complaintAbout("\n# " + std::string(5000, 'x')), "test.ini:2: the line is longer than 198 characters");
   EXPECT_EQ(complaintAbout(std::string("a = 1\nb = \0\n", 12)), "test.ini:2: the line contains a null character");
 }
 
