@@ -37,14 +37,12 @@ class InterfaceCursor {
   void flush();
 
  private:
-  void stageAddress(const std::string& address);
-  void sendWithMask(const std::string& mask);
-  void send(AddressChange change);
+  void send(const AddressChange& change);
 
   std::shared_ptr<BackEnd> backEnd_;
   std::vector<NetworkInterface> interfaces_;
   std::size_t position_ = 0;
-  std::optional<std::string> stagedAddress_;
+  std::optional<Ipv4Address> stagedAddress_;
 };
 
 }  // namespace QV

@@ -6,23 +6,25 @@
 #include <string>
 #include <vector>
 
+#include "agent/processor/Addresses.h"
+
 namespace QV {
 
 // Where an address comes from. The numbers are those of CIM_IPProtocolEndpoint.AddressOrigin (DMTF).
 enum class AddressOrigin : std::uint16_t { Unknown = 0, Static = 3, Dhcp = 4 };
 
-// One IP interface. Absent values are those that the processor does not have or does not tell.
+// One IP interface. Absent values are those that the processor does not have or does not report.
 struct NetworkInterface {
-  std::optional<std::string> name;        // the node name; absent where it cannot be read
-  std::optional<std::string> macAddress;  // "aa:bb:cc:dd:ee:ff"
+  std::optional<std::string> name;  // the node name; absent where it cannot be read
+  std::optional<MacAddress> macAddress;
   bool enabled = true;
 
-  std::optional<std::string> ipv4Address;     // dotted decimal
-  std::optional<std::string> ipv4SubnetMask;  // dotted decimal
-  std::optional<std::string> ipv4Gateway;     // dotted decimal
+  std::optional<Ipv4Address> ipv4Address;
+  std::optional<SubnetMask> ipv4SubnetMask;
+  std::optional<Ipv4Address> ipv4Gateway;
   AddressOrigin ipv4Origin = AddressOrigin::Unknown;
 
-  std::optional<std::string> ipv6Address;  // RFC 5952 text
+  std::optional<Ipv6Address> ipv6Address;
   std::optional<std::uint8_t> ipv6PrefixLength;
   AddressOrigin ipv6Origin = AddressOrigin::Unknown;
 
@@ -40,8 +42,8 @@ struct ManagementProcessor {
 
 // One change of an interface: applied as a whole or not at all. An absent value stays as it is.
 struct AddressChange {
-  std::optional<std::string> ipv4Address;
-  std::optional<std::string> ipv4SubnetMask;
+  std::optional<Ipv4Address> ipv4Address;
+  std::optional<SubnetMask> ipv4SubnetMask;
 };
 
 }  // namespace QV

@@ -10,7 +10,6 @@
 #include <algorithm>
 #include <array>
 #include <bit>
-#include <cstdio>
 #include <cstring>
 #include <fstream>
 #include <memory>
@@ -19,11 +18,8 @@
 namespace QV {
 namespace {
 
-template <typename Address>
-std::string textOf(int family, const Address& address) {
-  std::array<char, INET6_ADDRSTRLEN> text{};
-  return ::inet_ntop(family, &address, text.data(), text.size()) ? text.data() : "";
-}
+// The kernel holds an IPv4 address as a number whose octets lie in memory in network order.
+DottedDecimal::Octets octetsOf(in_addr_t address) { return std::bit_cast<DottedDecimal::Octets>(address); }
 
 template <typename SocketAddress>
 SocketAddress as(const sockaddr* address) {
@@ -39,10 +35,12 @@ void take(const ifaddrs& entry, NetworkInterface& interface) {
   if (!entry.ifa_addr) return;
   const int family = entry.ifa_addr->sa_family;
   if (family == AF_INET && !interface.ipv4Address) {
-    interface.ipv4Address = textOf(family, as<sockaddr_in>(entry.ifa_addr).sin_addr);
-    if (entry.ifa_netmask) interface.ipv4SubnetMask = textOf(family, as<sockaddr_in>(entry.ifa_netmask).sin_addr);
+    interface.ipv4Address = Ipv4Address(octetsOf(as<sockaddr_in>(entry.ifa_addr).sin_addr.s_addr));
+    if (entry.ifa_netmask) {
+      interface.ipv4SubnetMask = SubnetMask(octetsOf(as<sockaddr_in>(entry.ifa_netmask).sin_addr.s_addr));
+    }
   } else if (family == AF_INET6 && !interface.ipv6Address) {
-    interface.ipv6Address = textOf(family, as<sockaddr_in6>(entry.ifa_addr).sin6_addr);
+    interface.ipv6Address = Ipv6Address(std::bit_cast<Ipv6Address::Octets>(as<sockaddr_in6>(entry.ifa_addr).sin6_addr));
     if (entry.ifa_netmask) {
       int length = 0;
       for (const unsigned char byte : as<sockaddr_in6>(entry.ifa_netmask).sin6_addr.s6_addr)
@@ -51,11 +49,12 @@ void take(const ifaddrs& entry, NetworkInterface& interface) {
     }
   } else if (family == AF_PACKET) {
     const auto hardware = as<sockaddr_ll>(entry.ifa_addr);
-    if (hardware.sll_halen != 6) return;
-    std::array<char, 18> text{};
-    std::snprintf(text.data(), text.size(), "%02x:%02x:%02x:%02x:%02x:%02x", hardware.sll_addr[0], hardware.sll_addr[1],
-                  hardware.sll_addr[2], hardware.sll_addr[3], hardware.sll_addr[4], hardware.sll_addr[5]);
-    interface.macAddress = text.data();
+    MacAddress::Octets octets{};
+    if (hardware.sll_halen != octets.size()) {
+      return;
+    }
+    std::copy_n(hardware.sll_addr, octets.size(), octets.begin());
+    interface.macAddress = MacAddress(octets);
   }
 }
 
@@ -91,8 +90,8 @@ std::vector<std::string> parseResolverConfiguration(std::istream& text) {
   return servers;
 }
 
-std::map<std::string, std::string> parseDefaultGateways(std::istream& text) {
-  std::map<std::string, std::string> gateways;
+std::map<std::string, Ipv4Address> parseDefaultGateways(std::istream& text) {
+  std::map<std::string, Ipv4Address> gateways;
   for (std::string line; std::getline(text, line);) {
     std::istringstream words(line);
     std::string interface;
@@ -100,8 +99,9 @@ std::map<std::string, std::string> parseDefaultGateways(std::istream& text) {
     in_addr_t gateway = 0;
     unsigned flags = 0;
     const bool route = static_cast<bool>(words >> interface >> std::hex >> destination >> gateway >> flags);
-    // The kernel prints the addresses as the numbers that they are in memory.
-    if (route && destination == 0 && (flags & RTF_GATEWAY) != 0) gateways.emplace(interface, textOf(AF_INET, gateway));
+    if (route && destination == 0 && (flags & RTF_GATEWAY) != 0) {
+      gateways.emplace(interface, octetsOf(gateway));
+    }
   }
   return gateways;
 }

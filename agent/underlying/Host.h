@@ -17,6 +17,6 @@ ManagementProcessor readHost();
 std::vector<std::string> parseResolverConfiguration(std::istream& text);
 
 // The default gateways of a /proc/net/route, by interface.
-std::map<std::string, std::string> parseDefaultGateways(std::istream& text);
+std::map<std::string, Ipv4Address> parseDefaultGateways(std::istream& text);
 
 }  // namespace QV

@@ -42,10 +42,13 @@ const Versions& versionsOf(const NetworkInterface& interface) {
   return versionTable[std::size(versionTable) - 1];
 }
 
-template <typename Value>
-PropertyValue orNull(const std::optional<Value>& value) {
-  if (value) return *value;
-  return std::monostate{};
+PropertyValue orNull(const std::optional<std::uint8_t>& number) {
+  return number ? PropertyValue(*number) : std::monostate{};
+}
+
+template <typename Address>
+PropertyValue orNull(const std::optional<Address>& address) {
+  return address ? PropertyValue(address->text()) : std::monostate{};
 }
 
 std::uint16_t number(AddressOrigin origin) { return static_cast<std::uint16_t>(origin); }
@@ -150,8 +153,8 @@ Instances remoteAccessPoints(const System& system) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
     if (interface.name && interface.ipv4Gateway)
-      instances.push_back(
-          accessPoint(system, "Gateway:" + *interface.name, accessContextDefaultGateway, *interface.ipv4Gateway));
+      instances.push_back(accessPoint(system, "Gateway:" + *interface.name, accessContextDefaultGateway,
+                                      interface.ipv4Gateway->text()));
   }
   int position = 0;
   for (const std::string& server : system.configuration.dnsServers)

@@ -27,9 +27,9 @@ void changeOrSayNothingWasChanged(IpmiProcessor& processor, Deadline deadline, c
 
 std::string describe(const std::string& name, const AddressChange& change) {
   std::string text = "change of " + name;
-  if (change.ipv4Address) text += " to IP address " + *change.ipv4Address;
+  if (change.ipv4Address) text += " to IP address " + change.ipv4Address->text();
   if (change.ipv4SubnetMask)
-    text += (change.ipv4Address ? ", subnet mask " : " to subnet mask ") + *change.ipv4SubnetMask;
+    text += (change.ipv4Address ? ", subnet mask " : " to subnet mask ") + change.ipv4SubnetMask->text();
   return text;
 }
 

@@ -56,20 +56,20 @@ std::string parseSimulatedSettings(const BackEndSettings& section) {
 ManagementProcessor factoryConfiguration() {
   NetworkInterface fixed;
   fixed.name = "eth0";
-  fixed.macAddress = "02:00:00:00:00:01";
-  fixed.ipv4Address = "192.0.2.10";
-  fixed.ipv4SubnetMask = "255.255.255.0";
-  fixed.ipv4Gateway = "192.0.2.1";
+  fixed.macAddress = MacAddress::parse("02:00:00:00:00:01").value();
+  fixed.ipv4Address = Ipv4Address({192, 0, 2, 10});
+  fixed.ipv4SubnetMask = SubnetMask({255, 255, 255, 0});
+  fixed.ipv4Gateway = Ipv4Address({192, 0, 2, 1});
   fixed.ipv4Origin = AddressOrigin::Static;
-  fixed.ipv6Address = "2001:db8::10";
+  fixed.ipv6Address = Ipv6Address::parse("2001:db8::10").value();
   fixed.ipv6PrefixLength = std::uint8_t{64};
   fixed.ipv6Origin = AddressOrigin::Static;
 
   NetworkInterface leased;
   leased.name = "eth1";
-  leased.macAddress = "02:00:00:00:00:02";
-  leased.ipv4Address = "198.51.100.23";
-  leased.ipv4SubnetMask = "255.255.255.0";
+  leased.macAddress = MacAddress::parse("02:00:00:00:00:02").value();
+  leased.ipv4Address = Ipv4Address({198, 51, 100, 23});
+  leased.ipv4SubnetMask = SubnetMask({255, 255, 255, 0});
   leased.ipv4Origin = AddressOrigin::Dhcp;
 
   return {"BMC", "Simulated management processor", {"192.0.2.53", "2001:db8::53"}, {fixed, leased}};

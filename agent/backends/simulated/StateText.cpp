@@ -1,7 +1,5 @@
 #include "agent/backends/simulated/StateText.h"
 
-#include <arpa/inet.h>
-
 #include <initializer_list>
 #include <limits>
 #include <nlohmann/json.hpp>
@@ -9,7 +7,7 @@
 #include <stdexcept>
 #include <utility>
 
-#include "agent/processor/AddressValidation.h"
+#include "agent/processor/Addresses.h"
 
 namespace QV {
 namespace {
@@ -64,18 +62,14 @@ class Fields {
     return value;
   }
 
-  std::optional<std::string> ipv4(const char* name) const {
+  template <typename Address>
+  std::optional<Address> address(const char* name, const char* kind) const {
     const auto value = optionalText(name);
-    if (value && !parseIpv4(*value)) refuse(name, "is not a dotted IPv4 address: '" + *value + '\'');
-    return value;
-  }
-
-  std::optional<std::string> ipv6(const char* name) const {
-    const auto value = optionalText(name);
-    in6_addr parsed{};
-    if (value && ::inet_pton(AF_INET6, value->c_str(), &parsed) != 1)
-      refuse(name, "is not an IPv6 address: '" + *value + '\'');
-    return value;
+    const auto parsed = value ? Address::parse(*value) : std::nullopt;
+    if (value && !parsed) {
+      refuse(name, "is not " + std::string(kind) + ": '" + *value + '\'');
+    }
+    return parsed;
   }
 
   std::optional<std::uint8_t> prefixLength(const char* name) const {
@@ -107,6 +101,7 @@ class Fields {
 };
 
 NetworkInterface parseInterface(const Json& json, const std::string& path) {
+  constexpr const char* dotted = "a dotted IPv4 address";
   const Fields fields(json, path, {"name", "macAddress", "enabled", "ipv4", "ipv6"});
   const Fields ipv4(fields.required("ipv4"), fields.pathOf("ipv4"), {"origin", "address", "subnetMask", "gateway"});
   const Fields ipv6(fields.required("ipv6"), fields.pathOf("ipv6"), {"origin", "address", "prefixLength"});
@@ -115,23 +110,24 @@ NetworkInterface parseInterface(const Json& json, const std::string& path) {
   // The name becomes a field of identifiers that are separated by colons.
   if (interface.name && (interface.name->empty() || interface.name->find(':') != std::string::npos))
     fields.refuse("name", "is empty or holds a colon: '" + *interface.name + '\'');
-  interface.macAddress = fields.optionalText("macAddress");
+  interface.macAddress = fields.address<MacAddress>("macAddress", "a MAC address");
   interface.enabled = fields.boolean("enabled");
-  interface.ipv4Address = ipv4.ipv4("address");
-  interface.ipv4SubnetMask = ipv4.ipv4("subnetMask");
-  interface.ipv4Gateway = ipv4.ipv4("gateway");
+  interface.ipv4Address = ipv4.address<Ipv4Address>("address", dotted);
+  interface.ipv4SubnetMask = ipv4.address<SubnetMask>("subnetMask", dotted);
+  interface.ipv4Gateway = ipv4.address<Ipv4Address>("gateway", dotted);
   interface.ipv4Origin = ipv4.origin("origin");
-  interface.ipv6Address = ipv6.ipv6("address");
+  interface.ipv6Address = ipv6.address<Ipv6Address>("address", "an IPv6 address");
   interface.ipv6PrefixLength = ipv6.prefixLength("prefixLength");
   interface.ipv6Origin = ipv6.origin("origin");
   return interface;
 }
 
 std::string parseDnsServer(const Json& json, const std::string& path) {
-  in6_addr parsed{};
   if (json.is_string()) {
     const auto server = json.get<std::string>();
-    if (parseIpv4(server) || ::inet_pton(AF_INET6, server.c_str(), &parsed) == 1) return server;
+    if (Ipv4Address::parse(server) || Ipv6Address::parse(server)) {
+      return server;
+    }
   }
   throw std::runtime_error("the field " + path + " is not an IP address");
 }
@@ -158,7 +154,16 @@ ManagementProcessor parseProcessor(const Json& json) {
 
 template <typename Value>
 void put(Json& object, const char* name, const std::optional<Value>& value) {
-  if (value) object[name] = *value;
+  if (value) {
+    object[name] = *value;
+  }
+}
+
+template <typename Address>
+void putAddress(Json& object, const char* name, const std::optional<Address>& address) {
+  if (address) {
+    object[name] = address->text();
+  }
 }
 
 const char* wordOf(AddressOrigin origin) {
@@ -171,16 +176,16 @@ const char* wordOf(AddressOrigin origin) {
 Json write(const NetworkInterface& interface) {
   Json json = Json::object();
   put(json, "name", interface.name);
-  put(json, "macAddress", interface.macAddress);
+  putAddress(json, "macAddress", interface.macAddress);
   json["enabled"] = interface.enabled;
   Json& ipv4 = json["ipv4"] = Json::object();
   ipv4["origin"] = wordOf(interface.ipv4Origin);
-  put(ipv4, "address", interface.ipv4Address);
-  put(ipv4, "subnetMask", interface.ipv4SubnetMask);
-  put(ipv4, "gateway", interface.ipv4Gateway);
+  putAddress(ipv4, "address", interface.ipv4Address);
+  putAddress(ipv4, "subnetMask", interface.ipv4SubnetMask);
+  putAddress(ipv4, "gateway", interface.ipv4Gateway);
   Json& ipv6 = json["ipv6"] = Json::object();
   ipv6["origin"] = wordOf(interface.ipv6Origin);
-  put(ipv6, "address", interface.ipv6Address);
+  putAddress(ipv6, "address", interface.ipv6Address);
   put(ipv6, "prefixLength", interface.ipv6PrefixLength);
   return json;
 }

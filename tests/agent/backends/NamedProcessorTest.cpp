@@ -3,6 +3,7 @@
 
 #include "agent/backends/NamedProcessor.h"
 #include "tests/agent/instrumentation/RecordingBackEnd.h"
+#include "tests/agent/support/Addresses.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
@@ -25,7 +26,7 @@ TEST(NamedProcessor, keepsItsOwnNamesWhereNoneIsGiven) {
 TEST(NamedProcessor, passesChangesOn) {
   const Testing::TemporaryDirectory directory;
   const auto inner = std::make_shared<RecordingBackEnd>(directory / "state");
-  NamedProcessor(inner, "a", "b").change("eth1", {"192.0.2.99", {}});
+  NamedProcessor(inner, "a", "b").change("eth1", {ipv4("192.0.2.99"), {}});
   EXPECT_THAT(inner->changes, testing::ElementsAre("eth1 192.0.2.99 -"));
   EXPECT_EQ(inner->read().name, factoryConfiguration().name) << "the given name is not written to the processor";
 }

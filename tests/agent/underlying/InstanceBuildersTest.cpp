@@ -3,6 +3,7 @@
 
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/underlying/InstanceBuilders.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace QV {
 namespace {
@@ -88,7 +89,7 @@ TEST(ProtocolEndpoints, tellThatAnInterfaceIsDisabled) {
 TEST(ProtocolEndpoints, tellAnInterfaceOfIpv6Alone) {
   NetworkInterface interface;
   interface.name = "eth2";
-  interface.ipv6Address = "2001:db8::2";
+  interface.ipv6Address = ipv6("2001:db8::2");
   interface.ipv6Origin = AddressOrigin::Dhcp;
   EXPECT_EQ(endpointProperty(interface, "AddressType"), "AddressType=2u16");
   EXPECT_EQ(endpointProperty(interface, "IPVersionSupport"), "IPVersionSupport=2u16");

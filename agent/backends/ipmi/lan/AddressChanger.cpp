@@ -14,7 +14,7 @@ constexpr std::chrono::milliseconds betweenLooks{100};
 // Whether the address is one that was neither there nor written by us: another client's, whose change must stand. A
 // processor that mangles what it applies shows none.
 bool isAnothers(const AddressSettings& present, const AddressSettings& earlier, const AddressSettings& wanted) {
-  return present.address && *present.address != Ipv4Octets{} && present.address != earlier.address &&
+  return present.address && !present.address->isZero() && present.address != earlier.address &&
          present.address != wanted.address;
 }
 

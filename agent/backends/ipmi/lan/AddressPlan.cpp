@@ -11,7 +11,7 @@ std::string sourceText(std::uint8_t source) {
 std::string valueText(LanParameter parameter, const std::optional<ParameterData>& value) {
   if (!value) return "not told";
   if (parameter == LanParameter::AddressSource) return sourceText(value->front());
-  return toText(*toOctets(value));
+  return toAddress<Ipv4Address>(value)->text();
 }
 
 std::optional<ParameterData> data(const std::optional<AddressSource>& source) {
@@ -19,9 +19,12 @@ std::optional<ParameterData> data(const std::optional<AddressSource>& source) {
   return ParameterData{static_cast<std::uint8_t>(*source)};
 }
 
-std::optional<ParameterData> data(const std::optional<Ipv4Octets>& octets) {
-  if (!octets) return std::nullopt;
-  return ParameterData(octets->begin(), octets->end());
+template <typename Address>
+std::optional<ParameterData> data(const std::optional<Address>& address) {
+  if (!address) {
+    return std::nullopt;
+  }
+  return toData(*address);
 }
 
 struct Row {
@@ -36,8 +39,9 @@ std::vector<Row> compare(const AddressSettings& from, const AddressSettings& to)
           {LanParameter::SubnetMask, data(from.mask), data(to.mask)}};
 }
 
-void requireSet(const std::optional<Ipv4Octets>& octets, const std::string& what) {
-  if (octets == Ipv4Octets{})
+template <typename Address>
+void requireSet(const std::optional<Address>& address, const std::string& what) {
+  if (address && address->isZero())
     throw IpmiError("the interface has no " + what + " yet: give address and mask in one change");
 }
 
@@ -47,16 +51,16 @@ AddressSettings readAddressSettings(IpmiTransport& transport, std::uint8_t chann
   AddressSettings settings;
   if (const auto source = getParameter(transport, channel, LanParameter::AddressSource); source && !source->empty())
     settings.source = static_cast<AddressSource>(source->front() & 0x0F);
-  settings.address = toOctets(getParameter(transport, channel, LanParameter::IpAddress));
-  settings.mask = toOctets(getParameter(transport, channel, LanParameter::SubnetMask));
+  settings.address = toAddress<Ipv4Address>(getParameter(transport, channel, LanParameter::IpAddress));
+  settings.mask = toAddress<SubnetMask>(getParameter(transport, channel, LanParameter::SubnetMask));
   return settings;
 }
 
 AddressSettings withChange(const AddressSettings& present, const AddressChange& change) {
   AddressSettings wanted = present;
   wanted.source = AddressSource::Static;
-  if (change.ipv4Address) wanted.address = parseOctets(*change.ipv4Address);
-  if (change.ipv4SubnetMask) wanted.mask = parseOctets(*change.ipv4SubnetMask);
+  if (change.ipv4Address) wanted.address = change.ipv4Address;
+  if (change.ipv4SubnetMask) wanted.mask = change.ipv4SubnetMask;
   requireSet(wanted.address, "IP address");
   requireSet(wanted.mask, "subnet mask");
   return wanted;

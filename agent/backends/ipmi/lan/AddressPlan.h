@@ -14,8 +14,8 @@ namespace QV::Ipmi {
 // What a channel's static address is made of; absent is what the processor does not support.
 struct AddressSettings {
   std::optional<AddressSource> source;
-  std::optional<Ipv4Octets> address;
-  std::optional<Ipv4Octets> mask;
+  std::optional<Ipv4Address> address;
+  std::optional<SubnetMask> mask;
 
   bool operator==(const AddressSettings&) const = default;
 };

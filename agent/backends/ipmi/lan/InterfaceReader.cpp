@@ -1,11 +1,6 @@
 #include "agent/backends/ipmi/lan/InterfaceReader.h"
 
-#include <arpa/inet.h>
-
-#include <algorithm>
-#include <array>
 #include <charconv>
-#include <cstdio>
 
 #include "agent/backends/ipmi/lan/LanParameters.h"
 
@@ -14,19 +9,10 @@ namespace {
 
 constexpr std::string_view namePrefix = "lan";
 
-std::optional<std::string> address(const std::optional<ParameterData>& data) {
-  const auto octets = toOctets(data);
-  if (!octets || *octets == Ipv4Octets{}) return std::nullopt;
-  return toText(*octets);
-}
-
-std::optional<std::string> macAddress(const std::optional<ParameterData>& data) {
-  if (!data || data->size() < 6) return std::nullopt;
-  const ParameterData& bytes = *data;
-  std::array<char, sizeof "aa:bb:cc:dd:ee:ff"> text;
-  std::snprintf(text.data(), text.size(), "%02x:%02x:%02x:%02x:%02x:%02x", bytes[0], bytes[1], bytes[2], bytes[3],
-                bytes[4], bytes[5]);
-  return text.data();
+template <typename Address>
+std::optional<Address> addressIn(const std::optional<ParameterData>& data) {
+  const auto address = toAddress<Address>(data);
+  return address && address->isZero() ? std::nullopt : address;
 }
 
 AddressOrigin origin(const std::optional<ParameterData>& data) {
@@ -49,11 +35,11 @@ void readIpv6(const ParameterData& data, Ipv6Choice choice, NetworkInterface& in
   if (data.size() <= prefixAt) return;
   const std::uint8_t source = data[sourceAt];
   if (choice == Ipv6Choice::Static && (source & enabled) == 0) return;
-  const auto first = data.begin() + addressAt;
-  if (std::all_of(first, first + 16, [](std::uint8_t byte) { return byte == 0; })) return;
-  std::array<char, INET6_ADDRSTRLEN> text;
-  ::inet_ntop(AF_INET6, data.data() + addressAt, text.data(), text.size());
-  interface.ipv6Address = text.data();
+  const auto address = toAddress<Ipv6Address>(data, addressAt);
+  if (!address || address->isZero()) {
+    return;
+  }
+  interface.ipv6Address = address;
   interface.ipv6PrefixLength = data[prefixAt];
   if (choice == Ipv6Choice::Static)
     interface.ipv6Origin = AddressOrigin::Static;
@@ -74,10 +60,10 @@ NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, I
 
   NetworkInterface interface;
   interface.name = interfaceName(channel);
-  interface.macAddress = macAddress(mac);
-  interface.ipv4Address = address(ipv4);
-  interface.ipv4SubnetMask = address(mask);
-  interface.ipv4Gateway = address(get(LanParameter::DefaultGateway));
+  interface.macAddress = toAddress<MacAddress>(mac);
+  interface.ipv4Address = addressIn<Ipv4Address>(ipv4);
+  interface.ipv4SubnetMask = addressIn<SubnetMask>(mask);
+  interface.ipv4Gateway = addressIn<Ipv4Address>(get(LanParameter::DefaultGateway));
   interface.ipv4Origin = origin(source);
   if (ipv6 != Ipv6Choice::Off) {
     const bool fixed = ipv6 == Ipv6Choice::Static;

@@ -1,11 +1,8 @@
 #include "agent/backends/ipmi/lan/LanParameters.h"
 
-#include <algorithm>
 #include <map>
-#include <stdexcept>
 
 #include "agent/backends/ipmi/lan/CompletionCode.h"
-#include "agent/processor/AddressValidation.h"
 
 namespace QV::Ipmi {
 namespace {
@@ -41,26 +38,6 @@ IpmiResponse setParameter(IpmiTransport& transport, std::uint8_t channel, LanPar
   ParameterData request = {channel, static_cast<std::uint8_t>(parameter)};
   request.insert(request.end(), data.begin(), data.end());
   return transport.send({NetworkFunction::Transport, setLanConfigurationParameters, request}, repetition);
-}
-
-std::optional<Ipv4Octets> toOctets(const std::optional<ParameterData>& data) {
-  Ipv4Octets octets;
-  if (!data || data->size() < octets.size()) return std::nullopt;
-  std::copy_n(data->begin(), octets.size(), octets.begin());
-  return octets;
-}
-
-Ipv4Octets parseOctets(const std::string& text) {
-  const auto number = parseIpv4(text);
-  if (!number) throw std::invalid_argument('\'' + text + "' is no dotted decimal IPv4 address");
-  const auto octet = [&](int shift) { return static_cast<std::uint8_t>(*number >> shift); };
-  return {octet(24), octet(16), octet(8), octet(0)};
-}
-
-std::string toText(const Ipv4Octets& octets) {
-  std::string text;
-  for (const std::uint8_t octet : octets) text += (text.empty() ? "" : ".") + std::to_string(octet);
-  return text;
 }
 
 std::string describe(LanParameter parameter) {

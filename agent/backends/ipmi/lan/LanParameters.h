@@ -1,13 +1,15 @@
 // The LAN configuration parameters of a channel (IPMI 2.0, 23.1 and 23.2, table 23-4), as raw requests.
 #pragma once
 
-#include <array>
+#include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <optional>
 #include <string>
 #include <vector>
 
 #include "agent/backends/ipmi/session/IpmiTransport.h"
+#include "agent/processor/Addresses.h"
 
 namespace QV::Ipmi {
 
@@ -28,8 +30,6 @@ enum class SetProgress : std::uint8_t { Complete = 0, InProgress = 1, CommitWrit
 // Parameter 4.
 enum class AddressSource : std::uint8_t { Unspecified = 0, Static = 1, Dhcp = 2, Bios = 3, Other = 4 };
 
-using Ipv4Octets = std::array<std::uint8_t, 4>;
-
 using ParameterData = std::vector<std::uint8_t>;
 
 // The data of a parameter, without the revision byte before it; nothing where the processor does not support the
@@ -40,12 +40,18 @@ std::optional<ParameterData> getParameter(IpmiTransport& transport, std::uint8_t
 IpmiResponse setParameter(IpmiTransport& transport, std::uint8_t channel, LanParameter parameter,
                           const ParameterData& data, Repetition repetition);
 
-// The leading octets of a parameter's data as an address; nothing where there are fewer than four.
-std::optional<Ipv4Octets> toOctets(const std::optional<ParameterData>& data);
+// The octets of a parameter's data as an address, nothing where there are fewer; and the address as a parameter's data.
+template <typename Address>
+std::optional<Address> toAddress(const std::optional<ParameterData>& data, std::size_t first = 0) {
+  typename Address::Octets octets{};
+  if (!data || data->size() < first + octets.size()) {
+    return std::nullopt;
+  }
+  std::copy_n(data->begin() + static_cast<std::ptrdiff_t>(first), octets.size(), octets.begin());
+  return Address(octets);
+}
 
-// Dotted decimal text to octets and back. The text has been validated; another is refused with std::invalid_argument.
-Ipv4Octets parseOctets(const std::string& text);
-std::string toText(const Ipv4Octets& octets);
+inline ParameterData toData(const DottedDecimal& address) { return {address.octets().begin(), address.octets().end()}; }
 
 // "IP address", "subnet mask"
 std::string describe(LanParameter parameter);

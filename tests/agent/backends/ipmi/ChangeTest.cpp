@@ -8,6 +8,7 @@
 #include "agent/backends/ipmi/IpmiBackEnd.h"
 #include "tests/agent/backends/ipmi/RecordedLog.h"
 #include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace {
 
@@ -22,7 +23,7 @@ using testing::ThrowsMessage;
 
 auto refusal(const std::string& text) { return ThrowsMessage<std::runtime_error>(HasSubstr(text)); }
 
-const AddressChange bothValues{"192.0.2.77", "255.255.255.128"};
+const AddressChange bothValues{QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")};
 
 class IpmiChange : public testing::TestWithParam<SimulatedBmc::Personality> {};
 
@@ -40,17 +41,17 @@ TEST_P(IpmiChange, IsWhatAnotherClientSeesAndWhatTheNextReadShows) {
   EXPECT_EQ(bmc.witness("IP Address Source"), "Static Address");
   EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
   const auto interface = backEnd.read().interfaces.at(0);
-  EXPECT_EQ(interface.ipv4Address, "192.0.2.77");
-  EXPECT_EQ(interface.ipv4SubnetMask, "255.255.255.128");
+  EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.77"));
+  EXPECT_EQ(interface.ipv4SubnetMask, QV::mask("255.255.255.128"));
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Static);
 }
 
 TEST_P(IpmiChange, OfTheAddressLeavesTheMask) {
   const SimulatedBmc bmc(GetParam());
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
-  backEnd.change("lan1", {"192.0.2.76", "255.255.255.0"});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.76"), QV::mask("255.255.255.0")});
 
-  backEnd.change("lan1", {"192.0.2.77", std::nullopt});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), std::nullopt});
 
   EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
   EXPECT_EQ(bmc.witness("Subnet Mask"), "255.255.255.0");
@@ -74,19 +75,19 @@ TEST(IpmiChangeAmongReaders, IsSeenAsAWholeOrNotAtAll) {
       int mixed = 0;
       while (!ended) {
         const auto interface = backEnd.read().interfaces.at(0);
-        const bool changed = interface.ipv4Address == "192.0.2.77";
-        mixed += changed != (interface.ipv4SubnetMask == "255.255.255.128");
+        const bool changed = interface.ipv4Address == QV::ipv4("192.0.2.77");
+        mixed += changed != (interface.ipv4SubnetMask == QV::mask("255.255.255.128"));
       }
       return mixed;
     }));
 
   backEnd.change("lan1", bothValues);
-  backEnd.change("lan1", {"192.0.2.10", "255.255.255.0"});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.10"), QV::mask("255.255.255.0")});
   backEnd.change("lan1", bothValues);
 
   ended = true;
   for (auto& reader : readers) EXPECT_EQ(reader.get(), 0);
-  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, "192.0.2.77");
+  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.77"));
 }
 
 TEST(IpmiChangeRefused, ForAnInterfaceThatIsNotThere) {
@@ -147,7 +148,7 @@ TEST(IpmiChangeRefused, WhereTheBmcAcceptsAndDoesNotApply) {
 TEST(IpmiChangeRefused, WhereTheBmcAppliesAPartPutsTheEarlierValuesBack) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
-  backEnd.change("lan1", {"192.0.2.20", "255.255.255.0"});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.20"), QV::mask("255.255.255.0")});
   // Once the address alone: the script's second argument is its value.
   bmc.hook("set", "sed -i \"s/^ip_addr=.*/ip_addr=$2/\" \"$(dirname \"$0\")/lan.state\"; rm \"$0\"; exit 1");
 

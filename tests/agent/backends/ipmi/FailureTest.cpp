@@ -9,6 +9,7 @@
 #include "tests/agent/backends/ipmi/RecordedLog.h"
 #include "tests/agent/backends/ipmi/SimulatedBmc.h"
 #include "tests/agent/backends/ipmi/UdpRelay.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace {
 
@@ -22,7 +23,7 @@ using testing::HasSubstr;
 using testing::ThrowsMessage;
 using namespace std::chrono_literals;
 
-const AddressChange bothValues{"192.0.2.77", "255.255.255.128"};
+const AddressChange bothValues{QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")};
 
 auto refusal(const std::string& text) { return ThrowsMessage<std::runtime_error>(HasSubstr(text)); }
 
@@ -99,7 +100,7 @@ TEST(IpmiFailure, OfASessionThatTheBmcForgotIsNotSeen) {
   bmc.kill();
   bmc.restart();
 
-  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, "192.0.2.10");
+  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
 }
 
 TEST(IpmiFailure, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {

@@ -3,6 +3,7 @@
 
 #include "agent/backends/ipmi/IpmiBackEnd.h"
 #include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace {
 
@@ -20,10 +21,10 @@ TEST(IpmiRead, ShowsWhatTheBmcHas) {
   ASSERT_EQ(processor.interfaces.size(), 1u);
   const auto& interface = processor.interfaces[0];
   EXPECT_EQ(interface.name, "lan1");
-  EXPECT_EQ(interface.macAddress, "02:00:00:00:00:01");
-  EXPECT_EQ(interface.ipv4Address, "192.0.2.10");
-  EXPECT_EQ(interface.ipv4SubnetMask, "255.255.255.0");
-  EXPECT_EQ(interface.ipv4Gateway, "192.0.2.1");
+  EXPECT_EQ(interface.macAddress, QV::mac("02:00:00:00:00:01"));
+  EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.10"));
+  EXPECT_EQ(interface.ipv4SubnetMask, QV::mask("255.255.255.0"));
+  EXPECT_EQ(interface.ipv4Gateway, QV::ipv4("192.0.2.1"));
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Dhcp);
   EXPECT_TRUE(interface.enabled);
   EXPECT_EQ(interface.ipv6Address, std::nullopt) << "the simulator does not support IPv6 parameters";
@@ -44,13 +45,13 @@ TEST(IpmiRead, ShowsNoAddressWhereItIsZero) {
 TEST(IpmiRead, ShowsWhatAnotherClientChanged) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
-  ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, "192.0.2.10");
+  ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
 
   bmc.ipmitool({"lan", "set", "1", "ipsrc", "static"});
   bmc.ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.44"});
 
   const auto interface = backEnd.read().interfaces.at(0);
-  EXPECT_EQ(interface.ipv4Address, "192.0.2.44");
+  EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.44"));
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Static);
 }
 
@@ -59,11 +60,11 @@ TEST(IpmiRead, KeepsASnapshotForTheCacheTime) {
   auto settings = parseSettings(bmc.settings());
   settings.cache = std::chrono::minutes(1);
   IpmiBackEnd backEnd(settings);
-  ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, "192.0.2.10");
+  ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
 
   bmc.ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.44"});
 
-  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, "192.0.2.10");
+  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
 }
 
 TEST(IpmiRead, FindsTheSameChannelHoweverItLooks) {

@@ -10,6 +10,7 @@
 #include "tests/agent/backends/ipmi/RecordedLog.h"
 #include "tests/agent/backends/ipmi/SimulatedBmc.h"
 #include "tests/agent/backends/ipmi/UdpRelay.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace {
 
@@ -65,7 +66,7 @@ class IpmiRoundTripsWithAnother : public testing::Test {
   // What the next read costs, and whether it shows the address.
   unsigned requestsOfRead(const std::string& address) {
     wire.reset();
-    EXPECT_EQ(reader.read().interfaces.at(0).ipv4Address, address);
+    EXPECT_EQ(reader.read().interfaces.at(0).ipv4Address, QV::ipv4(address));
     return wire.requests();
   }
 
@@ -79,18 +80,18 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixAfterItsChangeAndThenNone) {
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
 
-  writer.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
 
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
 }
 
 TEST_F(IpmiRoundTripsWithAnother, AreNoneWhereItHadNothingToWrite) {
-  writer.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 12u);
 
-  writer.change("lan1", {"192.0.2.77", "255.255.255.128"});
-  EXPECT_THROW(writer.change("lan2", {"192.0.2.78", "255.255.255.128"}), std::runtime_error);
+  writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+  EXPECT_THROW(writer.change("lan2", {QV::ipv4("192.0.2.78"), QV::mask("255.255.255.128")}), std::runtime_error);
 
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
 }
@@ -99,7 +100,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixAfterAChangeThatTheBmcRefused) {
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
 
   bmc.hook("check", "exit 1");
-  EXPECT_THROW(writer.change("lan1", {"192.0.2.77", "255.255.255.128"}), std::runtime_error);
+  EXPECT_THROW(writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")}), std::runtime_error);
 
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
 }
@@ -114,7 +115,9 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixOnceWhileItsChangeIsUnderWayAndOnceWhenI
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
   slowWire.reset();
   slowWire.cutAtRequest(firstWrite);
-  auto change = std::async(std::launch::async, [&] { slowWriter.change("lan1", {"192.0.2.77", "255.255.255.128"}); });
+  auto change = std::async(std::launch::async, [&] {
+    slowWriter.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+  });
   const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
   while (slowWire.requests() < firstWrite && std::chrono::steady_clock::now() < deadline) {
     std::this_thread::yield();
@@ -157,7 +160,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
   const auto inTime = [&] { return std::chrono::steady_clock::now() < deadline; };
   readBroken();
   brokenWire.cutAtRequest(7);
-  EXPECT_NE(failureOf([&] { brokenWriter.change("lan1", {"192.0.2.77", "255.255.255.128"}); }), "");
+  EXPECT_NE(failureOf([&] { brokenWriter.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")}); }), "");
   while (readBroken().find("gives no session") == std::string::npos && inTime()) {
   }
   ASSERT_EQ(bmc.witness("Set in Progress"), "Set In Progress");
@@ -200,7 +203,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixAfterTheChangeOfOneThatCachesNothingItse
   IpmiBackEnd uncached(parseSettings(bmc.settings()));
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
 
-  uncached.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  uncached.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
 
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
 }
@@ -212,7 +215,7 @@ TEST(IpmiRoundTrips, OfAChangeInAHeldSessionAreThirteen) {
   backEnd.read();
 
   wire.reset();
-  backEnd.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
 
   // Three to look, one to see the lock free, lock, source, address, mask, commit, unlock, three to read back.
   EXPECT_EQ(wire.requests(), 13u);
@@ -222,10 +225,10 @@ TEST(IpmiRoundTrips, OfAChangeToWhatIsSoAlreadyAreThoseOfLooking) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
-  backEnd.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
 
   wire.reset();
-  backEnd.change("lan1", {"192.0.2.77", "255.255.255.128"});
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
 
   EXPECT_EQ(wire.requests(), 3u);
 }

@@ -19,8 +19,8 @@ int main(int, char** arguments) {
     if (::write(STDOUT_FILENO, ".", 1) != 1) return 1;
     for (int count = 1; changes == 0 || count <= changes; ++count) {
       const bool odd = count % 2 != 0;
-      const std::string address = network + (odd ? ".1" : ".2");
-      processor.change(interfaceName, {address, odd ? "255.255.255.0" : "255.255.0.0"});
+      const auto address = QV::Ipv4Address::parse(network + (odd ? ".1" : ".2"));
+      processor.change(interfaceName, {address, QV::SubnetMask::parse(odd ? "255.255.255.0" : "255.255.0.0")});
       const auto interfaces = processor.read().interfaces;
       const auto own = std::find_if(interfaces.begin(), interfaces.end(),
                                     [&](const auto& candidate) { return candidate.name == interfaceName; });

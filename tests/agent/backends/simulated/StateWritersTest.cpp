@@ -12,6 +12,7 @@
 #include <vector>
 
 #include "agent/backends/simulated/SimulatedBackEnd.h"
+#include "tests/agent/support/Addresses.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
@@ -70,7 +71,7 @@ TEST(StateWriters, thatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
   const Testing::TemporaryDirectory directory;
   const std::string state = directory / "state.json";
   SimulatedBackEnd processor(state);
-  processor.change("eth0", {"192.0.2.1", "255.255.255.0"});
+  processor.change("eth0", {ipv4("192.0.2.1"), mask("255.255.255.0")});
   std::mt19937 random(20);
   std::uniform_int_distribution<int> microseconds(0, 1500);
   int interrupted = 0;
@@ -84,15 +85,15 @@ TEST(StateWriters, thatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
 
     // Then the state is one of the two that it writes, whole
     const NetworkInterface interface = processor.read().interfaces.at(0);
-    ASSERT_TRUE((interface.ipv4Address == "192.0.2.1" && interface.ipv4SubnetMask == "255.255.255.0") ||
-                (interface.ipv4Address == "192.0.2.2" && interface.ipv4SubnetMask == "255.255.0.0"))
+    ASSERT_TRUE((interface.ipv4Address == ipv4("192.0.2.1") && interface.ipv4SubnetMask == mask("255.255.255.0")) ||
+                (interface.ipv4Address == ipv4("192.0.2.2") && interface.ipv4SubnetMask == mask("255.255.0.0")))
         << Testing::readFile(state);
   }
   EXPECT_GT(interrupted, 0) << "no kill met a writer between its first byte and its last step";
 
   // And the next change works and sweeps up
-  processor.change("eth0", {"192.0.2.3", {}});
-  EXPECT_EQ(processor.read().interfaces.at(0).ipv4Address, "192.0.2.3");
+  processor.change("eth0", {ipv4("192.0.2.3"), {}});
+  EXPECT_EQ(processor.read().interfaces.at(0).ipv4Address, ipv4("192.0.2.3"));
   EXPECT_FALSE(std::filesystem::exists(state + ".new"));
 }
 
@@ -100,11 +101,11 @@ TEST(StateWriters, areSeenByTheNextReadOfAProcessThatHasReadBefore) {
   const Testing::TemporaryDirectory directory;
   const std::string state = directory / "state.json";
   SimulatedBackEnd processor(state);
-  ASSERT_EQ(processor.read().interfaces.at(0).ipv4Address, "192.0.2.10");
+  ASSERT_EQ(processor.read().interfaces.at(0).ipv4Address, ipv4("192.0.2.10"));
 
   EXPECT_EQ(Writer(state, "eth0", "192.0.2", 1).await(), 0);
 
-  EXPECT_EQ(processor.read().interfaces.at(0).ipv4Address, "192.0.2.1");
+  EXPECT_EQ(processor.read().interfaces.at(0).ipv4Address, ipv4("192.0.2.1"));
 }
 
 TEST(StateWriters, thatRunAtOnceLoseNothing) {
@@ -115,10 +116,10 @@ TEST(StateWriters, thatRunAtOnceLoseNothing) {
   EXPECT_EQ(first.await(), 0);
   EXPECT_EQ(second.await(), 0);
   const auto interfaces = SimulatedBackEnd(state).read().interfaces;
-  EXPECT_EQ(interfaces.at(0).ipv4Address, "192.0.2.2");
-  EXPECT_EQ(interfaces.at(0).ipv4SubnetMask, "255.255.0.0");
-  EXPECT_EQ(interfaces.at(1).ipv4Address, "198.51.100.2");
-  EXPECT_EQ(interfaces.at(1).ipv4SubnetMask, "255.255.0.0");
+  EXPECT_EQ(interfaces.at(0).ipv4Address, ipv4("192.0.2.2"));
+  EXPECT_EQ(interfaces.at(0).ipv4SubnetMask, mask("255.255.0.0"));
+  EXPECT_EQ(interfaces.at(1).ipv4Address, ipv4("198.51.100.2"));
+  EXPECT_EQ(interfaces.at(1).ipv4SubnetMask, mask("255.255.0.0"));
 }
 
 }  // namespace

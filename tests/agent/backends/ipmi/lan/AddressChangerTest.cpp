@@ -4,6 +4,7 @@
 #include "agent/backends/ipmi/lan/AddressChanger.h"
 #include "tests/agent/backends/ipmi/RecordedLog.h"
 #include "tests/agent/backends/ipmi/ScriptedBmc.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace {
 
@@ -23,7 +24,7 @@ using testing::Pair;
 using testing::ThrowsMessage;
 using namespace std::chrono_literals;
 
-const AddressChange bothValues{"192.0.2.77", "255.255.255.128"};
+const AddressChange bothValues{QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")};
 const ParameterData oldAddress{192, 0, 2, 10}, newAddress{192, 0, 2, 77};
 const ParameterData oldMask{255, 255, 255, 0}, newMask{255, 255, 255, 128};
 const ParameterData fixed{1}, leased{2};
@@ -92,19 +93,19 @@ TEST_F(AddressChangerTest, TakesTheLockWhereItsStateIsNotTold) {
 }
 
 TEST_F(AddressChangerTest, WritesOnlyWhatDiffers) {
-  change({"192.0.2.77", "255.255.255.0"});
+  change({QV::ipv4("192.0.2.77"), QV::mask("255.255.255.0")});
 
   EXPECT_THAT(bmc.written, ElementsAre(Pair(LanParameter::IpAddress, newAddress)));
 }
 
 TEST_F(AddressChangerTest, WritesTheMaskAlone) {
-  change({std::nullopt, "255.255.255.128"});
+  change({std::nullopt, QV::mask("255.255.255.128")});
 
   EXPECT_THAT(bmc.written, ElementsAre(Pair(LanParameter::SubnetMask, newMask)));
 }
 
 TEST_F(AddressChangerTest, WritesNothingWhereTheValuesAreSoAlready) {
-  change({"192.0.2.10", "255.255.255.0"});
+  change({QV::ipv4("192.0.2.10"), QV::mask("255.255.255.0")});
 
   EXPECT_THAT(bmc.written, IsEmpty());
   EXPECT_EQ(begun, 0);
@@ -128,7 +129,7 @@ TEST_F(AddressChangerTest, MakesTheSourceStaticFirstAndKeepsTheMaskThatDhcpGave)
   bmc.values[LanParameter::AddressSource] = leased;
   bmc.refusesAddressUnderDhcp = true;
 
-  change({"192.0.2.77", std::nullopt});
+  change({QV::ipv4("192.0.2.77"), std::nullopt});
 
   EXPECT_THAT(bmc.written,
               ElementsAre(Pair(LanParameter::AddressSource, fixed), Pair(LanParameter::IpAddress, newAddress),
@@ -139,7 +140,7 @@ TEST_F(AddressChangerTest, RefusesToMakeAnInterfaceStaticThatHasNoAddress) {
   bmc.values[LanParameter::AddressSource] = leased;
   bmc.values[LanParameter::IpAddress] = {0, 0, 0, 0};
 
-  EXPECT_THAT([&] { change({std::nullopt, "255.255.255.128"}); }, refusal("has no IP address yet"));
+  EXPECT_THAT([&] { change({std::nullopt, QV::mask("255.255.255.128")}); }, refusal("has no IP address yet"));
 
   EXPECT_THAT(bmc.written, IsEmpty());
 }
@@ -147,7 +148,7 @@ TEST_F(AddressChangerTest, RefusesToMakeAnInterfaceStaticThatHasNoAddress) {
 TEST_F(AddressChangerTest, RefusesAnAddressWithoutAMaskWhereThereIsNone) {
   bmc.values[LanParameter::SubnetMask] = {0, 0, 0, 0};
 
-  EXPECT_THAT([&] { change({"192.0.2.77", std::nullopt}); }, refusal("has no subnet mask yet"));
+  EXPECT_THAT([&] { change({QV::ipv4("192.0.2.77"), std::nullopt}); }, refusal("has no subnet mask yet"));
 
   EXPECT_THAT(bmc.written, IsEmpty());
 }

@@ -3,6 +3,7 @@
 
 #include "agent/backends/ipmi/lan/InterfaceReader.h"
 #include "tests/agent/backends/ipmi/ScriptedBmc.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace {
 
@@ -43,7 +44,7 @@ TEST(IpmiInterface, LacksWhatTheBmcDoesNotSupport) {
     EXPECT_EQ(interface.macAddress, std::nullopt);
     EXPECT_EQ(interface.ipv4Gateway, std::nullopt);
     EXPECT_EQ(interface.ipv6Address, std::nullopt);
-    EXPECT_EQ(interface.ipv4Address, "192.0.2.10");
+    EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.10"));
   }
 }
 
@@ -107,9 +108,9 @@ TEST(IpmiInterface, HasTheKindOfIpv6AddressThatIsChosen) {
 
     const auto interface = readInterface(bmc, 1, test.choice);
 
-    using Address = std::optional<std::string>;
+    using Address = std::optional<QV::Ipv6Address>;
     using Length = std::optional<std::uint8_t>;
-    EXPECT_EQ(interface.ipv6Address, test.shown ? Address("2001:db8::10") : Address());
+    EXPECT_EQ(interface.ipv6Address, test.shown ? Address(QV::ipv6("2001:db8::10")) : Address());
     EXPECT_EQ(interface.ipv6PrefixLength, test.shown ? Length(64) : Length());
     EXPECT_EQ(interface.ipv6Origin, test.origin);
   }

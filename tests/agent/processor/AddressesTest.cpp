@@ -1,24 +1,25 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "agent/processor/AddressValidation.h"
+#include "agent/processor/Addresses.h"
+#include "tests/agent/support/Addresses.h"
 #include "tests/agent/support/Throws.h"
 
 namespace QV {
 namespace {
 
 std::string refusalOfAddress(const std::string& text) {
-  return thrownBy([&] { requireHostAddress(text); });
+  return thrownBy([&] { Ipv4Address::requireHost(text); });
 }
 
 std::string refusalOfMask(const std::string& text) {
-  return thrownBy([&] { requireSubnetMask(text); });
+  return thrownBy([&] { SubnetMask::requireUsable(text); });
 }
 
 TEST(Ipv4Text, isFourDecimalOctets) {
-  EXPECT_EQ(parseIpv4("0.0.0.0"), 0U);
-  EXPECT_EQ(parseIpv4("192.0.2.10"), 0xc000020aU);
-  EXPECT_EQ(parseIpv4("255.255.255.255"), 0xffffffffU);
+  EXPECT_EQ(ipv4("0.0.0.0").number(), 0U);
+  EXPECT_EQ(ipv4("192.0.2.10").number(), 0xc000020aU);
+  EXPECT_EQ(ipv4("255.255.255.255").number(), 0xffffffffU);
 }
 
 TEST(Ipv4Text, isNothingElse) {
@@ -28,14 +29,14 @@ TEST(Ipv4Text, isNothingElse) {
         "1.2.3.00", "1.2.3.010", " 1.2.3.4",  "1.2.3.4 ",  "1. 2.3.4",   "+1.2.3.4",         "-1.2.3.4",
         "1.2.3.-4", "0x1.2.3.4", "1.2.3.a",   "1,2,3,4",   "1.2.3.4/24", "1.2.3.4\n",        "::1",
         "localhost"})
-    EXPECT_EQ(parseIpv4(text), std::nullopt) << text;
-  EXPECT_EQ(parseIpv4(std::string_view("1.2.3.4\0", 8)), std::nullopt);
+    EXPECT_EQ(Ipv4Address::parse(text), std::nullopt) << text;
+  EXPECT_EQ(Ipv4Address::parse(std::string_view("1.2.3.4\0", 8)), std::nullopt);
 }
 
 TEST(HostAddress, isAcceptedUpToTheEdgesOfTheRangesThatHostsHave) {
   for (const char* text :
        {"1.0.0.0", "10.0.0.1", "126.255.255.255", "128.0.0.0", "169.254.1.1", "192.0.2.10", "223.255.255.255"})
-    EXPECT_EQ(requireHostAddress(text), parseIpv4(text)) << text;
+    EXPECT_EQ(Ipv4Address::requireHost(text), Ipv4Address::parse(text)) << text;
 }
 
 TEST(HostAddress, isRefusedWithTheTextAndTheReason) {
@@ -60,10 +61,11 @@ TEST(HostAddress, isCutInTheRefusalWhereItIsVeryLong) {
 
 TEST(SubnetMask, isAcceptedAtEveryUsableLength) {
   for (int length = 1; length <= 31; ++length) {
-    const Ipv4 mask = ~Ipv4{0} << (32 - length);
-    const std::string text = std::to_string(mask >> 24) + '.' + std::to_string(mask >> 16 & 255) + '.' +
-                             std::to_string(mask >> 8 & 255) + '.' + std::to_string(mask & 255);
-    EXPECT_EQ(requireSubnetMask(text), mask) << text;
+    const std::uint32_t bits = ~std::uint32_t{0} << (32 - length);
+    const auto octet = [&](int shift) { return static_cast<std::uint8_t>(bits >> shift); };
+    const SubnetMask expected({octet(24), octet(16), octet(8), octet(0)});
+    EXPECT_EQ(SubnetMask::requireUsable(expected.text()), expected);
+    EXPECT_EQ(expected.prefixLength(), length) << expected;
   }
 }
 
@@ -78,19 +80,39 @@ TEST(SubnetMask, isRefusedWithTheTextAndTheReason) {
 }
 
 TEST(HostOfSubnet, isNeitherTheNetworkNorItsBroadcastAddress) {
-  const Ipv4 mask = requireSubnetMask("255.255.255.0");
-  EXPECT_NO_THROW(requireHostOfSubnet(requireHostAddress("192.0.2.1"), mask));
-  EXPECT_NO_THROW(requireHostOfSubnet(requireHostAddress("192.0.2.254"), mask));
-  EXPECT_EQ(thrownBy([&] { requireHostOfSubnet(requireHostAddress("192.0.2.0"), mask); }),
+  const SubnetMask mask = SubnetMask::requireUsable("255.255.255.0");
+  EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.1"), mask));
+  EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.254"), mask));
+  EXPECT_EQ(thrownBy([&] { requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.0"), mask); }),
             "the IPv4 address '192.0.2.0' is, under the subnet mask '255.255.255.0', the network itself");
-  EXPECT_EQ(thrownBy([&] { requireHostOfSubnet(requireHostAddress("192.0.2.255"), mask); }),
+  EXPECT_EQ(thrownBy([&] { requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.255"), mask); }),
             "the IPv4 address '192.0.2.255' is, under the subnet mask '255.255.255.0', its broadcast address");
 }
 
+TEST(SubnetMask, hasNoPrefixLengthWhereItIsNotContiguous) {
+  EXPECT_EQ(mask("255.0.255.0").prefixLength(), std::nullopt);
+}
+
+TEST(Ipv6Text, isPrintedInItsShortestForm) {
+  EXPECT_EQ(ipv6("2001:DB8:0:0:0:0:0:10").text(), "2001:db8::10");
+  EXPECT_TRUE(ipv6("::").isZero());
+  for (const char* text : {"", "192.0.2.1", "2001:db8", "2001:db8::10%eth0", "2001:db8::10/64"}) {
+    EXPECT_EQ(Ipv6Address::parse(text), std::nullopt) << text;
+  }
+}
+
+TEST(MacAddressText, isSixPairsOfHexadecimalDigits) {
+  EXPECT_EQ(mac("02:00:00:00:AB:cd").text(), "02:00:00:00:ab:cd");
+  for (const char* text : {"", "02:00:00:00:00", "02:00:00:00:00:01:", "02-00-00-00-00-01", "2:0:0:0:0:1",
+                           "02:00:00:00:00:0g", "02:00:00:00:00:001"}) {
+    EXPECT_EQ(MacAddress::parse(text), std::nullopt) << text;
+  }
+}
+
 TEST(HostOfSubnet, isEitherAddressOfAPointToPointLink) {
-  const Ipv4 mask = requireSubnetMask("255.255.255.254");
-  EXPECT_NO_THROW(requireHostOfSubnet(requireHostAddress("192.0.2.0"), mask));
-  EXPECT_NO_THROW(requireHostOfSubnet(requireHostAddress("192.0.2.1"), mask));
+  const SubnetMask mask = SubnetMask::requireUsable("255.255.255.254");
+  EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.0"), mask));
+  EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.1"), mask));
 }
 
 }  // namespace
