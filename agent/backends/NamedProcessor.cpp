@@ -9,8 +9,12 @@ NamedProcessor::NamedProcessor(std::shared_ptr<BackEnd> processor, std::string n
 
 ManagementProcessor NamedProcessor::read() {
   ManagementProcessor processor = processor_->read();
-  if (!name_.empty()) processor.name = name_;
-  if (!description_.empty()) processor.description = description_;
+  if (!name_.empty()) {
+    processor.name = name_;
+  }
+  if (!description_.empty()) {
+    processor.description = description_;
+  }
   return processor;
 }
 

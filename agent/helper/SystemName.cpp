@@ -20,7 +20,9 @@ std::string configuredName() {
 
 std::string hostName() {
   std::array<char, 256> name{};
-  if (::gethostname(name.data(), name.size() - 1) != 0 || !name[0]) return "localhost";
+  if (::gethostname(name.data(), name.size() - 1) != 0 || !name[0]) {
+    return "localhost";
+  }
   return name.data();
 }
 

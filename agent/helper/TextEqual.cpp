@@ -11,7 +11,9 @@ char lower(char character) {
 }  // namespace
 
 bool textEqual(const char* a, const char* b) {
-  if (!a || !b) return false;
+  if (!a || !b) {
+    return false;
+  }
   while (*a && lower(*a) == lower(*b)) {
     ++a;
     ++b;

@@ -28,7 +28,9 @@ constexpr UnderlyingClass classes[] = {
 
 const UnderlyingClass* findUnderlyingClass(const char* name) {
   for (const UnderlyingClass& candidate : classes) {
-    if (textEqual(candidate.name, name)) return &candidate;
+    if (textEqual(candidate.name, name)) {
+      return &candidate;
+    }
   }
   return nullptr;
 }

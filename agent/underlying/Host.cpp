@@ -32,7 +32,9 @@ SocketAddress as(const sockaddr* address) {
 // which the first of a family counts.
 void take(const ifaddrs& entry, NetworkInterface& interface) {
   interface.enabled = (entry.ifa_flags & IFF_UP) != 0;
-  if (!entry.ifa_addr) return;
+  if (!entry.ifa_addr) {
+    return;
+  }
   const int family = entry.ifa_addr->sa_family;
   if (family == AF_INET && !interface.ipv4Address) {
     interface.ipv4Address = Ipv4Address(octetsOf(as<sockaddr_in>(entry.ifa_addr).sin_addr.s_addr));
@@ -43,8 +45,9 @@ void take(const ifaddrs& entry, NetworkInterface& interface) {
     interface.ipv6Address = Ipv6Address(std::bit_cast<Ipv6Address::Octets>(as<sockaddr_in6>(entry.ifa_addr).sin6_addr));
     if (entry.ifa_netmask) {
       int length = 0;
-      for (const unsigned char byte : as<sockaddr_in6>(entry.ifa_netmask).sin6_addr.s6_addr)
+      for (const unsigned char byte : as<sockaddr_in6>(entry.ifa_netmask).sin6_addr.s6_addr) {
         length += std::popcount(byte);
+      }
       interface.ipv6PrefixLength = static_cast<std::uint8_t>(length);
     }
   } else if (family == AF_PACKET) {
@@ -61,7 +64,9 @@ void take(const ifaddrs& entry, NetworkInterface& interface) {
 std::vector<NetworkInterface> readInterfaces() {
   std::vector<NetworkInterface> interfaces;
   ifaddrs* entries = nullptr;
-  if (::getifaddrs(&entries) != 0) return interfaces;
+  if (::getifaddrs(&entries) != 0) {
+    return interfaces;
+  }
   const std::unique_ptr<ifaddrs, decltype(&::freeifaddrs)> owner(entries, &::freeifaddrs);
   for (const ifaddrs* entry = entries; entry; entry = entry->ifa_next) {
     const std::string name = entry->ifa_name;
@@ -84,9 +89,13 @@ std::vector<std::string> parseResolverConfiguration(std::istream& text) {
     std::istringstream words(line);
     std::string keyword;
     std::string server;
-    if (words >> keyword >> server && keyword == "nameserver") servers.push_back(server);
+    if (words >> keyword >> server && keyword == "nameserver") {
+      servers.push_back(server);
+    }
   }
-  if (servers.empty()) servers.emplace_back("127.0.0.1");
+  if (servers.empty()) {
+    servers.emplace_back("127.0.0.1");
+  }
   return servers;
 }
 
@@ -113,7 +122,9 @@ ManagementProcessor readHost() {
   const auto gateways = parseDefaultGateways(routes);
   for (NetworkInterface& interface : host.interfaces) {
     const auto gateway = gateways.find(*interface.name);
-    if (gateway != gateways.end()) interface.ipv4Gateway = gateway->second;
+    if (gateway != gateways.end()) {
+      interface.ipv4Gateway = gateway->second;
+    }
   }
   return host;
 }

@@ -1,4 +1,4 @@
-// The IP configuration of the host that we run on, told as that of the management processor is.
+// The IP configuration of the host that we run on, described as that of the management processor is.
 #pragma once
 
 #include <istream>

@@ -37,7 +37,9 @@ const Versions& versionsOf(const NetworkInterface& interface) {
   const bool ipv4 = interface.ipv4Address || interface.ipv4Origin != AddressOrigin::Unknown;
   const bool ipv6 = interface.ipv6Address || interface.ipv6Origin != AddressOrigin::Unknown;
   for (const Versions& versions : versionTable) {
-    if (versions.ipv4 == ipv4 && versions.ipv6 == ipv6) return versions;
+    if (versions.ipv4 == ipv4 && versions.ipv6 == ipv6) {
+      return versions;
+    }
   }
   return versionTable[std::size(versionTable) - 1];
 }
@@ -58,7 +60,9 @@ template <typename Build>
 Instances forEachInterface(const System& system, const Build& build) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
-    if (interface.name) instances.push_back(build(interface, *interface.name));
+    if (interface.name) {
+      instances.push_back(build(interface, *interface.name));
+    }
   }
   return instances;
 }
@@ -125,7 +129,9 @@ Instances protocolEndpoints(const System& system) {
 Instances assignmentSettings(const System& system) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
-    if (!interface.name) continue;
+    if (!interface.name) {
+      continue;
+    }
     const std::string id = system.settingPrefix + ':' + *interface.name;
     instances.push_back(setting(id + ":static", "Static addresses of " + *interface.name, AddressOrigin::Static));
     instances.push_back(setting(id + ":dhcp", "DHCP addresses of " + *interface.name, AddressOrigin::Dhcp));
@@ -152,13 +158,15 @@ Instances dhcpSettings(const System& system) {
 Instances remoteAccessPoints(const System& system) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
-    if (interface.name && interface.ipv4Gateway)
+    if (interface.name && interface.ipv4Gateway) {
       instances.push_back(accessPoint(system, "Gateway:" + *interface.name, accessContextDefaultGateway,
                                       interface.ipv4Gateway->text()));
+    }
   }
   int position = 0;
-  for (const std::string& server : system.configuration.dnsServers)
+  for (const std::string& server : system.configuration.dnsServers) {
     instances.push_back(accessPoint(system, "DNS:" + std::to_string(++position), accessContextDnsServer, server));
+  }
   return instances;
 }
 

@@ -2,6 +2,7 @@
 
 #include <atomic>
 #include <stdexcept>
+#include <type_traits>
 
 #include "agent/backends/ipmi/session/IpmiLog.h"
 
@@ -21,15 +22,20 @@ void changeOrSayNothingWasChanged(IpmiProcessor& processor, Deadline deadline, c
                                   const AddressChange& change, std::atomic<bool>& begun) try {
   processor.change(deadline, interfaceName, change, begun);
 } catch (const IpmiError& error) {
-  if (begun) throw;
+  if (begun) {
+    throw;
+  }
   throw IpmiError(std::string(error.what()) + "; nothing was changed");
 }
 
 std::string describe(const std::string& name, const AddressChange& change) {
   std::string text = "change of " + name;
-  if (change.ipv4Address) text += " to IP address " + change.ipv4Address->text();
-  if (change.ipv4SubnetMask)
+  if (change.ipv4Address) {
+    text += " to IP address " + change.ipv4Address->text();
+  }
+  if (change.ipv4SubnetMask) {
     text += (change.ipv4Address ? ", subnet mask " : " to subnet mask ") + change.ipv4SubnetMask->text();
+  }
   return text;
 }
 
@@ -73,3 +79,9 @@ void IpmiBackEnd::change(const std::string& interfaceName, const AddressChange& 
 }
 
 }  // namespace QV::Ipmi
+
+extern "C" __attribute__((visibility("default"))) QV::BackEnd* qvCreateBackEnd(const QV::BackEndSettings& settings) {
+  return new QV::Ipmi::IpmiBackEnd(QV::Ipmi::parseSettings(settings));
+}
+
+static_assert(std::is_same_v<decltype(qvCreateBackEnd), QV::CreateBackEnd>);

@@ -86,8 +86,9 @@ ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   startOperation(deadline);
   const auto generationBefore = generation();
   ManagementProcessor processor{"BMC", "Management processor reached over IPMI", {}, {}};
-  for (const std::uint8_t channel : channels())
+  for (const std::uint8_t channel : channels()) {
     processor.interfaces.push_back(readInterface(connection_, channel, settings_.ipv6));
+  }
   trace("read " + std::to_string(processor.interfaces.size()) + " interfaces in " +
         std::to_string(connection_.roundTrips()) + " round trips");
   if (generationBefore) {
@@ -102,8 +103,9 @@ void IpmiProcessor::change(Deadline deadline, const std::string& name, const Add
   startOperation(deadline);
   const auto channel = channelOf(name);
   const auto& known = channels();
-  if (!channel || std::find(known.begin(), known.end(), *channel) == known.end())
+  if (!channel || std::find(known.begin(), known.end(), *channel) == known.end()) {
     throw IpmiError("there is no interface '" + name + '\'');
+  }
   const auto onBegin = [&] {
     begun = true;
     announceChange();

@@ -13,7 +13,9 @@ namespace QV {
 
 FileLock::FileLock(const std::string& path, std::chrono::milliseconds timeout)
     : descriptor_(::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0660)) {
-  if (descriptor_ < 0) throw std::runtime_error("the lock " + path + " cannot be opened: " + std::strerror(errno));
+  if (descriptor_ < 0) {
+    throw std::runtime_error("the lock " + path + " cannot be opened: " + std::strerror(errno));
+  }
   const auto deadline = std::chrono::steady_clock::now() + timeout;
   // flock alone would wait for ever on a holder that was stopped.
   while (::flock(descriptor_, LOCK_EX | LOCK_NB) != 0) {

@@ -9,7 +9,9 @@
 namespace QV {
 
 ManagementProcessor SimulatedBackEnd::read() {
-  if (const auto text = file_.read()) return parse(*text);
+  if (const auto text = file_.read()) {
+    return parse(*text);
+  }
   ManagementProcessor processor;
   file_.update([&](const std::optional<std::string>& current) {
     processor = current ? parse(*current) : factoryConfiguration();
@@ -24,10 +26,15 @@ void SimulatedBackEnd::change(const std::string& interfaceName, const AddressCha
     const auto interface =
         std::find_if(processor.interfaces.begin(), processor.interfaces.end(),
                      [&](const NetworkInterface& candidate) { return candidate.name == interfaceName; });
-    if (interface == processor.interfaces.end())
+    if (interface == processor.interfaces.end()) {
       throw std::runtime_error(file_.path().string() + ": there is no interface '" + interfaceName + '\'');
-    if (change.ipv4Address) interface->ipv4Address = change.ipv4Address;
-    if (change.ipv4SubnetMask) interface->ipv4SubnetMask = change.ipv4SubnetMask;
+    }
+    if (change.ipv4Address) {
+      interface->ipv4Address = change.ipv4Address;
+    }
+    if (change.ipv4SubnetMask) {
+      interface->ipv4SubnetMask = change.ipv4SubnetMask;
+    }
     interface->ipv4Origin = AddressOrigin::Static;
     return writeState(processor);
   });

@@ -23,10 +23,14 @@ class Fields {
  public:
   Fields(const Json& object, std::string path, std::initializer_list<const char*> known)
       : object_(object), path_(std::move(path)) {
-    if (!object.is_object()) throw std::runtime_error(place() + " is not an object");
+    if (!object.is_object()) {
+      throw std::runtime_error(place() + " is not an object");
+    }
     const std::set<std::string> names(known.begin(), known.end());
     for (const auto& item : object.items()) {
-      if (!names.contains(item.key())) throw std::runtime_error("the field " + pathOf(item.key()) + " is not known");
+      if (!names.contains(item.key())) {
+        throw std::runtime_error("the field " + pathOf(item.key()) + " is not known");
+      }
     }
   }
 
@@ -38,7 +42,9 @@ class Fields {
 
   const Json& required(const char* name) const {
     const auto found = object_.find(name);
-    if (found == object_.end()) refuse(name, "is missing");
+    if (found == object_.end()) {
+      refuse(name, "is missing");
+    }
     return *found;
   }
 
@@ -46,19 +52,25 @@ class Fields {
 
   std::optional<std::string> optionalText(const char* name) const {
     const auto found = object_.find(name);
-    if (found == object_.end()) return std::nullopt;
+    if (found == object_.end()) {
+      return std::nullopt;
+    }
     return text(name, *found);
   }
 
   bool boolean(const char* name) const {
     const Json& value = required(name);
-    if (!value.is_boolean()) refuse(name, "is neither true nor false");
+    if (!value.is_boolean()) {
+      refuse(name, "is neither true nor false");
+    }
     return value.get<bool>();
   }
 
   const Json& array(const char* name) const {
     const Json& value = required(name);
-    if (!value.is_array()) refuse(name, "is not an array");
+    if (!value.is_array()) {
+      refuse(name, "is not an array");
+    }
     return value;
   }
 
@@ -74,16 +86,21 @@ class Fields {
 
   std::optional<std::uint8_t> prefixLength(const char* name) const {
     const auto found = object_.find(name);
-    if (found == object_.end()) return std::nullopt;
-    if (!found->is_number_unsigned() || found->get<std::uint64_t>() > 128)
+    if (found == object_.end()) {
+      return std::nullopt;
+    }
+    if (!found->is_number_unsigned() || found->get<std::uint64_t>() > 128) {
       refuse(name, "is not a whole number from 0 to 128");
+    }
     return found->get<std::uint8_t>();
   }
 
   AddressOrigin origin(const char* name) const {
     const std::string value = text(name);
     for (const auto& [word, meaning] : origins) {
-      if (value == word) return meaning;
+      if (value == word) {
+        return meaning;
+      }
     }
     refuse(name, "is not static, dhcp or unknown: '" + value + '\'');
   }
@@ -92,7 +109,9 @@ class Fields {
   std::string place() const { return path_.empty() ? "the state" : "the field " + path_; }
 
   std::string text(const char* name, const Json& value) const {
-    if (!value.is_string()) refuse(name, "is not a text");
+    if (!value.is_string()) {
+      refuse(name, "is not a text");
+    }
     return value.get<std::string>();
   }
 
@@ -108,8 +127,9 @@ NetworkInterface parseInterface(const Json& json, const std::string& path) {
   NetworkInterface interface;
   interface.name = fields.optionalText("name");
   // The name becomes a field of identifiers that are separated by colons.
-  if (interface.name && (interface.name->empty() || interface.name->find(':') != std::string::npos))
+  if (interface.name && (interface.name->empty() || interface.name->find(':') != std::string::npos)) {
     fields.refuse("name", "is empty or holds a colon: '" + *interface.name + '\'');
+  }
   interface.macAddress = fields.address<MacAddress>("macAddress", "a MAC address");
   interface.enabled = fields.boolean("enabled");
   interface.ipv4Address = ipv4.address<Ipv4Address>("address", dotted);
@@ -139,15 +159,17 @@ ManagementProcessor parseProcessor(const Json& json) {
   ManagementProcessor processor;
   processor.name = fields.text("name");
   processor.description = fields.text("description");
-  for (const Json& server : fields.array("dnsServers"))
+  for (const Json& server : fields.array("dnsServers")) {
     processor.dnsServers.push_back(parseDnsServer(server, element("dnsServers", processor.dnsServers.size())));
+  }
   std::set<std::string> names;
   for (const Json& item : fields.array("interfaces")) {
     const std::string path = element("interfaces", processor.interfaces.size());
     processor.interfaces.push_back(parseInterface(item, path));
     const auto& name = processor.interfaces.back().name;
-    if (name && !names.insert(*name).second)
+    if (name && !names.insert(*name).second) {
       throw std::runtime_error("the field " + path + ".name is the name of another interface: '" + *name + '\'');
+    }
   }
   return processor;
 }
@@ -168,7 +190,9 @@ void putAddress(Json& object, const char* name, const std::optional<Address>& ad
 
 const char* wordOf(AddressOrigin origin) {
   for (const auto& [word, meaning] : origins) {
-    if (origin == meaning) return word;
+    if (origin == meaning) {
+      return word;
+    }
   }
   return "unknown";
 }
@@ -198,7 +222,9 @@ std::string writeState(const ManagementProcessor& processor) {
   json["description"] = processor.description;
   json["dnsServers"] = processor.dnsServers;
   json["interfaces"] = Json::array();
-  for (const NetworkInterface& interface : processor.interfaces) json["interfaces"].push_back(write(interface));
+  for (const NetworkInterface& interface : processor.interfaces) {
+    json["interfaces"].push_back(write(interface));
+  }
   return json.dump(2) + '\n';
 }
 

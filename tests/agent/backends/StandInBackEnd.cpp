@@ -19,6 +19,8 @@ class StandIn : public QV::BackEnd {
 
 extern "C" __attribute__((visibility("default"))) QV::BackEnd* qvCreateBackEnd(const QV::BackEndSettings& settings) {
   const auto name = settings.find("name");
-  if (name == settings.end()) throw std::runtime_error("[ipmi] name is missing");
+  if (name == settings.end()) {
+    throw std::runtime_error("[ipmi] name is missing");
+  }
   return new StandIn(name->second);
 }

@@ -39,8 +39,9 @@ TEST_F(AnInstrumentation, walksTheInterfaces) {
   EXPECT_FALSE(instrumentation);
   instrumentation.selectNode(IpInterfaceNode);
   std::vector<std::string> names;
-  for (std::string name; instrumentation && instrumentation.getProperty(NodeName, name); ++instrumentation)
+  for (std::string name; instrumentation && instrumentation.getProperty(NodeName, name); ++instrumentation) {
     names.push_back(name);
+  }
   EXPECT_THAT(names, testing::ElementsAre("eth0", "eth1"));
 }
 

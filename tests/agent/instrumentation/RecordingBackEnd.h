@@ -15,7 +15,9 @@ class RecordingBackEnd : public SimulatedBackEnd {
 
   void change(const std::string& interfaceName, const AddressChange& change) override {
     changes.push_back(interfaceName + " " + textOf(change.ipv4Address) + " " + textOf(change.ipv4SubnetMask));
-    if (unreachable) throw std::runtime_error("the processor does not answer");
+    if (unreachable) {
+      throw std::runtime_error("the processor does not answer");
+    }
     SimulatedBackEnd::change(interfaceName, change);
   }
 

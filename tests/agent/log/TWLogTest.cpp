@@ -94,7 +94,9 @@ TEST(Logger, takesMessagesFromSeveralThreads) {
     std::vector<std::jthread> threads;
     for (int thread = 0; thread < 4; ++thread) {
       threads.emplace_back([] {
-        for (int count = 0; count < 250; ++count) log("C", 6000, "x");
+        for (int count = 0; count < 250; ++count) {
+          log("C", 6000, "x");
+        }
       });
     }
   });

@@ -28,15 +28,17 @@ TEST(Ipv4Text, isNothingElse) {
         "1..2.3",   "1.2.3.4.",  "1.2.3.4.5", "256.1.1.1", "1.1.1.999",  "1.1.1.4294967297", "01.2.3.4",
         "1.2.3.00", "1.2.3.010", " 1.2.3.4",  "1.2.3.4 ",  "1. 2.3.4",   "+1.2.3.4",         "-1.2.3.4",
         "1.2.3.-4", "0x1.2.3.4", "1.2.3.a",   "1,2,3,4",   "1.2.3.4/24", "1.2.3.4\n",        "::1",
-        "localhost"})
+        "localhost"}) {
     EXPECT_EQ(Ipv4Address::parse(text), std::nullopt) << text;
+  }
   EXPECT_EQ(Ipv4Address::parse(std::string_view("1.2.3.4\0", 8)), std::nullopt);
 }
 
 TEST(HostAddress, isAcceptedUpToTheEdgesOfTheRangesThatHostsHave) {
   for (const char* text :
-       {"1.0.0.0", "10.0.0.1", "126.255.255.255", "128.0.0.0", "169.254.1.1", "192.0.2.10", "223.255.255.255"})
+       {"1.0.0.0", "10.0.0.1", "126.255.255.255", "128.0.0.0", "169.254.1.1", "192.0.2.10", "223.255.255.255"}) {
     EXPECT_EQ(Ipv4Address::requireHost(text), Ipv4Address::parse(text)) << text;
+  }
 }
 
 TEST(HostAddress, isRefusedWithTheTextAndTheReason) {

@@ -44,7 +44,9 @@ TEST(Host, readsItsLoopbackInterface) {
   const ManagementProcessor host = readHost();
   const auto loopback = std::find_if(host.interfaces.begin(), host.interfaces.end(),
                                      [](const NetworkInterface& interface) { return interface.name == "lo"; });
-  if (loopback == host.interfaces.end() || !loopback->ipv4Address) GTEST_SKIP() << "no loopback address here";
+  if (loopback == host.interfaces.end() || !loopback->ipv4Address) {
+    GTEST_SKIP() << "no loopback address here";
+  }
   EXPECT_TRUE(loopback->enabled);
   EXPECT_EQ(loopback->ipv4Address, ipv4("127.0.0.1"));
   EXPECT_EQ(loopback->ipv4SubnetMask, mask("255.0.0.0"));

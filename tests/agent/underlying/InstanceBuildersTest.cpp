@@ -21,7 +21,9 @@ std::string textOf(const Property& property) {
     std::string operator()(std::uint8_t number) const { return "=" + std::to_string(number) + "u8"; }
     std::string operator()(const std::vector<std::uint16_t>& numbers) const {
       std::string text = "=";
-      for (const std::uint16_t number : numbers) text += (text.size() > 1 ? "," : "") + std::to_string(number) + "u16";
+      for (const std::uint16_t number : numbers) {
+        text += (text.size() > 1 ? "," : "") + std::to_string(number) + "u16";
+      }
       return text;
     }
   } text;
@@ -30,7 +32,9 @@ std::string textOf(const Property& property) {
 
 std::vector<std::string> textsOf(const InstanceProperties& properties) {
   std::vector<std::string> texts;
-  for (const Property& property : properties) texts.push_back(textOf(property));
+  for (const Property& property : properties) {
+    texts.push_back(textOf(property));
+  }
   return texts;
 }
 
@@ -51,7 +55,9 @@ NetworkInterface nameless() {
 std::string endpointProperty(const NetworkInterface& interface, const std::string& name) {
   const Instances endpoints = protocolEndpoints(processor({interface}));
   for (const Property& property : endpoints.at(0)) {
-    if (property.name == name) return textOf(property);
+    if (property.name == name) {
+      return textOf(property);
+    }
   }
   return "no " + name;
 }
@@ -155,8 +161,9 @@ TEST(RemoteAccessPoints, areTheGatewaysAndTheNameServers) {
 
 TEST(Interfaces, withoutANameAreInNoClass) {
   const System system = processor({nameless()});
-  for (const auto build : {protocolEndpoints, assignmentSettings, staticSettings, dhcpSettings, remoteAccessPoints})
+  for (const auto build : {protocolEndpoints, assignmentSettings, staticSettings, dhcpSettings, remoteAccessPoints}) {
     EXPECT_THAT(build(system), IsEmpty());
+  }
 }
 
 TEST(AnotherSystem, isToldApartByItsClassAndItsSettingsPrefix) {

@@ -31,12 +31,16 @@ void AddressChanger::apply(const AddressChange& change) {
   try {
     write(earlier, wanted);
   } catch (const ConnectionLost& lost) {
-    if (!begun_) throw;
+    if (!begun_) {
+      throw;
+    }
     loss = lost.what();
   }
   const AddressSettings present = readBack(wanted, loss);
   const std::string difference = describeDifference(present, wanted);
-  if (difference.empty()) return;
+  if (difference.empty()) {
+    return;
+  }
   const std::string outcome = present == earlier ? "; the earlier values hold"
                               : isAnothers(present, earlier, wanted)
                                   ? "; another client has changed it meanwhile, and its values hold"

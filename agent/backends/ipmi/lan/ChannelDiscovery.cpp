@@ -2,7 +2,7 @@
 
 #include <optional>
 
-#include "agent/backends/ipmi/lan/CompletionCode.h"
+#include "agent/backends/ipmi/lan/LanParameters.h"
 
 namespace QV::Ipmi {
 namespace {
@@ -20,19 +20,29 @@ constexpr std::uint8_t mediumOtherLan = 6;
 std::optional<std::uint8_t> lanChannel(IpmiTransport& transport, std::uint8_t channel) {
   const IpmiResponse response =
       transport.send({NetworkFunction::Application, getChannelInfo, {channel}}, Repetition::Allowed);
-  if (response.completionCode != CompletionCode::done || response.data.size() < 2) return std::nullopt;
+  if (response.completionCode != CompletionCode::done || response.data.size() < 2) {
+    return std::nullopt;
+  }
   const std::uint8_t medium = response.data[1] & 0x7F;
-  if (medium != medium802Dot3 && medium != mediumOtherLan) return std::nullopt;
+  if (medium != medium802Dot3 && medium != mediumOtherLan) {
+    return std::nullopt;
+  }
   return static_cast<std::uint8_t>(response.data[0] & 0x0F);
 }
 
 std::vector<std::uint8_t> scan(IpmiTransport& transport, bool firstOnly) {
   std::vector<std::uint8_t> found;
   for (std::uint8_t channel = firstChannel; channel <= lastChannel; ++channel) {
-    if (lanChannel(transport, channel)) found.push_back(channel);
-    if (firstOnly && !found.empty()) break;
+    if (lanChannel(transport, channel)) {
+      found.push_back(channel);
+    }
+    if (firstOnly && !found.empty()) {
+      break;
+    }
   }
-  if (found.empty()) throw IpmiError("the BMC shows no LAN channel: name them in channels");
+  if (found.empty()) {
+    throw IpmiError("the BMC shows no LAN channel: name them in channels");
+  }
   return found;
 }
 
@@ -48,7 +58,9 @@ std::vector<std::uint8_t> discoverChannels(IpmiTransport& transport, const Chann
       break;
   }
   // In-band the present channel is the system interface, which is no LAN.
-  if (const auto inUse = lanChannel(transport, presentChannel)) return {*inUse};
+  if (const auto inUse = lanChannel(transport, presentChannel)) {
+    return {*inUse};
+  }
   return scan(transport, true);
 }
 

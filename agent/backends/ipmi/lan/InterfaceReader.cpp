@@ -16,7 +16,9 @@ std::optional<Address> addressIn(const std::optional<ParameterData>& data) {
 }
 
 AddressOrigin origin(const std::optional<ParameterData>& data) {
-  if (!data || data->empty()) return AddressOrigin::Unknown;
+  if (!data || data->empty()) {
+    return AddressOrigin::Unknown;
+  }
   switch (static_cast<AddressSource>(data->front() & 0x0F)) {
     case AddressSource::Static:
       return AddressOrigin::Static;
@@ -32,19 +34,24 @@ AddressOrigin origin(const std::optional<ParameterData>& data) {
 void readIpv6(const ParameterData& data, Ipv6Choice choice, NetworkInterface& interface) {
   constexpr std::size_t sourceAt = 1, addressAt = 2, prefixAt = 18;
   constexpr std::uint8_t enabled = 0x80, fromDhcp = 2;
-  if (data.size() <= prefixAt) return;
+  if (data.size() <= prefixAt) {
+    return;
+  }
   const std::uint8_t source = data[sourceAt];
-  if (choice == Ipv6Choice::Static && (source & enabled) == 0) return;
+  if (choice == Ipv6Choice::Static && (source & enabled) == 0) {
+    return;
+  }
   const auto address = toAddress<Ipv6Address>(data, addressAt);
   if (!address || address->isZero()) {
     return;
   }
   interface.ipv6Address = address;
   interface.ipv6PrefixLength = data[prefixAt];
-  if (choice == Ipv6Choice::Static)
+  if (choice == Ipv6Choice::Static) {
     interface.ipv6Origin = AddressOrigin::Static;
-  else if ((source & 0x0F) == fromDhcp)
+  } else if ((source & 0x0F) == fromDhcp) {
     interface.ipv6Origin = AddressOrigin::Dhcp;
+  }
 }
 
 }  // namespace
@@ -55,8 +62,9 @@ NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, I
   const auto ipv4 = get(LanParameter::IpAddress);
   const auto mask = get(LanParameter::SubnetMask);
   const auto mac = get(LanParameter::MacAddress);
-  if (!source && !ipv4 && !mask && !mac)
+  if (!source && !ipv4 && !mask && !mac) {
     throw IpmiError("the BMC has no LAN channel " + std::to_string(channel) + ": check channels");
+  }
 
   NetworkInterface interface;
   interface.name = interfaceName(channel);
@@ -67,8 +75,9 @@ NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, I
   interface.ipv4Origin = origin(source);
   if (ipv6 != Ipv6Choice::Off) {
     const bool fixed = ipv6 == Ipv6Choice::Static;
-    if (const auto data = get(fixed ? LanParameter::Ipv6StaticAddress : LanParameter::Ipv6DynamicAddress))
+    if (const auto data = get(fixed ? LanParameter::Ipv6StaticAddress : LanParameter::Ipv6DynamicAddress)) {
       readIpv6(*data, ipv6, interface);
+    }
   }
   return interface;
 }
@@ -77,9 +86,13 @@ std::string interfaceName(std::uint8_t channel) { return std::string(namePrefix)
 
 std::optional<std::uint8_t> channelOf(const std::string& name) {
   std::uint8_t channel = 0;
-  if (!name.starts_with(namePrefix)) return std::nullopt;
+  if (!name.starts_with(namePrefix)) {
+    return std::nullopt;
+  }
   const auto [rest, error] = std::from_chars(name.data() + namePrefix.size(), name.data() + name.size(), channel);
-  if (error != std::errc() || interfaceName(channel) != name) return std::nullopt;
+  if (error != std::errc() || interfaceName(channel) != name) {
+    return std::nullopt;
+  }
   return channel;
 }
 

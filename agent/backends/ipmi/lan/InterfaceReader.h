@@ -13,7 +13,7 @@ namespace QV::Ipmi {
 
 // Reads a channel in at most six round trips: source, address, mask, MAC, gateway and one IPv6 address. What the
 // processor does not support, and an address of zeros, is absent. Throws IpmiError where the exchange fails or the
-// channel tells nothing at all, which means that it is no LAN channel.
+// channel reports nothing at all, which means that it is no LAN channel.
 NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, Ipv6Choice ipv6);
 
 // The node name of a channel, "lan1", and the channel of a node name; nothing where the name is none.

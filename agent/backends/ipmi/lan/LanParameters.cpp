@@ -1,8 +1,8 @@
 #include "agent/backends/ipmi/lan/LanParameters.h"
 
+#include <array>
+#include <cstdio>
 #include <map>
-
-#include "agent/backends/ipmi/lan/CompletionCode.h"
 
 namespace QV::Ipmi {
 namespace {
@@ -25,11 +25,16 @@ std::optional<ParameterData> getParameter(IpmiTransport& transport, std::uint8_t
                                                 getLanConfigurationParameters,
                                                 {channel, static_cast<std::uint8_t>(parameter), firstSet, firstBlock}},
                                                Repetition::Allowed);
-  if (meansUnsupported(response.completionCode)) return std::nullopt;
-  if (response.completionCode != CompletionCode::done)
-    throw IpmiError("the BMC does not tell the " + describe(parameter) + " of LAN channel " + std::to_string(channel) +
+  if (meansUnsupported(response.completionCode)) {
+    return std::nullopt;
+  }
+  if (response.completionCode != CompletionCode::done) {
+    throw IpmiError("the BMC did not report the " + describe(parameter) + " of LAN channel " + std::to_string(channel) +
                     ": " + CompletionCode::describe(response.completionCode));
-  if (response.data.empty()) return std::nullopt;
+  }
+  if (response.data.empty()) {
+    return std::nullopt;
+  }
   return ParameterData(response.data.begin() + 1, response.data.end());
 }
 
@@ -51,5 +56,36 @@ std::string describe(LanParameter parameter) {
                                                             {LanParameter::Ipv6DynamicAddress, "dynamic IPv6 address"}};
   return names.at(parameter);
 }
+
+namespace CompletionCode {
+namespace {
+
+const std::map<std::uint8_t, const char*> meanings = {{done, "done"},
+                                                      {parameterNotSupported, "parameter not supported"},
+                                                      {setInProgress, "another client's change is in progress"},
+                                                      {readOnly, "parameter is read-only"},
+                                                      {0xC0, "the BMC is busy"},
+                                                      {0xC1, "command not known"},
+                                                      {0xC3, "the BMC timed out itself"},
+                                                      {parameterOutOfRange, "parameter out of range"},
+                                                      {notFound, "not there"},
+                                                      {invalidData, "invalid value"},
+                                                      {0xD4, "privilege too low: the session needs privilege = admin"},
+                                                      {0xD5, "not possible in the present state"},
+                                                      {0xFF, "unspecified error"}};
+
+}  // namespace
+
+std::string describe(std::uint8_t code) {
+  std::array<char, 8> number;
+  std::snprintf(number.data(), number.size(), "0x%02X", code);
+  const auto meaning = meanings.find(code);
+  if (meaning == meanings.end()) {
+    return std::string("completion code ") + number.data();
+  }
+  return std::string(meaning->second) + " (" + number.data() + ')';
+}
+
+}  // namespace CompletionCode
 
 }  // namespace QV::Ipmi

@@ -1,6 +1,6 @@
 #include "agent/backends/ipmi/lan/ParameterTransaction.h"
 
-#include "agent/backends/ipmi/lan/CompletionCode.h"
+#include "agent/backends/ipmi/lan/LanParameters.h"
 #include "agent/backends/ipmi/session/IpmiLog.h"
 
 namespace QV::Ipmi {
@@ -30,11 +30,12 @@ bool meansNoLock(std::uint8_t completionCode) {
 void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held) {
   try {
     const IpmiResponse response = setProgress(transport, channel, SetProgress::Complete, Repetition::Allowed);
-    if (response.completionCode == CompletionCode::done)
+    if (response.completionCode == CompletionCode::done) {
       held.erase(channel);
-    else
+    } else {
       logFailure("the set-in-progress lock of " + nameOf(channel) +
                  " is not given back: " + CompletionCode::describe(response.completionCode));
+    }
   } catch (const IpmiError& error) {
     logFailure("the set-in-progress lock of " + nameOf(channel) +
                " may stay set; the next operation gives it back: " + error.what());
@@ -55,23 +56,33 @@ ParameterTransaction::ParameterTransaction(IpmiTransport& transport, std::uint8_
 void ParameterTransaction::take() {
   const auto progress = getParameter(transport_, channel_, LanParameter::SetInProgress);
   const bool known = progress && !progress->empty();
-  if (known && static_cast<SetProgress>(progress->front() & 0x03) != SetProgress::Complete)
+  if (known && static_cast<SetProgress>(progress->front() & 0x03) != SetProgress::Complete) {
     throw IpmiError(busyText(channel_));
+  }
 
   held_.insert(channel_);
   const IpmiResponse response = setProgress(transport_, channel_, SetProgress::InProgress, Repetition::Forbidden);
-  if (response.completionCode == CompletionCode::done) return;
+  if (response.completionCode == CompletionCode::done) {
+    return;
+  }
   // The lock was free a moment ago; where the request had to be sent twice, the first took it.
-  if (response.completionCode == CompletionCode::setInProgress && known && response.late) return;
+  if (response.completionCode == CompletionCode::setInProgress && known && response.late) {
+    return;
+  }
   held_.erase(channel_);
-  if (response.completionCode == CompletionCode::setInProgress) throw IpmiError(busyText(channel_));
-  if (!meansNoLock(response.completionCode))
+  if (response.completionCode == CompletionCode::setInProgress) {
+    throw IpmiError(busyText(channel_));
+  }
+  if (!meansNoLock(response.completionCode)) {
     throw IpmiError(nameOf(channel_) + " cannot be changed: " + CompletionCode::describe(response.completionCode));
+  }
   logProgress(nameOf(channel_) + " has no set-in-progress lock: its parameters are written without");
 }
 
 ParameterTransaction::~ParameterTransaction() {
-  if (!held_.contains(channel_)) return;
+  if (!held_.contains(channel_)) {
+    return;
+  }
   transport_.beginCleanup();
   releaseLock(transport_, channel_, held_);
 }
@@ -79,7 +90,9 @@ ParameterTransaction::~ParameterTransaction() {
 void ParameterTransaction::write(const std::vector<ParameterWrite>& writes) {
   std::size_t written = 0;
   try {
-    for (; written < writes.size(); ++written) writeOne(writes[written]);
+    for (; written < writes.size(); ++written) {
+      writeOne(writes[written]);
+    }
   } catch (const ConnectionLost&) {
     throw;
   } catch (const IpmiError& error) {
@@ -90,9 +103,10 @@ void ParameterTransaction::write(const std::vector<ParameterWrite>& writes) {
 
 void ParameterTransaction::writeOne(const ParameterWrite& write) {
   const IpmiResponse response = setParameter(transport_, channel_, write.parameter, write.value, Repetition::Forbidden);
-  if (response.completionCode != CompletionCode::done)
+  if (response.completionCode != CompletionCode::done) {
     throw IpmiError("the BMC refuses the " + write.describe() + " on " + nameOf(channel_) + ": " +
                     CompletionCode::describe(response.completionCode));
+  }
 }
 
 // The commit matters on processors that stage their writes too: what is staged and left would go out with the next
@@ -101,7 +115,9 @@ std::string ParameterTransaction::putBack(const std::vector<ParameterWrite>& wri
   transport_.beginCleanup();
   while (count-- > 0) {
     const ParameterWrite& write = writes[count];
-    if (!write.previous) throw IpmiError("the earlier " + Ipmi::describe(write.parameter) + " is not known");
+    if (!write.previous) {
+      throw IpmiError("the earlier " + Ipmi::describe(write.parameter) + " is not known");
+    }
     writeOne({write.parameter, *write.previous, write.value});
   }
   commit();
@@ -112,10 +128,13 @@ std::string ParameterTransaction::putBack(const std::vector<ParameterWrite>& wri
 
 // Whether a processor applies on commit, at once or only at the end is its own; reading back tells.
 void ParameterTransaction::commit() {
-  if (!held_.contains(channel_)) return;
+  if (!held_.contains(channel_)) {
+    return;
+  }
   const IpmiResponse response = setProgress(transport_, channel_, SetProgress::CommitWrite, Repetition::Forbidden);
-  if (response.completionCode != CompletionCode::done)
+  if (response.completionCode != CompletionCode::done) {
     trace(nameOf(channel_) + " does not commit: " + CompletionCode::describe(response.completionCode));
+  }
 }
 
 }  // namespace QV::Ipmi

@@ -41,20 +41,20 @@ class OperationThread {
   OperationThread(const OperationThread&) = delete;
   OperationThread& operator=(const OperationThread&) = delete;
 
-  // Runs the operation and gives what it gives; throws std::runtime_error with the text of what it throws. Throws
+  // Runs the operation and returns what it returns; throws std::runtime_error with the text of what it throws. Throws
   // Overdue at the deadline, waiting for earlier operations included.
   template <typename Operation>
   auto run(Deadline deadline, Operation operation) {
     using Result = std::invoke_result_t<Operation>;
-    constexpr bool givesNothing = std::is_void_v<Result>;
+    constexpr bool returnsNothing = std::is_void_v<Result>;
     // A failure crosses as text, so that no exception object is shared between the threads.
     struct Outcome {
-      std::optional<std::conditional_t<givesNothing, std::monostate, Result>> value;
+      std::optional<std::conditional_t<returnsNothing, std::monostate, Result>> value;
       std::string failure;
     };
     const auto task = std::make_shared<std::packaged_task<Outcome()>>([operation = std::move(operation)]() -> Outcome {
       try {
-        if constexpr (givesNothing) {
+        if constexpr (returnsNothing) {
           operation();
           return {std::monostate{}, {}};
         } else {
@@ -66,10 +66,16 @@ class OperationThread {
     });
     std::future<Outcome> result = task->get_future();
     const auto number = enqueue([task] { (*task)(); });
-    if (result.wait_until(deadline.time()) != std::future_status::ready) throw Overdue(!withdraw(number));
+    if (result.wait_until(deadline.time()) != std::future_status::ready) {
+      throw Overdue(!withdraw(number));
+    }
     Outcome outcome = result.get();
-    if (!outcome.value) throw std::runtime_error(outcome.failure);
-    if constexpr (!givesNothing) return std::move(*outcome.value);
+    if (!outcome.value) {
+      throw std::runtime_error(outcome.failure);
+    }
+    if constexpr (!returnsNothing) {
+      return std::move(*outcome.value);
+    }
   }
 
   static constexpr std::chrono::seconds longestEnd{2};

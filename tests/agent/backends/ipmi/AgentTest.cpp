@@ -21,7 +21,9 @@ class IpmiAgent : public testing::Test {
     bmc = std::make_unique<SimulatedBmc>();
     std::string ini = "[log]\ndestination = file\nfile = " + log() + "\n[trace]\ndestination = file\nfile = " + log() +
                       "\n[processor]\nbackend = ipmi\n[ipmi]\n";
-    for (const auto& [key, value] : bmc->settings()) ini += key + " = " + value + '\n';
+    for (const auto& [key, value] : bmc->settings()) {
+      ini += key + " = " + value + '\n';
+    }
     Testing::writeFile(*directory / "agent.ini", ini);
     ::setenv("QV_AGENT_INI", (*directory / "agent.ini").c_str(), 1);
   }

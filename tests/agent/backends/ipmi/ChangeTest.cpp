@@ -70,7 +70,7 @@ TEST(IpmiChangeAmongReaders, IsSeenAsAWholeOrNotAtAll) {
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   std::vector<std::future<int>> readers;
   std::atomic<bool> ended = false;
-  for (int reader = 0; reader < 3; ++reader)
+  for (int reader = 0; reader < 3; ++reader) {
     readers.push_back(std::async(std::launch::async, [&] {
       int mixed = 0;
       while (!ended) {
@@ -80,13 +80,16 @@ TEST(IpmiChangeAmongReaders, IsSeenAsAWholeOrNotAtAll) {
       }
       return mixed;
     }));
+  }
 
   backEnd.change("lan1", bothValues);
   backEnd.change("lan1", {QV::ipv4("192.0.2.10"), QV::mask("255.255.255.0")});
   backEnd.change("lan1", bothValues);
 
   ended = true;
-  for (auto& reader : readers) EXPECT_EQ(reader.get(), 0);
+  for (auto& reader : readers) {
+    EXPECT_EQ(reader.get(), 0);
+  }
   EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.77"));
 }
 
@@ -94,8 +97,9 @@ TEST(IpmiChangeRefused, ForAnInterfaceThatIsNotThere) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
 
-  for (const char* name : {"lan2", "eth0", "lan", "lan01", "lan1 ", ""})
+  for (const char* name : {"lan2", "eth0", "lan", "lan01", "lan1 ", ""}) {
     EXPECT_THAT([&] { backEnd.change(name, bothValues); }, refusal("there is no interface")) << name;
+  }
 
   EXPECT_EQ(bmc.stored("ip_addr"), "192.0.2.10");
 }

@@ -160,9 +160,13 @@ TEST(IpmiFailure, OfTheNetworkForAMomentEndsInAConfirmedChange) {
   // The commit's answer is lost with the session; the network comes back.
   wire.cutAtRequest(9);
   std::jthread healer([&](std::stop_token stop) {
-    while (!stop.stop_requested() && bmc.stored("ip_addr") != "192.0.2.77") std::this_thread::yield();
+    while (!stop.stop_requested() && bmc.stored("ip_addr") != "192.0.2.77") {
+      std::this_thread::yield();
+    }
     const auto requests = wire.requests();
-    while (!stop.stop_requested() && wire.requests() < requests + 3) std::this_thread::yield();
+    while (!stop.stop_requested() && wire.requests() < requests + 3) {
+      std::this_thread::yield();
+    }
     wire.join();
   });
 
@@ -219,7 +223,8 @@ TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrect
 TEST(IpmiSessionRefused, InBandWhereThereIsNoDriverNamesTheModules) {
   IpmiBackEnd backEnd(parseSettings({{"device", "/dev/no-such-ipmi"}, {"cache", "0"}}));
 
-  EXPECT_THAT([&] { backEnd.read(); }, refusal("the BMC behind /dev/no-such-ipmi gives no session: no such device"));
+  EXPECT_THAT([&] { backEnd.read(); },
+              refusal("the BMC behind /dev/no-such-ipmi did not open a session: no such device"));
 }
 
 }  // namespace

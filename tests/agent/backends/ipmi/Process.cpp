@@ -16,7 +16,9 @@ namespace {
 
 std::array<int, 2> openPipe() {
   std::array<int, 2> ends;
-  if (::pipe2(ends.data(), O_CLOEXEC) != 0) throw std::runtime_error("no pipe");
+  if (::pipe2(ends.data(), O_CLOEXEC) != 0) {
+    throw std::runtime_error("no pipe");
+  }
   return ends;
 }
 
@@ -26,7 +28,9 @@ Process::Process(const std::vector<std::string>& command) {
   const auto input = openPipe();
   const auto output = openPipe();
   std::vector<char*> arguments;
-  for (const std::string& word : command) arguments.push_back(const_cast<char*>(word.c_str()));
+  for (const std::string& word : command) {
+    arguments.push_back(const_cast<char*>(word.c_str()));
+  }
   arguments.push_back(nullptr);
   posix_spawn_file_actions_t actions;
   ::posix_spawn_file_actions_init(&actions);
@@ -38,7 +42,9 @@ Process::Process(const std::vector<std::string>& command) {
   ::close(output[1]);
   input_ = input[1];
   output_ = output[0];
-  if (error != 0) throw std::runtime_error(command.front() + " cannot be started");
+  if (error != 0) {
+    throw std::runtime_error(command.front() + " cannot be started");
+  }
 }
 
 Process::~Process() {
@@ -57,15 +63,18 @@ void Process::writeLine(const std::string& line) {
 
 std::string Process::readLine() {
   std::string line;
-  for (char next = 0; ::read(output_, &next, 1) == 1 && next != '\n';) line.push_back(next);
+  for (char next = 0; ::read(output_, &next, 1) == 1 && next != '\n';) {
+    line.push_back(next);
+  }
   return line;
 }
 
 std::string Process::readAll() {
   std::string text;
   std::array<char, 4096> part;
-  for (ssize_t length = 0; (length = ::read(output_, part.data(), part.size())) > 0;)
+  for (ssize_t length = 0; (length = ::read(output_, part.data(), part.size())) > 0;) {
     text.append(part.data(), static_cast<std::size_t>(length));
+  }
   return text;
 }
 

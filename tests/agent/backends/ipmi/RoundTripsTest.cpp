@@ -161,7 +161,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
   readBroken();
   brokenWire.cutAtRequest(7);
   EXPECT_NE(failureOf([&] { brokenWriter.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")}); }), "");
-  while (readBroken().find("gives no session") == std::string::npos && inTime()) {
+  while (readBroken().find("did not open a session") == std::string::npos && inTime()) {
   }
   ASSERT_EQ(bmc.witness("Set in Progress"), "Set In Progress");
   reader.read();
@@ -255,7 +255,9 @@ TEST(IpmiRoundTrips, IncludeTheOneThatGivesAnIdleSessionBack) {
   wire.reset();
 
   const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
-  while (wire.requests() == 0 && std::chrono::steady_clock::now() < deadline) std::this_thread::yield();
+  while (wire.requests() == 0 && std::chrono::steady_clock::now() < deadline) {
+    std::this_thread::yield();
+  }
   EXPECT_EQ(wire.requests(), 1u);
 
   wire.reset();

@@ -17,9 +17,13 @@ std::string valueOf(const std::string& text, const std::string& label, char sepa
   std::istringstream lines(text);
   for (std::string line; std::getline(lines, line);) {
     const auto end = line.find(separator);
-    if (end == std::string::npos) continue;
+    if (end == std::string::npos) {
+      continue;
+    }
     const auto labelEnd = line.find_last_not_of(" \t", end - 1);
-    if (line.substr(0, labelEnd + 1) != label) continue;
+    if (line.substr(0, labelEnd + 1) != label) {
+      continue;
+    }
     const auto start = line.find_first_not_of(" \t", end + 1);
     return start == std::string::npos ? "" : line.substr(start);
   }
@@ -37,13 +41,19 @@ SimulatedBmc::~SimulatedBmc() = default;
 
 void SimulatedBmc::start() {
   std::vector<std::string> command = {SOURCE_DIR "/tools/ipmi-sim-bmc"};
-  if (port_ != 0) command.insert(command.end(), {"-p", std::to_string(port_)});
-  if (personality_ == Personality::AppliesAtOnce) command.push_back("-m");
+  if (port_ != 0) {
+    command.insert(command.end(), {"-p", std::to_string(port_)});
+  }
+  if (personality_ == Personality::AppliesAtOnce) {
+    command.push_back("-m");
+  }
   command.push_back(directory_.path());
   process_ = std::make_unique<Process>(command);
   const std::string address = process_->readLine();
   const auto colon = address.find(':');
-  if (colon == std::string::npos) throw std::runtime_error("the simulated BMC does not start");
+  if (colon == std::string::npos) {
+    throw std::runtime_error("the simulated BMC does not start");
+  }
   port_ = static_cast<std::uint16_t>(std::stoi(address.substr(colon + 1)));
 }
 

@@ -32,8 +32,9 @@ UdpRelay::UdpRelay(std::uint16_t destination)
   socklen_t length = sizeof here;
   if (::bind(client_, reinterpret_cast<sockaddr*>(&here), sizeof here) != 0 ||
       ::getsockname(client_, reinterpret_cast<sockaddr*>(&here), &length) != 0 ||
-      ::connect(bmc_, reinterpret_cast<sockaddr*>(&there), sizeof there) != 0)
+      ::connect(bmc_, reinterpret_cast<sockaddr*>(&there), sizeof there) != 0) {
     throw std::runtime_error("no relay");
+  }
   port_ = ::ntohs(here.sin_port);
   thread_ = std::thread([this] { relay(); });
 }
@@ -41,7 +42,9 @@ UdpRelay::UdpRelay(std::uint16_t destination)
 UdpRelay::~UdpRelay() {
   ::eventfd_write(stop_, 1);
   thread_.join();
-  for (const int descriptor : {client_, bmc_, stop_}) ::close(descriptor);
+  for (const int descriptor : {client_, bmc_, stop_}) {
+    ::close(descriptor);
+  }
 }
 
 void UdpRelay::relay() {
@@ -56,14 +59,19 @@ void UdpRelay::relay() {
           ::recvfrom(client_, datagram.data(), datagram.size(), 0, reinterpret_cast<sockaddr*>(&peer), &length);
       ++requests_;
       const bool passes = passing_ > 0;
-      if (passes && passing_ != unlimited) --passing_;
-      if (passes && size > 0) ::send(bmc_, datagram.data(), static_cast<std::size_t>(size), 0);
+      if (passes && passing_ != unlimited) {
+        --passing_;
+      }
+      if (passes && size > 0) {
+        ::send(bmc_, datagram.data(), static_cast<std::size_t>(size), 0);
+      }
     }
     if (sources[1].revents != 0) {
       const ssize_t size = ::recv(bmc_, datagram.data(), datagram.size(), 0);
-      if (passing_ > 0 && size > 0)
+      if (passing_ > 0 && size > 0) {
         ::sendto(client_, datagram.data(), static_cast<std::size_t>(size), 0, reinterpret_cast<sockaddr*>(&peer),
                  length);
+      }
     }
   }
 }

@@ -91,8 +91,9 @@ TEST_F(ASimulatedProcessor, ofAFreshMachineIsTheSameForAllThatAskAtOnce) {
   std::vector<ManagementProcessor> seen(4);
   {
     std::vector<std::jthread> threads;
-    for (ManagementProcessor& processor : seen)
+    for (ManagementProcessor& processor : seen) {
       threads.emplace_back([&] { processor = SimulatedBackEnd(state_).read(); });
+    }
   }
   EXPECT_THAT(seen, testing::Each(factoryConfiguration()));
 }

@@ -29,7 +29,9 @@ mode_t modeOf(const std::string& path) {
 
 std::set<std::string> namesIn(const Testing::TemporaryDirectory& directory) {
   std::set<std::string> names;
-  for (const auto& entry : std::filesystem::directory_iterator(directory.path())) names.insert(entry.path().filename());
+  for (const auto& entry : std::filesystem::directory_iterator(directory.path())) {
+    names.insert(entry.path().filename());
+  }
   return names;
 }
 
@@ -102,7 +104,9 @@ TEST(StateFile, keepsItsMode) {
 }
 
 TEST(StateFile, keepsItsOwner) {
-  if (::geteuid() != 0) GTEST_SKIP() << "only root can give files away";
+  if (::geteuid() != 0) {
+    GTEST_SKIP() << "only root can give files away";
+  }
   const Testing::TemporaryDirectory directory;
   Testing::writeFile(directory / "state", "old");
   ASSERT_EQ(::chown((directory / "state").c_str(), 1234, 4321), 0);
@@ -114,7 +118,9 @@ TEST(StateFile, keepsItsOwner) {
 }
 
 TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
-  if (::geteuid() != 0) GTEST_SKIP() << "only root can become another user";
+  if (::geteuid() != 0) {
+    GTEST_SKIP() << "only root can become another user";
+  }
   // Given a file of one user, in a directory in which another may write
   const Testing::TemporaryDirectory directory;
   Testing::writeFile(directory / "state", "old");
@@ -123,7 +129,9 @@ TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
 
   // When the other changes it
   const auto change = [&] {
-    if (::setgid(4321) != 0 || ::setuid(1234) != 0) std::exit(2);
+    if (::setgid(4321) != 0 || ::setuid(1234) != 0) {
+      std::exit(2);
+    }
     try {
       replace(directory / "state", "new");
     } catch (const std::exception& error) {

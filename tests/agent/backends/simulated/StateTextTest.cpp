@@ -50,8 +50,9 @@ TEST(StateText, isIndentedForItsReader) {
 }
 
 TEST(StateText, thatIsNoJsonIsRefused) {
-  for (const char* text : {"", "{", "hello", "{\"name\": \"BMC\"", "{} {}", "\xff"})
+  for (const char* text : {"", "{", "hello", "{\"name\": \"BMC\"", "{} {}", "\xff"}) {
     EXPECT_THAT(thrownBy([&] { parseState(text); }), testing::HasSubstr("parse error")) << text;
+  }
 }
 
 TEST(StateText, thatIsNoObjectIsRefused) {
@@ -97,9 +98,10 @@ TEST(StateText, withAValueThatMeansNothingIsRefused) {
             "the field interfaces[0].ipv4.subnetMask is not a dotted IPv4 address: '/24'");
   EXPECT_EQ(complaintWith("/interfaces/0/ipv6/address", "192.0.2.1"),
             "the field interfaces[0].ipv6.address is not an IPv6 address: '192.0.2.1'");
-  for (const json& length : {json(129), json(-1), json(64.5), json("64")})
+  for (const json& length : {json(129), json(-1), json(64.5), json("64")}) {
     EXPECT_EQ(complaintWith("/interfaces/0/ipv6/prefixLength", length),
               "the field interfaces[0].ipv6.prefixLength is not a whole number from 0 to 128");
+  }
 }
 
 TEST(StateText, withAFieldThatAChangeWouldLoseIsRefused) {

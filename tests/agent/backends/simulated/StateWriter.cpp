@@ -16,7 +16,9 @@ int main(int, char** arguments) {
   const int changes = std::stoi(arguments[4]);
   try {
     QV::SimulatedBackEnd processor(arguments[1]);
-    if (::write(STDOUT_FILENO, ".", 1) != 1) return 1;
+    if (::write(STDOUT_FILENO, ".", 1) != 1) {
+      return 1;
+    }
     for (int count = 1; changes == 0 || count <= changes; ++count) {
       const bool odd = count % 2 != 0;
       const auto address = QV::Ipv4Address::parse(network + (odd ? ".1" : ".2"));

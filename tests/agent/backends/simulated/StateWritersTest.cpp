@@ -23,22 +23,30 @@ class Writer {
  public:
   Writer(const std::string& state, const std::string& interface, const std::string& network, int changes) {
     std::array<int, 2> pipe{};
-    if (::pipe2(pipe.data(), O_CLOEXEC) != 0) throw std::runtime_error("no pipe can be made");
+    if (::pipe2(pipe.data(), O_CLOEXEC) != 0) {
+      throw std::runtime_error("no pipe can be made");
+    }
     output_ = pipe[0];
     posix_spawn_file_actions_t actions;
     ::posix_spawn_file_actions_init(&actions);
     ::posix_spawn_file_actions_adddup2(&actions, pipe[1], STDOUT_FILENO);
     std::vector<std::string> words = {STATE_WRITER, state, interface, network, std::to_string(changes)};
     std::vector<char*> arguments;
-    for (std::string& word : words) arguments.push_back(word.data());
+    for (std::string& word : words) {
+      arguments.push_back(word.data());
+    }
     arguments.push_back(nullptr);
     const int error = ::posix_spawn(&process_, STATE_WRITER, &actions, nullptr, arguments.data(), environ);
     ::posix_spawn_file_actions_destroy(&actions);
     ::close(pipe[1]);
-    if (error != 0) throw std::runtime_error("the writer cannot be started");
+    if (error != 0) {
+      throw std::runtime_error("the writer cannot be started");
+    }
   }
   ~Writer() {
-    if (process_ > 0) kill();
+    if (process_ > 0) {
+      kill();
+    }
     ::close(output_);
   }
   Writer(const Writer&) = delete;

@@ -193,7 +193,9 @@ TEST_F(AddressChangerTest, ThatIsRefusedPutsBackWhatWasWritten) {
 TEST_F(AddressChangerTest, ThatIsRefusedSaysWhatCouldNotBePutBack) {
   bmc.refuses[LanParameter::SubnetMask] = 0xCC;
   bmc.beforeRequest = [&](unsigned number) {
-    if (number == firstWrite + 2) bmc.refuses[LanParameter::IpAddress] = 0xFF;
+    if (number == firstWrite + 2) {
+      bmc.refuses[LanParameter::IpAddress] = 0xFF;
+    }
   };
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("could not be put back", "(0xFF)"));
@@ -239,7 +241,9 @@ TEST_F(AddressChangerTest, FailsWhereTheBmcAcceptsAndDoesNotApply) {
 TEST_F(AddressChangerTest, PutsTheEarlierValuesBackWhereTheBmcAppliesAPart) {
   bmc.applies = ScriptedBmc::Applies::AtOnce;
   bmc.beforeRequest = [&](unsigned) {
-    if (bmc.values[LanParameter::SubnetMask] == newMask) bmc.values[LanParameter::SubnetMask] = {255, 255, 0, 0};
+    if (bmc.values[LanParameter::SubnetMask] == newMask) {
+      bmc.values[LanParameter::SubnetMask] = {255, 255, 0, 0};
+    }
   };
 
   EXPECT_THAT([&] { change(bothValues); },
@@ -252,7 +256,9 @@ TEST_F(AddressChangerTest, PutsTheEarlierValuesBackWhereTheBmcAppliesAPart) {
 TEST_F(AddressChangerTest, LeavesAnAddressThatAnotherClientWroteMeanwhile) {
   const ParameterData anothers{192, 0, 2, 78};
   bmc.beforeRequest = [&](unsigned number) {
-    if (number > firstWrite + 2) bmc.values[LanParameter::IpAddress] = anothers;
+    if (number > firstWrite + 2) {
+      bmc.values[LanParameter::IpAddress] = anothers;
+    }
   };
 
   EXPECT_THAT([&] { change(bothValues); },
@@ -265,7 +271,9 @@ TEST_F(AddressChangerTest, LeavesAnAddressThatAnotherClientWroteMeanwhile) {
 TEST_F(AddressChangerTest, GivesTheLockBackWhereItsTimeEnds) {
   bmc.applies = ScriptedBmc::Applies::AtOnce;
   bmc.beforeRequest = [&](unsigned number) {
-    if (number > firstWrite && !bmc.cleaningUp) throw NotSent("operation_timeout is over");
+    if (number > firstWrite && !bmc.cleaningUp) {
+      throw NotSent("operation_timeout is over");
+    }
   };
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("operation_timeout is over", "nothing was changed"));
@@ -277,7 +285,9 @@ TEST_F(AddressChangerTest, GivesTheLockBackWhereItsTimeEnds) {
 TEST_F(AddressChangerTest, IsConfirmedWhereTheConnectionBreaksAndComesBack) {
   bmc.applies = ScriptedBmc::Applies::AtOnce;
   bmc.beforeRequest = [&](unsigned number) {
-    if (number == firstWrite + 2) throw ConnectionLost("session timeout");
+    if (number == firstWrite + 2) {
+      throw ConnectionLost("session timeout");
+    }
   };
 
   change(bothValues);
@@ -288,7 +298,9 @@ TEST_F(AddressChangerTest, IsConfirmedWhereTheConnectionBreaksAndComesBack) {
 
 TEST_F(AddressChangerTest, FailsClearlyWhereTheConnectionBreaksBeforeTheValuesHold) {
   bmc.beforeRequest = [&](unsigned number) {
-    if (number == firstWrite + 1) throw ConnectionLost("session timeout");
+    if (number == firstWrite + 1) {
+      throw ConnectionLost("session timeout");
+    }
   };
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("does not show it", "the earlier values hold"));
@@ -298,8 +310,12 @@ TEST_F(AddressChangerTest, FailsClearlyWhereTheConnectionBreaksBeforeTheValuesHo
 
 TEST_F(AddressChangerTest, HasAnUnknownOutcomeWhereTheBmcIsGoneAndRemembersTheLock) {
   bmc.beforeRequest = [&](unsigned number) {
-    if (number == firstWrite) throw ConnectionLost("session timeout");
-    if (number > firstWrite) throw NotSent("no session");
+    if (number == firstWrite) {
+      throw ConnectionLost("session timeout");
+    }
+    if (number > firstWrite) {
+      throw NotSent("no session");
+    }
   };
   IpmiFixture::takeLog();
 
@@ -312,7 +328,9 @@ TEST_F(AddressChangerTest, HasAnUnknownOutcomeWhereTheBmcIsGoneAndRemembersTheLo
 
 TEST_F(AddressChangerTest, ChangesNothingWhereTheConnectionBreaksWithTheLock) {
   bmc.beforeRequest = [&](unsigned number) {
-    if (number == lockRequest) throw ConnectionLost("session timeout");
+    if (number == lockRequest) {
+      throw ConnectionLost("session timeout");
+    }
   };
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("session timeout"));

@@ -125,8 +125,9 @@ TEST(IpmiInterface, HasNoIpv6AddressOfZeros) {
 TEST(IpmiInterfaceName, LeadsToItsChannel) {
   EXPECT_EQ(channelOf("lan1"), 1);
   EXPECT_EQ(channelOf("lan11"), 11);
-  for (const char* name : {"", "lan", "lan01", "lan1 ", "LAN1", "eth1", "lan256", "lan-1", "lan+1"})
+  for (const char* name : {"", "lan", "lan01", "lan1 ", "LAN1", "eth1", "lan256", "lan-1", "lan+1"}) {
     EXPECT_EQ(channelOf(name), std::nullopt) << name;
+  }
 }
 
 }  // namespace

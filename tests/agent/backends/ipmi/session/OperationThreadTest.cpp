@@ -65,15 +65,21 @@ TEST(OperationThread, RunsOneOperationAtATime) {
   const auto running = std::make_shared<std::atomic<int>>(0);
   const auto together = std::make_shared<std::atomic<int>>(0);
   std::vector<std::future<void>> callers;
-  for (int caller = 0; caller < 8; ++caller)
+  for (int caller = 0; caller < 8; ++caller) {
     callers.push_back(std::async(std::launch::async, [&] {
-      for (int operation = 0; operation < 50; ++operation)
+      for (int operation = 0; operation < 50; ++operation) {
         thread.run(Deadline(10s), [running, together] {
-          if (++*running > 1) ++*together;
+          if (++*running > 1) {
+            ++*together;
+          }
           --*running;
         });
+      }
     }));
-  for (auto& caller : callers) caller.get();
+  }
+  for (auto& caller : callers) {
+    caller.get();
+  }
   EXPECT_EQ(*together, 0);
 }
 

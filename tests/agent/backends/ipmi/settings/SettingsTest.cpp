@@ -31,7 +31,9 @@ class IpmiSettingsTest : public testing::Test {
   BackEndSettings lan(const BackEndSettings& more = {}) const {
     BackEndSettings section = {
         {"connection", "lan"}, {"host", "bmc.example"}, {"user", "admin"}, {"password_file", password}};
-    for (const auto& [key, value] : more) section[key] = value;
+    for (const auto& [key, value] : more) {
+      section[key] = value;
+    }
     return section;
   }
 
@@ -140,8 +142,9 @@ TEST_F(IpmiSettingsTest, RefuseBadValuesByNameAndReason) {
                         {"generation_file", "generation", "must be an absolute path"},
                         {"generation_file", "", "must be an absolute path"},
                         {"password_file", "/nowhere/password", "cannot be read: No such file"}};
-  for (const auto& [key, value, reason] : cases)
+  for (const auto& [key, value, reason] : cases) {
     EXPECT_THAT([&] { parseSettings(lan({{key, value}})); }, refusal(key, reason)) << key << " = " << value;
+  }
 }
 
 TEST_F(IpmiSettingsTest, NameTheKeyThatIsMissing) {
