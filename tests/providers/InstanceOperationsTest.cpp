@@ -227,9 +227,9 @@ TEST_P(InstanceOperationsTest, GetInstanceWithoutKeysAndBrokerHasNoMessage) {
 const std::map<std::string, std::pair<std::string, std::string>> copiedBesideTheKeys = {
     {"YRNx_MgmtHwComputerSystem", {"Description", "NameFormat"}},
     {"YRNx_MgmtHwIPProtocolEndPoint", {"IPv4Address", "SubnetMask"}},
-    {"YRNx_MgmtHwIPAssignmentSettingSequence", {"ElementName", "AddressOrigin"}},
-    {"YRNx_MgmtHwStaticIPAssignmentSettingData", {"ElementName", "AddressOrigin"}},
-    {"YRNx_MgmtHwDHCPAssignmentSettingData", {"ElementName", "AddressOrigin"}},
+    {"YRNx_MgmtHwIPAssignmentSettingSequence", {"AddressOrigin", "ElementName"}},
+    {"YRNx_MgmtHwStaticIPAssignmentSettingData", {"AddressOrigin", "ElementName"}},
+    {"YRNx_MgmtHwDHCPAssignmentSettingData", {"AddressOrigin", "ElementName"}},
     {"YRNx_MgmtHwRemoteServiceAccessPoint", {"AccessInfo", "OtherAccessContext"}},
 };
 
