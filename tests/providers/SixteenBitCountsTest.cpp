@@ -36,21 +36,30 @@ class SixteenBitCountsTest : public Testing::AssociationTest {
     return Testing::unitOf(Classes::endpoint).createInstanceMI(broker(), context(), nullptr);
   }
 
-  // Two endpoints with 32769 sequences, which make 65538 associations, two more than are counted. What is made of each
-  // class is one and the same, but for those of the given numbers, which cannot be made.
-  void addTooManyAssociations(const std::vector<int>& unmade = {}) {
+  // Two endpoints with 32769 sequences, which make 65538 associations, two more than are counted. Of these only those
+  // of the given numbers can be made; all sequences are one and the same.
+  void addTooManyAssociations(const std::vector<int>& made) {
     attach(Testing::modelOf(Classes::elementSettingData));
     addEnds({"eth0", "eth1"}, {"BMC:eth0:static"});
     std::vector<CMPIInstance*>& sequences =
         faults.upCallScripts[Testing::underlyingClassOf(Classes::sequence)].instances;
     sequences.resize(32769, sequences.front());
+    CMPIObjectPath* const sequencePath = makePath(Classes::sequence);
+    faults.failNewObjectPath = [=, this](const std::string& className, int) {
+      faults.unmadePath = className == Classes::sequence ? sequencePath : associationPath;
+      return className == Classes::sequence || className == model().className;
+    };
     CMPIInstance* const sequence = makeInstance(Testing::requestNameSpace, Classes::sequence, {});
-    CMPIInstance* const association = makeInstance(Testing::requestNameSpace, model().className, {});
-    Testing::withPath(association, associationPath);
+    Testing::withPath(sequence, sequencePath);
     faults.failNewInstance = [=, this](const std::string& className, int call) {
-      const bool isUnmade = std::find(unmade.begin(), unmade.end(), call) != unmade.end();
-      faults.unmadeInstance = className == Classes::sequence ? sequence : isUnmade ? nullptr : association;
-      return className != Classes::endpoint;
+      faults.unmadeInstance = className == Classes::sequence ? sequence : nullptr;
+      return className == Classes::sequence ||
+             (className == model().className && std::find(made.begin(), made.end(), call) == made.end());
+    };
+    faults.onNewInstance = [this](const std::string& className, int, CMPIInstance* instance) {
+      if (className == model().className) {
+        Testing::withPath(instance, associationPath);
+      }
     };
   }
 
@@ -85,17 +94,17 @@ TEST_F(SixteenBitCountsTest, OfGetInstance) {
 }
 
 TEST_F(SixteenBitCountsTest, OfAnAssociationsEnumInstances) {
-  addTooManyAssociations();
+  addTooManyAssociations({});
   EXPECT_EQ(read(Reading::EnumInstances, associationPath).order, (Strings{"instance", "instance", "done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfAnAssociationsEnumInstanceNames) {
-  addTooManyAssociations();
+  addTooManyAssociations({1, 2, 3});
   EXPECT_EQ(read(Reading::EnumInstanceNames, associationPath).order, (Strings{"path", "path", "done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfAnAssociationsGetInstance) {
-  addTooManyAssociations({1, 2});
+  addTooManyAssociations({3});
   EXPECT_EQ(read(Reading::GetInstance, associationPath).order, (Strings{"done"}));
 }
 
