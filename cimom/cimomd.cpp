@@ -63,11 +63,13 @@ std::string contentOf(const std::filesystem::path& file) {
   }
   std::ifstream stream(file, std::ios::binary);
   std::string content{std::istreambuf_iterator<char>(stream), {}};
-  if (content.empty()) {
-    throw Http::ServerError("cannot read " + file.string() + ": " +
-                            (stream.is_open() ? "it is empty" : std::strerror(errno)));
+  if (!content.empty()) {
+    return content;
   }
-  return content;
+  if (!stream.is_open()) {
+    throw Http::ServerError(file.string() + ": " + std::strerror(errno));
+  }
+  throw Http::ServerError(file.string() + (std::filesystem::is_directory(file) ? ": is a directory" : ": is empty"));
 }
 
 Http::ServerOptions serverOptions(const Configuration& configuration) {

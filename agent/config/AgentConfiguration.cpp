@@ -1,69 +1,54 @@
-#include "config/AgentConfiguration.h"
+#include "agent/config/AgentConfiguration.h"
 
 #include <algorithm>
-#include <array>
 #include <cerrno>
-#include <charconv>
 #include <cstdlib>
 #include <cstring>
+#include <exception>
 #include <fstream>
+#include <iterator>
+#include <limits>
 #include <set>
 #include <stdexcept>
 #include <utility>
 #include <vector>
 
-#include "config/IniFile.h"
+#include "ground/IniFile.h"
+#include "ground/Values.h"
 
 namespace QV {
 namespace {
 
 using Destination = ChannelSettings::Destination;
 
-// The enumerator that a word stands for.
-template <typename Enumeration, std::size_t Count>
-Enumeration choose(const std::string& value, const std::array<std::pair<const char*, Enumeration>, Count>& words) {
-  std::string expected;
-  for (const auto& [word, meaning] : words) {
-    if (value == word) return meaning;
-    expected += (expected.empty() ? "" : " | ") + std::string(word);
-  }
-  throw std::invalid_argument("'" + value + "' is not one of " + expected);
-}
-
 int level(const std::string& value) {
-  int number = 0;
-  const char* end = value.data() + value.size();
-  const auto [stop, error] = std::from_chars(value.data(), end, number);
-  if (error != std::errc{} || stop != end || number < 0)
-    throw std::invalid_argument("'" + value + "' is not a level: a whole number from 0 on");
-  return number;
-}
-
-std::string absolutePath(const std::string& value) {
-  if (!value.starts_with('/')) throw std::invalid_argument("'" + value + "' is not an absolute path");
-  return value;
-}
-
-std::string text(const std::string& value) {
-  if (value.empty()) throw std::invalid_argument("the value is missing");
-  return value;
+  return static_cast<int>(Ground::parseNumber(value, 0, std::numeric_limits<int>::max()));
 }
 
 Destination destination(const std::string& value) {
-  return choose(value, std::array{std::pair{"off", Destination::Off}, std::pair{"syslog", Destination::Syslog},
-                                  std::pair{"stderr", Destination::Stderr}, std::pair{"file", Destination::File}});
+  return Ground::parseChoice<Destination>(value, {{"off", Destination::Off},
+                                                  {"syslog", Destination::Syslog},
+                                                  {"stderr", Destination::Stderr},
+                                                  {"file", Destination::File}});
 }
 
-AgentConfiguration::BackEndKind backEnd(const std::string& value) {
-  using Kind = AgentConfiguration::BackEndKind;
-  return choose(value, std::array{std::pair{"simulated", Kind::Simulated}, std::pair{"ipmi", Kind::Ipmi}});
+// The name becomes part of a library's: it must not lead to another folder.
+std::string backEnd(const std::string& value) {
+  const bool plain = std::ranges::all_of(value, [](char character) {
+    return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') ||
+           (character >= '0' && character <= '9') || character == '-';
+  });
+  if (value.empty() || !plain) {
+    throw std::invalid_argument("must be the name of a back end, of letters, digits and '-'");
+  }
+  return value;
 }
 
 constexpr const char* componentThreshold = "threshold.";
 
 struct Key {
   const char* section;
-  const char* name;  // a name that ends in '.' takes any key that starts so; an empty one takes every key
+  const char* name;  // a name that ends in '.' takes any key that starts so
   void (*set)(AgentConfiguration& configuration, const std::string& key, const std::string& value);
 };
 
@@ -71,67 +56,113 @@ using Configuration = AgentConfiguration;
 using Text = const std::string;
 
 const Key keys[] = {
-    {"system", "name", [](Configuration& c, Text&, Text& value) { c.systemName = text(value); }},
+    {"system", "name", [](Configuration& c, Text&, Text& value) { c.systemName = Ground::parseText(value); }},
     {"log", "destination", [](Configuration& c, Text&, Text& value) { c.log.destination = destination(value); }},
-    {"log", "file", [](Configuration& c, Text&, Text& value) { c.log.file = absolutePath(value); }},
+    {"log", "file", [](Configuration& c, Text&, Text& value) { c.log.file = Ground::parseAbsolutePath(value); }},
     {"log", "threshold", [](Configuration& c, Text&, Text& value) { c.log.threshold = level(value); }},
     {"log", componentThreshold,
      [](Configuration& c, Text& key, Text& value) {
        c.log.componentThresholds[key.substr(std::strlen(componentThreshold))] = level(value);
      }},
     {"trace", "destination", [](Configuration& c, Text&, Text& value) { c.trace.destination = destination(value); }},
-    {"trace", "file", [](Configuration& c, Text&, Text& value) { c.trace.file = absolutePath(value); }},
+    {"trace", "file", [](Configuration& c, Text&, Text& value) { c.trace.file = Ground::parseAbsolutePath(value); }},
     {"trace", "threshold", [](Configuration& c, Text&, Text& value) { c.trace.threshold = level(value); }},
     {"trace", componentThreshold,
      [](Configuration& c, Text& key, Text& value) {
        c.trace.componentThresholds[key.substr(std::strlen(componentThreshold))] = level(value);
      }},
     {"processor", "backend", [](Configuration& c, Text&, Text& value) { c.backEnd = backEnd(value); }},
-    {"processor", "name", [](Configuration& c, Text&, Text& value) { c.processorName = text(value); }},
-    {"processor", "description", [](Configuration& c, Text&, Text& value) { c.processorDescription = text(value); }},
-    {"simulated", "state", [](Configuration& c, Text&, Text& value) { c.simulatedState = absolutePath(value); }},
-    {"ipmi", "", [](Configuration& c, Text& key, Text& value) { c.ipmi[key] = value; }},
+    {"processor", "name", [](Configuration& c, Text&, Text& value) { c.processorName = Ground::parseText(value); }},
+    {"processor", "description",
+     [](Configuration& c, Text&, Text& value) { c.processorDescription = Ground::parseText(value); }},
 };
 
 bool takes(const Key& known, const std::string& key) {
   const std::string name = known.name;
-  if (name.empty()) return true;
   return name.ends_with('.') ? key.starts_with(name) && key.size() > name.size() : key == name;
 }
 
-void set(AgentConfiguration& configuration, const std::string& section, const std::string& key,
-         const std::string& value) {
+const char* const backEnds[] = {AGENT_BACK_ENDS};
+
+// The section of a back end that is not chosen may stay: an administrator who tries another would lose it.
+bool isBackEndSection(const std::string& section, const std::string& chosen) {
+  return section == chosen || std::ranges::find(backEnds, section) != std::end(backEnds);
+}
+
+std::string chosenBackEnd(const std::vector<Ground::IniEntry>& entries) {
+  for (const Ground::IniEntry& entry : entries) {
+    if (entry.section == "processor" && entry.key == "backend") {
+      return entry.value;
+    }
+  }
+  return AgentConfiguration().backEnd;
+}
+
+void set(AgentConfiguration& configuration, const Ground::IniEntry& entry, const std::string& chosen) {
+  const auto& [section, key, value, line] = entry;
   bool sectionKnown = false;
   for (const Key& known : keys) {
-    if (section != known.section) continue;
+    if (section != known.section) {
+      continue;
+    }
     sectionKnown = true;
-    if (!takes(known, key)) continue;
+    if (!takes(known, key)) {
+      continue;
+    }
     try {
       return known.set(configuration, key, value);
     } catch (const std::invalid_argument& error) {
-      throw std::invalid_argument("[" + section + "] " + key + ": " + error.what());
+      throw std::runtime_error("[" + section + "] " + key + " = " + value + ": " + error.what());
     }
   }
-  if (section.empty()) throw std::invalid_argument("the key '" + key + "' stands before any section");
-  if (!sectionKnown) throw std::invalid_argument("there is no section [" + section + "]");
-  throw std::invalid_argument("[" + section + "] has no key '" + key + "'");
+  if (sectionKnown) {
+    throw std::runtime_error("[" + section + "] has no key '" + key + "'");
+  }
+  if (section.empty()) {
+    throw std::runtime_error("the key '" + key + "' stands before any section");
+  }
+  if (!isBackEndSection(section, chosen)) {
+    throw std::runtime_error("there is no section [" + section + "]");
+  }
+  if (section == chosen) {
+    configuration.backEndSettings[key] = value;
+  }
 }
 
 void requireFileName(const ChannelSettings& channel, const char* section, const std::string& fileName) {
-  if (channel.destination == Destination::File && channel.file.empty())
+  if (channel.destination == Destination::File && channel.file.empty()) {
     throw std::runtime_error(fileName + ": [" + section + "] destination is file, but the key 'file' is missing");
+  }
 }
 
 }  // namespace
 
 AgentConfiguration parseAgentConfiguration(std::istream& input, const std::string& fileName) {
+  // Which sections there may be depends on a key that may stand below them. What is wrong with the form of the text
+  // stops the reading, so that it comes after whatever is wrong with these entries.
+  std::vector<Ground::IniEntry> entries;
+  std::exception_ptr malformed;
+  try {
+    Ground::readIni(input, fileName, [&](const Ground::IniEntry& entry) { entries.push_back(entry); });
+  } catch (const std::runtime_error&) {
+    malformed = std::current_exception();
+  }
   AgentConfiguration configuration;
+  const std::string chosen = chosenBackEnd(entries);
   std::set<std::pair<std::string, std::string>> seen;
-  readIni(input, fileName, [&](const std::string& section, const std::string& key, const std::string& value) {
-    if (!seen.emplace(section, key).second)
-      throw std::invalid_argument("[" + section + "] " + key + " is given a second time");
-    set(configuration, section, key, value);
-  });
+  for (const Ground::IniEntry& entry : entries) {
+    try {
+      if (!seen.emplace(entry.section, entry.key).second) {
+        throw std::runtime_error("[" + entry.section + "] " + entry.key + ": duplicate");
+      }
+      set(configuration, entry, chosen);
+    } catch (const std::runtime_error& error) {
+      throw std::runtime_error(fileName + ":" + std::to_string(entry.line) + ": " + error.what());
+    }
+  }
+  if (malformed) {
+    std::rethrow_exception(malformed);
+  }
   requireFileName(configuration.log, "log", fileName);
   requireFileName(configuration.trace, "trace", fileName);
   return configuration;
@@ -143,7 +174,9 @@ AgentConfiguration readAgentConfiguration() {
   errno = 0;
   std::ifstream file(fileName);
   if (!file) {
-    if (!chosen && errno == ENOENT) return {};
+    if (!chosen && errno == ENOENT) {
+      return {};
+    }
     throw std::runtime_error(fileName + ": cannot be opened: " + std::strerror(errno));
   }
   return parseAgentConfiguration(file, fileName);

@@ -18,16 +18,15 @@ struct ChannelSettings {
 };
 
 struct AgentConfiguration {
-  enum class BackEndKind { Simulated, Ipmi };
+  using Section = std::map<std::string, std::string>;
 
   std::string systemName;  // empty: the host name
   ChannelSettings log{ChannelSettings::Destination::Syslog, {}, 6000, {}};
   ChannelSettings trace{ChannelSettings::Destination::Off, {}, 4000, {}};
-  BackEndKind backEnd = BackEndKind::Simulated;
-  std::string processorName;         // empty: what the processor itself says
-  std::string processorDescription;  // empty: what the processor itself says
-  std::string simulatedState = "/var/lib/compositeipconfig/management-processor.json";
-  std::map<std::string, std::string> ipmi;  // [ipmi] as it stands: its keys are the IPMI back end's
+  std::string backEnd = "simulated";  // a name of letters, digits and '-'
+  Section backEndSettings;            // the section of that name as it stands: its keys are the back end's own
+  std::string processorName;          // empty: what the processor itself says
+  std::string processorDescription;   // empty: what the processor itself says
 };
 
 // The configuration that is in force: the file that the environment variable QV_AGENT_INI names, which must be there;

@@ -1,4 +1,4 @@
-#include "helper/Conversion.h"
+#include "agent/helper/Conversion.h"
 
 #include <cmpimacs.h>
 

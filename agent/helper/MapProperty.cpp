@@ -1,9 +1,9 @@
+#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
 #include <optional>
 
-#include "QV/ProviderHelper.h"
-#include "helper/Conversion.h"
+#include "agent/helper/Conversion.h"
 
 namespace QV {
 namespace {
@@ -12,7 +12,9 @@ namespace {
 CMPIStatus set(CMPIInstance* target, const char* name, DataType type, const CMPIData& data) {
   const auto integer = integerOf(data);
   const auto text = textOf(data);
-  if (type == String && text) return CMSetProperty(target, name, text->c_str(), CMPI_chars);
+  if (type == String && text) {
+    return CMSetProperty(target, name, text->c_str(), CMPI_chars);
+  }
   CMPIValue value{};
   if (type == Uint16 && integer && integer->fits<CMPIUint16>()) {
     value.uint16 = static_cast<CMPIUint16>(integer->bits);

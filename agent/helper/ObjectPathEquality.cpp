@@ -1,3 +1,4 @@
+#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
 #include <algorithm>
@@ -5,8 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "QV/ProviderHelper.h"
-#include "helper/Conversion.h"
+#include "agent/helper/Conversion.h"
 
 namespace QV {
 namespace {
@@ -56,8 +56,12 @@ bool sameValue(const CMPIData& a, const CMPIData& b) {
   if (isNull(a) || isNull(b)) {
     return isNull(a) && isNull(b);
   }
-  if (bothEqual(integerOf(a), integerOf(b)) || bothEqual(textOf(a), textOf(b))) return true;
-  if (a.type != b.type) return false;
+  if (bothEqual(integerOf(a), integerOf(b)) || bothEqual(textOf(a), textOf(b))) {
+    return true;
+  }
+  if (a.type != b.type) {
+    return false;
+  }
   switch (a.type) {
     case CMPI_boolean:
       return (a.value.boolean != 0) == (b.value.boolean != 0);
@@ -124,7 +128,9 @@ bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b) {
 }  // namespace
 
 bool isObjPathsEqual(const CMPIObjectPath* requested, const CMPIObjectPath* candidate, bool flag) {
-  if (CMIsNullObject(requested) || CMIsNullObject(candidate)) return false;
+  if (CMIsNullObject(requested) || CMIsNullObject(candidate)) {
+    return false;
+  }
   return samePath(requested, candidate) && (!flag || sameNamespace(requested, candidate));
 }
 

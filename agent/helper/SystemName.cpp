@@ -1,10 +1,10 @@
+#include <QV/ProviderHelper.h>
 #include <unistd.h>
 
 #include <array>
 #include <exception>
 
-#include "QV/ProviderHelper.h"
-#include "config/AgentConfiguration.h"
+#include "agent/config/AgentConfiguration.h"
 
 namespace QV {
 namespace {
@@ -20,7 +20,9 @@ std::string configuredName() {
 
 std::string hostName() {
   std::array<char, 256> name{};
-  if (::gethostname(name.data(), name.size() - 1) != 0 || !name[0]) return "localhost";
+  if (::gethostname(name.data(), name.size() - 1) != 0 || !name[0]) {
+    return "localhost";
+  }
   return name.data();
 }
 

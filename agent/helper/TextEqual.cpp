@@ -1,4 +1,4 @@
-#include "QV/ProviderHelper.h"
+#include <QV/ProviderHelper.h>
 
 namespace QV {
 namespace {
@@ -11,7 +11,9 @@ char lower(char character) {
 }  // namespace
 
 bool textEqual(const char* a, const char* b) {
-  if (!a || !b) return false;
+  if (!a || !b) {
+    return false;
+  }
   while (*a && lower(*a) == lower(*b)) {
     ++a;
     ++b;

@@ -1,10 +1,10 @@
-#include "QV/Instrumentation.h"
+#include <QV/Instrumentation.h>
 
 #include <exception>
 
-#include "instrumentation/InterfaceCursor.h"
-#include "instrumentation/SharedBackEnd.h"
-#include "log/Report.h"
+#include "agent/backends/SharedBackEnd.h"
+#include "agent/instrumentation/InterfaceCursor.h"
+#include "agent/log/Report.h"
 
 namespace QV {
 namespace {

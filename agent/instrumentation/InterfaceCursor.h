@@ -2,14 +2,15 @@
 // which gathers the address and the mask of one change into one exchange with the processor.
 #pragma once
 
+#include <QV/Instrumentation.h>
+
 #include <cstddef>
 #include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
-#include "QV/Instrumentation.h"
-#include "instrumentation/BackEnd.h"
+#include "agent/processor/BackEnd.h"
 
 namespace QV {
 
@@ -36,14 +37,12 @@ class InterfaceCursor {
   void flush();
 
  private:
-  void stageAddress(const std::string& address);
-  void sendWithMask(const std::string& mask);
-  void send(AddressChange change);
+  void send(const AddressChange& change);
 
   std::shared_ptr<BackEnd> backEnd_;
   std::vector<NetworkInterface> interfaces_;
   std::size_t position_ = 0;
-  std::optional<std::string> stagedAddress_;
+  std::optional<Ipv4Address> stagedAddress_;
 };
 
 }  // namespace QV

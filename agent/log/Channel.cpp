@@ -1,4 +1,4 @@
-#include "log/Channel.h"
+#include "agent/log/Channel.h"
 
 #include <syslog.h>
 #include <unistd.h>
@@ -16,16 +16,24 @@ namespace {
 using Destination = QV::ChannelSettings::Destination;
 
 int leastThreshold(const QV::ChannelSettings& settings) {
-  if (settings.destination == Destination::Off) return std::numeric_limits<int>::max();
+  if (settings.destination == Destination::Off) {
+    return std::numeric_limits<int>::max();
+  }
   int least = settings.threshold;
-  for (const auto& [component, threshold] : settings.componentThresholds) least = std::min(least, threshold);
+  for (const auto& [component, threshold] : settings.componentThresholds) {
+    least = std::min(least, threshold);
+  }
   return least;
 }
 
 // The severities that syslog knows, by the level from which on each of them applies.
 int priority(int level) {
-  if (level >= 6000) return LOG_ERR;
-  if (level >= 5000) return LOG_WARNING;
+  if (level >= 6000) {
+    return LOG_ERR;
+  }
+  if (level >= 5000) {
+    return LOG_WARNING;
+  }
   return level >= 4000 ? LOG_INFO : LOG_DEBUG;
 }
 
@@ -40,7 +48,9 @@ Channel::Channel(QV::ChannelSettings settings)
     : settings_(std::move(settings)), least_(leastThreshold(settings_)), file_(settings_.file) {}
 
 bool Channel::passes(const std::string& component, int level) const noexcept {
-  if (level < least_ || settings_.destination == Destination::Off) return false;
+  if (level < least_ || settings_.destination == Destination::Off) {
+    return false;
+  }
   const auto named = settings_.componentThresholds.find(component);
   return level >= (named == settings_.componentThresholds.end() ? settings_.threshold : named->second);
 }

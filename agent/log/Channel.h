@@ -4,9 +4,9 @@
 #include <atomic>
 #include <string>
 
-#include "config/AgentConfiguration.h"
-#include "log/Line.h"
-#include "log/LogFile.h"
+#include "agent/config/AgentConfiguration.h"
+#include "agent/log/Line.h"
+#include "agent/log/LogFile.h"
 
 namespace TWLog {
 

@@ -1,4 +1,4 @@
-#include "log/Line.h"
+#include "agent/log/Line.h"
 
 #include <array>
 #include <cstdio>

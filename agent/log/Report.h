@@ -22,7 +22,7 @@ using Send = void(const char* function, const char* file, int line, const std::s
                   int, const std::string& message);
 
 // The unit is shown by its bare name, without folder and extension. A line that memory runs out for is lost, and what
-// it tells of goes on.
+// it is about goes on.
 inline void send(Send& channel, const char* component, int level, std::string_view text,
                  const SourceLocation& where) noexcept {
   try {

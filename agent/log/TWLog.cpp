@@ -1,9 +1,9 @@
-#include "TWLog/TWLog.h"
+#include <TWLog/TWLog.h>
 
 #include <exception>
 #include <utility>
 
-#include "log/Channel.h"
+#include "agent/log/Channel.h"
 
 namespace TWLog {
 namespace {
@@ -35,9 +35,11 @@ struct Channels {
 void sendWherePassed(Channel Channels::*channel, const Message& message) noexcept {
   try {
     Channel& chosen = Channels::instance().*channel;
-    if (chosen.passes(message.component, message.level)) chosen.send(message);
+    if (chosen.passes(message.component, message.level)) {
+      chosen.send(message);
+    }
   } catch (const std::exception&) {
-    // Out of memory: the message is lost, the request that it tells of is not.
+    // Out of memory: the message is lost, the request that it is about is not.
   }
 }
 
@@ -48,7 +50,9 @@ TWMessageBuffer::TWMessageBuffer() = default;
 TWMessageBuffer::~TWMessageBuffer() = default;
 
 TWMessageBuffer& TWMessageBuffer::operator<<(const char* text) {
-  if (text) text_ += text;
+  if (text) {
+    text_ += text;
+  }
   return *this;
 }
 

@@ -1,10 +1,11 @@
-#include "underlying/ClassTable.h"
+#include "agent/underlying/ClassTable.h"
+
+#include <QV/ProviderHelper.h>
 
 #include <iterator>
 
-#include "QV/ProviderHelper.h"
-#include "instrumentation/SharedBackEnd.h"
-#include "underlying/Host.h"
+#include "agent/backends/SharedBackEnd.h"
+#include "agent/underlying/Host.h"
 
 namespace QV {
 namespace {
@@ -27,7 +28,9 @@ constexpr UnderlyingClass classes[] = {
 
 const UnderlyingClass* findUnderlyingClass(const char* name) {
   for (const UnderlyingClass& candidate : classes) {
-    if (textEqual(candidate.name, name)) return &candidate;
+    if (textEqual(candidate.name, name)) {
+      return &candidate;
+    }
   }
   return nullptr;
 }

@@ -3,7 +3,7 @@
 
 #include <array>
 
-#include "underlying/InstanceBuilders.h"
+#include "agent/underlying/InstanceBuilders.h"
 
 namespace QV {
 

@@ -1,5 +1,6 @@
-#include "underlying/Host.h"
+#include "agent/underlying/Host.h"
 
+#include <QV/ProviderHelper.h>
 #include <arpa/inet.h>
 #include <ifaddrs.h>
 #include <net/if.h>
@@ -9,22 +10,16 @@
 #include <algorithm>
 #include <array>
 #include <bit>
-#include <cstdio>
 #include <cstring>
 #include <fstream>
 #include <memory>
 #include <sstream>
 
-#include "QV/ProviderHelper.h"
-
 namespace QV {
 namespace {
 
-template <typename Address>
-std::string textOf(int family, const Address& address) {
-  std::array<char, INET6_ADDRSTRLEN> text{};
-  return ::inet_ntop(family, &address, text.data(), text.size()) ? text.data() : "";
-}
+// The kernel holds an IPv4 address as a number whose octets lie in memory in network order.
+DottedDecimal::Octets octetsOf(in_addr_t address) { return std::bit_cast<DottedDecimal::Octets>(address); }
 
 template <typename SocketAddress>
 SocketAddress as(const sockaddr* address) {
@@ -37,33 +32,41 @@ SocketAddress as(const sockaddr* address) {
 // which the first of a family counts.
 void take(const ifaddrs& entry, NetworkInterface& interface) {
   interface.enabled = (entry.ifa_flags & IFF_UP) != 0;
-  if (!entry.ifa_addr) return;
+  if (!entry.ifa_addr) {
+    return;
+  }
   const int family = entry.ifa_addr->sa_family;
   if (family == AF_INET && !interface.ipv4Address) {
-    interface.ipv4Address = textOf(family, as<sockaddr_in>(entry.ifa_addr).sin_addr);
-    if (entry.ifa_netmask) interface.ipv4SubnetMask = textOf(family, as<sockaddr_in>(entry.ifa_netmask).sin_addr);
+    interface.ipv4Address = Ipv4Address(octetsOf(as<sockaddr_in>(entry.ifa_addr).sin_addr.s_addr));
+    if (entry.ifa_netmask) {
+      interface.ipv4SubnetMask = SubnetMask(octetsOf(as<sockaddr_in>(entry.ifa_netmask).sin_addr.s_addr));
+    }
   } else if (family == AF_INET6 && !interface.ipv6Address) {
-    interface.ipv6Address = textOf(family, as<sockaddr_in6>(entry.ifa_addr).sin6_addr);
+    interface.ipv6Address = Ipv6Address(std::bit_cast<Ipv6Address::Octets>(as<sockaddr_in6>(entry.ifa_addr).sin6_addr));
     if (entry.ifa_netmask) {
       int length = 0;
-      for (const unsigned char byte : as<sockaddr_in6>(entry.ifa_netmask).sin6_addr.s6_addr)
+      for (const unsigned char byte : as<sockaddr_in6>(entry.ifa_netmask).sin6_addr.s6_addr) {
         length += std::popcount(byte);
+      }
       interface.ipv6PrefixLength = static_cast<std::uint8_t>(length);
     }
   } else if (family == AF_PACKET) {
     const auto hardware = as<sockaddr_ll>(entry.ifa_addr);
-    if (hardware.sll_halen != 6) return;
-    std::array<char, 18> text{};
-    std::snprintf(text.data(), text.size(), "%02x:%02x:%02x:%02x:%02x:%02x", hardware.sll_addr[0], hardware.sll_addr[1],
-                  hardware.sll_addr[2], hardware.sll_addr[3], hardware.sll_addr[4], hardware.sll_addr[5]);
-    interface.macAddress = text.data();
+    MacAddress::Octets octets{};
+    if (hardware.sll_halen != octets.size()) {
+      return;
+    }
+    std::copy_n(hardware.sll_addr, octets.size(), octets.begin());
+    interface.macAddress = MacAddress(octets);
   }
 }
 
 std::vector<NetworkInterface> readInterfaces() {
   std::vector<NetworkInterface> interfaces;
   ifaddrs* entries = nullptr;
-  if (::getifaddrs(&entries) != 0) return interfaces;
+  if (::getifaddrs(&entries) != 0) {
+    return interfaces;
+  }
   const std::unique_ptr<ifaddrs, decltype(&::freeifaddrs)> owner(entries, &::freeifaddrs);
   for (const ifaddrs* entry = entries; entry; entry = entry->ifa_next) {
     const std::string name = entry->ifa_name;
@@ -86,14 +89,18 @@ std::vector<std::string> parseResolverConfiguration(std::istream& text) {
     std::istringstream words(line);
     std::string keyword;
     std::string server;
-    if (words >> keyword >> server && keyword == "nameserver") servers.push_back(server);
+    if (words >> keyword >> server && keyword == "nameserver") {
+      servers.push_back(server);
+    }
   }
-  if (servers.empty()) servers.emplace_back("127.0.0.1");
+  if (servers.empty()) {
+    servers.emplace_back("127.0.0.1");
+  }
   return servers;
 }
 
-std::map<std::string, std::string> parseDefaultGateways(std::istream& text) {
-  std::map<std::string, std::string> gateways;
+std::map<std::string, Ipv4Address> parseDefaultGateways(std::istream& text) {
+  std::map<std::string, Ipv4Address> gateways;
   for (std::string line; std::getline(text, line);) {
     std::istringstream words(line);
     std::string interface;
@@ -101,8 +108,9 @@ std::map<std::string, std::string> parseDefaultGateways(std::istream& text) {
     in_addr_t gateway = 0;
     unsigned flags = 0;
     const bool route = static_cast<bool>(words >> interface >> std::hex >> destination >> gateway >> flags);
-    // The kernel prints the addresses as the numbers that they are in memory.
-    if (route && destination == 0 && (flags & RTF_GATEWAY) != 0) gateways.emplace(interface, textOf(AF_INET, gateway));
+    if (route && destination == 0 && (flags & RTF_GATEWAY) != 0) {
+      gateways.emplace(interface, octetsOf(gateway));
+    }
   }
   return gateways;
 }
@@ -114,7 +122,9 @@ ManagementProcessor readHost() {
   const auto gateways = parseDefaultGateways(routes);
   for (NetworkInterface& interface : host.interfaces) {
     const auto gateway = gateways.find(*interface.name);
-    if (gateway != gateways.end()) interface.ipv4Gateway = gateway->second;
+    if (gateway != gateways.end()) {
+      interface.ipv4Gateway = gateway->second;
+    }
   }
   return host;
 }

@@ -1,4 +1,4 @@
-// The IP configuration of the host that we run on, told as that of the management processor is.
+// The IP configuration of the host that we run on, described as that of the management processor is.
 #pragma once
 
 #include <istream>
@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "instrumentation/ManagementProcessor.h"
+#include "agent/processor/ManagementProcessor.h"
 
 namespace QV {
 
@@ -17,6 +17,6 @@ ManagementProcessor readHost();
 std::vector<std::string> parseResolverConfiguration(std::istream& text);
 
 // The default gateways of a /proc/net/route, by interface.
-std::map<std::string, std::string> parseDefaultGateways(std::istream& text);
+std::map<std::string, Ipv4Address> parseDefaultGateways(std::istream& text);
 
 }  // namespace QV

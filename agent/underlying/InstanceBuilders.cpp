@@ -1,4 +1,4 @@
-#include "underlying/InstanceBuilders.h"
+#include "agent/underlying/InstanceBuilders.h"
 
 #include <optional>
 #include <utility>
@@ -37,15 +37,20 @@ const Versions& versionsOf(const NetworkInterface& interface) {
   const bool ipv4 = interface.ipv4Address || interface.ipv4Origin != AddressOrigin::Unknown;
   const bool ipv6 = interface.ipv6Address || interface.ipv6Origin != AddressOrigin::Unknown;
   for (const Versions& versions : versionTable) {
-    if (versions.ipv4 == ipv4 && versions.ipv6 == ipv6) return versions;
+    if (versions.ipv4 == ipv4 && versions.ipv6 == ipv6) {
+      return versions;
+    }
   }
   return versionTable[std::size(versionTable) - 1];
 }
 
-template <typename Value>
-PropertyValue orNull(const std::optional<Value>& value) {
-  if (value) return *value;
-  return std::monostate{};
+PropertyValue orNull(const std::optional<std::uint8_t>& number) {
+  return number ? PropertyValue(*number) : std::monostate{};
+}
+
+template <typename Address>
+PropertyValue orNull(const std::optional<Address>& address) {
+  return address ? PropertyValue(address->text()) : std::monostate{};
 }
 
 std::uint16_t number(AddressOrigin origin) { return static_cast<std::uint16_t>(origin); }
@@ -55,7 +60,9 @@ template <typename Build>
 Instances forEachInterface(const System& system, const Build& build) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
-    if (interface.name) instances.push_back(build(interface, *interface.name));
+    if (interface.name) {
+      instances.push_back(build(interface, *interface.name));
+    }
   }
   return instances;
 }
@@ -122,7 +129,9 @@ Instances protocolEndpoints(const System& system) {
 Instances assignmentSettings(const System& system) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
-    if (!interface.name) continue;
+    if (!interface.name) {
+      continue;
+    }
     const std::string id = system.settingPrefix + ':' + *interface.name;
     instances.push_back(setting(id + ":static", "Static addresses of " + *interface.name, AddressOrigin::Static));
     instances.push_back(setting(id + ":dhcp", "DHCP addresses of " + *interface.name, AddressOrigin::Dhcp));
@@ -149,13 +158,15 @@ Instances dhcpSettings(const System& system) {
 Instances remoteAccessPoints(const System& system) {
   Instances instances;
   for (const NetworkInterface& interface : system.configuration.interfaces) {
-    if (interface.name && interface.ipv4Gateway)
-      instances.push_back(
-          accessPoint(system, "Gateway:" + *interface.name, accessContextDefaultGateway, *interface.ipv4Gateway));
+    if (interface.name && interface.ipv4Gateway) {
+      instances.push_back(accessPoint(system, "Gateway:" + *interface.name, accessContextDefaultGateway,
+                                      interface.ipv4Gateway->text()));
+    }
   }
   int position = 0;
-  for (const std::string& server : system.configuration.dnsServers)
+  for (const std::string& server : system.configuration.dnsServers) {
     instances.push_back(accessPoint(system, "DNS:" + std::to_string(++position), accessContextDnsServer, server));
+  }
   return instances;
 }
 

@@ -7,7 +7,7 @@
 #include <variant>
 #include <vector>
 
-#include "underlying/System.h"
+#include "agent/underlying/System.h"
 
 namespace QV {
 

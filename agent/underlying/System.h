@@ -3,7 +3,7 @@
 
 #include <string>
 
-#include "instrumentation/ManagementProcessor.h"
+#include "agent/processor/ManagementProcessor.h"
 
 namespace QV {
 

@@ -1,16 +1,16 @@
 // The CMPI instance provider of the underlying classes, one algorithm over their table. Read only: the processor is
 // changed through the instrumentation. Object managers do hand out null objects with a good status, and good pointers
 // beside a bad one: what is made or delivered is looked at, and a request that cannot go on says why.
+#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
 #include <exception>
 #include <functional>
 #include <stdexcept>
 
-#include "QV/ProviderHelper.h"
-#include "helper/Conversion.h"
-#include "log/Report.h"
-#include "underlying/ClassTable.h"
+#include "agent/helper/Conversion.h"
+#include "agent/log/Report.h"
+#include "agent/underlying/ClassTable.h"
 
 namespace {
 

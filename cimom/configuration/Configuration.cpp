@@ -3,7 +3,6 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cerrno>
-#include <charconv>
 #include <cstring>
 #include <fstream>
 #include <functional>
@@ -12,7 +11,8 @@
 #include <string_view>
 #include <utility>
 
-#include "cimom/configuration/IniFile.h"
+#include "ground/IniFile.h"
+#include "ground/Values.h"
 
 namespace Cimom {
 namespace {
@@ -39,14 +39,11 @@ struct Setting {
 };
 
 std::uint64_t parseNumber(const GivenValue& value, std::uint64_t least, std::uint64_t most) {
-  std::uint64_t number = 0;
-  const char* end = value.text.data() + value.text.size();
-  const auto result = std::from_chars(value.text.data(), end, number);
-  if (result.ec == std::errc() && result.ptr == end && number >= least && number <= most) {
-    return number;
+  try {
+    return Ground::parseNumber(value.text, least, most);
+  } catch (const std::invalid_argument& refusal) {
+    throw UsageError(value.origin + ": " + refusal.what() + ", not \"" + value.text + "\"");
   }
-  throw UsageError(value.origin + ": must be a number from " + std::to_string(least) + " to " + std::to_string(most) +
-                   ", not \"" + value.text + "\"");
 }
 
 std::filesystem::path parsePath(const GivenValue& value) {
@@ -111,7 +108,7 @@ GivenValues readConfigurationFile(const std::filesystem::path& file) {
     throw UsageError(file.string() + ": " + (stream ? "is a directory" : std::strerror(errno)));
   }
   GivenValues values;
-  const auto take = [&](const IniEntry& entry) {
+  const auto take = [&](const Ground::IniEntry& entry) {
     if (!entry.section.empty()) {
       throw UsageError("there are no sections in this file, but \"" + entry.key + "\" is in [" + entry.section + "]");
     }
@@ -122,7 +119,7 @@ GivenValues readConfigurationFile(const std::filesystem::path& file) {
     values[entry.key].push_back({entry.value, origin, file.parent_path()});
   };
   try {
-    readIni(stream, file.string(), take);
+    Ground::readIni(stream, file.string(), take);
   } catch (const std::runtime_error& error) {
     throw UsageError(error.what());
   }

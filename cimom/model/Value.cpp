@@ -91,7 +91,7 @@ std::optional<Value> Value::asInteger(CMPIType type) const {
       visitInteger(type, other, [&](auto& target) {
         using Target = std::remove_reference_t<decltype(target)>;
         if (std::in_range<Target>(number)) {
-          target = static_cast<Target>(number);
+          target = static_cast<Target>(number);  // NOLINT(bugprone-signed-char-misuse): a small number, no letter
           result = Value(type, other);
         }
       });

@@ -15,14 +15,16 @@ std::set<std::string> exportsOf(const std::string& library) {
   const std::string command = "nm -DC --defined-only " + library;
   const std::unique_ptr<FILE, int (*)(FILE*)> nm(::popen(command.c_str(), "r"), ::pclose);
   std::string text;
-  for (int character = std::fgetc(nm.get()); character != EOF; character = std::fgetc(nm.get()))
+  for (int character = std::fgetc(nm.get()); character != EOF; character = std::fgetc(nm.get())) {
     text += static_cast<char>(character);
+  }
   std::set<std::string> names;
   std::istringstream lines(text);
   std::string address;
   std::string kind;
-  for (std::string name; lines >> address >> kind && std::getline(lines >> std::ws, name);)
+  for (std::string name; lines >> address >> kind && std::getline(lines >> std::ws, name);) {
     names.insert(name.substr(0, name.find_first_of("([")));
+  }
   return names;
 }
 

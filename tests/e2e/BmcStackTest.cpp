@@ -6,8 +6,8 @@
 #include <future>
 #include <optional>
 
-#include "tests/agent/ipmi/PrivateFile.h"
-#include "tests/agent/ipmi/SimulatedBmc.h"
+#include "tests/agent/backends/ipmi/PrivateFile.h"
+#include "tests/agent/backends/ipmi/SimulatedBmc.h"
 #include "tests/e2e/support/CompositeObjects.h"
 #include "tests/e2e/support/CompositeStack.h"
 

@@ -62,7 +62,7 @@ TEST_F(CommandLine, IsRefusedForWhatTheFileSays) {
   expectRefused({"--config", file("port = 0\nport = 0\n")}, 2, "cimomd.ini:2: port: duplicate");
   expectRefused({"--config", file("[http]\nport = 0\n")}, 2,
                 "cimomd.ini:2: there are no sections in this file, but \"port\" is in [http]");
-  expectRefused({"--config", file("port\n")}, 2, "cimomd.ini:1: expected \"key = value\"");
+  expectRefused({"--config", file("port\n")}, 2, "cimomd.ini:1: must be a [section] or a key = value");
   expectRefused({"--config", file("# " + std::string(5000, 'x') + "\n")}, 2, "cimomd.ini:1: the line is longer");
   expectRefused({"--config", directory_.path().string()}, 2, "is a directory");
 }

@@ -223,7 +223,7 @@ TEST_F(CompositeAssociation, AnswersNothingForAnObjectThatHasNoPartInIt) {
 
 TEST_F(CompositeAssociation, OfAnUnknownClassIsAnError) {
   EXPECT_THAT(stack_.failure("ain -ac YRNx_MgmtHwNothing", endpoint("eth0")),
-              HasSubstr("(4) CIM_ERR_INVALID_PARAMETER: no association class \"YRNx_MgmtHwNothing\""));
+              HasSubstr("(4) CIM_ERR_INVALID_PARAMETER: unknown association class \"YRNx_MgmtHwNothing\""));
 }
 
 }  // namespace

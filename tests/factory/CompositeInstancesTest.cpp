@@ -102,7 +102,9 @@ TEST_P(CompositeInstancesTest, AnotherClassIsRefusedWithoutTouchingTheStatus) {
 TEST_P(CompositeInstancesTest, ANullOrEmptyClassNameIsAnotherClass) {
   EXPECT_EQ(getAll(""), 1);
   IPConfigObjectFactory factory;
-  EXPECT_EQ((factory.*GetParam().getAll)(broker(), context(), makePath("X"), nullptr, nullptr, false, out, &status), 1);
+  EXPECT_EQ((factory.*GetParam().getAll)(broker(), context(), makePath("CIM_ManagedElement"), nullptr, nullptr, false,
+                                         out, &status),
+            1);
 }
 
 TEST_P(CompositeInstancesTest, AFailedEnumerationIsToldByTheStatusAlone) {
@@ -175,7 +177,8 @@ TEST_P(CompositeInstancesTest, NoFilterLeavesEveryPropertyVisible) {
   for (const bool noFilter : {false, true}) {
     CMPIInstance* const instance = make(properties, noFilter);
     CMSetProperty(instance, "Description", "seen", CMPI_chars);
-    EXPECT_EQ(hasProperty(instance, "Description"), noFilter);
+    // OpenPegasus filters what it sends instead of what is set.
+    EXPECT_EQ(hasProperty(instance, "Description"), noFilter || !personality().filterDropsOthers);
   }
 }
 

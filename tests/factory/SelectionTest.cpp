@@ -45,13 +45,24 @@ TEST_P(OwnedSelectionTest, OnlyThoseOwnedByTheProcessorsClassAreTakenLetterCaseA
 }
 
 TEST_P(OwnedSelectionTest, AnOwnerOfAnotherTypeOrWithoutCharactersIsNone) {
-  CMPIData number = {CMPI_uint16, CMPI_goodValue, {}};
-  CMPIData withoutString = {CMPI_string, CMPI_goodValue, {}};
-  withoutString.value.string = nullptr;
-  for (const CMPIData& owner : {number, withoutString}) {
+  std::vector<CMPIData> owners = {{CMPI_uint16, CMPI_goodValue, {}}, {CMPI_chars, CMPI_goodValue, {}}};
+  for (CMPIString* const none : stringsWithoutCharacters()) {
+    CMPIData owner = {CMPI_string, CMPI_goodValue, {}};
+    owner.value.string = none;
+    owners.push_back(owner);
+  }
+  for (const CMPIData& owner : owners) {
     withProperty(addUnderlying(sample().underlying, acceptable(sample(), 1)), "SystemCreationClassName", owner);
   }
   EXPECT_EQ(taken(GetParam()), 0u);
+}
+
+TEST_P(OwnedSelectionTest, AnOwnerMayComeAsBareCharacters) {
+  std::string characters = "YRNQV_SPComputerSystem";
+  CMPIData owner = {CMPI_chars, CMPI_goodValue, {}};
+  owner.value.chars = characters.data();
+  withProperty(addUnderlying(sample().underlying, acceptable(sample(), 1)), "SystemCreationClassName", owner);
+  EXPECT_EQ(taken(GetParam()), 1u);
 }
 
 TEST_F(SelectionTest, EveryComputerSystemIsTaken) {

@@ -2,7 +2,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/agent/ipmi/SimulatedBmc.h"
+#include "tests/agent/backends/ipmi/SimulatedBmc.h"
 #include "tests/e2e/support/CompositeObjects.h"
 #include "tests/e2e/support/FactoryState.h"
 #include "tests/e2e/support/Poll.h"

@@ -52,7 +52,7 @@ class AssociationBuilderFailureTest : public Testing::AssociationTest, public ::
 };
 
 TEST_P(AssociationBuilderFailureTest, TheOuterEndCannotBeRead) {
-  Testing::refuseText([&](const std::string& text, int) { return text == model().outer; });
+  refuseReading(model().outer, 1);
   expectOutcome(model().outerFails, 0, 0);
   EXPECT_TRUE(faults.upCalls.empty());
 }
@@ -65,7 +65,7 @@ TEST_P(AssociationBuilderFailureTest, AnOuterInstanceIsUnusable) {
 }
 
 TEST_P(AssociationBuilderFailureTest, TheInnerEndCannotBeReadForTheSecondOuter) {
-  Testing::refuseText([&](const std::string& text, int call) { return text == model().inner && call == 2; });
+  refuseReading(model().inner, 2);
   expectOutcome(model().innerFails, 3, 6);
 }
 

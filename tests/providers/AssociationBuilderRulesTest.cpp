@@ -4,7 +4,7 @@
 
 namespace {
 
-using Testing::homed;
+using Testing::homedReference;
 using Testing::number;
 using Testing::Strings;
 namespace Classes = Testing::Classes;
@@ -117,7 +117,7 @@ class OrderedMemberBuilderTest : public Testing::AssociationTest, public ::testi
     }
     return all;
   }
-  static std::string sequence(const std::string& name) { return homed(Classes::sequence, name); }
+  static std::string sequence(const std::string& name) { return homedReference(Classes::sequence, name); }
 
   const bool isStatic;
   const std::string marker;

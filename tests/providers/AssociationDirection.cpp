@@ -28,18 +28,22 @@ CMPIObjectPath* AssociationDirectionTest::source() {
   return clientPath(sourceClass(), sourceName());
 }
 
-Strings AssociationDirectionTest::homedFarNames() const {
+Strings AssociationDirectionTest::farPaths(std::string (*rendering)(const std::string&, const std::string&)) const {
   Strings paths;
   for (const std::string& name : farNames) {
-    paths.push_back(homed(farClass(), name));
+    paths.push_back(rendering(farClass(), name));
   }
   return paths;
 }
 
+std::string AssociationDirectionTest::sourceReference() const {
+  return rendered(hostOfReference(requestHost()), requestNameSpace, sourceClass(), sourceName());
+}
+
 Strings AssociationDirectionTest::sourceTiedToFarNames() const {
   Strings pairs;
-  for (const std::string& path : homedFarNames()) {
-    pairs.push_back(rendered("client.example", requestNameSpace, sourceClass(), sourceName()) + " -> " + path);
+  for (const std::string& path : farPaths(homedReference)) {
+    pairs.push_back(sourceReference() + " -> " + path);
   }
   return pairs;
 }

@@ -25,8 +25,10 @@ class AssociationDirectionTest : public AssociationTest, public ::testing::WithP
   // The source object's path as a client sends it, with the far end filled by `farNames`.
   CMPIObjectPath* source();
 
-  Strings homedFarNames() const;
-  // "source -> far" for every far name, the source as the client sent it.
+  Strings farPaths(std::string (*rendering)(const std::string& compositeClass, const std::string& name)) const;
+  // A reference to the source as the client sent it.
+  std::string sourceReference() const;
+  // "source -> far" of these references for every far name.
   Strings sourceTiedToFarNames() const;
 
   Strings farNames;

@@ -8,7 +8,6 @@ namespace Testing {
 namespace {
 
 const std::string rule(78, '=');
-constexpr const char* clientHost = "client.example";
 
 struct Composite {
   std::string compositeClass;
@@ -89,9 +88,7 @@ void AssociationTest::addEnds(const Strings& outerNames, const Strings& innerNam
 }
 
 CMPIObjectPath* AssociationTest::clientPath(const std::string& compositeClass, const std::string& name) {
-  CMPIObjectPath* const path = makePath(compositeClass, {{keyOf(compositeClass), name}});
-  CMSetHostname(path, clientHost);
-  return path;
+  return makePath(compositeClass, {{keyOf(compositeClass), name}});
 }
 
 Answer AssociationTest::navigate(Navigation navigation, const CMPIObjectPath* source) {
@@ -185,6 +182,18 @@ Strings AssociationTest::underlyingCalls() const {
   return classes;
 }
 
+void AssociationTest::refuseReading(const std::string& compositeClass, int number) {
+  if (number == 1) {
+    refuseNextReading(compositeClass);
+    return;
+  }
+  faults.onUpCall = [=, this, underlying = underlyingClassOf(compositeClass)](const UpCall& call) {
+    if (call.className == underlying && upCallsFor(underlying) == number - 1) {
+      refuseNextReading(compositeClass);
+    }
+  };
+}
+
 void AssociationTest::spoil(const std::string& compositeClass, int number, CMPIInstance* unusable) {
   faults.unmadeInstance = unusable;
   faults.failNewInstance = [=](const std::string& className, int call) {
@@ -208,6 +217,14 @@ std::string render(const CMPIObjectPath* path) {
 
 std::string homed(const std::string& compositeClass, const std::string& name) {
   return rendered(systemName(), requestNameSpace, compositeClass, name);
+}
+
+std::string homedInstance(const std::string& compositeClass, const std::string& name) {
+  return rendered(hostOfInstance(systemName()), requestNameSpace, compositeClass, name);
+}
+
+std::string homedReference(const std::string& compositeClass, const std::string& name) {
+  return rendered(hostOfReference(systemName()), requestNameSpace, compositeClass, name);
 }
 
 std::string renderPair(const CMPIInstance* instance, const std::string& first, const std::string& second) {

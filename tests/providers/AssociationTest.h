@@ -8,7 +8,7 @@
 
 #include "AssociationModel.h"
 #include "support/CompositeTest.h"
-#include "support/RefusedText.h"
+#include "support/RefusedReading.h"
 #include "support/Units.h"
 
 namespace Testing {
@@ -35,7 +35,7 @@ struct Answer {
 
 class AssociationTest : public CompositeTest {
  protected:
-  AssociationTest() { refuseText(nullptr); }
+  AssociationTest() { refuseNextReading(""); }
 
   // Makes the broker of the test that of the association's provider.
   void attach(const AssociationModel& model);
@@ -65,6 +65,8 @@ class AssociationTest : public CompositeTest {
   std::string messageLine(const std::string& message) const;
 
   Strings underlyingCalls() const;  // the classes of the up-calls, in order
+  // Makes the reading of the composite class of that number, from 1, fail; each reading before it makes an up-call.
+  void refuseReading(const std::string& compositeClass, int number);
   // Makes `unusable` what comes of the composite of that number, from 1.
   void spoil(const std::string& compositeClass, int number, CMPIInstance* unusable);
 
@@ -83,8 +85,12 @@ const char* keyOf(const std::string& compositeClass);
 
 // "//host/namespace:Class=name" of a path to a composite; "(none)" where there is no path.
 std::string render(const CMPIObjectPath* path);
-// The same of a composite with the system's name and the request's namespace.
+// The same of a composite with the system's name and the request's namespace: of its path in the answer to a request
+// for names, of its instance's path, and of a reference to it. The library homes all three; an object manager may lose
+// the host of the latter two.
 std::string homed(const std::string& compositeClass, const std::string& name);
+std::string homedInstance(const std::string& compositeClass, const std::string& name);
+std::string homedReference(const std::string& compositeClass, const std::string& name);
 std::string rendered(const std::string& host, const std::string& nameSpace, const std::string& compositeClass,
                      const std::string& name);
 

@@ -1,4 +1,5 @@
 // ModifyInstance of the endpoint, the static settings and the remote access point, down to the instrumentation.
+#include "cimom/broker/Handle.h"
 #include "support/Samples.h"
 
 namespace {
@@ -12,18 +13,30 @@ class ModifyOperationTest : public CompositeTest {
 
   CMPIStatus modify(const std::string& className, const CMPIObjectPath* path, const CMPIInstance* instance,
                     const CMPIBroker* unitBroker) {
+    // OpenPegasus names what the client sent and then the rest of the class.
+    const char* sent[] = {"IPv4Address", "SubnetMask", "Caption", "ElementName", nullptr};
     CMPIInstanceMI* const mi = unitOf(className).createInstanceMI(unitBroker, nullptr, nullptr);
-    return mi->ft->modifyInstance(mi, context(), result.result(), path, instance, nullptr);
+    return mi->ft->modifyInstance(mi, context(), result.result(), path, instance,
+                                  personality().listsModifiedProperties ? sent : nullptr);
   }
   CMPIStatus modify(const std::string& className, const CMPIObjectPath* path, const CMPIInstance* instance) {
     return modify(className, path, instance, broker());
   }
 
   CMPIStatus modifyEndpoint(const CMPIObjectPath* path, const Properties& properties) {
-    return modify(endpointClass, path, makeInstance(requestNameSpace, endpointClass, properties));
+    return modify(endpointClass, path, makeSent(endpointClass, properties));
   }
   CMPIStatus modifyStatic(const CMPIObjectPath* path, const Properties& properties) {
-    return modify(staticClass, path, makeInstance(requestNameSpace, staticClass, properties));
+    return modify(staticClass, path, makeSent(staticClass, properties));
+  }
+  // An instance as it reaches a provider from a client: all that its class declares.
+  CMPIInstance* makeSent(const std::string& className, const Properties& properties) {
+    CMPIInstance* const instance = makeInstance(requestNameSpace, className, properties);
+    if (!personality().sendsDefaults) {
+      auto& model = Cimom::modelOf<Cimom::Instance>(instance);
+      model = model.withoutDefaults();
+    }
+    return instance;
   }
   CMPIObjectPath* endpointPath(const std::string& name) { return makePath(endpointClass, {{"Name", name}}); }
   CMPIObjectPath* staticPath(const std::string& id) { return makePath(staticClass, {{"InstanceID", id}}); }
@@ -92,6 +105,29 @@ TEST_F(ModifyOperationTest, TheEntryIsFramedTracesBothPathsAndMarksNoExit) {
   EXPECT_NE(own[1].find("' at line 330 in IPProtocolEndpointProvider"), std::string::npos);
   EXPECT_TRUE(messagesWith("EXITING: IPProtocolendpt_ModifyInstance").empty());
   EXPECT_EQ(lineWith(own[0]).component, "Tarnwick.IPProtocolEndpointProvider");
+}
+
+TEST_F(ModifyOperationTest, WhatTheClientDidNotSendStaysAsItIs) {
+  const CMPIInstance* const instance = makeSent(endpointClass, {{"IPv4Address", "192.0.2.7"}});
+  EXPECT_TRUE(CMIsNullValue(CMGetProperty(instance, "SubnetMask", &status)));
+  EXPECT_EQ(hasProperty(instance, "EnabledState"), personality().sendsDefaults) << "which has a default";
+  EXPECT_EQ(modify(endpointClass, endpointPath("eth0"), instance).rc, CMPI_RC_OK);
+  EXPECT_EQ(instrumentation().nodes[0].values, (std::map<int, std::string>{{25, "192.0.2.7"}}));
+}
+
+TEST_F(ModifyOperationTest, ThePropertyListPlaysNoPart) {
+  const char* none[] = {nullptr};
+  const char* another[] = {"ElementName", nullptr};
+  CMPIInstanceMI* const mi = unitOf(endpointClass).createInstanceMI(broker(), nullptr, nullptr);
+  for (const char** const properties : {static_cast<const char**>(nullptr), none, another}) {
+    instrumentation().nodes[0].values.clear();
+    EXPECT_EQ(mi->ft
+                  ->modifyInstance(mi, context(), result.result(), endpointPath("eth0"),
+                                   makeSent(endpointClass, addressAndMask), properties)
+                  .rc,
+              CMPI_RC_OK);
+    EXPECT_EQ(instrumentation().nodes[0].values.size(), 2u);
+  }
 }
 
 TEST_F(ModifyOperationTest, AMissingPropertyIsNotWrittenAndItsCodeIsTheAnswerOnlyWhenReadLast) {
@@ -174,14 +210,27 @@ TEST_F(ModifyOperationTest, EmptyFieldsOfAnIdentifierVanish) {
 }
 
 TEST_F(ModifyOperationTest, WithoutAnIdentifierNothingIsReadOrWritten) {
-  const CMPIStatus answer = modifyStatic(makePath(staticClass, {{"Other", "x"}}), addressAndMask);
-  EXPECT_NE(answer.rc, CMPI_RC_OK) << "the code of the key's read is the answer";
+  constexpr CMPIData null = {CMPI_string, CMPI_keyValue | CMPI_nullValue, {}};
+  const CMPIObjectPath* const path = withKey(makePath(staticClass), "InstanceID", null, CMPI_RC_ERR_NOT_FOUND);
+  const CMPIStatus answer = modifyStatic(path, addressAndMask);
+  EXPECT_EQ(answer.rc, CMPI_RC_ERR_NOT_FOUND) << "the code of the key's read is the answer";
   EXPECT_EQ(answer.msg, nullptr);
   EXPECT_EQ(result.order, Calls{"done"});
   EXPECT_TRUE(instrumentation().calls.empty());
   EXPECT_EQ(linesOf("modifyStaticIPCMPIInstance"),
             (Calls{"ENTERING: modifyStaticIPCMPIInstance() in IPConfigObjectFactory [Line: 408]",
                    "EXITING: modifyStaticIPCMPIInstance() in IPConfigObjectFactory [Line: 444]"}));
+}
+
+TEST_F(ModifyOperationTest, AnIdentifierThatIsNotThereIsNullOrNamesTheEmptyInterface) {
+  const CMPIStatus answer = modifyStatic(makePath(staticClass, {{"Other", "x"}}), addressAndMask);
+  EXPECT_EQ(result.order, Calls{"done"});
+  EXPECT_TRUE(instrumentation().nodes[0].values.empty());
+  EXPECT_TRUE(instrumentation().nodes[1].values.empty());
+  // sfcb says of a key that it was not found, and not that it is null, which is what the operation goes by.
+  const bool isNull = (personality().absentState & CMPI_nullValue) != 0;
+  EXPECT_EQ(answer.rc, isNull ? personality().absentKeyCode : CMPI_RC_OK);
+  EXPECT_EQ(instrumentation().calls.empty(), isNull);
 }
 
 TEST_F(ModifyOperationTest, WronglyTypedValuesCountAsEmpty) {

@@ -71,6 +71,9 @@ CMPIInstance* CompositeTest::addUnderlying(const std::string& className, const P
 CMPIObjectPath* CompositeTest::makePath(const std::string& className,
                                         const std::vector<std::pair<std::string, std::string>>& keys) {
   CMPIObjectPath* const path = CMNewObjectPath(faults.real(), requestNameSpace, className.c_str(), nullptr);
+  if (personality().requestHost) {
+    CMSetHostname(path, personality().requestHost);
+  }
   for (const auto& [name, value] : keys) {
     CMAddKey(path, name.c_str(), value.c_str(), CMPI_chars);
   }
@@ -90,7 +93,7 @@ std::string text(const CMPIString* string) {
 namespace {
 
 std::string text(const CMPIData& data) {
-  if (CMIsNullValue(data)) {
+  if (isAbsent(data)) {
     return none;
   }
   EXPECT_EQ(data.type, CMPI_string);
@@ -109,16 +112,18 @@ std::string key(const CMPIObjectPath* path, const std::string& name) {
 
 const CMPIObjectPath* reference(const CMPIInstance* instance, const std::string& property) {
   const CMPIData data = CMGetProperty(instance, property.c_str(), nullptr);
-  if (CMIsNullValue(data)) {
+  if (isAbsent(data)) {
     return nullptr;
   }
   EXPECT_EQ(data.type, CMPI_ref);
   return data.value.ref;
 }
 
+bool isAbsent(const CMPIData& data) { return (data.state & (CMPI_nullValue | CMPI_notFound)) != 0; }
+
 int number(const CMPIInstance* instance, const std::string& property) {
   const CMPIData data = CMGetProperty(instance, property.c_str(), nullptr);
-  if (CMIsNullValue(data)) {
+  if (isAbsent(data)) {
     return -1;
   }
   EXPECT_TRUE(data.type == CMPI_uint16 || data.type == CMPI_uint8) << data.type;
@@ -128,13 +133,26 @@ int number(const CMPIInstance* instance, const std::string& property) {
 bool hasProperty(const CMPIInstance* instance, const std::string& property) {
   CMPIStatus status = {CMPI_RC_OK, nullptr};
   const CMPIData data = CMGetProperty(instance, property.c_str(), &status);
-  return status.rc == CMPI_RC_OK && !CMIsNullValue(data);
+  return status.rc == CMPI_RC_OK && !isAbsent(data);
 }
 
 const CMPIObjectPath* pathOf(const CMPIInstance* instance) { return CMGetObjectPath(instance, nullptr); }
+
+CMPICount keysWithValues(const CMPIObjectPath* path) {
+  CMPICount count = 0;
+  for (CMPICount i = 0; i < CMGetKeyCount(path, nullptr); ++i) {
+    count += isAbsent(CMGetKeyAt(path, i, nullptr, nullptr)) ? 0 : 1;
+  }
+  return count;
+}
+
 std::string classOf(const CMPIObjectPath* path) { return text(CMGetClassName(path, nullptr)); }
 std::string nameSpaceOf(const CMPIObjectPath* path) { return text(CMGetNameSpace(path, nullptr)); }
 std::string hostOf(const CMPIObjectPath* path) { return text(CMGetHostname(path, nullptr)); }
+
+std::string requestHost() { return personality().requestHost ? personality().requestHost : none; }
+std::string hostOfInstance(const std::string& host) { return personality().instancesKeepTheirHost ? host : none; }
+std::string hostOfReference(const std::string& host) { return personality().referencesKeepTheirHost ? host : none; }
 
 std::string systemName() { return QV::getSystemName(); }
 

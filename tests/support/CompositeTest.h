@@ -1,5 +1,6 @@
 // The ground that the library's tests stand on: its own objects in front of the embedded object manager's real broker,
-// with the product's schema, scripted underlying instances, and every line, call and result recorded.
+// with the product's schema and the running personality, scripted underlying instances, and every line, call and result
+// recorded.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -10,6 +11,7 @@
 #include <vector>
 
 #include "Faults.h"
+#include "Personality.h"
 #include "RecordingLog.h"
 #include "ScriptedInstrumentation.h"
 #include "cimom/ObjectManager.h"
@@ -34,9 +36,9 @@ class CompositeTest : public ::testing::Test {
 
   // Adds an instance to what the enumeration of an underlying class answers, and returns it.
   CMPIInstance* addUnderlying(const std::string& className, const Properties& properties);
-  // An instance of any class in any namespace, made by the real broker.
+  // An instance of any class in any namespace, made by the object manager.
   CMPIInstance* makeInstance(const std::string& nameSpace, const std::string& className, const Properties& properties);
-  // A request's object path with string keys.
+  // A request's object path with string keys and the host that requests have.
   CMPIObjectPath* makePath(const std::string& className,
                            const std::vector<std::pair<std::string, std::string>>& keys = {});
 
@@ -55,9 +57,18 @@ const CMPIObjectPath* reference(const CMPIInstance* instance, const std::string&
 int number(const CMPIInstance* instance, const std::string& property);  // -1 where there is none
 bool hasProperty(const CMPIInstance* instance, const std::string& property);
 const CMPIObjectPath* pathOf(const CMPIInstance* instance);
+CMPICount keysWithValues(const CMPIObjectPath* path);  // how many
 std::string classOf(const CMPIObjectPath* path);
 std::string nameSpaceOf(const CMPIObjectPath* path);
 std::string hostOf(const CMPIObjectPath* path);
+
+bool isAbsent(const CMPIData& data);  // null, or not there at all
+
+// Hosts as the object manager leaves them: of a request's path, of the path of an instance that was made on a path with
+// that host, and of a path with that host once it is set as a reference.
+std::string requestHost();
+std::string hostOfInstance(const std::string& host);
+std::string hostOfReference(const std::string& host);
 
 // The name that the agent gives the managed system while the tests run.
 std::string systemName();

@@ -1,4 +1,5 @@
-// A broker whose up-calls a test scripts and whose makers a test can make fail. Everything else is the real broker's.
+// A broker whose up-calls a test scripts and whose makers a test can make fail. Everything else is the real broker's,
+// with the running personality.
 #pragma once
 
 #include <cmpimacs.h>
@@ -8,12 +9,16 @@
 #include <string>
 #include <vector>
 
+#include "Alterations.h"
+#include "PersonalBroker.h"
+
 namespace Testing {
 
 // What the enumeration of one underlying class answers.
 struct UpCallScript {
   std::vector<CMPIInstance*> instances;  // null elements are answered as they are
   std::vector<CMPIData> items;           // answered after the instances, as they are
+  // An error comes with an empty enumeration or without one, as the personality has it.
   CMPIStatus status = {CMPI_RC_OK, nullptr};
   bool nullEnumeration = false;
 };
@@ -43,12 +48,17 @@ class FaultyBroker {
   FaultyBroker& operator=(const FaultyBroker&) = delete;
 
   const CMPIBroker* broker() const { return &broker_; }
-  const CMPIBroker* real() const { return real_; }
+  // The same object manager without scripts and failures.
+  const CMPIBroker* real() const { return personal_.broker(); }
+
+  // Makes the object manager forget a class that the schema has.
+  void forgetClass(const std::string& className) { personal_.unknownClasses.insert(className); }
 
   std::map<std::string, UpCallScript> upCallScripts;  // by underlying class
   // Called before an up-call is answered; may change the script.
   std::function<void(const UpCall&)> onUpCall;
   std::vector<UpCall> upCalls;
+  int readsPastTheEnd = 0;  // of enumerations
   std::vector<BrokerTrace> traces;
   std::vector<std::string> strings;  // the texts that newString was asked for
 
@@ -74,32 +84,13 @@ class FaultyBroker {
   static CMPIString* newString(const CMPIBroker*, const char*, CMPIStatus*);
   static CMPIStatus trace(const CMPIBroker*, int, const char*, const char*, const CMPIString*);
 
-  const CMPIBroker* real_;
+  PersonalBroker personal_;
   CMPIBroker broker_;
   CMPIBrokerFT upCallTable_;
   CMPIBrokerEncFT encapsulation_;
   std::map<std::string, int> newObjectPathCalls_;
   std::map<std::string, int> newInstanceCalls_;
 };
-
-// The instance, with its table replaced in part: getProperty answers `data` with the code `rc` for the name.
-CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
-// The instance, with its table replaced in part: getObjectPath answers `path`.
-CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path);
-// The instance, with its table replaced in part: counts the calls of getObjectPath.
-CMPIInstance* withPathsCounted(CMPIInstance* instance, int& count);
-// The instance, with its table replaced in part: getObjectPath answers null.
-CMPIInstance* withoutPath(CMPIInstance* instance);
-// An instance whose handle is null.
-CMPIInstance* withoutHandle();
-// A path whose handle is null.
-CMPIObjectPath* pathWithoutHandle();
-// The path, with its table replaced in part: getKey answers `data` with the code `rc` for the name.
-CMPIObjectPath* withKey(CMPIObjectPath* path, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
-// The path, with its table replaced in part: the names that getKey is asked for are appended to `names`.
-CMPIObjectPath* withKeysRecorded(CMPIObjectPath* path, std::vector<std::string>& names);
-// A string of the broker whose characters are read with the code `rc`.
-CMPIString* withCode(CMPIString* string, CMPIrc rc);
 
 // Keeps what a provider delivers.
 class RecordingResult {

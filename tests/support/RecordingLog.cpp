@@ -7,6 +7,22 @@
 
 namespace Testing {
 
+namespace {
+
+bool recorded = true;
+
+void record(Channel channel, const char* function, const char* file, int line, const std::string& component, int level,
+            const std::string& message) {
+  if (recorded) {
+    logLines().push_back({channel, function, file, line, component, level, message});
+  }
+}
+
+}  // namespace
+
+UnrecordedLog::UnrecordedLog() { recorded = false; }
+UnrecordedLog::~UnrecordedLog() { recorded = true; }
+
 std::vector<LogLine>& logLines() {
   static std::vector<LogLine> lines;
   return lines;
@@ -61,7 +77,7 @@ void TWLogger::logLevelMessage(const char* function, const char* file, int line,
   EXPECT_EQ(text, nullptr);
   EXPECT_EQ(first, 0);
   EXPECT_EQ(second, 0);
-  Testing::logLines().push_back({Testing::Channel::Log, function, file, line, component, level, message});
+  Testing::record(Testing::Channel::Log, function, file, line, component, level, message);
 }
 
 void TWLogger::traceLevelMessage(const char* function, const char* file, int line, const std::string& component,
@@ -69,7 +85,7 @@ void TWLogger::traceLevelMessage(const char* function, const char* file, int lin
   EXPECT_EQ(text, nullptr);
   EXPECT_EQ(first, 0);
   EXPECT_EQ(second, 0);
-  Testing::logLines().push_back({Testing::Channel::Trace, function, file, line, component, level, message});
+  Testing::record(Testing::Channel::Trace, function, file, line, component, level, message);
 }
 
 }  // namespace TWLog

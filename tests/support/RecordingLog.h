@@ -21,6 +21,15 @@ struct LogLine {
 // Everything sent since the last clear.
 std::vector<LogLine>& logLines();
 
+// While one lives, nothing is kept: the lines of a walk over tens of thousands of instances cost more than the walk.
+class UnrecordedLog {
+ public:
+  UnrecordedLog();
+  ~UnrecordedLog();
+  UnrecordedLog(const UnrecordedLog&) = delete;
+  UnrecordedLog& operator=(const UnrecordedLog&) = delete;
+};
+
 // The messages of one channel, in order.
 std::vector<std::string> messages(Channel channel = Channel::Log);
 

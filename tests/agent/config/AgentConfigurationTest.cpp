@@ -3,9 +3,10 @@
 
 #include <sstream>
 
-#include "agent/support/Throws.h"
-#include "config/AgentConfiguration.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/backends/simulated/SimulatedBackEnd.h"
+#include "agent/config/AgentConfiguration.h"
+#include "tests/agent/support/Throws.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
@@ -36,9 +37,8 @@ TEST(AgentConfiguration, anEmptyFileMeansTheDefaults) {
   EXPECT_EQ(configuration.log.threshold, 6000);
   EXPECT_EQ(configuration.trace.destination, Destination::Off);
   EXPECT_EQ(configuration.trace.threshold, 4000);
-  EXPECT_EQ(configuration.backEnd, AgentConfiguration::BackEndKind::Simulated);
-  EXPECT_EQ(configuration.simulatedState, "/var/lib/compositeipconfig/management-processor.json");
-  EXPECT_TRUE(configuration.ipmi.empty());
+  EXPECT_EQ(configuration.backEnd, "simulated");
+  EXPECT_TRUE(configuration.backEndSettings.empty());
 }
 
 TEST(AgentConfiguration, everyKeyIsTaken) {
@@ -58,11 +58,11 @@ TEST(AgentConfiguration, everyKeyIsTaken) {
   EXPECT_EQ(configuration.trace.file, "/l/trace");
   EXPECT_EQ(configuration.trace.threshold, 1);
   EXPECT_EQ(configuration.trace.componentThresholds, (std::map<std::string, int>{{"A", 2}, {"B", 0}}));
-  EXPECT_EQ(configuration.backEnd, AgentConfiguration::BackEndKind::Ipmi);
+  EXPECT_EQ(configuration.backEnd, "ipmi");
   EXPECT_EQ(configuration.processorName, "bmc7");
   EXPECT_EQ(configuration.processorDescription, "the one in rack 7");
-  EXPECT_EQ(configuration.simulatedState, "/s/state.json");
-  EXPECT_EQ(configuration.ipmi, (std::map<std::string, std::string>{{"host", "192.0.2.10"}, {"anything", "at all"}}));
+  EXPECT_EQ(configuration.backEndSettings,
+            (std::map<std::string, std::string>{{"host", "192.0.2.10"}, {"anything", "at all"}}));
 }
 
 TEST(AgentConfiguration, theSampleIsAFileOfDefaults) {
@@ -85,7 +85,7 @@ TEST(AgentConfiguration, theSampleIsAFileOfDefaults) {
   EXPECT_EQ(shown.trace.destination, defaults.trace.destination);
   EXPECT_EQ(shown.trace.threshold, defaults.trace.threshold);
   EXPECT_EQ(shown.backEnd, defaults.backEnd);
-  EXPECT_EQ(shown.simulatedState, defaults.simulatedState);
+  EXPECT_NE(inForce.find("\nstate = " + parseSimulatedSettings({}) + "\n"), std::string::npos);
 }
 
 struct Fault {
@@ -105,29 +105,31 @@ INSTANTIATE_TEST_SUITE_P(
         Fault{"name = x\n", "agent.ini:1: the key 'name' stands before any section"},
         Fault{"[system]\nname = x\n[sytem]\nname = y\n", "agent.ini:4: there is no section [sytem]"},
         Fault{"\n[system]\nnane = x\n", "agent.ini:3: [system] has no key 'nane'"},
-        Fault{"[system]\nname =\n", "agent.ini:2: [system] name: the value is missing"},
+        Fault{"[system]\nname =\n", "agent.ini:2: [system] name = : must not be empty"},
         Fault{"[log]\nthreshold.=5\n", "agent.ini:2: [log] has no key 'threshold.'"},
         Fault{"[log]\nthreshold = high\n",
-              "agent.ini:2: [log] threshold: 'high' is not a level: a whole number from 0 on"},
-        Fault{"[log]\nthreshold = -1\n", "agent.ini:2: [log] threshold: '-1' is not a level: a whole number from 0 on"},
+              "agent.ini:2: [log] threshold = high: must be a number from 0 to 2147483647"},
+        Fault{"[log]\nthreshold = -1\n", "agent.ini:2: [log] threshold = -1: must be a number from 0 to 2147483647"},
         Fault{"[trace]\nthreshold.A = 99999999999\n",
-              "agent.ini:2: [trace] threshold.A: '99999999999' is not a level: a whole number from 0 on"},
+              "agent.ini:2: [trace] threshold.A = 99999999999: must be a number from 0 to 2147483647"},
         Fault{"[log]\ndestination = mail\n",
-              "agent.ini:2: [log] destination: 'mail' is not one of off | syslog | stderr | file"},
-        Fault{"[log]\nfile = log.txt\n", "agent.ini:2: [log] file: 'log.txt' is not an absolute path"},
+              "agent.ini:2: [log] destination = mail: must be one of off, syslog, stderr, file"},
+        Fault{"[log]\nfile = log.txt\n", "agent.ini:2: [log] file = log.txt: must be an absolute path"},
         Fault{"[log]\ndestination = file\n", "agent.ini: [log] destination is file, but the key 'file' is missing"},
         Fault{"[trace]\ndestination = file\n", "agent.ini: [trace] destination is file, but the key 'file' is missing"},
-        Fault{"[processor]\nbackend = magic\n",
-              "agent.ini:2: [processor] backend: 'magic' is not one of simulated | ipmi"},
-        Fault{"[simulated]\nstate = here\n", "agent.ini:2: [simulated] state: 'here' is not an absolute path"},
-        Fault{"[system]\nname = a\nname = b\n", "agent.ini:3: [system] name is given a second time"},
-        Fault{"[system]\njust words\n", "agent.ini:2: neither a [section] nor a key = value"},
-        Fault{"[system\nname = a\n", "agent.ini:1: neither a [section] nor a key = value"}),
+        Fault{
+            "[processor]\nbackend = ../magic\n",
+            "agent.ini:2: [processor] backend = ../magic: must be the name of a back end, of letters, digits and '-'"},
+        Fault{"[processor]\nbackend =\n",
+              "agent.ini:2: [processor] backend = : must be the name of a back end, of letters, digits and '-'"},
+        Fault{"[magic]\nwand = 1\n[processor]\nbackend = ipmi\n", "agent.ini:2: there is no section [magic]"},
+        Fault{"[system]\nname = a\nname = b\n", "agent.ini:3: [system] name: duplicate"},
+        Fault{"[system]\njust words\n", "agent.ini:2: must be a [section] or a key = value"},
+        Fault{"[system\nname = a\n", "agent.ini:1: must be a [section] or a key = value"}),
     [](const auto& fault) { return "fault" + std::to_string(fault.index); });
 
 TEST(AgentConfiguration, theFirstOfSeveralFaultsIsReported) {
-  EXPECT_EQ(complaintAbout("[system]\nwords\n[nowhere]\na = b\n"),
-            "agent.ini:2: neither a [section] nor a key = value");
+  EXPECT_EQ(complaintAbout("[system]\nwords\n[nowhere]\na = b\n"), "agent.ini:2: must be a [section] or a key = value");
   EXPECT_EQ(complaintAbout("[nowhere]\na = b\nwords\n"), "agent.ini:2: there is no section [nowhere]");
 }
 
@@ -135,6 +137,12 @@ TEST(AgentConfiguration, anIndentedKeyIsAKeyAndNoContinuation) {
   const AgentConfiguration configuration = parse("[processor]\n  name = a\n\tdescription = b\n");
   EXPECT_EQ(configuration.processorName, "a");
   EXPECT_EQ(configuration.processorDescription, "b");
+}
+
+TEST(AgentConfiguration, theSectionOfTheChosenBackEndIsPassedOnWhereverItStands) {
+  const AgentConfiguration configuration = parse("[magic]\nwand = 1\n[processor]\nbackend = magic\n[ipmi]\nhost = a\n");
+  EXPECT_EQ(configuration.backEnd, "magic");
+  EXPECT_EQ(configuration.backEndSettings, (std::map<std::string, std::string>{{"wand", "1"}}));
 }
 
 TEST(AgentConfiguration, commentsBlankLinesAndCarriageReturnsMeanNothing) {
@@ -150,7 +158,8 @@ TEST(AgentConfiguration, theLongestLineIsTakenWholeAndALongerOneRefused) {
 }
 
 TEST(AgentConfiguration, aNullCharacterIsRefused) {
-  EXPECT_EQ(complaintAbout(std::string("[system]\nname = a\0b\n", 20)), "agent.ini:2: the line holds a null character");
+  EXPECT_EQ(complaintAbout(std::string("[system]\nname = a\0b\n", 20)),
+            "agent.ini:2: the line contains a null character");
 }
 
 TEST(AgentConfiguration, theFileThatTheVariableNamesIsRead) {

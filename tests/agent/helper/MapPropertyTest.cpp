@@ -1,3 +1,4 @@
+#include <QV/ProviderHelper.h>
 #include <gtest/gtest.h>
 
 #include <cstdint>
@@ -5,8 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "QV/ProviderHelper.h"
-#include "agent/helper/BrokerFixture.h"
+#include "tests/agent/helper/BrokerFixture.h"
 
 namespace QV {
 namespace {
@@ -254,8 +254,9 @@ class MapNumber : public WithBroker, public testing::WithParamInterface<Number> 
     manager_.loadSchemaText("class Source { [key] string Id; " + type + " U16; " + type + " U8; };", "root/test");
     CMPIInstance* made = CMNewInstance(broker(), path("Source"), nullptr);
     const CMPIValue value = valueOf(GetParam());
-    for (const char* name : {"U16", "U8"})
+    for (const char* name : {"U16", "U8"}) {
       EXPECT_EQ(CMSetProperty(made, name, &value, GetParam().type).rc, CMPI_RC_OK) << name;
+    }
     return made;
   }
 

@@ -1,11 +1,11 @@
+#include <QV/ProviderHelper.h>
 #include <gtest/gtest.h>
 
 #include <map>
 #include <memory>
 #include <vector>
 
-#include "QV/ProviderHelper.h"
-#include "agent/helper/BrokerFixture.h"
+#include "tests/agent/helper/BrokerFixture.h"
 
 namespace QV {
 namespace {

@@ -1,10 +1,10 @@
+#include <QV/ProviderHelper.h>
 #include <gtest/gtest.h>
 #include <unistd.h>
 
 #include <array>
 
-#include "QV/ProviderHelper.h"
-#include "support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {

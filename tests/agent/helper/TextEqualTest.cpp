@@ -1,6 +1,5 @@
+#include <QV/ProviderHelper.h>
 #include <gtest/gtest.h>
-
-#include "QV/ProviderHelper.h"
 
 namespace QV {
 namespace {

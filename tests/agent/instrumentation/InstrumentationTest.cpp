@@ -1,4 +1,5 @@
 // The instrumentation as its callers have it: the shared library behind its contract, on the simulated processor.
+#include <QV/Instrumentation.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -6,9 +7,8 @@
 #include <thread>
 #include <vector>
 
-#include "QV/Instrumentation.h"
-#include "agent/support/AgentEnvironment.h"
-#include "agent/support/Throws.h"
+#include "tests/agent/support/AgentEnvironment.h"
+#include "tests/agent/support/Throws.h"
 
 namespace QV {
 namespace {
@@ -39,8 +39,9 @@ TEST_F(AnInstrumentation, walksTheInterfaces) {
   EXPECT_FALSE(instrumentation);
   instrumentation.selectNode(IpInterfaceNode);
   std::vector<std::string> names;
-  for (std::string name; instrumentation && instrumentation.getProperty(NodeName, name); ++instrumentation)
+  for (std::string name; instrumentation && instrumentation.getProperty(NodeName, name); ++instrumentation) {
     names.push_back(name);
+  }
   EXPECT_THAT(names, testing::ElementsAre("eth0", "eth1"));
 }
 

@@ -1,16 +1,22 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "agent/instrumentation/RecordingBackEnd.h"
-#include "agent/support/Throws.h"
-#include "instrumentation/InterfaceCursor.h"
-#include "instrumentation/simulated/StateText.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/backends/simulated/StateText.h"
+#include "agent/instrumentation/InterfaceCursor.h"
+#include "tests/agent/instrumentation/RecordingBackEnd.h"
+#include "tests/agent/support/Addresses.h"
+#include "tests/agent/support/Throws.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace QV {
 namespace {
 
-using namespace NodeLexicon;
+using NodeLexicon::IpInterfaceNode;
+using NodeLexicon::Ipv4Address;
+using NodeLexicon::Ipv4SubnetMask;
+using NodeLexicon::NodeName;
+using NodeLexicon::NodeType;
+using NodeLexicon::Properties;
 using testing::ElementsAre;
 using testing::EndsWith;
 using testing::HasSubstr;
@@ -143,8 +149,8 @@ TEST_F(AnInterfaceCursor, makesTheSourceStatic) {
   cursor_.set(Ipv4Address, "198.51.100.99");
   cursor_.flush();
   EXPECT_EQ(onProcessor(1).ipv4Origin, AddressOrigin::Static);
-  EXPECT_EQ(onProcessor(1).ipv4Address, "198.51.100.99");
-  EXPECT_EQ(onProcessor(1).ipv4SubnetMask, "255.255.255.0");
+  EXPECT_EQ(onProcessor(1).ipv4Address, ipv4("198.51.100.99"));
+  EXPECT_EQ(onProcessor(1).ipv4SubnetMask, mask("255.255.255.0"));
 }
 
 TEST_F(AnInterfaceCursor, readsWhatItWrote) {
@@ -200,7 +206,7 @@ TEST_F(AnInterfaceCursor, refusesAnAddressAloneThatIsNoHostUnderTheCurrentMask) 
 
 TEST_F(AnInterfaceCursor, refusesAMaskAloneUnderWhichTheCurrentAddressIsNoHost) {
   ManagementProcessor processor = factoryConfiguration();
-  processor.interfaces[0].ipv4Address = "192.0.2.8";
+  processor.interfaces[0].ipv4Address = ipv4("192.0.2.8");
   install(processor);
   EXPECT_THAT(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.255.255.252"); }), HasSubstr("the network itself"));
   EXPECT_THAT(backEnd_->changes, IsEmpty());
@@ -208,8 +214,8 @@ TEST_F(AnInterfaceCursor, refusesAMaskAloneUnderWhichTheCurrentAddressIsNoHost) 
 
 TEST_F(AnInterfaceCursor, doesNotHoldAnAddressAgainstACurrentMaskThatTellsNothing) {
   ManagementProcessor processor = factoryConfiguration();
-  processor.interfaces[0].ipv4Address = "0.0.0.0";
-  processor.interfaces[0].ipv4SubnetMask = "0.0.0.0";
+  processor.interfaces[0].ipv4Address = ipv4("0.0.0.0");
+  processor.interfaces[0].ipv4SubnetMask = mask("0.0.0.0");
   install(processor);
   cursor_.set(Ipv4Address, "192.0.2.255");
   cursor_.flush();

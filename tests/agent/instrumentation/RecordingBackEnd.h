@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "instrumentation/simulated/SimulatedBackEnd.h"
+#include "agent/backends/simulated/SimulatedBackEnd.h"
 
 namespace QV {
 
@@ -14,10 +14,16 @@ class RecordingBackEnd : public SimulatedBackEnd {
   using SimulatedBackEnd::SimulatedBackEnd;
 
   void change(const std::string& interfaceName, const AddressChange& change) override {
-    changes.push_back(interfaceName + " " + change.ipv4Address.value_or("-") + " " +
-                      change.ipv4SubnetMask.value_or("-"));
-    if (unreachable) throw std::runtime_error("the processor does not answer");
+    changes.push_back(interfaceName + " " + textOf(change.ipv4Address) + " " + textOf(change.ipv4SubnetMask));
+    if (unreachable) {
+      throw std::runtime_error("the processor does not answer");
+    }
     SimulatedBackEnd::change(interfaceName, change);
+  }
+
+  template <typename Address>
+  static std::string textOf(const std::optional<Address>& address) {
+    return address ? address->text() : "-";
   }
 
   std::vector<std::string> changes;  // "INTERFACE ADDRESS MASK", an absent value as "-"

@@ -11,9 +11,9 @@
 #include <utility>
 #include <vector>
 
-#include "agent/support/AllocationCount.h"
-#include "log/Channel.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/log/Channel.h"
+#include "tests/agent/support/AllocationCount.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace {
 std::vector<std::pair<int, std::string>> sentToSyslog;
@@ -121,7 +121,9 @@ TEST(Channel, tellsSyslogTheSeverity) {
   const std::string component = "C";
   const std::string text = "100 %s";
   sentToSyslog.clear();
-  for (const int level : {6000, 5999, 5000, 4999, 4000, 3999}) channel.send({"f", "F", 1, component, level, text});
+  for (const int level : {6000, 5999, 5000, 4999, 4000, 3999}) {
+    channel.send({"f", "F", 1, component, level, text});
+  }
   EXPECT_THAT(sentToSyslog, testing::ElementsAre(testing::Pair(LOG_DAEMON | LOG_ERR, "6000 C f (F:1): 100 %s"),
                                                  testing::Pair(LOG_DAEMON | LOG_WARNING, "5999 C f (F:1): 100 %s"),
                                                  testing::Pair(LOG_DAEMON | LOG_WARNING, testing::_),

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "log/Line.h"
+#include "agent/log/Line.h"
 
 namespace TWLog {
 namespace {

@@ -7,8 +7,8 @@
 #include <thread>
 #include <vector>
 
-#include "log/LogFile.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/log/LogFile.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace TWLog {
 namespace {
@@ -73,7 +73,9 @@ TEST(LogFile, isNotInheritedByPrograms) {
   int open = 0;
   for (const auto& entry : std::filesystem::directory_iterator("/proc/self/fd")) {
     std::error_code ignored;
-    if (std::filesystem::read_symlink(entry.path(), ignored) != directory / "log") continue;
+    if (std::filesystem::read_symlink(entry.path(), ignored) != directory / "log") {
+      continue;
+    }
     ++open;
     EXPECT_NE(::fcntl(std::stoi(entry.path().filename()), F_GETFD) & FD_CLOEXEC, 0);
   }
@@ -87,7 +89,9 @@ TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
   LogFile second(directory / "log");
   constexpr int lines = 500;
   const auto write = [&](LogFile& file, char mark) {
-    for (int count = 0; count < lines; ++count) file.append(std::string(200, mark) + '\n');
+    for (int count = 0; count < lines; ++count) {
+      file.append(std::string(200, mark) + '\n');
+    }
   };
 
   // When all of them write at once
@@ -102,7 +106,9 @@ TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
   // Then every line is there, and is of one writer
   std::istringstream text(Testing::readFile(directory / "log"));
   int count = 0;
-  for (std::string line; std::getline(text, line); ++count) ASSERT_EQ(line, std::string(200, line.at(0)));
+  for (std::string line; std::getline(text, line); ++count) {
+    ASSERT_EQ(line, std::string(200, line.at(0)));
+  }
   EXPECT_EQ(count, 4 * lines);
 }
 

@@ -5,8 +5,8 @@
 
 #include <cstdlib>
 
-#include "log/Report.h"
-#include "support/TemporaryDirectory.h"
+#include "agent/log/Report.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace {
 

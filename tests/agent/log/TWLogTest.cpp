@@ -1,5 +1,6 @@
 // The logging library as its callers have it: the shared library behind its contract. agent.ini is read once in a
 // process, so each case that needs one of its own runs in a child.
+#include <TWLog/TWLog.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -9,8 +10,7 @@
 #include <thread>
 #include <vector>
 
-#include "TWLog/TWLog.h"
-#include "support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace {
 
@@ -81,7 +81,7 @@ TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
     std::exit(0);
   };
   EXPECT_EXIT(report(), ExitedWithCode(0),
-              "^management agent: [^\n]*agent.ini:2: .log. destination: 'mail' is not one of [^\n]*; logging with the "
+              "^management agent: [^\n]*agent.ini:2: .log. destination = mail: must be one of [^\n]*; logging with the "
               "defaults\n$");
   ::unsetenv("QV_AGENT_INI");
 }
@@ -94,7 +94,9 @@ TEST(Logger, takesMessagesFromSeveralThreads) {
     std::vector<std::jthread> threads;
     for (int thread = 0; thread < 4; ++thread) {
       threads.emplace_back([] {
-        for (int count = 0; count < 250; ++count) log("C", 6000, "x");
+        for (int count = 0; count < 250; ++count) {
+          log("C", 6000, "x");
+        }
       });
     }
   });

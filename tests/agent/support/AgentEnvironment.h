@@ -8,7 +8,7 @@
 #include <memory>
 #include <string>
 
-#include "support/TemporaryDirectory.h"
+#include "tests/support/TemporaryDirectory.h"
 
 class AgentEnvironment : public testing::Environment {
  public:

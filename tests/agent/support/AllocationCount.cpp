@@ -1,4 +1,4 @@
-#include "agent/support/AllocationCount.h"
+#include "tests/agent/support/AllocationCount.h"
 
 #include <atomic>
 #include <cstdlib>
@@ -12,7 +12,9 @@ long allocationCount() { return allocations; }
 
 void* operator new(std::size_t size) {
   ++allocations;
-  if (void* memory = std::malloc(size)) return memory;
+  if (void* memory = std::malloc(size)) {
+    return memory;
+  }
   throw std::bad_alloc();
 }
 

@@ -1,3 +1,4 @@
+#include <QV/ProviderHelper.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <net/if.h>
@@ -7,8 +8,8 @@
 #include <set>
 #include <sstream>
 
-#include "QV/ProviderHelper.h"
-#include "underlying/Host.h"
+#include "agent/underlying/Host.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace QV {
 namespace {
@@ -21,7 +22,7 @@ std::vector<std::string> nameServers(const std::string& text) {
   return parseResolverConfiguration(stream);
 }
 
-std::map<std::string, std::string> gateways(const std::string& text) {
+std::map<std::string, Ipv4Address> gateways(const std::string& text) {
   std::istringstream stream(text);
   return parseDefaultGateways(stream);
 }
@@ -43,11 +44,13 @@ TEST(Host, readsItsLoopbackInterface) {
   const ManagementProcessor host = readHost();
   const auto loopback = std::find_if(host.interfaces.begin(), host.interfaces.end(),
                                      [](const NetworkInterface& interface) { return interface.name == "lo"; });
-  if (loopback == host.interfaces.end() || !loopback->ipv4Address) GTEST_SKIP() << "no loopback address here";
+  if (loopback == host.interfaces.end() || !loopback->ipv4Address) {
+    GTEST_SKIP() << "no loopback address here";
+  }
   EXPECT_TRUE(loopback->enabled);
-  EXPECT_EQ(loopback->ipv4Address, "127.0.0.1");
-  EXPECT_EQ(loopback->ipv4SubnetMask, "255.0.0.0");
-  EXPECT_EQ(loopback->macAddress, "00:00:00:00:00:00");
+  EXPECT_EQ(loopback->ipv4Address, ipv4("127.0.0.1"));
+  EXPECT_EQ(loopback->ipv4SubnetMask, mask("255.0.0.0"));
+  EXPECT_EQ(loopback->macAddress, mac("00:00:00:00:00:00"));
 }
 
 TEST(ResolverConfiguration, listsItsNameServersInOrder) {
@@ -69,7 +72,7 @@ TEST(DefaultGateways, areThoseOfTheRoutesToEverywhere) {
                      "\t0003\t0\t0\t0\t00000000\n"
                      "eth0\t000200C0\t00000000\t0001\t0\t0\t0\t00FFFFFF\n"
                      "tun0\t00000000\t00000000\t0001\t0\t0\t0\t00000000\n"),
-            (std::map<std::string, std::string>{{"eth0", "192.0.2.1"}}));
+            (std::map<std::string, Ipv4Address>{{"eth0", ipv4("192.0.2.1")}}));
 }
 
 TEST(DefaultGateways, areNoneInATextThatIsNoRouteTable) {

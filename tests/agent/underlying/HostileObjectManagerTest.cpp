@@ -7,8 +7,8 @@
 
 #include <string>
 
-#include "agent/helper/BrokerFixture.h"
-#include "agent/support/AgentEnvironment.h"
+#include "tests/agent/helper/BrokerFixture.h"
+#include "tests/agent/support/AgentEnvironment.h"
 
 extern "C" CMPIInstanceMI* UnderlyingIPConfigProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*,
                                                                         CMPIStatus*);

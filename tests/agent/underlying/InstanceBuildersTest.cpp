@@ -1,8 +1,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "instrumentation/simulated/SimulatedBackEnd.h"
-#include "underlying/InstanceBuilders.h"
+#include "agent/backends/simulated/SimulatedBackEnd.h"
+#include "agent/underlying/InstanceBuilders.h"
+#include "tests/agent/support/Addresses.h"
 
 namespace QV {
 namespace {
@@ -20,7 +21,9 @@ std::string textOf(const Property& property) {
     std::string operator()(std::uint8_t number) const { return "=" + std::to_string(number) + "u8"; }
     std::string operator()(const std::vector<std::uint16_t>& numbers) const {
       std::string text = "=";
-      for (const std::uint16_t number : numbers) text += (text.size() > 1 ? "," : "") + std::to_string(number) + "u16";
+      for (const std::uint16_t number : numbers) {
+        text += (text.size() > 1 ? "," : "") + std::to_string(number) + "u16";
+      }
       return text;
     }
   } text;
@@ -29,7 +32,9 @@ std::string textOf(const Property& property) {
 
 std::vector<std::string> textsOf(const InstanceProperties& properties) {
   std::vector<std::string> texts;
-  for (const Property& property : properties) texts.push_back(textOf(property));
+  for (const Property& property : properties) {
+    texts.push_back(textOf(property));
+  }
   return texts;
 }
 
@@ -50,7 +55,9 @@ NetworkInterface nameless() {
 std::string endpointProperty(const NetworkInterface& interface, const std::string& name) {
   const Instances endpoints = protocolEndpoints(processor({interface}));
   for (const Property& property : endpoints.at(0)) {
-    if (property.name == name) return textOf(property);
+    if (property.name == name) {
+      return textOf(property);
+    }
   }
   return "no " + name;
 }
@@ -88,7 +95,7 @@ TEST(ProtocolEndpoints, tellThatAnInterfaceIsDisabled) {
 TEST(ProtocolEndpoints, tellAnInterfaceOfIpv6Alone) {
   NetworkInterface interface;
   interface.name = "eth2";
-  interface.ipv6Address = "2001:db8::2";
+  interface.ipv6Address = ipv6("2001:db8::2");
   interface.ipv6Origin = AddressOrigin::Dhcp;
   EXPECT_EQ(endpointProperty(interface, "AddressType"), "AddressType=2u16");
   EXPECT_EQ(endpointProperty(interface, "IPVersionSupport"), "IPVersionSupport=2u16");
@@ -154,8 +161,9 @@ TEST(RemoteAccessPoints, areTheGatewaysAndTheNameServers) {
 
 TEST(Interfaces, withoutANameAreInNoClass) {
   const System system = processor({nameless()});
-  for (const auto build : {protocolEndpoints, assignmentSettings, staticSettings, dhcpSettings, remoteAccessPoints})
+  for (const auto build : {protocolEndpoints, assignmentSettings, staticSettings, dhcpSettings, remoteAccessPoints}) {
     EXPECT_THAT(build(system), IsEmpty());
+  }
 }
 
 TEST(AnotherSystem, isToldApartByItsClassAndItsSettingsPrefix) {

@@ -1,5 +1,6 @@
 // The underlying provider as an object manager has it: the shared library behind its factory, loaded into a real
 // broker, on the simulated processor.
+#include <QV/Instrumentation.h>
 #include <cmpimacs.h>
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -9,10 +10,9 @@
 #include <string>
 #include <vector>
 
-#include "QV/Instrumentation.h"
-#include "agent/support/AgentEnvironment.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
+#include "tests/agent/support/AgentEnvironment.h"
 
 extern "C" CMPIInstanceMI* UnderlyingIPConfigProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*,
                                                                         CMPIStatus*);
@@ -65,15 +65,22 @@ constexpr const char* classNames[] = {"YRNQV_SPComputerSystem",
                                       "YRNQV_Stranger"};
 
 std::string textOf(const CMPIData& data) {
-  if (CMIsNullValue(data)) return "null";
+  if (CMIsNullValue(data)) {
+    return "null";
+  }
   if (CMIsArray(data)) {
     std::string text;
-    for (CMPICount index = 0; index < CMGetArrayCount(data.value.array, nullptr); ++index)
+    for (CMPICount index = 0; index < CMGetArrayCount(data.value.array, nullptr); ++index) {
       text += (text.empty() ? "" : ",") + textOf(CMGetArrayElementAt(data.value.array, index, nullptr));
+    }
     return text;
   }
-  if (data.type == CMPI_uint16) return std::to_string(data.value.uint16);
-  if (data.type == CMPI_uint8) return std::to_string(data.value.uint8);
+  if (data.type == CMPI_uint16) {
+    return std::to_string(data.value.uint16);
+  }
+  if (data.type == CMPI_uint8) {
+    return std::to_string(data.value.uint8);
+  }
   return data.type == CMPI_string ? CMGetCharsPtr(data.value.string, nullptr) : "?";
 }
 
@@ -85,7 +92,9 @@ Properties propertiesOf(const CMPIInstance* instance) {
   for (CMPICount index = 0; index < CMGetPropertyCount(instance, nullptr); ++index) {
     CMPIString* name = nullptr;
     const CMPIData data = CMGetPropertyAt(instance, index, &name, nullptr);
-    if (!CMIsNullValue(data)) properties[CMGetCharsPtr(name, nullptr)] = textOf(data);
+    if (!CMIsNullValue(data)) {
+      properties[CMGetCharsPtr(name, nullptr)] = textOf(data);
+    }
   }
   return properties;
 }
@@ -128,15 +137,18 @@ class TheUnderlyingProvider : public testing::Test {
     CMPIEnumeration* instances = CBEnumInstances(broker(), scope_.context(), path(className),
                                                  wanted.size() > 1 ? wanted.data() : nullptr, &status_);
     std::vector<Properties> all;
-    while (status_.rc == CMPI_RC_OK && CMHasNext(instances, nullptr))
+    while (status_.rc == CMPI_RC_OK && CMHasNext(instances, nullptr)) {
       all.push_back(propertiesOf(CMGetNext(instances, nullptr).value.inst));
+    }
     return all;
   }
 
   std::vector<CMPIObjectPath*> enumerateNames(const char* className) {
     CMPIEnumeration* paths = CBEnumInstanceNames(broker(), scope_.context(), path(className), &status_);
     std::vector<CMPIObjectPath*> all;
-    while (status_.rc == CMPI_RC_OK && CMHasNext(paths, nullptr)) all.push_back(CMGetNext(paths, nullptr).value.ref);
+    while (status_.rc == CMPI_RC_OK && CMHasNext(paths, nullptr)) {
+      all.push_back(CMGetNext(paths, nullptr).value.ref);
+    }
     return all;
   }
 
@@ -192,10 +204,11 @@ TEST_F(TheUnderlyingProvider, servesTheSettings) {
     std::vector<std::string> ids;
     for (Properties& properties : enumerate(className)) {
       const std::string id = properties["InstanceID"];
-      if (id.starts_with("BMC:"))
+      if (id.starts_with("BMC:")) {
         ids.push_back(id);
-      else
+      } else {
         EXPECT_TRUE(id.starts_with("Host:")) << id;
+      }
     }
     return ids;
   };
@@ -209,11 +222,12 @@ TEST_F(TheUnderlyingProvider, servesTheAccessPointsOfTheProcessorAndOfTheHost) {
   std::vector<std::string> own;
   int ofHost = 0;
   for (Properties& properties : enumerate("YRNQV_IPRemoteServiceAccessPoint")) {
-    if (properties["SystemCreationClassName"] != "YRNQV_SPComputerSystem")
+    if (properties["SystemCreationClassName"] != "YRNQV_SPComputerSystem") {
       ++ofHost;
-    else
+    } else {
       own.push_back(properties["Name"] + ' ' + properties["AccessContext"] + ' ' + properties["InfoFormat"] + ' ' +
                     properties["AccessInfo"]);
+    }
   }
   EXPECT_THAT(own, ElementsAre("Gateway:eth0 2 3 192.0.2.1", "DNS:1 3 3 192.0.2.53", "DNS:2 3 4 2001:db8::53"));
   EXPECT_GT(ofHost, 0);
@@ -221,7 +235,9 @@ TEST_F(TheUnderlyingProvider, servesTheAccessPointsOfTheProcessorAndOfTheHost) {
 
 TEST_F(TheUnderlyingProvider, namesEveryInstanceByItsKeysAndFindsItByThem) {
   for (const char* className : classNames) {
-    if (className == std::string("YRNQV_Stranger")) continue;
+    if (className == std::string("YRNQV_Stranger")) {
+      continue;
+    }
     const auto instances = enumerate(className);
     const auto paths = enumerateNames(className);
     ASSERT_EQ(paths.size(), instances.size()) << className;
@@ -270,7 +286,9 @@ TEST_F(TheUnderlyingProvider, showsAtOnceWhatTheInstrumentationWrote) {
 TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsAndTracesIt) {
   Testing::writeFile(AgentEnvironment::instance().state(), "{");
   for (const char* className : classNames) {
-    if (className == std::string("YRNQV_Stranger")) continue;
+    if (className == std::string("YRNQV_Stranger")) {
+      continue;
+    }
     enumerate(className);
     EXPECT_EQ(status_.rc, CMPI_RC_ERR_FAILED) << className;
     EXPECT_THAT(message(), HasSubstr(AgentEnvironment::instance().state() + ": "));

@@ -1,5 +1,4 @@
-#ifndef TESTS_E2E_PROBE_PROBEOBJECTS_H_
-#define TESTS_E2E_PROBE_PROBEOBJECTS_H_
+#pragma once
 
 #include <cmpift.h>
 
@@ -8,19 +7,17 @@
 
 namespace Probe {
 
-/// The text that a modified TEST_Thing keeps until the provider is cleaned up.
+// The text that a modified TEST_Thing keeps until the provider is cleaned up.
 std::string text();
 void setText(const std::string& text);
 
-/// The instances of a class in the path's namespace: two things, one part, one link from the first thing to the part,
-/// one numbered; none of any other class.
+// The instances of a class in the path's namespace: two things, one part, one link from the first thing to the part,
+// one numbered; none of any other class.
 std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjectPath* path);
 
 CMPIObjectPath* thingPath(const CMPIBroker* broker, const char* nameSpace, const char* className, CMPIUint16 number);
 
-/// Whether both paths name the same object; hosts and namespaces do not count.
+// Whether both paths name the same object; hosts and namespaces do not count.
 bool same(const CMPIObjectPath* one, const CMPIObjectPath* other);
 
 }  // namespace Probe
-
-#endif  // TESTS_E2E_PROBE_PROBEOBJECTS_H_

@@ -1,5 +1,4 @@
-#ifndef TESTS_E2E_SUPPORT_CIMOMD_H_
-#define TESTS_E2E_SUPPORT_CIMOMD_H_
+#pragma once
 
 #include <cstdint>
 #include <string>
@@ -9,27 +8,27 @@
 
 namespace Testing {
 
-/// A running cimomd on a free port of 127.0.0.1, stopped at the latest with this object.
+// A running cimomd on a free port of 127.0.0.1, stopped at the latest with this object.
 class Cimomd {
  public:
-  /// Waits until it listens. Throws std::runtime_error with what it wrote to the standard error where it ends instead.
-  /// @param options further options; --port is given already
+  // Waits until it listens. Throws std::runtime_error with what it wrote to the standard error where it ends instead.
+  // @param options further options; --port is given already
   explicit Cimomd(const std::vector<std::string>& options, const Environment& environment = {});
 
-  /// Options with which it serves the probe provider and its classes, in root/test.
+  // Options with which it serves the probe provider and its classes, in root/test.
   static std::vector<std::string> probeOptions();
 
   std::uint16_t port() const { return port_; }
   Process& process() { return process_; }
 
-  /// "http://127.0.0.1:PORT/NAMESPACE:OBJECT", as wbemcli takes it.
+  // "http://127.0.0.1:PORT/NAMESPACE:OBJECT", as wbemcli takes it.
   std::string url(const std::string& object, const std::string& nameSpace = "root/test") const;
 
-  /// Runs wbemcli: an operation and its options, the object, and what follows it.
+  // Runs wbemcli: an operation and its options, the object, and what follows it.
   Completed wbemcli(std::vector<std::string> operation, const std::string& object,
                     const std::vector<std::string>& more = {}) const;
 
-  /// Ends it with SIGTERM and gives its exit status.
+  // Ends it with SIGTERM and gives its exit status.
   int stop();
 
  private:
@@ -38,5 +37,3 @@ class Cimomd {
 };
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_CIMOMD_H_

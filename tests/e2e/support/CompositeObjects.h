@@ -1,6 +1,5 @@
 // The composite's objects as wbemcli prints and takes them, without host and namespace: keys in the schema's order.
-#ifndef TESTS_E2E_SUPPORT_COMPOSITEOBJECTS_H_
-#define TESTS_E2E_SUPPORT_COMPOSITEOBJECTS_H_
+#pragma once
 
 #include <string>
 
@@ -23,12 +22,12 @@ inline std::string endpoint(const std::string& interface) {
   return accessPointObject("YRNx_MgmtHwIPProtocolEndPoint", interface, "YRNx_MgmtHwIPProtocolEndPoint");
 }
 
-/// Its CreationClassName is not the class's name.
+// Its CreationClassName is not the class's name.
 inline std::string remoteAccessPoint(const std::string& name) {
   return accessPointObject("YRNx_MgmtHwRemoteServiceAccessPoint", name, "YRNx_RemoteAccessPoint");
 }
 
-/// @param id the interface and the kind: "eth0:static"
+// @param id the interface and the kind: "eth0:static"
 inline std::string sequence(const std::string& id) {
   return "YRNx_MgmtHwIPAssignmentSettingSequence.InstanceID=" + quoted("BMC:" + id);
 }
@@ -42,5 +41,3 @@ inline std::string dhcpSetting(const std::string& interface) {
 }
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_COMPOSITEOBJECTS_H_

@@ -1,5 +1,4 @@
-#ifndef TESTS_E2E_SUPPORT_COMPOSITESTACK_H_
-#define TESTS_E2E_SUPPORT_COMPOSITESTACK_H_
+#pragma once
 
 #include <memory>
 #include <string>
@@ -11,15 +10,15 @@
 
 namespace Testing {
 
-/// The whole product as it is installed: cimomd with the product's classes and registration, the composite and the
-/// underlying provider, and an agent.ini of its own. The managed system is called managed.example.
+// The whole product as it is installed: cimomd with the product's classes and registration, the composite and the
+// underlying provider, and an agent.ini of its own. The managed system is called managed.example.
 class CompositeStack : public WbemClient {
  public:
-  /// @param processor the sections of agent.ini that say how the management processor is reached
-  /// @param logThreshold the least level that reaches log()
+  // @param processor the sections of agent.ini that say how the management processor is reached
+  // @param logThreshold the least level that reaches log()
   explicit CompositeStack(const std::string& processor, int logThreshold = 6000);
 
-  /// The options with which cimomd serves the product.
+  // The options with which cimomd serves the product.
   static std::vector<std::string> options();
 
   Cimomd& cimomd() { return *cimomd_; }
@@ -35,12 +34,10 @@ class CompositeStack : public WbemClient {
   std::unique_ptr<Cimomd> cimomd_;
 };
 
-/// The content of a file; empty where there is none.
+// The content of a file; empty where there is none.
 std::string contentOf(const std::filesystem::path& file);
 
-/// Sections of agent.ini for a simulated management processor, in its factory state where the file is not there yet.
+// Sections of agent.ini for a simulated management processor, in its factory state where the file is not there yet.
 std::string simulatedProcessor(const std::filesystem::path& state);
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_COMPOSITESTACK_H_

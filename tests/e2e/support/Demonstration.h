@@ -1,5 +1,4 @@
-#ifndef TESTS_E2E_SUPPORT_DEMONSTRATION_H_
-#define TESTS_E2E_SUPPORT_DEMONSTRATION_H_
+#pragma once
 
 #include <gtest/gtest.h>
 
@@ -12,14 +11,14 @@
 
 namespace Testing {
 
-/// tools/demonstrate in a build directory of its own, which lends it the built files.
+// tools/demonstrate in a build directory of its own, which lends it the built files.
 class Demonstration : public testing::Test {
  protected:
   Demonstration();
 
   Completed demonstrate(std::vector<std::string> arguments) const;
 
-  /// That what it started has ended and what it wrote outside the build directory is gone.
+  // That what it started has ended and what it wrote outside the build directory is gone.
   void expectNothingLeft() const;
 
   const std::filesystem::path& build() const { return directory_.path(); }
@@ -31,5 +30,3 @@ class Demonstration : public testing::Test {
 };
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_DEMONSTRATION_H_

@@ -13,7 +13,7 @@ namespace Testing {
 using Values = std::map<std::string, std::string>;
 using Objects = std::vector<std::string>;
 
-/// A class, the objects that it has, and what each of them shows. Values that the schema gives by default show too.
+// A class, the objects that it has, and what each of them shows. Values that the schema gives by default show too.
 struct ClassCase {
   std::string className;
   Objects objects;
@@ -22,7 +22,7 @@ struct ClassCase {
 
 void PrintTo(const ClassCase& row, std::ostream* stream);
 
-/// The six classes that are no associations.
+// The six classes that are no associations.
 std::vector<ClassCase> classCases();
 
 inline constexpr const char* hosted = "YRNx_MgmtHwIPHostedAccessPoint";
@@ -32,8 +32,8 @@ inline constexpr const char* elementSetting = "YRNx_MgmtHwIPElementSettingData";
 inline constexpr const char* staticMember = "YRNx_MgmtHwStaticIPOrderedMemberOfCollection";
 inline constexpr const char* dhcpMember = "YRNx_MgmtHwDHCPOrderedMemberOfCollection";
 
-/// What one end sees through one association: the far ends that Associators, AssociatorNames and References answer, and
-/// those that ReferenceNames answers, which are the same except where said otherwise.
+// What one end sees through one association: the far ends that Associators, AssociatorNames and References answer, and
+// those that ReferenceNames answers, which are the same except where said otherwise.
 struct View {
   const char* association;
   std::string source;
@@ -41,10 +41,10 @@ struct View {
   Objects referenceNames = far;
 };
 
-/// Each association from each end.
+// Each association from each end.
 std::vector<View> views();
 
-/// An association class and the pairs that its enumeration answers, in order.
+// An association class and the pairs that its enumeration answers, in order.
 struct Enumeration {
   const char* association;
   const char* first;

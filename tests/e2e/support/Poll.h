@@ -1,12 +1,11 @@
-#ifndef TESTS_E2E_SUPPORT_POLL_H_
-#define TESTS_E2E_SUPPORT_POLL_H_
+#pragma once
 
 #include <chrono>
 #include <thread>
 
 namespace Testing {
 
-/// Asks until the condition holds; gives false when it does not within the time.
+// Asks until the condition holds; gives false when it does not within the time.
 template <typename Condition>
 bool poll(Condition condition, std::chrono::milliseconds patience = std::chrono::seconds(30)) {
   const auto deadline = std::chrono::steady_clock::now() + patience;
@@ -18,5 +17,3 @@ bool poll(Condition condition, std::chrono::milliseconds patience = std::chrono:
 }
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_POLL_H_

@@ -1,5 +1,4 @@
-#ifndef TESTS_E2E_SUPPORT_PROCESS_H_
-#define TESTS_E2E_SUPPORT_PROCESS_H_
+#pragma once
 
 #include <sys/types.h>
 
@@ -15,11 +14,11 @@ namespace Testing {
 
 using Environment = std::map<std::string, std::string>;
 
-/// A program that runs beside the test and is killed at the latest with this object.
+// A program that runs beside the test and is killed at the latest with this object.
 class Process {
  public:
-  /// @param command the program, looked for along PATH, and its arguments
-  /// @param environment added to the test's own
+  // @param command the program, looked for along PATH, and its arguments
+  // @param environment added to the test's own
   explicit Process(const std::vector<std::string>& command, const Environment& environment = {});
   ~Process();
   Process(const Process&) = delete;
@@ -27,12 +26,12 @@ class Process {
 
   void signal(int number) const;
 
-  /// The exit status; 128 and the signal's number where a signal ended it. Throws std::runtime_error when the program
-  /// has not ended by then.
+  // The exit status; 128 and the signal's number where a signal ended it. Throws std::runtime_error when the program
+  // has not ended by then.
   int wait(std::chrono::seconds patience = std::chrono::seconds(30));
   bool isRunning();
 
-  /// What it has written so far.
+  // What it has written so far.
   std::string output() const;
   std::string errors() const;
 
@@ -43,7 +42,7 @@ class Process {
   int status_ = -1;
 };
 
-/// A program that has run to its end.
+// A program that has run to its end.
 struct Completed {
   int status;
   std::string output;
@@ -53,5 +52,3 @@ struct Completed {
 Completed run(const std::vector<std::string>& command, const Environment& environment = {});
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_PROCESS_H_

@@ -1,5 +1,4 @@
-#ifndef TESTS_E2E_SUPPORT_WBEM_H_
-#define TESTS_E2E_SUPPORT_WBEM_H_
+#pragma once
 
 #include <map>
 #include <string>
@@ -7,26 +6,24 @@
 
 namespace Testing {
 
-/// An instance as `wbemcli -nl` prints it: its path, and the properties that have a value as they stand there (texts in
-/// quotes). `names` holds those without one too.
+// An instance as `wbemcli -nl` prints it: its path, and the properties that have a value as they stand there (texts in
+// quotes). `names` holds those without one too.
 struct Printed {
   std::string path;
   std::map<std::string, std::string> values;
   std::vector<std::string> names;
 };
 
-/// Reads what `wbemcli -nl` printed of instances.
+// Reads what `wbemcli -nl` printed of instances.
 std::vector<Printed> instancesOf(const std::string& output);
 
-/// The lines that are not empty.
+// The lines that are not empty.
 std::vector<std::string> linesOf(const std::string& output);
 
-/// A path as wbemcli prints it, "host/namespace:Class.keys", without the host and the namespace.
+// A path as wbemcli prints it, "host/namespace:Class.keys", without the host and the namespace.
 std::string objectOf(const std::string& path);
 
-/// A path as wbemcli prints it, without the host.
+// A path as wbemcli prints it, without the host.
 std::string withoutHost(const std::string& path);
 
 }  // namespace Testing
-
-#endif  // TESTS_E2E_SUPPORT_WBEM_H_

@@ -10,21 +10,21 @@
 
 namespace Testing {
 
-/// wbemcli, talking to an object manager on a port of 127.0.0.1.
+// wbemcli, talking to an object manager on a port of 127.0.0.1.
 class WbemClient {
  public:
   virtual ~WbemClient() = default;
 
   virtual std::uint16_t port() const = 0;
 
-  /// "http://127.0.0.1:PORT/NAMESPACE:OBJECT", as wbemcli takes it.
+  // "http://127.0.0.1:PORT/NAMESPACE:OBJECT", as wbemcli takes it.
   std::string url(const std::string& object, const std::string& nameSpace = "root/cimv2") const;
 
-  /// Runs wbemcli; a space is what `operation` is split at.
+  // Runs wbemcli; a space is what `operation` is split at.
   Completed wbemcli(const std::string& operation, const std::string& object, const std::vector<std::string>& more = {},
                     const std::string& nameSpace = "root/cimv2") const;
 
-  /// What a wbemcli that must succeed answers: paths as they are printed; paths without host and namespace; instances.
+  // What a wbemcli that must succeed answers: paths as they are printed; paths without host and namespace; instances.
   std::vector<std::string> paths(const std::string& operation, const std::string& object,
                                  const std::string& nameSpace = "root/cimv2") const;
   std::vector<std::string> names(const std::string& operation, const std::string& object,
@@ -32,13 +32,13 @@ class WbemClient {
   std::vector<Printed> instances(const std::string& operation, const std::string& object,
                                  const std::string& properties = {}, const std::string& nameSpace = "root/cimv2") const;
 
-  /// The properties that have a value of the one instance that GetInstance answers.
+  // The properties that have a value of the one instance that GetInstance answers.
   std::map<std::string, std::string> get(const std::string& object, const std::string& nameSpace = "root/cimv2") const;
 
-  /// ModifyInstance of "Name=value,..." pairs, which must succeed.
+  // ModifyInstance of "Name=value,..." pairs, which must succeed.
   void modify(const std::string& object, const std::string& values) const;
 
-  /// What a wbemcli that must fail says.
+  // What a wbemcli that must fail says.
   std::string failure(const std::string& operation, const std::string& object,
                       const std::vector<std::string>& more = {}, const std::string& nameSpace = "root/cimv2") const;
 };

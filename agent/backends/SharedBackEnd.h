@@ -1,0 +1,16 @@
+// The management processor of this process: one back end, shared by the instrumentation's cursors and by the underlying
+// provider, so that what a client writes is what the next read shows.
+#pragma once
+
+#include <memory>
+
+#include "agent/processor/BackEnd.h"
+
+namespace QV {
+
+// The back end that agent.ini chooses, made on first use. Throws std::runtime_error in words an administrator can act
+// on where agent.ini is broken or the back end cannot be made; the next call tries again. Safe to call from several
+// threads at once.
+std::shared_ptr<BackEnd> sharedBackEnd();
+
+}  // namespace QV

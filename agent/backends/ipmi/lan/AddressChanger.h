@@ -1,0 +1,42 @@
+// A change of an interface's address from the first look to the confirmation that it holds.
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <utility>
+
+#include "agent/backends/ipmi/lan/AddressPlan.h"
+#include "agent/backends/ipmi/lan/ParameterTransaction.h"
+#include "agent/backends/ipmi/session/IpmiTransport.h"
+#include "agent/processor/ManagementProcessor.h"
+
+namespace QV::Ipmi {
+
+class AddressChanger {
+ public:
+  // `onBegin` is called before the first request that may change the configuration, once. Processors may take a moment
+  // to apply a change: `patience` is how long it is read back.
+  AddressChanger(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::function<void()> onBegin,
+                 std::chrono::milliseconds patience)
+      : transport_(transport), channel_(channel), held_(held), onBegin_(std::move(onBegin)), patience_(patience) {}
+
+  // Returns once the processor shows the change, which is at once where it has the values already. Throws IpmiError
+  // that says whether nothing was changed, the earlier values were put back, or the outcome is unknown.
+  void apply(const AddressChange& change);
+
+ private:
+  AddressSettings readBack(const AddressSettings& wanted, const std::string& loss);
+  std::string putBack(const AddressSettings& present, const AddressSettings& earlier);
+  void write(const AddressSettings& from, const AddressSettings& to);
+
+  IpmiTransport& transport_;
+  const std::uint8_t channel_;
+  HeldLocks& held_;
+  const std::function<void()> onBegin_;
+  const std::chrono::milliseconds patience_;
+  bool begun_ = false;
+};
+
+}  // namespace QV::Ipmi

@@ -1,0 +1,35 @@
+// The management processor of a machine that has none: a state file that several processes may share.
+#pragma once
+
+#include <string>
+
+#include "agent/backends/simulated/StateFile.h"
+#include "agent/processor/BackEnd.h"
+
+namespace QV {
+
+class SimulatedBackEnd : public BackEnd {
+ public:
+  // Touches nothing yet: the first read or change writes the factory configuration where there is no file.
+  explicit SimulatedBackEnd(const std::string& stateFile) : file_(stateFile) {}
+
+  // The file is read anew each time, since other processes change it. A damaged file is an error that names the field,
+  // and no change overwrites it.
+  ManagementProcessor read() override;
+  void change(const std::string& interfaceName, const AddressChange& change) override;
+
+ private:
+  ManagementProcessor parse(const std::string& text) const;
+
+  const StateFile file_;
+};
+
+// The state file that the section [simulated] names, or the usual one. Throws std::runtime_error that names the key and
+// what is wrong with it.
+std::string parseSimulatedSettings(const BackEndSettings& section);
+
+// What a new simulated processor has: an interface with static addresses, one that is configured by DHCP, and two name
+// servers, all of the address blocks that are set aside for documentation (RFC 5737, RFC 3849).
+ManagementProcessor factoryConfiguration();
+
+}  // namespace QV

@@ -1,0 +1,130 @@
+#include "agent/backends/simulated/StateFile.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <chrono>
+#include <cstring>
+#include <stdexcept>
+#include <string_view>
+
+#include "agent/backends/simulated/FileLock.h"
+#include "ground/Descriptor.h"
+
+namespace QV {
+namespace {
+
+namespace fs = std::filesystem;
+
+// An exchange with a processor ends within five seconds, a simulated one too.
+constexpr std::chrono::milliseconds lockTimeout{4000};
+
+[[noreturn]] void fail(const fs::path& path, const char* what) {
+  throw std::runtime_error(path.string() + ": " + what + ": " + std::strerror(errno));
+}
+
+fs::path followLinks(fs::path path) {
+  constexpr int mostLinks = 40;  // the kernel's own limit
+  for (int links = 0; fs::is_symlink(path); ++links) {
+    if (links == mostLinks) {
+      throw std::runtime_error(path.string() + ": too many symbolic links");
+    }
+    path = path.parent_path() / fs::read_symlink(path);
+  }
+  return path;
+}
+
+fs::path withSuffix(const fs::path& path, const char* suffix) { return path.string() + suffix; }
+
+std::optional<std::string> readAll(const fs::path& path) {
+  const Descriptor file(path, O_RDONLY);
+  if (!file.isOpen()) {
+    if (errno == ENOENT) {
+      return std::nullopt;
+    }
+    fail(path, "cannot be opened");
+  }
+  std::string text;
+  char block[4096];
+  for (;;) {
+    const ssize_t count = ::read(file.number(), block, sizeof block);
+    if (count == 0) {
+      return text;
+    }
+    if (count > 0) {
+      text.append(block, static_cast<std::size_t>(count));
+    } else if (errno != EINTR) {
+      fail(path, "cannot be read");
+    }
+  }
+}
+
+void writeAll(const Descriptor& file, const fs::path& path, std::string_view text) {
+  while (!text.empty()) {
+    const ssize_t count = ::write(file.number(), text.data(), text.size());
+    if (count > 0) {
+      text.remove_prefix(static_cast<std::size_t>(count));
+    } else if (errno != EINTR) {
+      fail(path, "cannot be written");
+    }
+  }
+}
+
+// A writer without the right to give files away still keeps the state; only then does the owner change to it.
+void keepModeAndOwner(const Descriptor& file, const fs::path& path, const struct stat& original) {
+  if (::fchown(file.number(), original.st_uid, original.st_gid) != 0 && errno != EPERM) {
+    fail(path, "cannot be given its owner");
+  }
+  if (::fchmod(file.number(), original.st_mode & 07777) != 0) {
+    fail(path, "cannot be given its mode");
+  }
+}
+
+// Called under the lock, so the new file's name can be fixed: one that is there is a killed writer's.
+void replace(const fs::path& target, std::string_view text) {
+  const fs::path fresh = withSuffix(target, ".new");
+  ::unlink(fresh.c_str());
+  try {
+    const Descriptor file(fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, 0640);
+    if (!file.isOpen()) {
+      fail(fresh, "cannot be created");
+    }
+    struct stat original {};
+    if (::stat(target.c_str(), &original) == 0) {
+      keepModeAndOwner(file, fresh, original);
+    }
+    writeAll(file, fresh, text);
+    if (::fsync(file.number()) != 0) {
+      fail(fresh, "cannot be brought to the disk");
+    }
+    if (::rename(fresh.c_str(), target.c_str()) != 0) {
+      fail(target, "cannot be replaced");
+    }
+  } catch (...) {
+    ::unlink(fresh.c_str());
+    throw;
+  }
+  const Descriptor directory(target.parent_path(), O_RDONLY | O_DIRECTORY);
+  if (!directory.isOpen() || ::fsync(directory.number()) != 0) {
+    fail(target, "cannot be brought to the disk");
+  }
+}
+
+}  // namespace
+
+std::optional<std::string> StateFile::read() const { return readAll(followLinks(path_)); }
+
+void StateFile::update(const std::function<std::string(const std::optional<std::string>&)>& edit) const {
+  const fs::path target = followLinks(path_);
+  std::error_code failure;
+  fs::create_directories(target.parent_path(), failure);
+  if (failure) {
+    throw std::runtime_error(target.parent_path().string() + ": cannot be created: " + failure.message());
+  }
+  const FileLock lock(withSuffix(target, ".lock"), lockTimeout);
+  replace(target, edit(readAll(target)));
+}
+
+}  // namespace QV

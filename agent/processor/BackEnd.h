@@ -1,0 +1,35 @@
+// The seam between the agent and a management processor. An implementation reaches one processor; the instrumentation
+// and the underlying provider share it within a process.
+#pragma once
+
+#include <map>
+#include <memory>
+#include <string>
+
+#include "agent/processor/ManagementProcessor.h"
+
+namespace QV {
+
+class BackEnd {
+ public:
+  virtual ~BackEnd() = default;
+
+  // The processor as it is now. Throws std::runtime_error in words an administrator can act on. Safe to call from
+  // several threads at once.
+  virtual ManagementProcessor read() = 0;
+
+  // Changes the interface of that name; its source becomes static. Returns when the processor has taken the change and
+  // confirmed it; throws std::runtime_error where it was refused, could not be sent, or its outcome is unknown. The
+  // values have been validated. Safe to call from several threads at once.
+  virtual void change(const std::string& interfaceName, const AddressChange& change) = 0;
+};
+
+// The keys and values of the back end's own section of agent.ini. An unknown key or a malformed value is refused by the
+// back end's constructor with a std::runtime_error that names it.
+using BackEndSettings = std::map<std::string, std::string>;
+
+// What the back end NAME exports from its library, libqvbmc-NAME.so, with C linkage, under the name "qvCreateBackEnd".
+// The caller owns the result. Throws as a constructor does.
+using CreateBackEnd = BackEnd*(const BackEndSettings& settings);
+
+}  // namespace QV

@@ -1,0 +1,58 @@
+// The keys and values of one section of a configuration file, each value taken with its form and range checked. Every
+// refusal is a std::runtime_error "PLACE: KEY = VALUE: REASON".
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <functional>
+#include <map>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "ground/Values.h"
+
+namespace Ground {
+
+// A key that is not there leaves its target as it is.
+class Settings {
+ public:
+  using Section = std::map<std::string, std::string>;
+
+  // `place` is where the section stands, for the messages. The section must outlive the reader.
+  Settings(std::string place, const Section& section) : place_(std::move(place)), section_(section) {}
+
+  // The value, or null where the key is not there.
+  const std::string* find(const std::string& key) const;
+
+  // The value of a key that must be there and not be empty.
+  const std::string& required(const std::string& key) const;
+
+  void text(const std::string& key, std::string& target) const;
+
+  void absolutePath(const std::string& key, std::string& target) const;
+
+  void seconds(const std::string& key, std::chrono::milliseconds& target, std::chrono::milliseconds least,
+               std::chrono::milliseconds most) const;
+
+  template <typename Number>
+  void number(const std::string& key, Number& target, std::uint64_t least, std::uint64_t most) const {
+    take(key, [&](const std::string& value) { target = static_cast<Number>(parseNumber(value, least, most)); });
+  }
+
+  template <typename Value>
+  void choice(const std::string& key, Value& target, const std::vector<std::pair<std::string, Value>>& choices) const {
+    take(key, [&](const std::string& value) { target = parseChoice(value, choices); });
+  }
+
+  // Hands the value to `use`, where the key is there, and refuses it where that throws std::invalid_argument.
+  void take(const std::string& key, const std::function<void(const std::string& value)>& use) const;
+
+  [[noreturn]] void refuse(const std::string& key, const std::string& value, const std::string& reason) const;
+
+ private:
+  const std::string place_;
+  const Section& section_;
+};
+
+}  // namespace Ground

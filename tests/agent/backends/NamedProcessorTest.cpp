@@ -1,0 +1,35 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include "agent/backends/NamedProcessor.h"
+#include "tests/agent/instrumentation/RecordingBackEnd.h"
+#include "tests/agent/support/Addresses.h"
+#include "tests/support/TemporaryDirectory.h"
+
+namespace QV {
+namespace {
+
+TEST(NamedProcessor, bearsTheGivenNames) {
+  const Testing::TemporaryDirectory directory;
+  NamedProcessor processor(std::make_shared<RecordingBackEnd>(directory / "state"), "bmc7", "in rack 7");
+  EXPECT_EQ(processor.read().name, "bmc7");
+  EXPECT_EQ(processor.read().description, "in rack 7");
+  EXPECT_EQ(processor.read().interfaces, factoryConfiguration().interfaces);
+}
+
+TEST(NamedProcessor, keepsItsOwnNamesWhereNoneIsGiven) {
+  const Testing::TemporaryDirectory directory;
+  NamedProcessor processor(std::make_shared<RecordingBackEnd>(directory / "state"), "", "");
+  EXPECT_EQ(processor.read(), factoryConfiguration());
+}
+
+TEST(NamedProcessor, passesChangesOn) {
+  const Testing::TemporaryDirectory directory;
+  const auto inner = std::make_shared<RecordingBackEnd>(directory / "state");
+  NamedProcessor(inner, "a", "b").change("eth1", {ipv4("192.0.2.99"), {}});
+  EXPECT_THAT(inner->changes, testing::ElementsAre("eth1 192.0.2.99 -"));
+  EXPECT_EQ(inner->read().name, factoryConfiguration().name) << "the given name is not written to the processor";
+}
+
+}  // namespace
+}  // namespace QV

@@ -1,0 +1,230 @@
+// What goes wrong between the agent and its BMC: every operation ends in its time, and the next one after the recovery
+// works.
+#include <gmock/gmock.h>
+
+#include <chrono>
+
+#include "agent/backends/ipmi/IpmiBackEnd.h"
+#include "tests/agent/backends/ipmi/PrivateFile.h"
+#include "tests/agent/backends/ipmi/RecordedLog.h"
+#include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "tests/agent/backends/ipmi/UdpRelay.h"
+#include "tests/agent/support/Addresses.h"
+
+namespace {
+
+using IpmiFixture::SimulatedBmc;
+using IpmiFixture::UdpRelay;
+using QV::AddressChange;
+using QV::BackEndSettings;
+using QV::Ipmi::IpmiBackEnd;
+using QV::Ipmi::parseSettings;
+using testing::HasSubstr;
+using testing::ThrowsMessage;
+using namespace std::chrono_literals;
+
+const AddressChange bothValues{QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")};
+
+auto refusal(const std::string& text) { return ThrowsMessage<std::runtime_error>(HasSubstr(text)); }
+
+constexpr auto operationTimeout = 1000ms;
+// What a busy machine takes to wake a thread.
+constexpr auto tolerance = 200ms;
+
+BackEndSettings impatient(BackEndSettings settings) {
+  settings["operation_timeout"] = "1";
+  return settings;
+}
+
+// Runs the operation and holds it to its time-out.
+template <typename Operation>
+auto inTime(Operation operation) {
+  return [operation] {
+    const auto start = std::chrono::steady_clock::now();
+    try {
+      operation();
+    } catch (...) {
+      EXPECT_LT(std::chrono::steady_clock::now() - start, operationTimeout + tolerance);
+      throw;
+    }
+  };
+}
+
+// Repeats a read until the BMC is back.
+bool readsAgain(IpmiBackEnd& backEnd) {
+  const auto deadline = std::chrono::steady_clock::now() + 10s;
+  while (std::chrono::steady_clock::now() < deadline) {
+    try {
+      backEnd.read();
+      return true;
+    } catch (const std::runtime_error&) {
+    }
+  }
+  return false;
+}
+
+TEST(IpmiFailure, OfABmcThatStallsEndsInTimeAndPasses) {
+  const SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
+  backEnd.read();
+
+  bmc.halt();
+  EXPECT_THAT(inTime([&] { backEnd.read(); }), refusal("the BMC at 127.0.0.1"));
+  EXPECT_THAT(inTime([&] { backEnd.read(); }), refusal("the BMC at 127.0.0.1"));
+  EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("nothing was changed"));
+  bmc.resume();
+
+  EXPECT_TRUE(readsAgain(backEnd));
+  EXPECT_EQ(bmc.stored("ip_addr"), "192.0.2.10");
+}
+
+TEST(IpmiFailure, OfABmcThatIsRestartedPasses) {
+  SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
+  backEnd.read();
+
+  bmc.kill();
+  EXPECT_THAT(inTime([&] { backEnd.read(); }), refusal("the BMC at 127.0.0.1"));
+  bmc.restart();
+
+  EXPECT_TRUE(readsAgain(backEnd));
+}
+
+TEST(IpmiFailure, OfASessionThatTheBmcForgotIsNotSeen) {
+  SimulatedBmc bmc;
+  auto settings = bmc.settings();
+  settings["session_timeout"] = "1";
+  IpmiBackEnd backEnd(parseSettings(settings));
+  backEnd.read();
+
+  bmc.kill();
+  bmc.restart();
+
+  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
+}
+
+TEST(IpmiFailure, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
+  const SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
+  bmc.hook("set", "kill -STOP $SIMULATOR");
+  IpmiFixture::takeLog();
+
+  EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
+  EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 6000, "the outcome is unknown"));
+  bmc.removeHook("set");
+  bmc.resume();
+
+  EXPECT_TRUE(readsAgain(backEnd));
+  EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
+  backEnd.change("lan1", bothValues);
+  EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
+}
+
+TEST(IpmiFailure, OfABmcThatDiesInMidChangeLeavesTheOutcomeOpen) {
+  SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
+  bmc.hook("set", "kill -KILL $SIMULATOR");
+
+  EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
+  bmc.removeHook("set");
+  bmc.restart();
+
+  EXPECT_TRUE(readsAgain(backEnd));
+  backEnd.change("lan1", bothValues);
+  EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
+}
+
+TEST(IpmiFailure, OfTheNetworkInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings(wire.port()))));
+  backEnd.read();
+
+  // Look (3), lock seen free, locked, source, and there it goes.
+  wire.cutAtRequest(7);
+  EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
+  EXPECT_EQ(bmc.witness("Set in Progress"), "Set In Progress");
+  wire.join();
+
+  EXPECT_TRUE(readsAgain(backEnd));
+  EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
+}
+
+TEST(IpmiFailure, OfTheNetworkForAMomentEndsInAConfirmedChange) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  auto settings = bmc.settings(wire.port());
+  settings["session_timeout"] = "0.4";
+  IpmiBackEnd backEnd(parseSettings(settings));
+  backEnd.read();
+  // The commit's answer is lost with the session; the network comes back.
+  wire.cutAtRequest(9);
+  std::jthread healer([&](std::stop_token stop) {
+    while (!stop.stop_requested() && bmc.stored("ip_addr") != "192.0.2.77") {
+      std::this_thread::yield();
+    }
+    const auto requests = wire.requests();
+    while (!stop.stop_requested() && wire.requests() < requests + 3) {
+      std::this_thread::yield();
+    }
+    wire.join();
+  });
+
+  backEnd.change("lan1", bothValues);
+
+  EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
+  EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
+}
+
+struct Refusal {
+  const char* name;
+  const char* key;
+  const char* value;
+  const char* message;
+};
+
+class IpmiSessionRefused : public testing::TestWithParam<Refusal> {};
+
+TEST_P(IpmiSessionRefused, TellsWhatToDo) {
+  const SimulatedBmc bmc;
+  auto settings = impatient(bmc.settings());
+  settings[GetParam().key] = GetParam().value;
+  IpmiBackEnd backEnd(parseSettings(settings));
+
+  EXPECT_THAT(inTime([&] { backEnd.read(); }), refusal(GetParam().message));
+  EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal(GetParam().message));
+
+  IpmiBackEnd right(parseSettings(bmc.settings()));
+  EXPECT_NO_THROW(right.read());
+}
+
+INSTANTIATE_TEST_SUITE_P(Reasons, IpmiSessionRefused,
+                         testing::Values(Refusal{"CipherSuite", "cipher_suite", "17", "try cipher_suite = 3"},
+                                         Refusal{"User", "user", "nobody", "the user 'nobody'"},
+                                         Refusal{"Host", "host", "no-such-host.invalid", "host"},
+                                         Refusal{"Port", "port", "9", "no answer; check host and port"}),
+                         [](const auto& refusal) { return refusal.param.name; });
+
+TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrected) {
+  const SimulatedBmc bmc;
+  const Testing::TemporaryDirectory directory;
+  const std::string file = directory / "password";
+  IpmiFixture::writePrivateFile(file, "wrong\n");
+  auto settings = bmc.settings();
+  settings["password_file"] = file;
+  IpmiBackEnd backEnd(parseSettings(settings));
+  EXPECT_THAT([&] { backEnd.read(); }, refusal("refused the password in " + file));
+
+  IpmiFixture::writePrivateFile(file, "test\n");
+
+  EXPECT_NO_THROW(backEnd.read());
+}
+
+TEST(IpmiSessionRefused, InBandWhereThereIsNoDriverNamesTheModules) {
+  IpmiBackEnd backEnd(parseSettings({{"device", "/dev/no-such-ipmi"}, {"cache", "0"}}));
+
+  EXPECT_THAT([&] { backEnd.read(); },
+              refusal("the BMC behind /dev/no-such-ipmi did not open a session: no such device"));
+}
+
+}  // namespace

@@ -1,0 +1,75 @@
+// Object managers run provider libraries in processes of their own: here the agent is in two, one that changes and one
+// that reads, and each keeps its own look at the BMC.
+#include <gmock/gmock.h>
+
+#include "tests/agent/backends/ipmi/Process.h"
+#include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "tests/agent/backends/ipmi/UdpRelay.h"
+
+namespace {
+
+using IpmiFixture::Process;
+using IpmiFixture::SimulatedBmc;
+using IpmiFixture::UdpRelay;
+
+class IpmiProcesses : public testing::Test {
+ protected:
+  // The command of a process with the agent in it, which reaches the BMC through that port and keeps a look at it for
+  // as long as it may.
+  std::vector<std::string> agentBehind(std::uint16_t port, const std::string& ini) const {
+    auto settings = bmc.settings(port);
+    settings["cache"] = "60";
+    std::string text = "[log]\ndestination = stderr\n[processor]\nbackend = ipmi\n[ipmi]\n";
+    for (const auto& [key, value] : settings) {
+      text += key + " = " + value + '\n';
+    }
+    Testing::writeFile(directory / ini, text);
+    return {"env", "QV_AGENT_INI=" + (directory / ini), AGENT_CLIENT};
+  }
+
+  static std::string ask(Process& process, const std::string& line) {
+    process.writeLine(line);
+    return process.readLine();
+  }
+
+  const Testing::TemporaryDirectory directory;
+  const SimulatedBmc bmc;
+  UdpRelay wire{bmc.port()};
+  Process reader{agentBehind(wire.port(), "reader.ini")};
+  Process writer{agentBehind(bmc.port(), "writer.ini")};
+};
+
+TEST_F(IpmiProcesses, SeeEachOthersChangesWithTheNextRead) {
+  EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
+  EXPECT_EQ(wire.requests(), 12u);
+
+  wire.reset();
+  EXPECT_EQ(ask(writer, "change 192.0.2.77 255.255.255.128"), "done");
+  EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.77/255.255.255.128");
+  EXPECT_EQ(wire.requests(), 6u);
+
+  EXPECT_EQ(ask(reader, "change 192.0.2.78 255.255.255.0"), "done");
+  EXPECT_EQ(ask(writer, "read"), "lan1 192.0.2.78/255.255.255.0");
+}
+
+TEST_F(IpmiProcesses, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
+  EXPECT_EQ(ask(writer, "read"), ask(reader, "read"));
+
+  wire.reset();
+  bmc.ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.44"});
+  EXPECT_EQ(ask(writer, "read"), "lan1 192.0.2.10/255.255.255.0") << "a change that is not the agent's";
+  EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
+
+  EXPECT_EQ(wire.requests(), 0u);
+}
+
+TEST_F(IpmiProcesses, SeeAChangeWhoseProcessEndedAtOnceAfterIt) {
+  EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
+  {
+    Process passing(agentBehind(bmc.port(), "passing.ini"));
+    EXPECT_EQ(ask(passing, "change 192.0.2.77 255.255.255.128"), "done");
+  }
+  EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.77/255.255.255.128");
+}
+
+}  // namespace

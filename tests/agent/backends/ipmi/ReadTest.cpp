@@ -1,0 +1,93 @@
+// Reading a real RMCP+ server.
+#include <gmock/gmock.h>
+
+#include "agent/backends/ipmi/IpmiBackEnd.h"
+#include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "tests/agent/support/Addresses.h"
+
+namespace {
+
+using IpmiFixture::SimulatedBmc;
+using QV::AddressOrigin;
+using QV::Ipmi::IpmiBackEnd;
+using QV::Ipmi::parseSettings;
+
+TEST(IpmiRead, ShowsWhatTheBmcHas) {
+  const SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(bmc.settings()));
+
+  const auto processor = backEnd.read();
+
+  ASSERT_EQ(processor.interfaces.size(), 1u);
+  const auto& interface = processor.interfaces[0];
+  EXPECT_EQ(interface.name, "lan1");
+  EXPECT_EQ(interface.macAddress, QV::mac("02:00:00:00:00:01"));
+  EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.10"));
+  EXPECT_EQ(interface.ipv4SubnetMask, QV::mask("255.255.255.0"));
+  EXPECT_EQ(interface.ipv4Gateway, QV::ipv4("192.0.2.1"));
+  EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Dhcp);
+  EXPECT_TRUE(interface.enabled);
+  EXPECT_EQ(interface.ipv6Address, std::nullopt) << "the simulator does not support IPv6 parameters";
+  EXPECT_TRUE(processor.dnsServers.empty());
+}
+
+TEST(IpmiRead, ShowsNoAddressWhereItIsZero) {
+  const SimulatedBmc bmc(SimulatedBmc::Personality::AppliesAtOnce);
+  IpmiBackEnd backEnd(parseSettings(bmc.settings()));
+
+  const auto interface = backEnd.read().interfaces.at(0);
+
+  EXPECT_EQ(interface.ipv4Address, std::nullopt);
+  EXPECT_EQ(interface.ipv4SubnetMask, std::nullopt);
+  EXPECT_EQ(interface.ipv4Gateway, std::nullopt);
+}
+
+TEST(IpmiRead, ShowsWhatAnotherClientChanged) {
+  const SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(bmc.settings()));
+  ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
+
+  bmc.ipmitool({"lan", "set", "1", "ipsrc", "static"});
+  bmc.ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.44"});
+
+  const auto interface = backEnd.read().interfaces.at(0);
+  EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.44"));
+  EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Static);
+}
+
+TEST(IpmiRead, KeepsASnapshotForTheCacheTime) {
+  const SimulatedBmc bmc;
+  auto settings = parseSettings(bmc.settings());
+  settings.cache = std::chrono::minutes(1);
+  IpmiBackEnd backEnd(settings);
+  ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
+
+  bmc.ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.44"});
+
+  EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
+}
+
+TEST(IpmiRead, FindsTheSameChannelHoweverItLooks) {
+  const SimulatedBmc bmc;
+  for (const char* channels : {"auto", "all", "1"}) {
+    auto settings = bmc.settings();
+    settings["channels"] = channels;
+    IpmiBackEnd backEnd(parseSettings(settings));
+
+    const auto processor = backEnd.read();
+
+    ASSERT_EQ(processor.interfaces.size(), 1u) << channels;
+    EXPECT_EQ(processor.interfaces[0].name, "lan1") << channels;
+  }
+}
+
+TEST(IpmiRead, SaysThatAListedChannelIsNoLanChannel) {
+  const SimulatedBmc bmc;
+  auto settings = bmc.settings();
+  settings["channels"] = "1, 7";
+  IpmiBackEnd backEnd(parseSettings(settings));
+
+  EXPECT_THAT([&] { backEnd.read(); }, testing::ThrowsMessage<std::runtime_error>(testing::HasSubstr("LAN channel 7")));
+}
+
+}  // namespace

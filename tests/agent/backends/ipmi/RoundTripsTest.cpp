@@ -1,0 +1,268 @@
+// What a read costs, counted on the wire: over a real network the round trips are the cost.
+#include <gmock/gmock.h>
+
+#include <algorithm>
+#include <chrono>
+#include <future>
+#include <thread>
+
+#include "agent/backends/ipmi/IpmiBackEnd.h"
+#include "tests/agent/backends/ipmi/RecordedLog.h"
+#include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "tests/agent/backends/ipmi/UdpRelay.h"
+#include "tests/agent/support/Addresses.h"
+
+namespace {
+
+using IpmiFixture::SimulatedBmc;
+using IpmiFixture::UdpRelay;
+using QV::Ipmi::IpmiBackEnd;
+using QV::Ipmi::parseSettings;
+
+bool traced(const std::string& text) {
+  const auto log = IpmiFixture::takeLog();
+  return std::any_of(log.begin(), log.end(), [&](const auto& line) { return line.trace && line.text == text; });
+}
+
+TEST(IpmiRoundTrips, OfAReadAreTwelveFromColdAndSixInAHeldSession) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiFixture::takeLog();
+
+  backEnd.read();
+  EXPECT_EQ(wire.requests(), 12u);
+  EXPECT_TRUE(traced("read 1 interfaces in 12 round trips"));
+
+  wire.reset();
+  backEnd.read();
+  EXPECT_EQ(wire.requests(), 6u);
+  EXPECT_TRUE(traced("read 1 interfaces in 6 round trips"));
+}
+
+TEST(IpmiRoundTrips, AreNoneWithinTheCacheTime) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  auto settings = parseSettings(bmc.settings(wire.port()));
+  settings.cache = std::chrono::minutes(1);
+  IpmiBackEnd backEnd(settings);
+  const auto first = backEnd.read();
+
+  wire.reset();
+
+  EXPECT_EQ(backEnd.read(), first);
+  EXPECT_EQ(wire.requests(), 0u);
+}
+
+// Two back ends are what two processes have: each its own look, and the file in common.
+class IpmiRoundTripsWithAnother : public testing::Test {
+ protected:
+  QV::Ipmi::IpmiSettings cached(std::uint16_t port) const {
+    auto settings = parseSettings(bmc.settings(port));
+    settings.cache = std::chrono::minutes(1);
+    return settings;
+  }
+
+  // What the next read costs, and whether it shows the address.
+  unsigned requestsOfRead(const std::string& address) {
+    wire.reset();
+    EXPECT_EQ(reader.read().interfaces.at(0).ipv4Address, QV::ipv4(address));
+    return wire.requests();
+  }
+
+  const SimulatedBmc bmc;
+  UdpRelay wire{bmc.port()};
+  IpmiBackEnd reader{cached(wire.port())};
+  IpmiBackEnd writer{cached(bmc.port())};
+};
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixAfterItsChangeAndThenNone) {
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+
+  writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreNoneWhereItHadNothingToWrite) {
+  writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 12u);
+
+  writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+  EXPECT_THROW(writer.change("lan2", {QV::ipv4("192.0.2.78"), QV::mask("255.255.255.128")}), std::runtime_error);
+
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixAfterAChangeThatTheBmcRefused) {
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+
+  bmc.hook("check", "exit 1");
+  EXPECT_THROW(writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")}), std::runtime_error);
+
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixOnceWhileItsChangeIsUnderWayAndOnceWhenItIsOver) {
+  // Given a change that waits for the answer to its first write: three requests to look, one for the lock's state, one
+  // for the lock
+  constexpr unsigned firstWrite = 6;
+  UdpRelay slowWire(bmc.port());
+  IpmiBackEnd slowWriter(cached(slowWire.port()));
+  slowWriter.read();
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+  slowWire.reset();
+  slowWire.cutAtRequest(firstWrite);
+  auto change = std::async(std::launch::async, [&] {
+    slowWriter.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+  });
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+  while (slowWire.requests() < firstWrite && std::chrono::steady_clock::now() < deadline) {
+    std::this_thread::yield();
+  }
+
+  // When others read meanwhile and afterwards, however it ends
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+  slowWire.join();
+  change.wait();
+
+  // Then they look once more
+  wire.reset();
+  reader.read();
+  EXPECT_EQ(wire.requests(), 6u);
+}
+
+// The text of what the operation throws; empty where it succeeds.
+template <typename Operation>
+std::string failureOf(const Operation& operation) {
+  try {
+    operation();
+    return {};
+  } catch (const std::runtime_error& error) {
+    return error.what();
+  }
+}
+
+// What was written under a lock may be applied or dropped when the lock is given back, whenever that is. The simulator
+// shows it until then, and drops it.
+TEST_F(IpmiRoundTripsWithAnother, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
+  // Given a change that is over and left its lock behind, and a look that was begun since
+  UdpRelay brokenWire(bmc.port());
+  auto settings = bmc.settings(brokenWire.port());
+  settings["operation_timeout"] = "1";
+  settings["session_timeout"] = "0.4";
+  IpmiBackEnd brokenWriter(parseSettings(settings));
+  const auto readBroken = [&] { return failureOf([&] { brokenWriter.read(); }); };
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(20);
+  const auto inTime = [&] { return std::chrono::steady_clock::now() < deadline; };
+  readBroken();
+  brokenWire.cutAtRequest(7);
+  EXPECT_NE(failureOf([&] { brokenWriter.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")}); }), "");
+  while (readBroken().find("did not open a session") == std::string::npos && inTime()) {
+  }
+  ASSERT_EQ(bmc.witness("Set in Progress"), "Set In Progress");
+  reader.read();
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
+
+  // When the lock is given back
+  brokenWire.join();
+  while (!readBroken().empty() && inTime()) {
+  }
+  ASSERT_EQ(bmc.witness("Set in Progress"), "Set Complete");
+
+  // Then the processor is looked at once more
+  EXPECT_NE(requestsOfRead("192.0.2.10"), 0u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixEachTimeWhereChangesCannotBeLearnedOfAndTheLogSaysSoOnce) {
+  std::filesystem::create_symlink("/dev/null", bmc.generationFile());
+  IpmiFixture::takeLog();
+
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+
+  const auto log = IpmiFixture::takeLog();
+  const auto tells = [&](const auto& line) {
+    return !line.trace && line.level == 6000 && line.text.starts_with(bmc.generationFile() + ": is a symbolic link");
+  };
+  EXPECT_EQ(std::count_if(log.begin(), log.end(), tells), 1);
+  EXPECT_TRUE(IpmiFixture::contains(log, 6000, "generation_file"));
+
+  // And once the file can be used, looks are kept again
+  std::filesystem::remove(bmc.generationFile());
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
+}
+
+TEST_F(IpmiRoundTripsWithAnother, AreSixAfterTheChangeOfOneThatCachesNothingItself) {
+  IpmiBackEnd uncached(parseSettings(bmc.settings()));
+  EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
+
+  uncached.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+
+  EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
+}
+
+TEST(IpmiRoundTrips, OfAChangeInAHeldSessionAreThirteen) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  backEnd.read();
+
+  wire.reset();
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+
+  // Three to look, one to see the lock free, lock, source, address, mask, commit, unlock, three to read back.
+  EXPECT_EQ(wire.requests(), 13u);
+}
+
+TEST(IpmiRoundTrips, OfAChangeToWhatIsSoAlreadyAreThoseOfLooking) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+
+  wire.reset();
+  backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
+
+  EXPECT_EQ(wire.requests(), 3u);
+}
+
+TEST(IpmiRoundTrips, IncludeTheOneThatGivesTheSessionBack) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  {
+    IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+    backEnd.read();
+    wire.reset();
+  }
+  EXPECT_EQ(wire.requests(), 1u);
+}
+
+// A BMC has few sessions; one that is merely left takes a place of them for a minute.
+TEST(IpmiRoundTrips, IncludeTheOneThatGivesAnIdleSessionBack) {
+  const SimulatedBmc bmc;
+  UdpRelay wire(bmc.port());
+  auto settings = bmc.settings(wire.port());
+  settings["session_timeout"] = "0.4";
+  IpmiBackEnd backEnd(parseSettings(settings));
+  backEnd.read();
+  wire.reset();
+
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
+  while (wire.requests() == 0 && std::chrono::steady_clock::now() < deadline) {
+    std::this_thread::yield();
+  }
+  EXPECT_EQ(wire.requests(), 1u);
+
+  wire.reset();
+  backEnd.read();
+  EXPECT_EQ(wire.requests(), 12u);
+}
+
+}  // namespace

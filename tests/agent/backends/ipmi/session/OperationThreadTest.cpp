@@ -1,0 +1,112 @@
+#include <gmock/gmock.h>
+
+#include <atomic>
+#include <future>
+#include <vector>
+
+#include "agent/backends/ipmi/session/OperationThread.h"
+
+namespace {
+
+using QV::Ipmi::Deadline;
+using QV::Ipmi::OperationThread;
+using QV::Ipmi::Overdue;
+using namespace std::chrono_literals;
+
+const auto never = 1h;
+const auto nothing = [] {};
+
+TEST(OperationThread, GivesWhatTheOperationGivesAndThrowsWhatItThrows) {
+  OperationThread thread(never, nothing);
+  EXPECT_EQ(thread.run(Deadline(10s), [] { return 42; }), 42);
+  EXPECT_THAT([&] { thread.run(Deadline(10s), []() -> int { throw std::out_of_range("too far"); }); },
+              testing::ThrowsMessage<std::runtime_error>("too far"));
+}
+
+TEST(OperationThread, LetsTheCallerGoAtTheDeadlineAndFinishesTheOperation) {
+  const auto release = std::make_shared<std::promise<void>>();
+  const auto ended = std::make_shared<std::promise<void>>();
+  OperationThread thread(never, nothing);
+
+  try {
+    thread.run(Deadline(20ms), [released = release->get_future().share(), ended] {
+      released.wait();
+      ended->set_value();
+    });
+    FAIL() << "the operation cannot have ended";
+  } catch (const Overdue& overdue) {
+    EXPECT_TRUE(overdue.begun());
+  }
+
+  release->set_value();
+  EXPECT_EQ(ended->get_future().wait_for(10s), std::future_status::ready);
+}
+
+TEST(OperationThread, NeverBeginsAnOperationWhoseCallerHasLeft) {
+  const auto release = std::make_shared<std::promise<void>>();
+  const auto begun = std::make_shared<std::atomic<bool>>(false);
+  OperationThread thread(never, nothing);
+  EXPECT_THROW(thread.run(Deadline(20ms), [released = release->get_future().share()] { released.wait(); }), Overdue);
+
+  try {
+    thread.run(Deadline(20ms), [begun] { *begun = true; });
+    FAIL() << "the operation cannot have ended";
+  } catch (const Overdue& overdue) {
+    EXPECT_FALSE(overdue.begun());
+  }
+
+  release->set_value();
+  thread.run(Deadline(10s), nothing);
+  EXPECT_FALSE(*begun);
+}
+
+TEST(OperationThread, RunsOneOperationAtATime) {
+  OperationThread thread(never, nothing);
+  const auto running = std::make_shared<std::atomic<int>>(0);
+  const auto together = std::make_shared<std::atomic<int>>(0);
+  std::vector<std::future<void>> callers;
+  for (int caller = 0; caller < 8; ++caller) {
+    callers.push_back(std::async(std::launch::async, [&] {
+      for (int operation = 0; operation < 50; ++operation) {
+        thread.run(Deadline(10s), [running, together] {
+          if (++*running > 1) {
+            ++*together;
+          }
+          --*running;
+        });
+      }
+    }));
+  }
+  for (auto& caller : callers) {
+    caller.get();
+  }
+  EXPECT_EQ(*together, 0);
+}
+
+TEST(OperationThread, ActsOnceWhenIdleAndOnceWhenItEnds) {
+  const auto idle = std::make_shared<std::atomic<int>>(0);
+  {
+    OperationThread thread(10ms, [idle] {
+      ++*idle;
+      idle->notify_all();
+    });
+    idle->wait(0);
+    EXPECT_EQ(*idle, 1);
+  }
+  EXPECT_EQ(*idle, 2);
+}
+
+TEST(OperationThread, ThatIsBlockedDoesNotHoldItsOwner) {
+  const auto release = std::make_shared<std::promise<void>>();
+  const auto idle = std::make_shared<std::promise<void>>();
+  const auto start = std::chrono::steady_clock::now();
+  {
+    OperationThread thread(never, [idle] { idle->set_value(); });
+    EXPECT_THROW(thread.run(Deadline(20ms), [released = release->get_future().share()] { released.wait(); }), Overdue);
+  }
+  EXPECT_LT(std::chrono::steady_clock::now() - start, OperationThread::longestEnd + 1s);
+  release->set_value();
+  EXPECT_EQ(idle->get_future().wait_for(10s), std::future_status::ready) << "it cleans up when it can";
+}
+
+}  // namespace

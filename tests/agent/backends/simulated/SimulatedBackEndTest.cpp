@@ -1,0 +1,102 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <thread>
+#include <vector>
+
+#include "agent/backends/simulated/SimulatedBackEnd.h"
+#include "agent/backends/simulated/StateText.h"
+#include "tests/agent/support/Addresses.h"
+#include "tests/agent/support/Throws.h"
+#include "tests/support/TemporaryDirectory.h"
+
+namespace QV {
+namespace {
+
+class ASimulatedProcessor : public testing::Test {
+ protected:
+  const Testing::TemporaryDirectory directory_;
+  const std::string state_ = directory_ / "processor/state.json";
+  SimulatedBackEnd processor_{state_};
+};
+
+TEST_F(ASimulatedProcessor, touchesNothingBeforeItIsUsed) { EXPECT_TRUE(std::filesystem::is_empty(directory_.path())); }
+
+TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationOnTheFirstRead) {
+  EXPECT_EQ(processor_.read(), factoryConfiguration());
+  EXPECT_EQ(Testing::readFile(state_), writeState(factoryConfiguration()));
+}
+
+TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationWithTheFirstChange) {
+  processor_.change("eth1", {ipv4("198.51.100.99"), mask("255.255.0.0")});
+  ManagementProcessor expected = factoryConfiguration();
+  expected.interfaces[1].ipv4Address = ipv4("198.51.100.99");
+  expected.interfaces[1].ipv4SubnetMask = mask("255.255.0.0");
+  expected.interfaces[1].ipv4Origin = AddressOrigin::Static;
+  EXPECT_EQ(processor_.read(), expected);
+}
+
+TEST_F(ASimulatedProcessor, changesNoMoreThanItIsTold) {
+  processor_.change("eth0", {{}, mask("255.255.0.0")});
+  ManagementProcessor expected = factoryConfiguration();
+  expected.interfaces[0].ipv4SubnetMask = mask("255.255.0.0");
+  EXPECT_EQ(processor_.read(), expected);
+}
+
+TEST_F(ASimulatedProcessor, showsWhatAnotherProcessWrote) {
+  processor_.read();
+  SimulatedBackEnd(state_).change("eth0", {ipv4("192.0.2.77"), {}});
+  EXPECT_EQ(processor_.read().interfaces[0].ipv4Address, ipv4("192.0.2.77"));
+}
+
+TEST_F(ASimulatedProcessor, refusesToChangeAnInterfaceThatItDoesNotHave) {
+  EXPECT_EQ(thrownBy([&] {
+              processor_.change("eth9", {ipv4("192.0.2.77"), {}});
+            }),
+            state_ + ": there is no interface 'eth9'");
+}
+
+TEST_F(ASimulatedProcessor, withADamagedStateTellsTheFileAndTheFieldAndLeavesTheFile) {
+  processor_.read();
+  for (const std::string damage : {"", "{", "{\"name\": 7}", "\0\0"}) {
+    Testing::writeFile(state_, damage);
+    EXPECT_THAT(thrownBy([&] { processor_.read(); }), testing::StartsWith(state_ + ": "));
+    EXPECT_THAT(thrownBy([&] {
+                  processor_.change("eth0", {ipv4("192.0.2.77"), {}});
+                }),
+                testing::StartsWith(state_ + ": "));
+    EXPECT_EQ(Testing::readFile(state_), damage);
+  }
+}
+
+TEST_F(ASimulatedProcessor, losesNoChangeOfSeveralThreads) {
+  // When two threads change an interface each, over and over
+  constexpr int changes = 50;
+  const auto change = [&](const std::string& interface, const std::string& network) {
+    for (int host = 1; host <= changes; ++host) {
+      processor_.change(interface, {ipv4(network + std::to_string(host)), {}});
+    }
+  };
+  {
+    std::jthread first([&] { change("eth0", "192.0.2."); });
+    std::jthread second([&] { change("eth1", "198.51.100."); });
+  }
+
+  // Then the last change of each is there
+  EXPECT_EQ(processor_.read().interfaces[0].ipv4Address, ipv4("192.0.2.50"));
+  EXPECT_EQ(processor_.read().interfaces[1].ipv4Address, ipv4("198.51.100.50"));
+}
+
+TEST_F(ASimulatedProcessor, ofAFreshMachineIsTheSameForAllThatAskAtOnce) {
+  std::vector<ManagementProcessor> seen(4);
+  {
+    std::vector<std::jthread> threads;
+    for (ManagementProcessor& processor : seen) {
+      threads.emplace_back([&] { processor = SimulatedBackEnd(state_).read(); });
+    }
+  }
+  EXPECT_THAT(seen, testing::Each(factoryConfiguration()));
+}
+
+}  // namespace
+}  // namespace QV
