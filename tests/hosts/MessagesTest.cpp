@@ -69,8 +69,8 @@ class HostMessages : public HostTest {
 
   static void expectExplained(const Completed& answer, const std::string& part) {
     EXPECT_NE(answer.status, 0) << answer.output;
-    EXPECT_THAT(answer.errors, HasSubstr(part));
     EXPECT_TRUE(host().guide().explains(answer.errors)) << answer.errors;
+    EXPECT_THAT(answer.errors + host().diagnostics(), HasSubstr(part));
   }
 
   // That nothing is answered and nothing said.
@@ -110,12 +110,12 @@ TEST_F(HostMessages, OfMissingCompositeClassesAreExplained) {
 
 TEST_F(HostMessages, OfAMissingProviderDirectoryAreExplained) {
   host().install(without({"/usr/local/lib/cmpi"}));
-  expectExplained(firstRequest(), "");
+  expectExplained(firstRequest(), "IPProtocolendptProvider");
 }
 
 TEST_F(HostMessages, OfTheAgentsMissingLibrariesAreExplained) {
   host().install(without({"ldconfig"}));
-  expectExplained(firstRequest(), "");
+  expectExplained(firstRequest(), "libqvhelper.so.1: cannot open shared object file");
 }
 
 TEST_F(HostMessages, AreNoneWhereARegistrationIsMissing) {
@@ -160,8 +160,13 @@ TEST_F(HostMessages, OfAStateThatCannotBeWrittenAreExplained) {
 }
 
 TEST_F(HostMessages, OfAMistakeInAgentIniAreExplained) {
+  installOn("[processor]\nbakcend = simulated\n");
+  expectExplained(firstRequest(), "agent.ini:8: ");
+}
+
+TEST_F(HostMessages, OfAnUnknownBackEndAreExplained) {
   installOn("[processor]\nbackend = simulatd\n");
-  expectExplained(firstRequest(), "agent.ini:8: [processor] backend");
+  expectExplained(firstRequest(), "the back end simulatd cannot be loaded");
 }
 
 TEST_F(HostMessages, OfABmcThatDoesNotAnswerAreExplained) {

@@ -23,7 +23,7 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr const char* agentIni = INSTALL_PREFIX "/etc/compositeipconfig/agent.ini";
-constexpr const char* agentLog = "/var/lib/compositeipconfig/agent.log";
+constexpr const char* agentLog = "/var/tmp/agent.log";
 constexpr const char* shared = INSTALL_PREFIX "/share/compositeipconfig";
 
 // A TCP socket of 127.0.0.1; port 0 takes a free one.

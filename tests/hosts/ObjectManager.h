@@ -50,6 +50,8 @@ class ObjectManager : public WbemClient {
   /// is reached. Takes effect with the next start of the object manager.
   void configureAgent(const std::string& processor, int logThreshold = 6000) const;
   std::string log() const;
+  /// Everything that an administrator is told beside the answer to a client.
+  virtual std::string diagnostics() const { return log(); }
   /// The file that a simulated management processor is kept in, and what it holds.
   static std::string stateFile();
   static std::string simulatedProcessor();

@@ -11,6 +11,7 @@ class Sfcb : public ObjectManager {
   /// By leaving them idle, for less time than the minute that sfcb gives them by itself.
   bool unloadProviders() override;
   void allowProviders() override;
+  std::string diagnostics() const override;
   bool answersWithoutAClass() const override { return false; }
   bool answersRequestsThatItLost() const override { return false; }
   std::string program() const override { return "sfcbd"; }
