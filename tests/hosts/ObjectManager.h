@@ -72,6 +72,9 @@ class ObjectManager : public WbemClient {
   /// Whether a request ends, with an error, when the provider process that it was given to is killed.
   virtual bool answersRequestsThatItLost() const = 0;
 
+  /// Whether the client is told why the underlying provider failed.
+  bool passesReasonsOn() const { return processes_ == 1 || passesReasonsBetweenProcesses(); }
+
   /// The program that its step "start" starts.
   virtual std::string program() const = 0;
 
@@ -94,6 +97,8 @@ class ObjectManager : public WbemClient {
   virtual std::vector<std::string> installing() const = 0;
   virtual std::vector<std::string> removing() const = 0;
   virtual std::vector<std::string> upgrading() const = 0;
+  /// Whether the text of a failed up-call reaches a provider in another process.
+  virtual bool passesReasonsBetweenProcesses() const = 0;
 
  private:
   bool isListening() const;

@@ -24,6 +24,7 @@ class OpenPegasus : public ObjectManager {
   std::vector<std::string> installing() const override;
   std::vector<std::string> removing() const override;
   std::vector<std::string> upgrading() const override;
+  bool passesReasonsBetweenProcesses() const override { return true; }
 };
 
 }  // namespace Testing

@@ -24,6 +24,7 @@ class Sfcb : public ObjectManager {
   std::vector<std::string> installing() const override;
   std::vector<std::string> removing() const override;
   std::vector<std::string> upgrading() const override;
+  bool passesReasonsBetweenProcesses() const override { return false; }
 
  private:
   std::string configuration() const;
