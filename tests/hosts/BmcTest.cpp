@@ -82,6 +82,7 @@ TEST_F(HostBmc, IsFoundAgainAfterItWasAway) {
   const std::string failure = host().failure("ei", "YRNx_MgmtHwIPProtocolEndPoint");
   EXPECT_THAT(failure, HasSubstr("(1) CIM_ERR_FAILED"));
   EXPECT_TRUE(host().guide().explains(failure)) << failure;
+  EXPECT_THAT(host().diagnostics(), HasSubstr("127.0.0.1:" + std::to_string(bmc_.port())));
   bmc_.restart();
   EXPECT_EQ(shownAddress(), before);
 }

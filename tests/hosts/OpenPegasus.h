@@ -8,7 +8,7 @@ class OpenPegasus : public ObjectManager {
  public:
   OpenPegasus(std::string prefix, int processes) : ObjectManager(std::move(prefix), processes) {}
 
-  /// By disabling their modules.
+  // By disabling their modules.
   bool unloadProviders() override;
   void allowProviders() override;
   bool answersWithoutAClass() const override { return true; }
@@ -24,7 +24,6 @@ class OpenPegasus : public ObjectManager {
   std::vector<std::string> installing() const override;
   std::vector<std::string> removing() const override;
   std::vector<std::string> upgrading() const override;
-  bool passesReasonsBetweenProcesses() const override { return true; }
 };
 
 }  // namespace Testing

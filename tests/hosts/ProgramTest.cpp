@@ -69,10 +69,10 @@ TEST_F(PrivateMachine, KeepsToItselfWhatIsWrittenThere) {
 }
 
 TEST_F(PrivateMachine, EndsWithAllItsProcesses) {
-  const std::string program = (directory_.path() / "sleeper").string();
-  std::filesystem::copy_file("/bin/sleep", program);
-  EXPECT_EQ(enter(program + " 60 & echo started").output, "started\n");
-  EXPECT_TRUE(poll([&] { return processesRunning({program}).empty(); }));
+  const std::string sleeper = (directory_.path() / "sleeper").string();
+  std::filesystem::copy_file("/bin/sleep", sleeper);
+  EXPECT_EQ(enter(sleeper + " 60 & echo started").output, "started\n");
+  EXPECT_TRUE(poll([&] { return processesRunning({sleeper}).empty(); }));
 }
 
 TEST_F(PrivateMachine, EndsAsItsCommandEnds) {

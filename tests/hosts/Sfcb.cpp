@@ -3,6 +3,7 @@
 #include <filesystem>
 
 #include "tests/e2e/support/Poll.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace Testing {
 namespace {
@@ -29,6 +30,8 @@ std::map<std::string, std::string> Sfcb::differences() const {
   differences["/etc/sfcb/sfcb.cfg"] = configuration();
   return differences;
 }
+
+std::string Sfcb::diagnostics() const { return log() + readFile("/var/log/sfcbd.log"); }
 
 void Sfcb::prepare() {
   run("sed -i -e 's/^httpPort:.*/httpPort: " + std::to_string(port()) + "/' -e '/^#*httpLocalOnly:/d' " +

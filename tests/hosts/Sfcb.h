@@ -8,9 +8,10 @@ class Sfcb : public ObjectManager {
  public:
   Sfcb(std::string prefix, int processes) : ObjectManager(std::move(prefix), processes) {}
 
-  /// By leaving them idle, for less time than the minute that sfcb gives them by itself.
+  // By leaving them idle, for less time than the minute that sfcb gives them by itself.
   bool unloadProviders() override;
   void allowProviders() override;
+  std::string diagnostics() const override;
   bool answersWithoutAClass() const override { return false; }
   bool answersRequestsThatItLost() const override { return false; }
   std::string program() const override { return "sfcbd"; }
@@ -24,7 +25,6 @@ class Sfcb : public ObjectManager {
   std::vector<std::string> installing() const override;
   std::vector<std::string> removing() const override;
   std::vector<std::string> upgrading() const override;
-  bool passesReasonsBetweenProcesses() const override { return false; }
 
  private:
   std::string configuration() const;
