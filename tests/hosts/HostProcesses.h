@@ -8,13 +8,13 @@
 
 namespace Testing {
 
-/// Those that have a file mapped whose path holds the text: those that have loaded a library, say.
+// Those that have a file mapped whose path holds the text: those that have loaded a library, say.
 std::vector<pid_t> processesMapping(const std::string& part);
 
-/// Those that run one of the programs, given by their paths.
+// Those that run one of the programs, given by their paths.
 std::vector<pid_t> processesRunning(const std::vector<std::string>& programs);
 
-/// What a process has in memory, in KiB; 0 where it has ended.
+// What a process has in memory, in KiB; 0 where it has ended.
 long residentKib(pid_t process);
 
 }  // namespace Testing

@@ -12,21 +12,21 @@
 
 namespace Testing {
 
-/// An object manager that is installed on this machine, brought from its stock state to serving the product by the
-/// commands of docs/object-managers.md. It is changed for good: to be used on a private machine only.
+// An object manager that is installed on this machine, brought from its stock state to serving the product by the
+// commands of docs/object-managers.md. It is changed for good: to be used on a private machine only.
 class ObjectManager : public WbemClient {
  public:
   using Edit = std::function<std::string(const std::string& commands)>;
 
-  /// The one of that name, "sfcb" or "openpegasus", as its environment variable says where it is. Gives null where the
-  /// variable is not set, throws std::invalid_argument for another name.
-  /// @param processes how many the two libraries run in: 1, as they are registered, or 2
+  // The one of that name, "sfcb" or "openpegasus", as its environment variable says where it is. Gives null where the
+  // variable is not set, throws std::invalid_argument for another name.
+  // @param processes how many the two libraries run in: 1, as they are registered, or 2
   static std::unique_ptr<ObjectManager> find(const std::string& name, int processes);
 
-  /// The environment variable that holds the prefix of an installation.
+  // The environment variable that holds the prefix of an installation.
   static std::string variableOf(const std::string& name);
 
-  /// What has to be there and is not, with what to do about it, in a line; empty where nothing is missing.
+  // What has to be there and is not, with what to do about it, in a line; empty where nothing is missing.
   std::string missing() const;
 
   const std::string& prefix() const { return prefix_; }
@@ -34,50 +34,50 @@ class ObjectManager : public WbemClient {
   int processes() const { return processes_; }
   const Guide& guide() const { return guide_; }
 
-  /// From stock to serving, and back again. An edit changes the commands of every step before they are run.
+  // From stock to serving, and back again. An edit changes the commands of every step before they are run.
   void install(const Edit& edit = {});
   void remove(const Edit& edit = {});
-  /// A new version over the one that is there.
+  // A new version over the one that is there.
   void upgrade();
 
   void start(const Edit& edit = {});
   void stop();
   void restart();
-  /// Ends it without asking it to end.
+  // Ends it without asking it to end.
   void kill();
 
-  /// Writes agent.ini: the managed system is managed.example, and the given sections say how the management processor
-  /// is reached. Takes effect with the next start of the object manager.
+  // Writes agent.ini: the managed system is managed.example, and the given sections say how the management processor
+  // is reached. Takes effect with the next start of the object manager.
   void configureAgent(const std::string& processor, int logThreshold = 6000) const;
   std::string log() const;
-  /// Everything that an administrator is told beside the answer to a client.
+  // Everything that an administrator is told beside the answer to a client.
   virtual std::string diagnostics() const { return log(); }
-  /// The file that a simulated management processor is kept in, and what it holds.
+  // The file that a simulated management processor is kept in, and what it holds.
   static std::string stateFile();
   static std::string simulatedProcessor();
 
-  /// Has the object manager end the processes that have the libraries loaded, which it starts again when asked. Gives
-  /// false where they do not end.
+  // Has the object manager end the processes that have the libraries loaded, which it starts again when asked. Gives
+  // false where they do not end.
   virtual bool unloadProviders() = 0;
-  /// Takes back what keeps it from loading them.
+  // Takes back what keeps it from loading them.
   virtual void allowProviders() {}
 
-  /// The processes that have one of the libraries loaded: "composite" or "underlying"; either where none is named.
+  // The processes that have one of the libraries loaded: "composite" or "underlying"; either where none is named.
   static std::vector<pid_t> providerProcesses(const std::string& library = {});
 
-  /// Runs the commands of a step of the document; throws std::runtime_error with what they wrote where they fail.
+  // Runs the commands of a step of the document; throws std::runtime_error with what they wrote where they fail.
   std::string carryOut(const std::string& step, const Edit& edit = {}) const;
 
-  /// Whether it answers Associators and AssociatorNames where the client names no association class.
+  // Whether it answers Associators and AssociatorNames where the client names no association class.
   virtual bool answersWithoutAClass() const = 0;
 
-  /// Whether a request ends, with an error, when the provider process that it was given to is killed.
+  // Whether a request ends, with an error, when the provider process that it was given to is killed.
   virtual bool answersRequestsThatItLost() const = 0;
 
-  /// The program that its step "start" starts.
+  // The program that its step "start" starts.
   virtual std::string program() const = 0;
 
-  /// The name that it has in the document.
+  // The name that it has in the document.
   virtual std::string title() const = 0;
 
  protected:
@@ -85,13 +85,13 @@ class ObjectManager : public WbemClient {
 
   std::string run(const std::string& commands) const;
 
-  /// Files and directories that an installation has, below its prefix.
+  // Files and directories that an installation has, below its prefix.
   virtual std::vector<std::string> parts() const = 0;
   virtual std::vector<std::string> programs() const = 0;
   virtual Environment environment() const;
-  /// Texts of the document that are otherwise on this machine.
+  // Texts of the document that are otherwise on this machine.
   virtual std::map<std::string, std::string> differences() const;
-  /// Makes it listen on port() only, and takes away what another running one left.
+  // Makes it listen on port() only, and takes away what another running one left.
   virtual void prepare() = 0;
   virtual std::vector<std::string> installing() const = 0;
   virtual std::vector<std::string> removing() const = 0;

@@ -8,7 +8,7 @@ class OpenPegasus : public ObjectManager {
  public:
   OpenPegasus(std::string prefix, int processes) : ObjectManager(std::move(prefix), processes) {}
 
-  /// By disabling their modules.
+  // By disabling their modules.
   bool unloadProviders() override;
   void allowProviders() override;
   bool answersWithoutAClass() const override { return true; }

@@ -8,7 +8,7 @@ class Sfcb : public ObjectManager {
  public:
   Sfcb(std::string prefix, int processes) : ObjectManager(std::move(prefix), processes) {}
 
-  /// By leaving them idle, for less time than the minute that sfcb gives them by itself.
+  // By leaving them idle, for less time than the minute that sfcb gives them by itself.
   bool unloadProviders() override;
   void allowProviders() override;
   std::string diagnostics() const override;
