@@ -104,7 +104,7 @@ TEST_F(CompositeAssociation, ReferencesBothEnds) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     const auto found = stack_.instances(scoped("ri", "-arc", view.association), view.source);
     ASSERT_THAT(found, SizeIs(view.far.size()));
-    const bool members = view.association == staticMember || view.association == dhcpMember;
+    const bool members = view.association == std::string(staticMember) || view.association == std::string(dhcpMember);
     for (std::size_t i = 0; i < found.size(); ++i) {
       const Ends ends = endsOf(found[i]);
       ASSERT_THAT(ends, ElementsAre(Key(members ? "GroupComponent" : "Antecedent"),
@@ -140,7 +140,7 @@ TEST_F(CompositeAssociation, NamesItsReferencesByBothEnds) {
     for (std::size_t i = 0; i < names.size(); ++i) {
       EXPECT_THAT(names[i], StartsWith(std::string(view.association) + '.'));
       // The keys of this one are references that its References does not set, so its names have none.
-      if (view.association == elementSetting) continue;
+      if (view.association == std::string(elementSetting)) continue;
       EXPECT_THAT(names[i], AllOf(HasSubstr(view.source), HasSubstr(view.referenceNames[i])));
     }
   }
