@@ -29,14 +29,19 @@ class HostAssociations : public HostTest {
   // The values that are paths, by the names of the references.
   static Ends endsOf(const Printed& instance) {
     Ends ends;
-    for (const auto& [name, value] : instance.values)
-      if (value.find("root/cimv2") != std::string::npos) ends[name] = canonical(value);
+    for (const auto& [name, value] : instance.values) {
+      if (value.find("root/cimv2") != std::string::npos) {
+        ends[name] = canonical(value);
+      }
+    }
     return ends;
   }
 
   static Objects objectsOf(const std::vector<Printed>& instances) {
     Objects objects;
-    for (const Printed& instance : instances) objects.push_back(canonical(objectOf(instance.path)));
+    for (const Printed& instance : instances) {
+      objects.push_back(canonical(objectOf(instance.path)));
+    }
     return objects;
   }
 };
@@ -53,9 +58,12 @@ TEST_F(HostAssociations, AnswerTheFarEndsOfEachEnd) {
 TEST_F(HostAssociations, AnswerWholeInstances) {
   for (const std::string& source : {computerSystem(), sequence("eth1:dhcp")}) {
     for (const View& view : views()) {
-      if (view.source != source) continue;
-      for (const Printed& found : host().instances(scoped("ai", "-ac", view.association), source))
+      if (view.source != source) {
+        continue;
+      }
+      for (const Printed& found : host().instances(scoped("ai", "-ac", view.association), source)) {
         EXPECT_EQ(found.values, host().get(objectOf(found.path)));
+      }
     }
   }
 }
@@ -84,16 +92,21 @@ TEST_F(HostAssociations, NameTheirReferencesByBothEnds) {
     ASSERT_THAT(names, SizeIs(view.referenceNames.size()));
     EXPECT_THAT(names, Each(StartsWith(std::string(view.association) + '.')));
     // This class has no keys.
-    if (view.association == std::string(elementSetting)) continue;
-    for (std::size_t i = 0; i < names.size(); ++i)
+    if (view.association == std::string(elementSetting)) {
+      continue;
+    }
+    for (std::size_t i = 0; i < names.size(); ++i) {
       EXPECT_THAT(names[i],
                   testing::AllOf(HasSubstr(canonical(view.source)), HasSubstr(canonical(view.referenceNames[i]))));
+    }
   }
 }
 
 TEST_F(HostAssociations, WithoutAClassReferToEverythingThatAnEndIsRelatedTo) {
   std::map<std::string, std::size_t> related;
-  for (const View& view : views()) related[view.source] += view.far.size();
+  for (const View& view : views()) {
+    related[view.source] += view.far.size();
+  }
   for (const auto& [source, count] : related) {
     SCOPED_TRACE(source);
     EXPECT_THAT(host().names("rin", source), SizeIs(count));
@@ -105,7 +118,9 @@ TEST_F(HostAssociations, WithoutAClassAnswerAllFarEndsOrNone) {
   std::map<std::string, Objects> everything;
   for (const View& view : views()) {
     Objects& far = everything[view.source];
-    for (const std::string& object : view.far) far.push_back(canonical(object));
+    for (const std::string& object : view.far) {
+      far.push_back(canonical(object));
+    }
   }
   for (const auto& [source, far] : everything) {
     SCOPED_TRACE(source);
@@ -130,7 +145,9 @@ TEST_F(HostAssociations, EnumerateTheirNames) {
   for (const Enumeration& row : enumerations()) {
     const Objects names = canonical(host().names("ein", row.association));
     ASSERT_THAT(names, SizeIs(row.pairs.size())) << row.association;
-    if (row.association == std::string(elementSetting)) continue;
+    if (row.association == std::string(elementSetting)) {
+      continue;
+    }
     for (std::size_t i = 0; i < names.size(); ++i) {
       const auto& [first, second] = row.pairs[i];
       EXPECT_EQ(names[i], std::string(row.association) + '.' + row.first + '=' + canonical(first) + ',' + row.second +
@@ -142,7 +159,9 @@ TEST_F(HostAssociations, EnumerateTheirNames) {
 TEST_F(HostAssociations, AreGotByTheNamesThatWereEnumerated) {
   for (const Enumeration& row : enumerations()) {
     // Without keys it cannot be asked for.
-    if (row.association == std::string(elementSetting)) continue;
+    if (row.association == std::string(elementSetting)) {
+      continue;
+    }
     for (const auto& [first, second] : row.pairs) {
       const std::string name =
           std::string(row.association) + '.' + row.first + '=' + first + ',' + row.second + '=' + second;

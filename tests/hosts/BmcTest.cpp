@@ -23,7 +23,9 @@ class HostBmc : public HostTest {
     // As an administrator has it, who leaves the key out.
     settings.erase("cache");
     std::string processor = "[processor]\nbackend = ipmi\n[ipmi]\n";
-    for (const auto& [key, value] : settings) processor += key + " = " + value + '\n';
+    for (const auto& [key, value] : settings) {
+      processor += key + " = " + value + '\n';
+    }
     serve(processor);
   }
 

@@ -83,8 +83,9 @@ TEST_F(HostChanges, OfARemoteAccessPointHaveNoEffect) {
 }
 
 TEST_F(HostChanges, OfOtherClassesAreNotSupported) {
-  for (const std::string& object : {computerSystem(), sequence("eth0:static"), dhcpSetting("eth0")})
+  for (const std::string& object : {computerSystem(), sequence("eth0:static"), dhcpSetting("eth0")}) {
     EXPECT_THAT(host().failure("mi", object, {"ElementName=other"}), HasSubstr("(7) CIM_ERR_NOT_SUPPORTED"));
+  }
 }
 
 TEST_F(HostChanges, OutliveTheObjectManager) {

@@ -38,7 +38,9 @@ class Client {
   explicit Client(std::uint16_t port) : port_(port) {}
 
   std::string answerTo(const Call& call) {
-    if (!connection_) connection_.emplace(port_);
+    if (!connection_) {
+      connection_.emplace(port_);
+    }
     const std::string body = messageOf("<IMETHODCALL NAME=\"" + call.method + "\">" + nameSpacePath("cimv2") +
                                        call.parameters + "</IMETHODCALL>");
     const auto response = connection_->post(
@@ -46,7 +48,9 @@ class Client {
         "Content-Type: application/xml; charset=\"utf-8\"\r\nCIMOperation: MethodCall\r\nCIMMethod: " + call.method +
             "\r\nCIMObject: root%2Fcimv2\r\n");
     const std::string* connection = response.headers.find("Connection");
-    if (connection && *connection == "close") connection_.reset();
+    if (connection && *connection == "close") {
+      connection_.reset();
+    }
     return response.body;
   }
 
@@ -65,8 +69,12 @@ std::string endpointPath(const std::string& interface) {
 std::vector<Call> calls() {
   std::vector<Call> all;
   std::vector<std::string> classes;
-  for (const ClassCase& row : classCases()) classes.push_back(row.className);
-  for (const Enumeration& row : enumerations()) classes.emplace_back(row.association);
+  for (const ClassCase& row : classCases()) {
+    classes.push_back(row.className);
+  }
+  for (const Enumeration& row : enumerations()) {
+    classes.emplace_back(row.association);
+  }
   for (const std::string& name : classes) {
     all.push_back({"EnumerateInstances", className(name)});
     all.push_back({"EnumerateInstanceNames", className(name)});
@@ -75,9 +83,10 @@ std::vector<Call> calls() {
   // Of a named association: where none is named, OpenPegasus orders the answers now so, now so.
   for (const auto& [method, filter] :
        {std::pair{"Associators", "AssocClass"}, std::pair{"AssociatorNames", "AssocClass"},
-        std::pair{"References", "ResultClass"}, std::pair{"ReferenceNames", "ResultClass"}})
+        std::pair{"References", "ResultClass"}, std::pair{"ReferenceNames", "ResultClass"}}) {
     all.push_back({method, parameter("ObjectName", endpointPath("eth1")) +
                                parameter(filter, "<CLASSNAME NAME=\"" + std::string(clientAccess) + "\"/>")});
+  }
   return all;
 }
 
@@ -94,7 +103,9 @@ class HostEndurance : public HostTest {
  protected:
   static long residentProviders() {
     long sum = 0;
-    for (const pid_t process : ObjectManager::providerProcesses()) sum += residentKib(process);
+    for (const pid_t process : ObjectManager::providerProcesses()) {
+      sum += residentKib(process);
+    }
     return sum;
   }
 };

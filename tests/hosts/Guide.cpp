@@ -25,7 +25,9 @@ Guide::Guide() : text_(readFile(file)) {}
 std::string Guide::commands(const std::string& step) const {
   const std::string opening = "\n```sh " + step + "\n";
   const auto begin = text_.find(opening);
-  if (begin == std::string::npos) throw std::runtime_error(std::string(file) + " has no step \"" + step + '"');
+  if (begin == std::string::npos) {
+    throw std::runtime_error(std::string(file) + " has no step \"" + step + '"');
+  }
   const auto first = begin + opening.size();
   return text_.substr(first, text_.find("```", first) - first);
 }
@@ -34,7 +36,9 @@ bool Guide::explains(const std::string& message) const {
   // The first column of the tables: a line "| `wording` | …".
   static const std::regex row("\n\\| `([^`]+)` \\|");
   for (std::sregex_iterator found(text_.begin(), text_.end(), row), end; found != end; ++found) {
-    if (std::regex_search(message, patternOf((*found)[1]))) return true;
+    if (std::regex_search(message, patternOf((*found)[1]))) {
+      return true;
+    }
   }
   return false;
 }

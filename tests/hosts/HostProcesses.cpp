@@ -16,8 +16,12 @@ std::vector<pid_t> processesThat(const std::function<bool(const fs::path& direct
   std::vector<pid_t> found;
   for (const auto& entry : fs::directory_iterator("/proc")) {
     const std::string name = entry.path().filename().string();
-    if (name.find_first_not_of("0123456789") != std::string::npos) continue;
-    if (condition(entry.path())) found.push_back(std::stoi(name));
+    if (name.find_first_not_of("0123456789") != std::string::npos) {
+      continue;
+    }
+    if (condition(entry.path())) {
+      found.push_back(std::stoi(name));
+    }
   }
   std::sort(found.begin(), found.end());
   return found;
@@ -43,7 +47,9 @@ long residentKib(pid_t process) {
   std::istringstream status(readFile("/proc/" + std::to_string(process) + "/status"));
   for (std::string word; status >> word;) {
     long size = 0;
-    if (word == "VmRSS:" && status >> size) return size;
+    if (word == "VmRSS:" && status >> size) {
+      return size;
+    }
   }
   return 0;
 }

@@ -17,7 +17,9 @@ std::string sorted(const std::string& keys) {
   std::vector<std::string> found(std::sregex_token_iterator(keys.begin(), keys.end(), key), {});
   std::sort(found.begin(), found.end());
   std::string text;
-  for (const std::string& one : found) text += (text.empty() ? "" : ",") + one;
+  for (const std::string& one : found) {
+    text += (text.empty() ? "" : ",") + one;
+  }
   return text;
 }
 
@@ -28,7 +30,9 @@ void HostTest::use(ObjectManager& objectManager) { current = &objectManager; }
 ObjectManager& HostTest::host() { return *current; }
 
 void HostTest::SetUp() {
-  if (served != ObjectManager::simulatedProcessor()) serve(ObjectManager::simulatedProcessor());
+  if (served != ObjectManager::simulatedProcessor()) {
+    serve(ObjectManager::simulatedProcessor());
+  }
   std::filesystem::remove(ObjectManager::stateFile());
 }
 
@@ -52,12 +56,16 @@ std::string HostTest::canonical(const std::string& text) {
 }
 
 std::vector<std::string> HostTest::canonical(std::vector<std::string> texts) {
-  for (std::string& text : texts) text = canonical(text);
+  for (std::string& text : texts) {
+    text = canonical(text);
+  }
   return texts;
 }
 
 std::map<std::string, std::string> HostTest::canonical(std::map<std::string, std::string> values) {
-  for (auto& [name, value] : values) value = canonical(value);
+  for (auto& [name, value] : values) {
+    value = canonical(value);
+  }
   return values;
 }
 

@@ -37,15 +37,18 @@ TEST_F(HostInstances, AreEnumeratedWithEveryValue) {
 }
 
 TEST_F(HostInstances, AreEnumeratedByName) {
-  for (const ClassCase& row : classCases())
+  for (const ClassCase& row : classCases()) {
     EXPECT_EQ(canonical(host().names("ein", row.className)), canonical(row.objects));
+  }
 }
 
 TEST_F(HostInstances, AreGotByTheNamesThatWereEnumerated) {
   for (const ClassCase& row : classCases()) {
     const auto names = host().names("ein", row.className);
     ASSERT_THAT(names, SizeIs(row.values.size())) << row.className;
-    for (std::size_t i = 0; i < names.size(); ++i) EXPECT_EQ(host().get(names[i]), row.values[i]) << names[i];
+    for (std::size_t i = 0; i < names.size(); ++i) {
+      EXPECT_EQ(host().get(names[i]), row.values[i]) << names[i];
+    }
   }
 }
 
@@ -76,8 +79,9 @@ TEST_F(HostInstances, AnswerForTheirSuperclasses) {
 TEST_F(HostInstances, OfTheUnderlyingClassesAreServedToo) {
   for (const char* underlying :
        {"YRNQV_SPComputerSystem", "YRNQV_IPProtocolEndpoint", "YRNQV_IPAssignmentSettingData",
-        "YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData", "YRNQV_IPRemoteServiceAccessPoint"})
+        "YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData", "YRNQV_IPRemoteServiceAccessPoint"}) {
     EXPECT_THAT(host().names("ein", underlying, "root/yrnse"), testing::Not(IsEmpty())) << underlying;
+  }
   const auto settings = host().get(R"(YRNQV_StaticIPAssignmentSettingData.InstanceID="BMC:eth0")", "root/yrnse");
   EXPECT_EQ(settings.at("IPv4Address"), quoted("192.0.2.10"));
 }
@@ -86,13 +90,16 @@ TEST_F(HostInstances, AreTheSameForManyClientsAtOnce) {
   const auto expected = host().names("ein", "YRNx_MgmtHwClientAccess");
   ASSERT_THAT(expected, SizeIs(6));
   std::vector<std::unique_ptr<Process>> clients;
-  for (int i = 0; i < 16; ++i)
+  for (int i = 0; i < 16; ++i) {
     clients.push_back(
         std::make_unique<Process>(std::vector<std::string>{"wbemcli", "ein", host().url("YRNx_MgmtHwClientAccess")}));
+  }
   for (const auto& client : clients) {
     EXPECT_EQ(client->wait(), 0) << client->errors();
     std::vector<std::string> names = linesOf(client->output());
-    for (std::string& name : names) name = objectOf(name);
+    for (std::string& name : names) {
+      name = objectOf(name);
+    }
     EXPECT_EQ(names, expected);
   }
 }

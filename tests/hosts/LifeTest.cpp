@@ -31,7 +31,9 @@ class HostLife : public HostTest {
 
   // Comes back when they are gone and whoever started them has seen it.
   static void killAll(const std::vector<pid_t>& processes) {
-    for (const pid_t process : processes) kill(process, SIGKILL);
+    for (const pid_t process : processes) {
+      kill(process, SIGKILL);
+    }
     EXPECT_TRUE(poll([&] {
       return std::none_of(processes.begin(), processes.end(), [](pid_t process) { return kill(process, 0) == 0; });
     }));
@@ -53,7 +55,9 @@ TEST_F(HostLife, GoesOnAfterAProviderProcessWasKilled) {
     ASSERT_THAT(before, SizeIs(host().processes()));
     killAll(before);
     expectServing();
-    for (const pid_t process : ObjectManager::providerProcesses()) EXPECT_THAT(before, Not(Contains(process)));
+    for (const pid_t process : ObjectManager::providerProcesses()) {
+      EXPECT_THAT(before, Not(Contains(process)));
+    }
   }
 }
 
@@ -61,7 +65,9 @@ TEST_F(HostLife, GoesOnAfterAProviderProcessWasKilledDuringARequest) {
   // Given a request that the providers, halted, do not answer
   expectServing();
   const auto before = ObjectManager::providerProcesses();
-  for (const pid_t process : before) kill(process, SIGSTOP);
+  for (const pid_t process : before) {
+    kill(process, SIGSTOP);
+  }
   Process request({"wbemcli", "ein", host().url(clientAccess)});
   EXPECT_FALSE(poll([&] { return !request.isRunning(); }, std::chrono::milliseconds(500)));
 
@@ -102,10 +108,12 @@ TEST_F(HostLife, LeavesNothingWhereItIsRemoved) {
   EXPECT_FALSE(std::filesystem::exists(INSTALL_PREFIX "/lib/libqvhelper.so.1"));
   host().start();
   EXPECT_THAT(host().wbemcli("ecn", "").output, Not(HasSubstr("YRNx_")));
-  for (const ClassCase& row : classCases())
+  for (const ClassCase& row : classCases()) {
     EXPECT_THAT(host().failure("ei", row.className), HasSubstr("(5) CIM_ERR_INVALID_CLASS")) << row.className;
-  for (const Enumeration& row : enumerations())
+  }
+  for (const Enumeration& row : enumerations()) {
     EXPECT_THAT(host().failure("ei", row.association), HasSubstr("(5) CIM_ERR_INVALID_CLASS")) << row.association;
+  }
   EXPECT_THAT(host().failure("ei", "YRNQV_IPProtocolEndpoint", {}, "root/yrnse"),
               HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
   EXPECT_THAT(ObjectManager::providerProcesses(), IsEmpty());

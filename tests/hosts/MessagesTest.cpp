@@ -25,8 +25,12 @@ Edit without(const std::vector<std::string>& texts) {
     std::string left;
     for (std::string line; std::getline(lines, line);) {
       bool forgotten = false;
-      for (const std::string& text : texts) forgotten = forgotten || line.find(text) != std::string::npos;
-      if (!forgotten) left += line + '\n';
+      for (const std::string& text : texts) {
+        forgotten = forgotten || line.find(text) != std::string::npos;
+      }
+      if (!forgotten) {
+        left += line + '\n';
+      }
     }
     return left.empty() ? ":\n" : left;
   };
@@ -35,8 +39,9 @@ Edit without(const std::vector<std::string>& texts) {
 // The commands with another text in the place of one.
 Edit with(const std::string& part, const std::string& by) {
   return [part, by](std::string commands) {
-    for (std::size_t at = 0; (at = commands.find(part, at)) != std::string::npos; at += by.size())
+    for (std::size_t at = 0; (at = commands.find(part, at)) != std::string::npos; at += by.size()) {
       commands.replace(at, part.size(), by);
+    }
     return commands;
   };
 }
@@ -143,10 +148,11 @@ TEST_F(HostMessages, OfTheMissingSchemaAreExplained) {
   } catch (const std::runtime_error& error) {
     refusal = error.what();
   }
-  if (refusal.empty())
+  if (refusal.empty()) {
     EXPECT_NE(firstRequest().output, "");
-  else
+  } else {
     EXPECT_TRUE(host().guide().explains(refusal)) << refusal;
+  }
 }
 
 TEST_F(HostMessages, OfAStateThatCannotBeWrittenAreExplained) {

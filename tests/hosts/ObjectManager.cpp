@@ -55,8 +55,9 @@ class LoopbackSocket {
 };
 
 std::string replaced(std::string text, const std::string& part, const std::string& by) {
-  for (std::size_t at = 0; (at = text.find(part, at)) != std::string::npos; at += by.size())
+  for (std::size_t at = 0; (at = text.find(part, at)) != std::string::npos; at += by.size()) {
     text.replace(at, part.size(), by);
+  }
   return text;
 }
 
@@ -65,14 +66,22 @@ std::string replaced(std::string text, const std::string& part, const std::strin
 std::unique_ptr<ObjectManager> ObjectManager::find(const std::string& name, int processes) {
   const std::string variable = variableOf(name);
   const char* prefix = std::getenv(variable.c_str());
-  if (!prefix) return nullptr;
-  if (name == "sfcb") return std::make_unique<Sfcb>(prefix, processes);
+  if (!prefix) {
+    return nullptr;
+  }
+  if (name == "sfcb") {
+    return std::make_unique<Sfcb>(prefix, processes);
+  }
   return std::make_unique<OpenPegasus>(prefix, processes);
 }
 
 std::string ObjectManager::variableOf(const std::string& name) {
-  if (name == "sfcb") return "HOSTS_SFCB";
-  if (name == "openpegasus") return "HOSTS_PEGASUS";
+  if (name == "sfcb") {
+    return "HOSTS_SFCB";
+  }
+  if (name == "openpegasus") {
+    return "HOSTS_PEGASUS";
+  }
   throw std::invalid_argument("no object manager is called " + name + " here: sfcb or openpegasus");
 }
 
@@ -81,15 +90,18 @@ ObjectManager::ObjectManager(std::string prefix, int processes)
 
 std::string ObjectManager::missing() const {
   for (const std::string& part : parts()) {
-    if (!fs::exists(fs::path(prefix_) / part))
+    if (!fs::exists(fs::path(prefix_) / part)) {
       return prefix_ + " has no " + part + ": name the prefix that " + title() + " was installed to";
+    }
   }
-  if (Testing::run({"sh", "-c", "command -v wbemcli"}).status != 0)
+  if (Testing::run({"sh", "-c", "command -v wbemcli"}).status != 0) {
     return "wbemcli is not there: install the package sblim-wbemcli";
+  }
   for (const char* file : {"cmake_install.cmake", "lib/libcompositeipconfigprovider.so.1",
                            "lib/libunderlyingipconfigprovider.so.1", "lib/libqvinstrumentation.so.1"}) {
-    if (!fs::exists(fs::path(BINARY_DIR) / file))
+    if (!fs::exists(fs::path(BINARY_DIR) / file)) {
       return std::string(BINARY_DIR "/") + file + " is not there: build the project first";
+    }
   }
   return {};
 }
@@ -107,40 +119,60 @@ std::string ObjectManager::run(const std::string& commands) const {
   Process shell({"sh", "-euc", "cd '" SOURCE_DIR "'\n" + commands}, environment());
   const int status = shell.wait(std::chrono::seconds(120));
   const std::string said = shell.output() + shell.errors();
-  if (status != 0) throw std::runtime_error("status " + std::to_string(status) + " of\n" + commands + '\n' + said);
+  if (status != 0) {
+    throw std::runtime_error("status " + std::to_string(status) + " of\n" + commands + '\n' + said);
+  }
   return said;
 }
 
 std::string ObjectManager::carryOut(const std::string& step, const Edit& edit) const {
   std::string commands = guide_.commands(step);
-  if (edit) commands = edit(commands);
-  for (const auto& [text, here] : differences()) commands = replaced(commands, text, here);
+  if (edit) {
+    commands = edit(commands);
+  }
+  for (const auto& [text, here] : differences()) {
+    commands = replaced(commands, text, here);
+  }
   return run(commands);
 }
 
 void ObjectManager::install(const Edit& edit) {
-  if (!prepared_) prepare();
+  if (!prepared_) {
+    prepare();
+  }
   prepared_ = true;
   for (const std::string& step : installing()) {
     carryOut(step, edit);
-    if (step == "install" && processes_ == 2) registerSeparately();
-    if (step.ends_with(" start")) awaitListening();
+    if (step == "install" && processes_ == 2) {
+      registerSeparately();
+    }
+    if (step.ends_with(" start")) {
+      awaitListening();
+    }
   }
 }
 
 void ObjectManager::remove(const Edit& edit) {
   for (const std::string& step : removing()) {
     carryOut(step, edit);
-    if (step.ends_with(" stop")) awaitEnd();
+    if (step.ends_with(" stop")) {
+      awaitEnd();
+    }
   }
 }
 
 void ObjectManager::upgrade() {
   for (const std::string& step : upgrading()) {
     carryOut(step);
-    if (step == "install" && processes_ == 2) registerSeparately();
-    if (step.ends_with(" stop")) awaitEnd();
-    if (step.ends_with(" start")) awaitListening();
+    if (step == "install" && processes_ == 2) {
+      registerSeparately();
+    }
+    if (step.ends_with(" stop")) {
+      awaitEnd();
+    }
+    if (step.ends_with(" start")) {
+      awaitListening();
+    }
   }
 }
 
@@ -166,20 +198,24 @@ void ObjectManager::restart() {
 }
 
 void ObjectManager::kill() {
-  for (const pid_t process : processesRunning(programs())) ::kill(process, SIGKILL);
+  for (const pid_t process : processesRunning(programs())) {
+    ::kill(process, SIGKILL);
+  }
   awaitEnd();
 }
 
 bool ObjectManager::isListening() const { return LoopbackSocket(port_).connects(); }
 
 void ObjectManager::awaitListening() const {
-  if (!poll([this] { return isListening(); }))
+  if (!poll([this] { return isListening(); })) {
     throw std::runtime_error(title() + " does not listen on port " + std::to_string(port_));
+  }
 }
 
 void ObjectManager::awaitEnd() const {
-  if (!poll([this] { return processesRunning(programs()).empty(); }))
+  if (!poll([this] { return processesRunning(programs()).empty(); })) {
     throw std::runtime_error(title() + " does not end");
+  }
 }
 
 std::string ObjectManager::stateFile() { return "/var/lib/compositeipconfig/management-processor.json"; }

@@ -46,12 +46,16 @@ std::vector<std::string> OpenPegasus::upgrading() const {
 }
 
 bool OpenPegasus::unloadProviders() {
-  for (const char* module : modules) run(std::string("cimprovider -d -m ") + module);
+  for (const char* module : modules) {
+    run(std::string("cimprovider -d -m ") + module);
+  }
   return poll([] { return providerProcesses().empty(); });
 }
 
 void OpenPegasus::allowProviders() {
-  for (const char* module : modules) run(std::string("cimprovider -e -m ") + module);
+  for (const char* module : modules) {
+    run(std::string("cimprovider -e -m ") + module);
+  }
 }
 
 }  // namespace Testing

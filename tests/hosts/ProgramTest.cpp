@@ -50,7 +50,9 @@ class PrivateMachine : public testing::Test {
  protected:
   void SetUp() override {
     const Completed completed = enter("true");
-    if (completed.status != 0) GTEST_SKIP() << completed.errors;
+    if (completed.status != 0) {
+      GTEST_SKIP() << completed.errors;
+    }
   }
 
   Completed enter(const std::string& script) const {

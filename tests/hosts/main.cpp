@@ -28,9 +28,13 @@ int enterPrivateMachine(char** argv, const std::string& prefix) {
   setenv(insideVariable, "1", 1);
   std::vector<std::string> command = {SOURCE_DIR "/tests/hosts/private-machine", prefix, INSTALL_PREFIX, BINARY_DIR,
                                       "--"};
-  for (char** argument = argv; *argument; ++argument) command.emplace_back(*argument);
+  for (char** argument = argv; *argument; ++argument) {
+    command.emplace_back(*argument);
+  }
   std::vector<char*> words;
-  for (std::string& word : command) words.push_back(word.data());
+  for (std::string& word : command) {
+    words.push_back(word.data());
+  }
   words.push_back(nullptr);
   execv(words.front(), words.data());
   return fail(command.front() + ": " + std::strerror(errno));
@@ -65,8 +69,9 @@ class ServedProduct : public testing::Environment {
 int main(int argc, char** argv) {
   std::vector<char*> original(argv, argv + argc + 1);
   testing::InitGoogleMock(&argc, argv);
-  if (argc < 2 || argc > 3 || (argc == 3 && std::strcmp(argv[2], "separately") != 0))
+  if (argc < 2 || argc > 3 || (argc == 3 && std::strcmp(argv[2], "separately") != 0)) {
     return fail("usage: hosts_test sfcb|openpegasus [separately] [GoogleTest's options]");
+  }
   try {
     const auto objectManager = ObjectManager::find(argv[1], argc == 3 ? 2 : 1);
     if (!objectManager) {
@@ -74,9 +79,12 @@ int main(int argc, char** argv) {
                 << " is installed\n";
       return skipped;
     }
-    if (const std::string missing = objectManager->missing(); !missing.empty())
+    if (const std::string missing = objectManager->missing(); !missing.empty()) {
       return fail(ObjectManager::variableOf(argv[1]) + ": " + missing);
-    if (!std::getenv(insideVariable)) return enterPrivateMachine(original.data(), objectManager->prefix());
+    }
+    if (!std::getenv(insideVariable)) {
+      return enterPrivateMachine(original.data(), objectManager->prefix());
+    }
     HostTest::use(*objectManager);
     testing::AddGlobalTestEnvironment(new ServedProduct(*objectManager));
     return RUN_ALL_TESTS();

@@ -55,13 +55,18 @@ Objects sequences() {
 
 std::vector<std::pair<std::string, std::string>> product(const Objects& outer, const Objects& inner) {
   std::vector<std::pair<std::string, std::string>> pairs;
-  for (const std::string& first : outer)
-    for (const std::string& second : inner) pairs.emplace_back(first, second);
+  for (const std::string& first : outer) {
+    for (const std::string& second : inner) {
+      pairs.emplace_back(first, second);
+    }
+  }
   return pairs;
 }
 
 std::vector<std::pair<std::string, std::string>> swapped(std::vector<std::pair<std::string, std::string>> pairs) {
-  for (auto& [first, second] : pairs) std::swap(first, second);
+  for (auto& [first, second] : pairs) {
+    std::swap(first, second);
+  }
   return pairs;
 }
 

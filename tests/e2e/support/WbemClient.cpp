@@ -14,7 +14,9 @@ Completed WbemClient::wbemcli(const std::string& operation, const std::string& o
                               const std::vector<std::string>& more, const std::string& nameSpace) const {
   std::vector<std::string> command = {"wbemcli"};
   std::istringstream words(operation);
-  for (std::string word; words >> word;) command.push_back(word);
+  for (std::string word; words >> word;) {
+    command.push_back(word);
+  }
   command.push_back(url(object, nameSpace));
   command.insert(command.end(), more.begin(), more.end());
   return run(command);
@@ -30,7 +32,9 @@ std::vector<std::string> WbemClient::paths(const std::string& operation, const s
 std::vector<std::string> WbemClient::names(const std::string& operation, const std::string& object,
                                            const std::string& nameSpace) const {
   std::vector<std::string> names = paths(operation, object, nameSpace);
-  for (std::string& name : names) name = objectOf(name);
+  for (std::string& name : names) {
+    name = objectOf(name);
+  }
   return names;
 }
 
