@@ -10,6 +10,7 @@
 #include "agent/backends/NamedProcessor.h"
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/config/AgentConfiguration.h"
+#include "agent/log/Report.h"
 
 namespace QV {
 namespace {
@@ -44,13 +45,30 @@ std::shared_ptr<BackEnd> load(const std::string& name, const BackEndSettings& se
   return {create(settings), [library](BackEnd* backEnd) { delete backEnd; }};
 }
 
+// Reported as a failure, so that it is seen: whoever takes made-up values for a processor's must be able to learn it.
+std::shared_ptr<BackEnd> simulate(const BackEndSettings& settings) {
+  const std::string state = parseSimulatedSettings(settings);
+  auto backEnd = std::make_shared<SimulatedBackEnd>(state);
+  TWLog::report("Tarnwick.SimulatedProcessor", TWLog::failureLevel,
+                "the management processor is simulated (" + agentConfigurationFile() +
+                    ": backend = simulated): its values are made up, and changes reach no hardware but " + state);
+  return backEnd;
+}
+
 std::shared_ptr<BackEnd> createBackEnd() {
   const AgentConfiguration configuration = readAgentConfiguration();
+  const std::string& choice = configuration.backEnd;
+  if (choice.empty()) {
+    throw std::runtime_error(agentConfigurationFile() +
+                             ": [processor] has no key 'backend', so that there is no management processor; set "
+                             "backend = ipmi for a BMC, or backend = simulated for made-up values");
+  }
+  const bool simulated = choice == "simulated";
   const BackEndSettings& settings = configuration.backEndSettings;
-  const std::shared_ptr<BackEnd> backEnd = configuration.backEnd == "simulated"
-                                               ? std::make_shared<SimulatedBackEnd>(parseSimulatedSettings(settings))
-                                               : load(configuration.backEnd, settings);
-  return std::make_shared<NamedProcessor>(backEnd, configuration.processorName, configuration.processorDescription);
+  const std::string& description = configuration.processorDescription;
+  return std::make_shared<NamedProcessor>(simulated ? simulate(settings) : load(choice, settings),
+                                          configuration.processorName,
+                                          simulated ? describedAsSimulated(description) : description);
 }
 
 }  // namespace

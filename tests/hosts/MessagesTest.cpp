@@ -167,7 +167,17 @@ TEST_F(HostMessages, OfAStateThatCannotBeWrittenAreExplained) {
 
 TEST_F(HostMessages, OfAMistakeInAgentIniAreExplained) {
   installOn("[processor]\nbakcend = simulated\n");
-  expectExplained(firstRequest(), "agent.ini:8: ");
+  expectExplained(firstRequest(), "agent.ini:11: ");
+}
+
+TEST_F(HostMessages, OfAMissingAgentIniAreExplained) {
+  host().install(without({"agent.ini", "[processor]", "backend = simulated", "INI"}));
+  expectExplained(firstRequest(), "cannot be opened: No such file or directory; create it");
+}
+
+TEST_F(HostMessages, OfAProcessorThatIsNotChosenAreExplained) {
+  installOn("");
+  expectExplained(firstRequest(), "[processor] has no key 'backend'");
 }
 
 TEST_F(HostMessages, OfAnUnknownBackEndAreExplained) {

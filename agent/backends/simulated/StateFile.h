@@ -15,6 +15,10 @@ class StateFile {
 
   const std::filesystem::path& path() const { return path_; }
 
+  // Throws std::runtime_error where this user cannot read or replace the file. A missing directory is made, else
+  // nothing.
+  void requireWritable() const;
+
   // The text; nothing where there is no file. Throws std::runtime_error where it cannot be read.
   std::optional<std::string> read() const;
 

@@ -28,6 +28,12 @@ TEST(SystemName, isTheConfiguredOne) { expectSystemName("[system]\nname = manage
 
 TEST(SystemName, isTheHostNameWithoutAConfiguredOne) { expectSystemName("", hostName()); }
 
+TEST(SystemName, IsTheHostNameWithoutAgentIni) {
+  ::setenv("QV_AGENT_INI", "/nowhere/agent.ini", 1);
+  EXPECT_EXIT(std::exit(getSystemName() == hostName() ? 0 : 1), testing::ExitedWithCode(0), "");
+  ::unsetenv("QV_AGENT_INI");
+}
+
 TEST(SystemName, isTheHostNameWhereAgentIniIsBroken) { expectSystemName("[nowhere]\nname = x\n", hostName()); }
 
 }  // namespace

@@ -86,6 +86,19 @@ TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
   ::unsetenv("QV_AGENT_INI");
 }
 
+TEST(Logger, ReportsAMissingAgentIniOnceWithWhatToDoAndGoesOn) {
+  ::setenv("QV_AGENT_INI", "/nowhere/agent.ini", 1);
+  const auto report = [] {
+    log("C", 6000, "one");
+    log("C", 6000, "two");
+    std::exit(0);
+  };
+  EXPECT_EXIT(report(), ExitedWithCode(0),
+              "^management agent: /nowhere/agent.ini: cannot be opened: No such file or directory; create it[^\n]*; "
+              "logging with the defaults\n$");
+  ::unsetenv("QV_AGENT_INI");
+}
+
 TEST(Logger, takesMessagesFromSeveralThreads) {
   const Testing::TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
