@@ -11,6 +11,7 @@
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/config/AgentConfiguration.h"
 #include "agent/log/Report.h"
+#include "ground/Settings.h"
 
 namespace QV {
 namespace {
@@ -55,6 +56,20 @@ std::shared_ptr<BackEnd> simulate(const BackEndSettings& settings) {
   return backEnd;
 }
 
+// A back end knows its keys, the agent the file and the line on which they stand.
+std::shared_ptr<BackEnd> open(const AgentConfiguration& configuration) {
+  const std::string& choice = configuration.backEnd;
+  try {
+    return choice == "simulated" ? simulate(configuration.backEndSettings)
+                                 : load(choice, configuration.backEndSettings);
+  } catch (const Ground::RefusedSetting& refused) {
+    const auto line = configuration.backEndLines.find(refused.key());
+    throw std::runtime_error(agentConfigurationFile() +
+                             (line == configuration.backEndLines.end() ? "" : ":" + std::to_string(line->second)) +
+                             ": [" + choice + "] " + refused.withoutPlace());
+  }
+}
+
 std::shared_ptr<BackEnd> createBackEnd() {
   const AgentConfiguration configuration = readAgentConfiguration();
   const std::string& choice = configuration.backEnd;
@@ -63,12 +78,9 @@ std::shared_ptr<BackEnd> createBackEnd() {
                              ": [processor] has no key 'backend', so that there is no management processor; set "
                              "backend = ipmi for a BMC, or backend = simulated for made-up values");
   }
-  const bool simulated = choice == "simulated";
-  const BackEndSettings& settings = configuration.backEndSettings;
   const std::string& description = configuration.processorDescription;
-  return std::make_shared<NamedProcessor>(simulated ? simulate(settings) : load(choice, settings),
-                                          configuration.processorName,
-                                          simulated ? describedAsSimulated(description) : description);
+  return std::make_shared<NamedProcessor>(open(configuration), configuration.processorName,
+                                          choice == "simulated" ? describedAsSimulated(description) : description);
 }
 
 }  // namespace

@@ -158,6 +158,7 @@ void set(AgentConfiguration& configuration, const Ground::IniEntry& entry, const
   }
   if (section == chosen) {
     configuration.backEndSettings[key] = value;
+    configuration.backEndLines[key] = line;
   }
 }
 

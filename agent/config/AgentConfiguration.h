@@ -23,11 +23,12 @@ struct AgentConfiguration {
   std::string systemName;  // empty: the host name
   ChannelSettings log{ChannelSettings::Destination::Syslog, {}, 6000, {}};
   ChannelSettings trace{ChannelSettings::Destination::Off, {}, 4000, {}};
-  bool publishesHost = false;        // whether the underlying classes show the host beside the processor
-  std::string backEnd;               // a name of letters, digits and '-'; empty: none is chosen
-  Section backEndSettings;           // the section of that name as it stands: its keys are the back end's own
-  std::string processorName;         // empty: what the processor itself says
-  std::string processorDescription;  // empty: what the processor itself says
+  bool publishesHost = false;  // whether the underlying classes show the host beside the processor
+  std::string backEnd;         // a name of letters, digits and '-'; empty: none is chosen
+  Section backEndSettings;     // the section of that name as it stands: its keys are the back end's own
+  std::map<std::string, unsigned> backEndLines;  // the line on which each of these stands
+  std::string processorName;                     // empty: what the processor itself says
+  std::string processorDescription;              // empty: what the processor itself says
 };
 
 // The file of the configuration that is in force: the one that the environment variable QV_AGENT_INI names, else

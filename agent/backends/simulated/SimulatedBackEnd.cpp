@@ -71,7 +71,7 @@ std::string parseSimulatedSettings(const BackEndSettings& section) {
   const Ground::Settings settings("agent.ini, [simulated]", section);
   for (const auto& [key, value] : section) {
     if (key != "state") {
-      settings.refuse(key, value, "there is no such key");
+      settings.refuse(key, value, "there is no such key: must be one of state");
     }
   }
   std::string state = "/var/lib/compositeipconfig/management-processor.json";

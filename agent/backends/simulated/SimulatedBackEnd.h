@@ -26,8 +26,7 @@ class SimulatedBackEnd : public BackEnd {
   const StateFile file_;
 };
 
-// The state file that the section [simulated] names, or the usual one. Throws std::runtime_error that names the key and
-// what is wrong with it.
+// The state file that the section [simulated] names, or the usual one. Throws Ground::RefusedSetting.
 std::string parseSimulatedSettings(const BackEndSettings& section);
 
 // A simulated processor's description, which says so itself or is made to; an empty one stays empty.

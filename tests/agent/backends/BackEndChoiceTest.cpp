@@ -114,7 +114,9 @@ TEST_F(ABackEndChoice, loadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSett
 TEST_F(ABackEndChoice, passesOnWhyTheIpmiBackEndRefusesItsSettings) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
-  expect(describe, "^.ipmi. name is missing$");
+  expect(describe, "^/.*/agent.ini: .ipmi. name = : the key is missing and has no default$");
+  choose("[processor]\nbackend = ipmi\n[ipmi]\nname = loaded\ncolour = red\n");
+  expect(describe, "^/.*/agent.ini:5: .ipmi. colour = red: unknown$");
 }
 
 TEST_F(ABackEndChoice, tellsWhyTheIpmiBackEndCannotBeLoaded) {
@@ -143,9 +145,9 @@ TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
 
 TEST_F(ABackEndChoice, tellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
   choose("[processor]\nbackend = simulated\n[simulated]\nstate = here\n");
-  expect(describe, "^agent.ini, .simulated.: state = here: must be an absolute path$");
+  expect(describe, "^/.*/agent.ini:4: .simulated. state = here: must be an absolute path$");
   choose("[processor]\nbackend = simulated\n[simulated]\nstatus = /here\n");
-  expect(describe, "^agent.ini, .simulated.: status = /here: there is no such key$");
+  expect(describe, "^/.*/agent.ini:4: .simulated. status = /here: there is no such key: must be one of state$");
 }
 
 TEST_F(ABackEndChoice, TellsThatTheStateCannotBeWrittenBeforeItIsAskedForAnything) {
