@@ -2,6 +2,7 @@
 
 #include <dlfcn.h>
 
+#include <exception>
 #include <filesystem>
 #include <mutex>
 #include <stdexcept>
@@ -42,8 +43,15 @@ std::shared_ptr<BackEnd> load(const std::string& name, const BackEndSettings& se
   if (!create) {
     throw std::runtime_error("the back end " + name + " cannot be used: " + ::dlerror());
   }
-  // The deleter holds the library, so its code outlives the object.
-  return {create(settings), [library](BackEnd* backEnd) { delete backEnd; }};
+  // The deleter holds the library, so its code outlives the object. What is thrown is made anew before the library
+  // goes, which holds the code of its exceptions, too.
+  try {
+    return {create(settings), [library](BackEnd* backEnd) { delete backEnd; }};
+  } catch (const Ground::RefusedSetting& refused) {
+    throw Ground::RefusedSetting(refused);
+  } catch (const std::exception& error) {
+    throw std::runtime_error(error.what());
+  }
 }
 
 // Reported as a failure, so that it is seen: whoever takes made-up values for a processor's must be able to learn it.

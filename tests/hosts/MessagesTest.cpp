@@ -171,7 +171,9 @@ TEST_F(HostMessages, OfAMistakeInAgentIniAreExplained) {
 }
 
 TEST_F(HostMessages, OfAMissingAgentIniAreExplained) {
-  host().install(without({"agent.ini", "[processor]", "backend = simulated", "INI"}));
+  installOn("[processor]\nbackend = simulated\n");
+  std::filesystem::remove(CONFIGURATION_DIR "/agent.ini");
+  host().restart();
   expectExplained(firstRequest(), "cannot be opened: No such file or directory; create it");
 }
 
