@@ -192,8 +192,8 @@ TEST_F(NullArgumentsTest, InTheEncapsulationTable) {
     REFUSED_BY_STATUS(eft.getMessage2(none, "a", nullptr, "a", st, 0));
     REFUSED_BY_STATUS(
         eft.newCMPIError(none, "a", "a", "a", CMPIErrorSeverity{}, CMPIErrorProbableCause{}, CMPI_RC_OK, st));
-    REFUSED(eft.logMessage(none, 1, "a", "a", nullptr));
-    REFUSED(eft.trace(none, 1, "a", "a", nullptr));
+    REFUSED(eft.logMessage(none, Cmpi::Severity{}, "a", "a", nullptr));
+    REFUSED(eft.trace(none, Cmpi::TraceLevel{}, "a", "a", nullptr));
     REFUSED(eft.openMessageFile(none, "a", nullptr));
     REFUSED(eft.closeMessageFile(none, nullptr));
   }
@@ -212,8 +212,8 @@ TEST_F(NullArgumentsTest, InTheEncapsulationTable) {
   REFUSED_BY_STATUS(eft.getMessage2(broker, "a", nullptr, nullptr, st, 0));
   REFUSED_BY_STATUS(eft.newCMPIError(broker, nullptr, nullptr, nullptr, CMPIErrorSeverity{}, CMPIErrorProbableCause{},
                                      CMPI_RC_OK, st));
-  REFUSED(eft.logMessage(broker, 1, nullptr, nullptr, nullptr));
-  REFUSED(eft.trace(broker, 1, nullptr, nullptr, nullptr));
+  REFUSED(eft.logMessage(broker, Cmpi::Severity{}, nullptr, nullptr, nullptr));
+  REFUSED(eft.trace(broker, Cmpi::TraceLevel{}, nullptr, nullptr, nullptr));
   EXPECT_NE(eft.newObjectPath(broker, nullptr, "Class", nullptr), nullptr) << "a path need not have a namespace";
 }
 
