@@ -65,7 +65,7 @@ std::shared_ptr<BackEnd> simulate(const BackEndSettings& settings) {
 }
 
 // A back end knows its keys, the agent the file and the line on which they stand.
-std::shared_ptr<BackEnd> open(const AgentConfiguration& configuration) {
+std::shared_ptr<BackEnd> openBackEnd(const AgentConfiguration& configuration) {
   const std::string& choice = configuration.backEnd;
   try {
     return choice == "simulated" ? simulate(configuration.backEndSettings)
@@ -87,7 +87,7 @@ std::shared_ptr<BackEnd> createBackEnd() {
                              "backend = ipmi for a BMC, or backend = simulated for made-up values");
   }
   const std::string& description = configuration.processorDescription;
-  return std::make_shared<NamedProcessor>(open(configuration), configuration.processorName,
+  return std::make_shared<NamedProcessor>(openBackEnd(configuration), configuration.processorName,
                                           choice == "simulated" ? describedAsSimulated(description) : description);
 }
 
