@@ -24,6 +24,7 @@ TEST_F(DemonstrationTest, ShowsTheSystemAChangeAndTheModel) {
   ASSERT_EQ(completed.status, 0) << completed.errors;
   const std::string& shown = completed.output;
   EXPECT_THAT(shown, ContainsRegex("BMC +Simulated management processor +14, 28 +1\n"));
+  EXPECT_THAT(shown, HasSubstr("It is simulated: its values are made up"));
   EXPECT_THAT(shown, ContainsRegex("before:\n.*\n  eth0 +192.0.2.10 +255.255.255.0 +static\n"));
   EXPECT_THAT(shown, ContainsRegex("after:\n.*\n  eth0 +192.0.2.77 +255.255.255.128 +static\n"));
   EXPECT_THAT(shown,

@@ -46,8 +46,8 @@ class ObjectManager : public WbemClient {
   // Ends it without asking it to end.
   void kill();
 
-  // Writes agent.ini: the managed system is managed.example, and the given sections say how the management processor
-  // is reached. Takes effect with the next start of the object manager.
+  // Writes agent.ini: the managed system is managed.example, the host is shown in root/yrnse, and the given sections
+  // say how the management processor is reached. Takes effect with the next start of the object manager.
   void configureAgent(const std::string& processor, int logThreshold = 6000) const;
   std::string log() const;
   // Everything that an administrator is told beside the answer to a client.
