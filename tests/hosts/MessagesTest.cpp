@@ -170,14 +170,14 @@ TEST_F(HostMessagesTest, OfAMistakeInAgentIniAreExplained) {
   expectExplained(firstRequest(), "agent.ini:11: ");
 }
 
-TEST_F(HostMessages, OfAMissingAgentIniAreExplained) {
+TEST_F(HostMessagesTest, OfAMissingAgentIniAreExplained) {
   installOn("[processor]\nbackend = simulated\n");
   std::filesystem::remove(CONFIGURATION_DIR "/agent.ini");
   host().restart();
   expectExplained(firstRequest(), "cannot be opened: No such file or directory; create it");
 }
 
-TEST_F(HostMessages, OfAProcessorThatIsNotChosenAreExplained) {
+TEST_F(HostMessagesTest, OfAProcessorThatIsNotChosenAreExplained) {
   installOn("");
   expectExplained(firstRequest(), "[processor] has no key 'backend'");
 }

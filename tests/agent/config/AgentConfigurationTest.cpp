@@ -196,7 +196,7 @@ TEST(AgentConfigurationTest, AFileThatTheVariableNamesAndThatIsMissingIsAnError)
                 "[processor] with backend = ipmi for a BMC, or backend = simulated for made-up values");
 }
 
-TEST(AgentConfiguration, AFileThatThisUserMayNotReadIsAnError) {
+TEST(AgentConfigurationTest, AFileThatThisUserMayNotReadIsAnError) {
   const Testing::TemporaryDirectory directory;
   writeFile(directory / "a.ini", "");
   std::filesystem::permissions(directory / "a.ini", std::filesystem::perms::none);
@@ -212,7 +212,7 @@ TEST(AgentConfiguration, AFileThatThisUserMayNotReadIsAnError) {
               "a.ini: cannot be opened: Permission denied; let the object manager's user read it$");
 }
 
-TEST(AgentConfiguration, IsLookedForInOnePlaceWhateverTheInstallPrefix) {
+TEST(AgentConfigurationTest, IsLookedForInOnePlaceWhateverTheInstallPrefix) {
   EXPECT_EQ(agentConfigurationFile(), CONFIGURATION_DIR "/agent.ini");
   const AgentIniVariable variable("/elsewhere/agent.ini");
   EXPECT_EQ(agentConfigurationFile(), "/elsewhere/agent.ini");
