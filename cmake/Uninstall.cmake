@@ -1,0 +1,35 @@
+# cmake -DBINARY_DIR=directory -DOWN_DIRECTORIES=list -P Uninstall.cmake: removes the files that the last installation from
+# the build directory wrote, below DESTDIR where that is set, and those of our own directories that are empty then. What
+# an administrator or the programs themselves wrote stays.
+file(GLOB manifests "${BINARY_DIR}/install_manifest*.txt")
+if(NOT manifests)
+  message(FATAL_ERROR "uninstall: nothing was installed from ${BINARY_DIR}: there is no install_manifest.txt in it")
+endif()
+
+set(emptied "")
+foreach(manifest ${manifests})
+  file(STRINGS "${manifest}" files)
+  foreach(file ${files})
+    set(installed "$ENV{DESTDIR}${file}")
+    if(EXISTS "${installed}" OR IS_SYMLINK "${installed}")
+      execute_process(COMMAND rm -f -- "${installed}" RESULT_VARIABLE failed ERROR_VARIABLE reason)
+      if(failed)
+        string(STRIP "${reason}" reason)
+        message(FATAL_ERROR "uninstall: ${reason}: be root, or whoever installed it")
+      endif()
+      message(STATUS "Removed: ${installed}")
+    endif()
+    get_filename_component(directory "${installed}" DIRECTORY)
+    list(APPEND emptied "${directory}")
+  endforeach()
+endforeach()
+
+# Deepest first.
+foreach(own ${OWN_DIRECTORIES})
+  foreach(directory ${emptied})
+    if("${directory}/" MATCHES "^(.*/${own})/" AND IS_DIRECTORY "${CMAKE_MATCH_1}")
+      execute_process(COMMAND rmdir --ignore-fail-on-non-empty -- "${CMAKE_MATCH_1}")
+    endif()
+  endforeach()
+endforeach()
+file(REMOVE ${manifests})
