@@ -7,10 +7,16 @@ include(GNUInstallDirs)
 
 install(FILES LICENSE DESTINATION "${CMAKE_INSTALL_DOCDIR}" COMPONENT library)
 
-# A library that others are linked against, or that the agent loads.
+# A library that others are linked against.
 function(install_agent_library target component)
   set_target_properties(${target} PROPERTIES INSTALL_RPATH "$ORIGIN")
   install(TARGETS ${target} LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}" COMPONENT ${component})
+endfunction()
+
+# A library that the agent loads (agent/backends/SharedBackEnd.cpp).
+function(install_back_end target component)
+  set_target_properties(${target} PROPERTIES INSTALL_RPATH "$ORIGIN/..")
+  install(TARGETS ${target} LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}/compositeipconfig" COMPONENT ${component})
 endfunction()
 
 # A library that object managers load. They look for lib<location>.so in their provider directories: the link stands
@@ -20,13 +26,4 @@ function(install_provider target component)
   install(TARGETS ${target} LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}/cmpi" COMPONENT ${component})
 endfunction()
 
-# Our own directories, which go with the last file in them: the deepest first.
-set(shared "${CMAKE_INSTALL_DATADIR}/compositeipconfig")
-set(own "${CMAKE_INSTALL_LIBDIR}/cmpi" "${shared}/cimomd" "${shared}/sfcb" "${shared}/pegasus" "${shared}"
-        "${CMAKE_INSTALL_DOCDIR}")
-add_custom_target(
-  uninstall
-  COMMAND "${CMAKE_COMMAND}" "-DBINARY_DIR=${PROJECT_BINARY_DIR}" "-DOWN_DIRECTORIES=${own}" -P
-          "${PROJECT_SOURCE_DIR}/cmake/Uninstall.cmake"
-  COMMENT "Removing what was installed last from this build"
-  VERBATIM)
+add_custom_target(uninstall COMMAND "${PROJECT_SOURCE_DIR}/tools/uninstall" "${PROJECT_BINARY_DIR}" VERBATIM USES_TERMINAL)

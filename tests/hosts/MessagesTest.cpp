@@ -191,7 +191,7 @@ TEST_F(HostMessages, OfAMachineWithoutABmcAreExplained) {
 
 TEST_F(HostMessages, OfAMissingBackEndAreExplained) {
   installOn(ipmi("connection = inband\n"));
-  std::filesystem::remove(INSTALL_PREFIX "/lib/libqvbmc-ipmi.so");
+  std::filesystem::remove(INSTALL_PREFIX "/lib/compositeipconfig/libqvbmc-ipmi.so");
   host().restart();
   expectExplained(firstRequest(), "libqvbmc-ipmi.so");
 }
