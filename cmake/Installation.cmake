@@ -1,7 +1,7 @@
 # Where the build is installed, and the target `uninstall`. An installed tree works wherever it is moved to: libraries
 # find each other relative to where they stand, and cimomd its classes and providers (cimom/configuration/).
 if(NOT CMAKE_INSTALL_DOCDIR)
-  set(CMAKE_INSTALL_DOCDIR "share/doc/compositeipconfig" CACHE PATH "Samples and licences")
+  set(CMAKE_INSTALL_DOCDIR "share/doc/compositeipconfig")
 endif()
 include(GNUInstallDirs)
 

@@ -191,6 +191,9 @@ std::optional<Configuration> readCommandLine(int argc, const char* const* argv, 
   GivenValues values;
   std::error_code unreadable;
   if (!fileOption->empty()) {
+    if (file.empty()) {
+      throw UsageError("--config: must not be empty");
+    }
     values = readConfigurationFile(file);
   } else if (std::filesystem::status(installation.configurationFile, unreadable).type() !=
              std::filesystem::file_type::not_found) {

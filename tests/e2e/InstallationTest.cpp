@@ -115,11 +115,11 @@ TEST_F(InstallationTest, LoadsABackEndOfTheMovedTree) {
     GTEST_SKIP() << "this build has no IPMI back end";
   }
   const auto askFor = [&](const std::string& why) {
-    const Cimomd cimomd = serve(tree, "[processor]\nbackend = ipmi\n[ipmi]\ndevice = relative\n");
+    const Cimomd cimomd = serve(tree, "[processor]\nbackend = ipmi\n[ipmi]\nconnection = nowhere\n");
     EXPECT_THAT(run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwComputerSystem", "root/cimv2")}).errors, HasSubstr(why));
   };
   // It is the back end that looks at its keys.
-  askFor("[ipmi]: device = relative: ");
+  askFor("[ipmi]: connection = nowhere: ");
   fs::remove(onlyFile(tree, "libqvbmc-ipmi.so"));
   askFor("the back end ipmi cannot be loaded");
 }

@@ -119,7 +119,8 @@ TEST_F(HostMessages, OfAMissingProviderDirectoryAreExplained) {
 }
 
 TEST_F(HostMessages, OfTheAgentsMissingLibrariesAreExplained) {
-  host().install(without({"ldconfig"}));
+  const std::string install = "cmake --install build/default\n";
+  host().install(with(install, install + "rm /usr/local/lib/libqvhelper.so.1\n"));
   expectExplained(firstRequest(), "libqvhelper.so.1: cannot open shared object file");
 }
 
