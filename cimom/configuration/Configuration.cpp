@@ -133,9 +133,10 @@ void useInstalled(std::vector<std::filesystem::path>& paths, const char* setting
   if (!paths.empty()) {
     return;
   }
-  if (!std::filesystem::exists(installed)) {
+  std::error_code unreadable;
+  if (!std::filesystem::exists(installed, unreadable)) {
     throw UsageError(std::string("--") + setting + ": must be given, because " + installed.string() +
-                     ", where it is installed, does not exist");
+                     ", where it is installed, cannot be read or does not exist");
   }
   paths.push_back(installed);
 }
