@@ -14,8 +14,8 @@
 namespace QV {
 namespace {
 
-// Back ends are installed in a directory of their own beside this library, and built into the same one; the plain name lets
-// the loader's own search find it elsewhere.
+// Back ends are installed in a directory of their own beside this library, and built into the same one; the plain name
+// lets the loader's own search find it elsewhere.
 std::string pathOf(const std::string& libraryName) {
   Dl_info self{};
   if (::dladdr(reinterpret_cast<const void*>(&sharedBackEnd), &self) != 0 && self.dli_fname) {

@@ -9,7 +9,7 @@
 #include <string_view>
 #include <system_error>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 
 namespace Cimom {
 namespace {

@@ -1,14 +1,14 @@
 // The demonstration against a simulated BMC that answers real IPMI.
 #include <gmock/gmock.h>
 
-#include "tests/e2e/support/Demonstration.h"
+#include "tests/e2e/DemonstrationFixture.h"
 
 namespace {
 
 using namespace Testing;
 using testing::ContainsRegex;
 
-TEST_F(Demonstration, ShowsABmcAChangeAndTheModel) {
+TEST_F(DemonstrationTest, ShowsABmcAChangeAndTheModel) {
   const Completed completed = demonstrate({"--bmc"});
   ASSERT_EQ(completed.status, 0) << completed.errors;
   const std::string& shown = completed.output;

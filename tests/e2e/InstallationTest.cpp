@@ -4,7 +4,8 @@
 
 #include <filesystem>
 
-#include "tests/e2e/support/CompositeStack.h"
+#include "Paths.h"
+#include "tests/support/client/CompositeStack.h"
 
 namespace {
 

@@ -1,4 +1,4 @@
-// Which back end agent.ini chooses, and what is said where it cannot be had. A process has one back end, so each case
+// Which back end agent.ini chooses, and what is said if it cannot be had. A process has one back end, so each case
 // runs in a child, on a copy of the instrumentation library beside which the case puts what it needs.
 #include <dlfcn.h>
 #include <gtest/gtest.h>
@@ -9,22 +9,23 @@
 #include <memory>
 
 #include "agent/processor/BackEnd.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using SharedBackEnd = std::shared_ptr<BackEnd>();
 
-class ABackEndChoice : public testing::Test {
+class BackEndChoiceTest : public testing::Test {
  protected:
-  ABackEndChoice() {
+  BackEndChoiceTest() {
     std::filesystem::copy_file(INSTRUMENTATION, library_);
     ::setenv("QV_AGENT_INI", ini_.c_str(), 1);
   }
-  ~ABackEndChoice() override { ::unsetenv("QV_AGENT_INI"); }
+  ~BackEndChoiceTest() override { ::unsetenv("QV_AGENT_INI"); }
 
-  void choose(const std::string& text) const { Testing::writeFile(ini_, text + "[log]\ndestination = off\n"); }
+  void choose(const std::string& text) const { writeFile(ini_, text + "[log]\ndestination = off\n"); }
 
   // In the child: the processor's name and description, else what was thrown.
   static std::string describe(SharedBackEnd* sharedBackEnd) {
@@ -48,47 +49,47 @@ class ABackEndChoice : public testing::Test {
     EXPECT_EXIT(child(), testing::ExitedWithCode(0), pattern);
   }
 
-  const Testing::TemporaryDirectory directory_;
+  const TemporaryDirectory directory_;
   const std::string ini_ = directory_ / "agent.ini";
   const std::string library_ = directory_ / "libqvinstrumentation.so.1";
   const std::string ipmi_ = directory_ / "libqvbmc-ipmi.so";
 };
 
-TEST_F(ABackEndChoice, isTheSimulatedProcessorByDefault) {
+TEST_F(BackEndChoiceTest, IsTheSimulatedProcessorByDefault) {
   choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
   expect(describe, "^BMC: Simulated management processor$");
 }
 
-TEST_F(ABackEndChoice, givesTheProcessorItsConfiguredNames) {
+TEST_F(BackEndChoiceTest, GivesTheProcessorItsConfiguredNames) {
   choose("[simulated]\nstate = " + (directory_ / "state.json") + "\n[processor]\nname = a\ndescription = b\n");
   expect(describe, "^a: b$");
 }
 
-TEST_F(ABackEndChoice, loadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSettings) {
+TEST_F(BackEndChoiceTest, LoadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSettings) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\n[ipmi]\nname = loaded\n");
   expect(describe, "^loaded: a stand-in$");
 }
 
-TEST_F(ABackEndChoice, passesOnWhyTheIpmiBackEndRefusesItsSettings) {
+TEST_F(BackEndChoiceTest, PassesOnWhyTheIpmiBackEndRefusesItsSettings) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^.ipmi. name is missing$");
 }
 
-TEST_F(ABackEndChoice, tellsWhyTheIpmiBackEndCannotBeLoaded) {
-  Testing::writeFile(ipmi_, "no library");
+TEST_F(BackEndChoiceTest, TellsWhyTheIpmiBackEndCannotBeLoaded) {
+  writeFile(ipmi_, "no library");
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^the back end ipmi cannot be loaded: .*libqvbmc-ipmi.so: ");
 }
 
-TEST_F(ABackEndChoice, tellsThatALibraryIsNoBackEnd) {
+TEST_F(BackEndChoiceTest, TellsThatALibraryIsNoBackEnd) {
   std::filesystem::copy_file(INSTRUMENTATION, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^the back end ipmi cannot be used: .*qvCreateBackEnd");
 }
 
-TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
+TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
   choose("[processor]\nbackend = magic\n");
   expect(
       [this](SharedBackEnd* sharedBackEnd) {
@@ -100,14 +101,14 @@ TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
       ".processor. of agent.ini; then BMC: Simulated");
 }
 
-TEST_F(ABackEndChoice, tellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
+TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
   choose("[simulated]\nstate = here\n");
   expect(describe, "^agent.ini, .simulated.: state = here: must be an absolute path$");
   choose("[simulated]\nstatus = /here\n");
   expect(describe, "^agent.ini, .simulated.: status = /here: there is no such key$");
 }
 
-TEST_F(ABackEndChoice, isMadeOnceAndShared) {
+TEST_F(BackEndChoiceTest, IsMadeOnceAndShared) {
   choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
   expect(
       [](SharedBackEnd* sharedBackEnd) {
@@ -117,4 +118,3 @@ TEST_F(ABackEndChoice, isMadeOnceAndShared) {
 }
 
 }  // namespace
-}  // namespace QV

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "cimom/configuration/Configuration.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 

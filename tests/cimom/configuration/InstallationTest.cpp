@@ -4,7 +4,7 @@
 
 namespace {
 
-TEST(Installation, StandsBesideTheProgram) {
+TEST(InstallationTest, StandsBesideTheProgram) {
   const auto program = std::filesystem::canonical("/proc/self/exe");
   const Cimom::Installation installation = Cimom::thisInstallation();
   for (const auto& path : {installation.schema, installation.registration, installation.providerDirectory}) {
