@@ -6,12 +6,13 @@
 #include <fstream>
 #include <iterator>
 
+#include "Paths.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
 #include "cimom/cimxml/Endpoint.h"
 #include "cimom/http/Server.h"
 #include "tests/cimom/cimxml/Messages.h"
-#include "tests/cimom/http/HttpClient.h"
+#include "tests/support/client/HttpClient.h"
 
 CMPI_EXTERN_C CMPIInstanceMI* ProbeProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 
@@ -24,9 +25,9 @@ constexpr const char* headers =
 
 struct Manager {
   Manager() {
-    std::ifstream mof(SOURCE_DIR "/tests/e2e/probe/Probe.mof");
+    std::ifstream mof(SOURCE_DIR "/tests/support/probe/Probe.mof");
     manager.loadSchemaText(std::string{std::istreambuf_iterator<char>(mof), {}}, "root/test", "Probe.mof");
-    for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/e2e/probe/Probe.reg")) {
+    for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/support/probe/Probe.reg")) {
       registration.association = false;
       if (registration.instance) manager.addProvider(registration, &ProbeProvider_Create_InstanceMI, nullptr);
     }

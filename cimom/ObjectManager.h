@@ -7,7 +7,7 @@
 #include <string_view>
 
 #include "cimom/broker/BrokerCore.h"
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 

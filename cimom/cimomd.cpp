@@ -1,7 +1,5 @@
 #include <signal.h>
-#include <unistd.h>
 
-#include <array>
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
@@ -15,6 +13,7 @@
 #include "cimom/configuration/Configuration.h"
 #include "cimom/http/PasswordFile.h"
 #include "cimom/http/Server.h"
+#include "ground/HostName.h"
 
 namespace {
 
@@ -90,15 +89,10 @@ Http::ServerOptions serverOptions(const Configuration& configuration) {
   return options;
 }
 
-std::string hostName() {
-  std::array<char, 256> name{};
-  return gethostname(name.data(), name.size() - 1) == 0 && name[0] != '\0' ? name.data() : "localhost";
-}
-
 void serve(const Configuration& configuration, const EndSignals& endSignals) {
   ObjectManager manager;
   load(manager, configuration);
-  const CimXml::Endpoint endpoint(manager.broker(), manager.classes(), hostName());
+  const CimXml::Endpoint endpoint(manager.broker(), manager.classes(), Ground::hostName());
   Http::Server server(serverOptions(configuration),
                       [&endpoint](const Http::Request& request) { return endpoint.handle(request); });
   std::cout << "listening on " << server.endpoint() << std::endl;

@@ -16,12 +16,12 @@ const char* textOf(const CMPIString* string, CMPIStatus* status);
 // The characters of a value that is flagged non-null and typed as a string or chars; the empty text for any other.
 const char* textOf(const CMPIData& data, CMPIStatus* status);
 
-// The path's namespace and class name, and its rendering for the trace; the empty text where there is none.
+// The path's namespace and class name, and its rendering for the trace; the empty text if there is none.
 const char* nameSpaceOf(const CMPIObjectPath* path, CMPIStatus* status);
 const char* classNameOf(const CMPIObjectPath* path, CMPIStatus* status);
 const char* renderingOf(const CMPIObjectPath* path);
 
-// A key of a path and a property of an instance; a null value where the object or the name is missing.
+// A key of a path and a property of an instance; a null value if the object or the name is missing.
 CMPIData keyOf(const CMPIObjectPath* path, const char* name, CMPIStatus* status);
 CMPIData propertyOf(const CMPIInstance* instance, const char* name, CMPIStatus* status);
 
@@ -30,7 +30,7 @@ CMPIData propertyOf(const CMPIInstance* instance, const char* name, CMPIStatus* 
 // items that carry good instances.
 CMPIData instanceItem(const CMPIData& item);
 
-// The instance's object path, null where the instance is.
+// The instance's object path, null if the instance is.
 CMPIObjectPath* pathOf(const CMPIInstance* instance, CMPIStatus* status);
 
 // Sets a text or a reference on an instance that is not null; the outcome is not looked at.

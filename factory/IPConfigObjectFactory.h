@@ -38,7 +38,7 @@ class IPConfigObjectFactory {
   // an array could not be made. `noFilter` false installs the property list and the class's keys as the property filter
   // of every instance.
   //
-  // make… returns one new instance with its constant properties, or null where no object path could be made.
+  // make… returns one new instance with its constant properties, or null if no object path could be made.
 #define IPCONFIG_DECLARE_PAIR(getAll, make, row)                                                                  \
   int getAll(const CMPIBroker* broker, const CMPIContext* ctx, const CMPIObjectPath* ref, const char* className,  \
              const char** properties, bool noFilter, std::vector<CMPIInstance*>& out, CMPIStatus* status);        \

@@ -7,15 +7,22 @@
 #include <filesystem>
 #include <utility>
 
-namespace QV {
+namespace Ground {
 
 class Descriptor {
  public:
-  // Opens the file as open(2) does, not to be inherited by programs that the process starts. `errno` tells why a
+  Descriptor() = default;  // not open
+  // Takes over an open descriptor, or -1.
+  explicit Descriptor(int number) : number_(number) {}
+  // Opens the file as open(2) does, not to be inherited by programs that the process starts. `errno` says why a
   // descriptor is not open.
   Descriptor(const std::filesystem::path& path, int flags, mode_t mode = 0)
       : number_(::open(path.c_str(), flags | O_CLOEXEC, mode)) {}
   Descriptor(Descriptor&& other) noexcept : number_(std::exchange(other.number_, -1)) {}
+  Descriptor& operator=(Descriptor&& other) noexcept {
+    std::swap(number_, other.number_);
+    return *this;
+  }
   ~Descriptor() {
     if (isOpen()) {
       ::close(number_);
@@ -28,7 +35,7 @@ class Descriptor {
   int number() const { return number_; }
 
  private:
-  int number_;
+  int number_ = -1;
 };
 
-}  // namespace QV
+}  // namespace Ground

@@ -41,7 +41,7 @@ class Settings {
   // `place` is where the section stands, for the messages. The section must outlive the reader.
   Settings(std::string place, const Section& section) : place_(std::move(place)), section_(section) {}
 
-  // The value, or null where the key is not there.
+  // The value, or null if the key is not there.
   const std::string* find(const std::string& key) const;
 
   // The value of a key that must be there and not be empty.
@@ -64,7 +64,7 @@ class Settings {
     take(key, [&](const std::string& value) { target = parseChoice(value, choices); });
   }
 
-  // Hands the value to `use`, where the key is there, and refuses it where that throws std::invalid_argument.
+  // Hands the value to `use`, where the key is there, and refuses it if that throws std::invalid_argument.
   void take(const std::string& key, const std::function<void(const std::string& value)>& use) const;
 
   [[noreturn]] void refuse(const std::string& key, const std::string& value, const std::string& reason) const;

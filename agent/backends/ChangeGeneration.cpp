@@ -28,11 +28,11 @@ using Number = ChangeGeneration::Number;
 
 constexpr mode_t ownerAndGroup = 0660;
 
-// Without O_NONBLOCK a FIFO could hold the caller up for ever. It is opened for writing even where it is only read, so
+// Without O_NONBLOCK a FIFO could hold the caller up for ever. It is opened for writing even if it is only read, so
 // that a process which cannot tell the others of a change learns that before there is one.
-Descriptor openFile(const fs::path& path) {
+Ground::Descriptor openFile(const fs::path& path) {
   constexpr int flags = O_RDWR | O_CREAT | O_NOFOLLOW | O_NONBLOCK | O_NOCTTY;
-  Descriptor file(path, flags, ownerAndGroup);
+  Ground::Descriptor file(path, flags, ownerAndGroup);
   if (!file.isOpen() && errno == ENOENT) {
     std::error_code failure;
     fs::create_directories(path.parent_path(), failure);
@@ -44,8 +44,8 @@ Descriptor openFile(const fs::path& path) {
   return file;
 }
 
-Descriptor openRegular(const fs::path& path) {
-  Descriptor file = openFile(path);
+Ground::Descriptor openRegular(const fs::path& path) {
+  Ground::Descriptor file = openFile(path);
   struct stat status {};
   if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
     failWithErrno(path, errno == ELOOP ? "is a symbolic link" : "cannot be opened");
@@ -63,8 +63,8 @@ Descriptor openRegular(const fs::path& path) {
   return file;
 }
 
-// Nothing where the file is empty, which is how it comes into being. What has any other size belongs to somebody else.
-std::optional<Number> read(const Descriptor& file, const fs::path& path) {
+// Nothing if the file is empty, which is how it comes into being. What has any other size belongs to somebody else.
+std::optional<Number> read(const Ground::Descriptor& file, const fs::path& path) {
   std::array<unsigned char, sizeof(Number) + 1> bytes{};
   const ssize_t length = ::pread(file.number(), bytes.data(), bytes.size(), 0);
   if (length < 0) {
@@ -83,7 +83,7 @@ std::optional<Number> read(const Descriptor& file, const fs::path& path) {
 
 // Drawn at random, not counted: two processes that renew it at once cannot meet at one number, and a file that was
 // removed and made again does not start over at numbers that somebody has seen.
-Number write(const Descriptor& file, const fs::path& path) {
+Number write(const Ground::Descriptor& file, const fs::path& path) {
   std::random_device random;
   const Number number = Number{random()} << 32 | random();
   const ssize_t length = ::pwrite(file.number(), &number, sizeof number, 0);
@@ -99,13 +99,13 @@ Number write(const Descriptor& file, const fs::path& path) {
 }  // namespace
 
 Number ChangeGeneration::current() const {
-  const Descriptor file = openRegular(file_);
+  const Ground::Descriptor file = openRegular(file_);
   const auto number = read(file, file_);
   return number ? *number : write(file, file_);
 }
 
 void ChangeGeneration::renew() const {
-  const Descriptor file = openRegular(file_);
+  const Ground::Descriptor file = openRegular(file_);
   read(file, file_);
   write(file, file_);
 }

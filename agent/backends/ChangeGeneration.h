@@ -20,7 +20,7 @@ class ChangeGeneration {
   // and writing, is a link or anything else that is no regular file, or has content that is not ours.
   Number current() const;
 
-  // Gives it a number that it never had. Throws as current() does, and where the file cannot be written.
+  // Gives it a number that it never had. Throws as current() does, and if the file cannot be written.
   void renew() const;
 
  private:

@@ -18,7 +18,7 @@ struct Key {
 
 using Keys = std::vector<Key>;
 
-// Nothing where they cannot be read, or one of them has no name: such a path names no instance that can be told.
+// Nothing if they cannot be read, or one of them has no name: such a path names no instance that can be told.
 // Some object managers look a key up by its exact spelling only, so the keys are taken by index.
 std::optional<Keys> keysOf(const CMPIObjectPath* path) {
   CMPIStatus status{CMPI_RC_OK, nullptr};

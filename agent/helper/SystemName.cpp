@@ -1,10 +1,9 @@
 #include <QV/ProviderHelper.h>
-#include <unistd.h>
 
-#include <array>
 #include <exception>
 
 #include "agent/config/AgentConfiguration.h"
+#include "ground/HostName.h"
 
 namespace QV {
 namespace {
@@ -18,20 +17,12 @@ std::string configuredName() {
   }
 }
 
-std::string hostName() {
-  std::array<char, 256> name{};
-  if (::gethostname(name.data(), name.size() - 1) != 0 || !name[0]) {
-    return "localhost";
-  }
-  return name.data();
-}
-
 }  // namespace
 
 std::string getSystemName() {
   // Asked for with every object path, so agent.ini is read once. The host name may change while we run.
   static const std::string configured = configuredName();
-  return configured.empty() ? hostName() : configured;
+  return configured.empty() ? Ground::hostName() : configured;
 }
 
 }  // namespace QV

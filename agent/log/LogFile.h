@@ -5,29 +5,29 @@
 #include <string>
 #include <string_view>
 
+#include "ground/Descriptor.h"
+
 namespace TWLog {
 
 class LogFile {
  public:
   explicit LogFile(std::string path) : path_(std::move(path)) {}
-  ~LogFile();
   LogFile(const LogFile&) = delete;
   LogFile& operator=(const LogFile&) = delete;
 
   const std::string& path() const { return path_; }
 
   // Appends a line with a single write, so that the lines of several processes do not mix. Opens the file on first use,
-  // and again where the path no longer names the open file. Returns 0, else the errno that kept the line out; the next
+  // and again if the path no longer names the open file. Returns 0, else the errno that kept the line out; the next
   // line tries again. Safe to call from several threads at once.
   int append(std::string_view line);
 
  private:
   int openIfNeeded();
-  void close();
 
   const std::string path_;
   std::mutex mutex_;
-  int descriptor_ = -1;
+  Ground::Descriptor file_;
 };
 
 }  // namespace TWLog

@@ -40,15 +40,15 @@ class Ipv4Address : public DottedDecimal {
  public:
   using DottedDecimal::DottedDecimal;
 
-  // Nothing where the text is of another form.
+  // Nothing if the text is of another form.
   static std::optional<Ipv4Address> parse(std::string_view text);
 
-  // An address that a host can have. Throws std::invalid_argument, naming the text and the reason, where the text is
+  // An address that a host can have. Throws std::invalid_argument, naming the text and the reason, if the text is
   // not dotted decimal, or one of 0.0.0.0/8 (this network), 127.0.0.0/8 (loopback), 224.0.0.0/4 (multicast) or
   // 240.0.0.0/4 (reserved, broadcast); RFC 6890.
   static Ipv4Address requireHost(const std::string& text);
 
-  // Why no host can have it; null where one can.
+  // Why no host can have it; null if one can.
   const char* unusable() const;
 };
 
@@ -56,21 +56,21 @@ class SubnetMask : public DottedDecimal {
  public:
   using DottedDecimal::DottedDecimal;
 
-  // Nothing where the text is of another form.
+  // Nothing if the text is of another form.
   static std::optional<SubnetMask> parse(std::string_view text);
 
-  // Throws std::invalid_argument, naming the text and the reason, where it is not dotted decimal, not contiguous, or
+  // Throws std::invalid_argument, naming the text and the reason, if it is not dotted decimal, not contiguous, or
   // leaves no network (0.0.0.0) or no peer (255.255.255.255).
   static SubnetMask requireUsable(const std::string& text);
 
-  // Why it is of no use; null where it is.
+  // Why it is of no use; null if it is.
   const char* unusable() const;
 
-  // Nothing where the mask is not contiguous.
+  // Nothing if the mask is not contiguous.
   std::optional<int> prefixLength() const;
 };
 
-// Throws std::invalid_argument where the address is its subnet's own or its broadcast address. A mask of 31 bits has
+// Throws std::invalid_argument if the address is its subnet's own or its broadcast address. A mask of 31 bits has
 // neither (RFC 3021).
 void requireHostOfSubnet(const Ipv4Address& address, const SubnetMask& mask);
 
@@ -81,7 +81,7 @@ class Ipv6Address {
   constexpr Ipv6Address() = default;
   constexpr explicit Ipv6Address(const Octets& octets) : octets_(octets) {}
 
-  // Nothing where the text is not an IPv6 address.
+  // Nothing if the text is not an IPv6 address.
   static std::optional<Ipv6Address> parse(const std::string& text);
 
   auto operator<=>(const Ipv6Address&) const = default;
@@ -100,7 +100,7 @@ class MacAddress {
   constexpr MacAddress() = default;
   constexpr explicit MacAddress(const Octets& octets) : octets_(octets) {}
 
-  // "aa:bb:cc:dd:ee:ff", in letters of either case; nothing where the text is of another form.
+  // "aa:bb:cc:dd:ee:ff", in letters of either case; nothing if the text is of another form.
   static std::optional<MacAddress> parse(std::string_view text);
 
   auto operator<=>(const MacAddress&) const = default;

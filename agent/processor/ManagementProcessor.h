@@ -15,7 +15,7 @@ enum class AddressOrigin : std::uint16_t { Unknown = 0, Static = 3, Dhcp = 4 };
 
 // One IP interface. Absent values are those that the processor does not have or does not report.
 struct NetworkInterface {
-  std::optional<std::string> name;  // the node name; absent where it cannot be read
+  std::optional<std::string> name;  // the node name; absent if it cannot be read
   std::optional<MacAddress> macAddress;
   bool enabled = true;
 

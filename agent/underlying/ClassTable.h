@@ -14,7 +14,7 @@ struct UnderlyingClass {
   bool ofHostToo;  // whether it has instances of the host, too, which agent.ini must ask for
 };
 
-// The class of that name, letters without regard to case; null where there is none.
+// The class of that name, letters without regard to case; null if there is none.
 const UnderlyingClass* findUnderlyingClass(const char* name);
 
 // All instances of a class: those of the management processor, then those of the host where the class has them and

@@ -4,7 +4,7 @@
 #include <iostream>
 #include <string>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 
 namespace Cimom {
 namespace {

@@ -9,7 +9,7 @@
 
 #include "cimom/broker/Models.h"
 #include "cimom/broker/RequestScope.h"
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/model/Instance.h"
 
 namespace Cimom {

@@ -5,7 +5,7 @@
 #include <cstdio>
 #include <cstdlib>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 
 namespace Cimom {
 namespace {

@@ -4,28 +4,13 @@
 #include <memory>
 #include <string_view>
 
+#include "ground/Names.h"
+
 namespace Cimom {
 
-// ASCII lower case; CIM names (DSP0004) have no other letters that case would matter for.
-constexpr char lowerCase(char letter) {
-  return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
-}
-
-// Orders CIM names, which are equal without regard to case.
-struct NameLess {
-  using is_transparent = void;
-
-  bool operator()(std::string_view left, std::string_view right) const {
-    return std::lexicographical_compare(left.begin(), left.end(), right.begin(), right.end(),
-                                        [](char a, char b) { return lowerCase(a) < lowerCase(b); });
-  }
-};
-
-// Whether two CIM names are the same name.
-inline bool sameName(std::string_view left, std::string_view right) {
-  return std::equal(left.begin(), left.end(), right.begin(), right.end(),
-                    [](char a, char b) { return lowerCase(a) == lowerCase(b); });
-}
+using Ground::lowerCase;
+using Ground::NameLess;
+using Ground::sameName;
 
 // The first element with that name, or null.
 template <typename Range>

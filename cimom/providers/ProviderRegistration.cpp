@@ -6,7 +6,7 @@
 #include <sstream>
 #include <string_view>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 
 namespace Cimom {
 namespace {

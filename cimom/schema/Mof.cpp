@@ -4,7 +4,7 @@
 #include <fstream>
 #include <iterator>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/schema/MofParser.h"
 
 namespace Cimom {

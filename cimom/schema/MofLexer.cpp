@@ -3,7 +3,7 @@
 #include <charconv>
 #include <cstdint>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/model/Names.h"
 
 namespace Cimom {

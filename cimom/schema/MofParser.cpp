@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/model/Names.h"
 #include "cimom/model/Types.h"
 

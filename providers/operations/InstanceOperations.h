@@ -1,4 +1,4 @@
-// The operations of the six providers that serve a composite class, told once; a unit is a row.
+// The operations of the six providers that serve a composite class, stated once; a unit is a row.
 #pragma once
 
 #include <cmpift.h>

@@ -3,21 +3,18 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <cstdio>
-#include <memory>
 #include <set>
 #include <sstream>
 #include <string>
 
+#include "tests/support/system/Process.h"
+
 namespace {
 
+using namespace Testing;
+
 std::set<std::string> exportsOf(const std::string& library) {
-  const std::string command = "nm -DC --defined-only " + library;
-  const std::unique_ptr<FILE, int (*)(FILE*)> nm(::popen(command.c_str(), "r"), ::pclose);
-  std::string text;
-  for (int character = std::fgetc(nm.get()); character != EOF; character = std::fgetc(nm.get())) {
-    text += static_cast<char>(character);
-  }
+  const std::string text = run({"nm", "-DC", "--defined-only", library}).output;
   std::set<std::string> names;
   std::istringstream lines(text);
   std::string address;
@@ -28,7 +25,7 @@ std::set<std::string> exportsOf(const std::string& library) {
   return names;
 }
 
-TEST(Exports, ofTheLogAreItsContract) {
+TEST(ExportsTest, OfTheLogAreItsContract) {
   EXPECT_THAT(exportsOf(TWLOG),
               testing::UnorderedElementsAre("TWLog::TWMessageBuffer::TWMessageBuffer",
                                             "TWLog::TWMessageBuffer::~TWMessageBuffer",
@@ -36,12 +33,12 @@ TEST(Exports, ofTheLogAreItsContract) {
                                             "TWLog::TWLogger::logLevelMessage", "TWLog::TWLogger::traceLevelMessage"));
 }
 
-TEST(Exports, ofTheHelpersAreTheirContract) {
+TEST(ExportsTest, OfTheHelpersAreTheirContract) {
   EXPECT_THAT(exportsOf(QVHELPER), testing::UnorderedElementsAre("QV::mapProperty", "QV::getSystemName",
                                                                  "QV::isObjPathsEqual", "QV::textEqual"));
 }
 
-TEST(Exports, ofTheInstrumentationAreItsContractAndTheSharedBackEnd) {
+TEST(ExportsTest, OfTheInstrumentationAreItsContractAndTheSharedBackEnd) {
   EXPECT_THAT(
       exportsOf(QVINSTRUMENTATION),
       testing::UnorderedElementsAre("QV::Instrumentation::Instrumentation", "QV::Instrumentation::~Instrumentation",
@@ -50,7 +47,7 @@ TEST(Exports, ofTheInstrumentationAreItsContractAndTheSharedBackEnd) {
                                     "QV::Instrumentation::setProperty", "QV::sharedBackEnd"));
 }
 
-TEST(Exports, ofTheUnderlyingProviderAreItsFactory) {
+TEST(ExportsTest, OfTheUnderlyingProviderAreItsFactory) {
   EXPECT_THAT(exportsOf(UNDERLYING), testing::UnorderedElementsAre("UnderlyingIPConfigProvider_Create_InstanceMI"));
 }
 

@@ -7,9 +7,10 @@
 #include <string>
 #include <vector>
 
-#include "tests/e2e/support/CompositeStack.h"
-#include "tests/e2e/support/Process.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "Paths.h"
+#include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Process.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 

@@ -4,7 +4,7 @@
 
 namespace {
 
-TEST(CmpiConstants, VersionsAndCapabilities) {
+TEST(CmpiConstantsTest, VersionsAndCapabilities) {
   EXPECT_EQ(CMPICurrentVersion, 200);
   EXPECT_EQ(CMPIVersion100, 100);
   EXPECT_EQ(CMPI_MB_InstanceManipulation, 7);
@@ -14,7 +14,7 @@ TEST(CmpiConstants, VersionsAndCapabilities) {
   EXPECT_EQ(CMPI_MB_Supports_Extended_Error, 0x8000);
 }
 
-TEST(CmpiConstants, Types) {
+TEST(CmpiConstantsTest, Types) {
   EXPECT_EQ(CMPI_boolean, 0x0002);
   EXPECT_EQ(CMPI_real64, 0x000C);
   EXPECT_EQ(CMPI_uint16, 0x0090);
@@ -31,7 +31,7 @@ TEST(CmpiConstants, Types) {
   EXPECT_EQ(CMPI_keyInteger, CMPI_sint64);
 }
 
-TEST(CmpiConstants, StatesAndReturnCodes) {
+TEST(CmpiConstantsTest, StatesAndReturnCodes) {
   EXPECT_EQ(CMPI_nullValue, 0x0100);
   EXPECT_EQ(CMPI_keyValue, 0x0200);
   EXPECT_EQ(CMPI_notFound, 0x0400);
@@ -43,7 +43,7 @@ TEST(CmpiConstants, StatesAndReturnCodes) {
   EXPECT_EQ(CMPI_RC_ERROR, 200);
 }
 
-TEST(CmpiMacros, NullTestsLookAtThePointerThenAtTheHandle) {
+TEST(CmpiMacrosTest, NullTestsLookAtThePointerThenAtTheHandle) {
   CMPIInstance* none = nullptr;
   CMPIInstance withoutHandle = {nullptr, nullptr};
   int handle = 0;

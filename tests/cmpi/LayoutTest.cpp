@@ -18,7 +18,7 @@ const Row rows[] = {
 #include "layout.inc"
 };
 
-TEST(CmpiLayout, EveryStructAndMemberStandsWhereTheBinaryInterfaceHasIt) {
+TEST(CmpiLayoutTest, EveryStructAndMemberStandsWhereTheBinaryInterfaceHasIt) {
   ASSERT_GT(std::size(rows), 300u);
   for (const Row& row : rows) {
     EXPECT_EQ(row.offset, row.expectedOffset) << row.name;

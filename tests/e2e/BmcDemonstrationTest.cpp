@@ -1,7 +1,7 @@
 // The demonstration against a simulated BMC that answers real IPMI.
 #include <gmock/gmock.h>
 
-#include "tests/e2e/support/Demonstration.h"
+#include "tests/e2e/DemonstrationFixture.h"
 
 namespace {
 
@@ -9,7 +9,7 @@ using namespace Testing;
 using testing::ContainsRegex;
 using testing::HasSubstr;
 
-TEST_F(Demonstration, ShowsABmcAChangeAndTheModel) {
+TEST_F(DemonstrationTest, ShowsABmcAChangeAndTheModel) {
   const Completed completed = demonstrate({"--bmc"});
   ASSERT_EQ(completed.status, 0) << completed.errors;
   const std::string& shown = completed.output;

@@ -6,17 +6,17 @@
 #include <future>
 #include <optional>
 
-#include "tests/agent/backends/ipmi/PrivateFile.h"
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/CompositeStack.h"
+#include "tests/support/Classes.h"
+#include "tests/support/agent/SimulatedBmc.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
 using namespace Testing;
 using namespace std::chrono_literals;
-using IpmiFixture::SimulatedBmc;
-using Personality = IpmiFixture::SimulatedBmc::Personality;
+using Personality = SimulatedBmc::Personality;
 using testing::AllOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -35,7 +35,7 @@ std::string witnessedAddress(const SimulatedBmc& bmc) {
   return bmc.witness("IP Address") + '/' + bmc.witness("Subnet Mask") + ' ' + bmc.witness("IP Address Source");
 }
 
-class BmcStack : public testing::Test {
+class BmcStackTest : public testing::Test {
  protected:
   void start(Personality personality = Personality::AppliesOnCommit) {
     bmc_.emplace(personality);
@@ -51,7 +51,7 @@ class BmcStack : public testing::Test {
   // it.
   void expectFailure(const std::string& reason) const {
     const auto begin = std::chrono::steady_clock::now();
-    const std::string read = stack_->failure("ei", "YRNx_MgmtHwIPProtocolEndPoint");
+    const std::string read = stack_->failure("ei", Classes::endpoint);
     EXPECT_LT(std::chrono::steady_clock::now() - begin, operationTimeout + margin);
     EXPECT_THAT(read, AllOf(HasSubstr("(1) CIM_ERR_FAILED"), HasSubstr(reason)));
     EXPECT_THAT(stack_->log(), HasSubstr(reason));
@@ -71,9 +71,9 @@ class BmcStack : public testing::Test {
   std::optional<CompositeStack> stack_;
 };
 
-TEST_F(BmcStack, ShowsWhatTheBmcHolds) {
+TEST_F(BmcStackTest, ShowsWhatTheBmcHolds) {
   start();
-  EXPECT_EQ(stack_->names("ein", "YRNx_MgmtHwIPProtocolEndPoint"), std::vector{endpoint("lan1")});
+  EXPECT_EQ(stack_->names("ein", Classes::endpoint), std::vector{endpoint("lan1")});
   const auto shown = stack_->get(endpoint("lan1"));
   EXPECT_EQ(shown.at("IPv4Address"), quoted(bmc_->witness("IP Address")));
   EXPECT_EQ(shown.at("IPv4Address"), quoted("192.0.2.10"));
@@ -87,7 +87,7 @@ TEST_F(BmcStack, ShowsWhatTheBmcHolds) {
   EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.10/255.255.255.0 DHCP Address");
 }
 
-TEST_F(BmcStack, ShowsWhatOthersChange) {
+TEST_F(BmcStackTest, ShowsWhatOthersChange) {
   start();
   bmc_->ipmitool({"lan", "set", "1", "ipsrc", "static"});
   bmc_->ipmitool({"lan", "set", "1", "ipaddr", "192.0.2.33"});
@@ -96,20 +96,20 @@ TEST_F(BmcStack, ShowsWhatOthersChange) {
   EXPECT_EQ(shown.at("AddressOrigin"), "3");
 }
 
-TEST_F(BmcStack, ChangesAnEndpointOnABmcThatAppliesOnCommit) {
+TEST_F(BmcStackTest, ChangesAnEndpointOnABmcThatAppliesOnCommit) {
   start();
   stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77,SubnetMask=255.255.255.128");
   EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.77/255.255.255.128 Static Address");
   expectAnswering();
 }
 
-TEST_F(BmcStack, ChangesStaticSettingsOnABmcThatAppliesOnCommit) {
+TEST_F(BmcStackTest, ChangesStaticSettingsOnABmcThatAppliesOnCommit) {
   start();
   stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.78");
   EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.78/255.255.255.0 Static Address");
 }
 
-TEST_F(BmcStack, ChangesAnEndpointOnABmcThatAppliesAtOnce) {
+TEST_F(BmcStackTest, ChangesAnEndpointOnABmcThatAppliesAtOnce) {
   start(Personality::AppliesAtOnce);
   EXPECT_EQ(bmc_->witness("IP Address"), "0.0.0.0");
   stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.77,SubnetMask=255.255.255.128");
@@ -117,7 +117,7 @@ TEST_F(BmcStack, ChangesAnEndpointOnABmcThatAppliesAtOnce) {
   expectAnswering();
 }
 
-TEST_F(BmcStack, IsChangedByTwoObjectManagersOneAfterTheOther) {
+TEST_F(BmcStackTest, IsChangedByTwoObjectManagersOneAfterTheOther) {
   start();
   const CompositeStack other(sectionFor(bmc_->settings()));
   auto first = std::async(std::launch::async, [&] { stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.77"); });
@@ -136,7 +136,7 @@ TEST_F(BmcStack, IsChangedByTwoObjectManagersOneAfterTheOther) {
   EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.79/255.255.255.0 Static Address");
 }
 
-TEST_F(BmcStack, ShowsAtOnceWhatAnotherObjectManagerChanged) {
+TEST_F(BmcStackTest, ShowsAtOnceWhatAnotherObjectManagerChanged) {
   bmc_.emplace();
   QV::BackEndSettings settings = bmc_->settings();
   settings["cache"] = "60";
@@ -152,7 +152,7 @@ TEST_F(BmcStack, ShowsAtOnceWhatAnotherObjectManagerChanged) {
   EXPECT_EQ(stack_->log() + other.log(), "");
 }
 
-TEST_F(BmcStack, SendsNothingOfAChangeThatNoInterfaceCanHave) {
+TEST_F(BmcStackTest, SendsNothingOfAChangeThatNoInterfaceCanHave) {
   start();
   stack_->modify(endpoint("lan1"), "IPv4Address=127.0.0.1");
   stack_->modify(endpoint("lan1"), "SubnetMask=255.0.255.0");
@@ -160,7 +160,7 @@ TEST_F(BmcStack, SendsNothingOfAChangeThatNoInterfaceCanHave) {
   EXPECT_THAT(stack_->log(), AllOf(HasSubstr("127.0.0.1"), HasSubstr("255.0.255.0")));
 }
 
-TEST_F(BmcStack, SaysInTheLogThatTheBmcRefusedAChange) {
+TEST_F(BmcStackTest, SaysInTheLogThatTheBmcRefusedAChange) {
   start();
   bmc_->hook("check", "exit 1");
   stack_->modify(endpoint("lan1"), "IPv4Address=192.0.2.77");
@@ -171,7 +171,7 @@ TEST_F(BmcStack, SaysInTheLogThatTheBmcRefusedAChange) {
   EXPECT_EQ(bmc_->witness("IP Address"), "192.0.2.77");
 }
 
-TEST_F(BmcStack, OutlivesABmcThatStalls) {
+TEST_F(BmcStackTest, OutlivesABmcThatStalls) {
   start();
   expectAnswering();
   bmc_->halt();
@@ -180,13 +180,13 @@ TEST_F(BmcStack, OutlivesABmcThatStalls) {
   expectAnswering();
 }
 
-TEST_F(BmcStack, ServesOthersWhileABmcStalls) {
+TEST_F(BmcStackTest, ServesOthersWhileABmcStalls) {
   bmc_.emplace();
   QV::BackEndSettings settings = bmc_->settings();
   settings["operation_timeout"] = "4";
   startObjectManager(settings);
   bmc_->halt();
-  Process waiting({"wbemcli", "ei", stack_->url("YRNx_MgmtHwComputerSystem")});
+  Process waiting({"wbemcli", "ei", stack_->url(Classes::computerSystem)});
   expectServing();
   EXPECT_TRUE(waiting.isRunning());
   EXPECT_NE(waiting.wait(), 0);
@@ -194,7 +194,7 @@ TEST_F(BmcStack, ServesOthersWhileABmcStalls) {
   bmc_->resume();
 }
 
-TEST_F(BmcStack, SaysInTheLogThatTheOutcomeOfAChangeIsUnknown) {
+TEST_F(BmcStackTest, SaysInTheLogThatTheOutcomeOfAChangeIsUnknown) {
   start();
   bmc_->hook("set", "kill -STOP $SIMULATOR");
   const auto begin = std::chrono::steady_clock::now();
@@ -207,7 +207,7 @@ TEST_F(BmcStack, SaysInTheLogThatTheOutcomeOfAChangeIsUnknown) {
   expectAnswering();
 }
 
-TEST_F(BmcStack, OutlivesABmcThatEndsAndStartsAgain) {
+TEST_F(BmcStackTest, OutlivesABmcThatEndsAndStartsAgain) {
   start();
   expectAnswering();
   bmc_->kill();
@@ -218,24 +218,24 @@ TEST_F(BmcStack, OutlivesABmcThatEndsAndStartsAgain) {
   EXPECT_EQ(bmc_->witness("IP Address"), "192.0.2.77");
 }
 
-TEST_F(BmcStack, SaysThatThePasswordIsRefused) {
+TEST_F(BmcStackTest, SaysThatThePasswordIsRefused) {
   bmc_.emplace();
-  const Testing::TemporaryDirectory secrets;
+  const TemporaryDirectory secrets;
   QV::BackEndSettings settings = bmc_->settings();
   settings["password_file"] = (secrets.path() / "password").string();
-  IpmiFixture::writePrivateFile(settings["password_file"], "wrong\n");
+  writePrivateFile(settings["password_file"], "wrong\n");
   startObjectManager(settings);
   expectFailure("password");
 }
 
-TEST_F(BmcStack, SaysThatNobodyAnswersAtAPort) {
+TEST_F(BmcStackTest, SaysThatNobodyAnswersAtAPort) {
   bmc_.emplace();
   startObjectManager(bmc_->settings());
   bmc_->kill();
   expectFailure("127.0.0.1:" + std::to_string(bmc_->port()));
 }
 
-TEST_F(BmcStack, SaysWhatIsWrongWithItsSettings) {
+TEST_F(BmcStackTest, SaysWhatIsWrongWithItsSettings) {
   bmc_.emplace();
   QV::BackEndSettings settings = bmc_->settings();
   settings["cipher_suite"] = "0";

@@ -2,7 +2,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/e2e/support/Cimomd.h"
+#include "Paths.h"
+#include "tests/support/client/Cimomd.h"
 
 namespace {
 
@@ -12,7 +13,7 @@ using testing::EndsWith;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-class CommandLine : public testing::Test {
+class CommandLineTest : public testing::Test {
  protected:
   static Completed cimomd(std::vector<std::string> arguments) {
     arguments.insert(arguments.begin(), BINARY_DIR "/bin/cimomd");
@@ -31,7 +32,7 @@ class CommandLine : public testing::Test {
   TemporaryDirectory directory_;
 };
 
-TEST_F(CommandLine, ShowsHelpWithEveryOption) {
+TEST_F(CommandLineTest, ShowsHelpWithEveryOption) {
   const Completed completed = cimomd({"--help"});
   EXPECT_EQ(completed.status, 0);
   for (const char* option : {"--config", "--address", "--port", "--schema", "--registration", "--provider-dir",
@@ -40,9 +41,9 @@ TEST_F(CommandLine, ShowsHelpWithEveryOption) {
     EXPECT_THAT(completed.output, HasSubstr(option));
 }
 
-TEST_F(CommandLine, ShowsTheVersion) { EXPECT_THAT(cimomd({"--version"}).output, StartsWith("cimomd ")); }
+TEST_F(CommandLineTest, ShowsTheVersion) { EXPECT_THAT(cimomd({"--version"}).output, StartsWith("cimomd ")); }
 
-TEST_F(CommandLine, IsRefusedWithStatusTwo) {
+TEST_F(CommandLineTest, IsRefusedWithStatusTwo) {
   expectRefused({"--nonsense"}, 2, "--nonsense");
   expectRefused({"--port"}, 2, "--port");
   expectRefused({"--port", "65536"}, 2, "--port: must be a number from 0 to 65535, not \"65536\"");
@@ -56,7 +57,7 @@ TEST_F(CommandLine, IsRefusedWithStatusTwo) {
   expectRefused({"--config", "/nowhere/cimomd.ini"}, 2, "/nowhere/cimomd.ini: No such file or directory");
 }
 
-TEST_F(CommandLine, IsRefusedForWhatTheFileSays) {
+TEST_F(CommandLineTest, IsRefusedForWhatTheFileSays) {
   expectRefused({"--config", file("port = 0\nnonsense = 1\n")}, 2, "cimomd.ini:2: unknown key \"nonsense\"");
   expectRefused({"--config", file("; comment\n\nport = high\n")}, 2, "cimomd.ini:3: port: must be a number");
   expectRefused({"--config", file("port = 0\nport = 0\n")}, 2, "cimomd.ini:2: port: duplicate");
@@ -67,7 +68,7 @@ TEST_F(CommandLine, IsRefusedForWhatTheFileSays) {
   expectRefused({"--config", directory_.path().string()}, 2, "is a directory");
 }
 
-TEST_F(CommandLine, FailsWithStatusOneForWhatItIsGiven) {
+TEST_F(CommandLineTest, FailsWithStatusOneForWhatItIsGiven) {
   expectRefused({"--port", "0", "--schema", "/nowhere.mof"}, 1, "/nowhere.mof");
   expectRefused({"--port", "0", "--schema", directory_.write("bad.mof", "class {").string()}, 1, "bad.mof:1");
   expectRefused({"--port", "0", "--registration", "/nowhere.reg"}, 1, "/nowhere.reg");
@@ -77,38 +78,39 @@ TEST_F(CommandLine, FailsWithStatusOneForWhatItIsGiven) {
   expectRefused({"--port", "0", "--tls-certificate", "/nowhere", "--tls-key", "/nowhere"}, 1, "/nowhere");
 }
 
-TEST_F(CommandLine, FailsForAProviderWithoutALibrary) {
+TEST_F(CommandLineTest, FailsForAProviderWithoutALibrary) {
   auto options = Cimomd::probeOptions();
   options.back() = directory_.path().string();
   options.insert(options.end(), {"--port", "0"});
   expectRefused(options, 1, "cimomprobe");
 }
 
-TEST_F(CommandLine, FailsForAPortThatIsTaken) {
+TEST_F(CommandLineTest, FailsForAPortThatIsTaken) {
   const Cimomd first({});
   expectRefused({"--port", std::to_string(first.port())}, 1, "Address already in use");
 }
 
-TEST_F(CommandLine, TakesItsOptionsFromTheFileRelativeToIt) {
+TEST_F(CommandLineTest, TakesItsOptionsFromTheFileRelativeToIt) {
   directory_.write("probe.mof", "class TEST_Local { };");
-  const Cimomd cimomd({"--config", file("schema = probe.mof\nregistration = " SOURCE_DIR "/tests/e2e/probe/Probe.reg\n"
-                                        "schema = " SOURCE_DIR "/tests/e2e/probe/Probe.mof\n"
-                                        "provider-dir = " BINARY_DIR "/lib ; where the build puts it\n")});
+  const Cimomd cimomd(
+      {"--config", file("schema = probe.mof\nregistration = " SOURCE_DIR "/tests/support/probe/Probe.reg\n"
+                        "schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\n"
+                        "provider-dir = " BINARY_DIR "/lib ; where the build puts it\n")});
   const std::string classes = cimomd.wbemcli({"ecn"}, "").output;
   EXPECT_THAT(classes, AllOf(HasSubstr("TEST_Local"), HasSubstr("TEST_Thing")));
 }
 
-TEST_F(CommandLine, TakesIndentedKeysOfTheFile) {
+TEST_F(CommandLineTest, TakesIndentedKeysOfTheFile) {
   // Indentation means nothing: neither a second value of the key above nor a line that is passed over.
   expectRefused({"--config", file("address = 127.0.0.1\n  port = high\n")}, 2, "cimomd.ini:2: port: must be a number");
   expectRefused({"--config", file("port = 0\n  nonsense = 1\n")}, 2, "cimomd.ini:2: unknown key \"nonsense\"");
-  const Cimomd cimomd({"--config", file("  schema = " SOURCE_DIR "/tests/e2e/probe/Probe.mof\n"
-                                        "\tregistration = " SOURCE_DIR "/tests/e2e/probe/Probe.reg\n"
+  const Cimomd cimomd({"--config", file("  schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\n"
+                                        "\tregistration = " SOURCE_DIR "/tests/support/probe/Probe.reg\n"
                                         "  provider-dir = " BINARY_DIR "/lib\n")});
   EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
 }
 
-TEST_F(CommandLine, WinsOverTheFile) {
+TEST_F(CommandLineTest, WinsOverTheFile) {
   // The file's port could not be listened on.
   EXPECT_NE(Cimomd({"--config", file("port = 1\naddress = 192.0.2.1\n"), "--address", "127.0.0.1"}).port(), 1);
 }

@@ -5,9 +5,9 @@
 
 #include <set>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/CompositeStack.h"
-#include "tests/e2e/support/FactoryState.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/CompositeStack.h"
+#include "tests/support/client/FactoryState.h"
 
 namespace {
 
@@ -33,7 +33,7 @@ std::string referenceOf(const std::string& printed) {
 // The ends of an association, by the names of its references: "Class.First=a,Second=b".
 using Ends = std::map<std::string, std::string>;
 
-class CompositeAssociation : public testing::Test {
+class CompositeAssociationTest : public testing::Test {
  protected:
   // From the values of an instance: those that hold a path.
   static Ends endsOf(const Printed& instance) {
@@ -60,7 +60,7 @@ class CompositeAssociation : public testing::Test {
   CompositeStack stack_{simulatedProcessor(directory_.path() / "processor.json")};
 };
 
-TEST_F(CompositeAssociation, AnswersTheFarEndsOfEachEnd) {
+TEST_F(CompositeAssociationTest, AnswersTheFarEndsOfEachEnd) {
   for (const View& view : views()) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     EXPECT_EQ(stack_.names(scoped("ain", "-ac", view.association), view.source), view.far);
@@ -71,20 +71,20 @@ TEST_F(CompositeAssociation, AnswersTheFarEndsOfEachEnd) {
   }
 }
 
-TEST_F(CompositeAssociation, NamesTheManagedSystemAsTheHostOfWhatItAnswers) {
+TEST_F(CompositeAssociationTest, NamesTheManagedSystemAsTheHostOfWhatItAnswers) {
   for (const View& view : views())
     EXPECT_THAT(stack_.paths(scoped("ain", "-ac", view.association), view.source),
                 AllOf(Not(IsEmpty()), Each(StartsWith("managed.example/root/cimv2:"))));
 }
 
-TEST_F(CompositeAssociation, AnswersWholeInstances) {
+TEST_F(CompositeAssociationTest, AnswersWholeInstances) {
   for (const Printed& found : stack_.instances("ai", computerSystem()))
     EXPECT_EQ(found.values, stack_.get(objectOf(found.path)));
   for (const Printed& found : stack_.instances("ai", sequence("eth1:dhcp")))
     EXPECT_EQ(found.values, stack_.get(objectOf(found.path)));
 }
 
-TEST_F(CompositeAssociation, AnswersThroughEveryAssociationWhereNoneIsNamed) {
+TEST_F(CompositeAssociationTest, AnswersThroughEveryAssociationWhereNoneIsNamed) {
   std::map<std::string, Objects> everything;
   for (const View& view : views()) {
     Objects& far = everything[view.source];
@@ -99,12 +99,13 @@ TEST_F(CompositeAssociation, AnswersThroughEveryAssociationWhereNoneIsNamed) {
   }
 }
 
-TEST_F(CompositeAssociation, ReferencesBothEnds) {
+TEST_F(CompositeAssociationTest, ReferencesBothEnds) {
   for (const View& view : views()) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     const auto found = stack_.instances(scoped("ri", "-arc", view.association), view.source);
     ASSERT_THAT(found, SizeIs(view.far.size()));
-    const bool members = view.association == std::string(staticMember) || view.association == std::string(dhcpMember);
+    const bool members = view.association == std::string(Classes::staticOrderedMember) ||
+                         view.association == std::string(Classes::dhcpOrderedMember);
     for (std::size_t i = 0; i < found.size(); ++i) {
       const Ends ends = endsOf(found[i]);
       ASSERT_THAT(ends, ElementsAre(Key(members ? "GroupComponent" : "Antecedent"),
@@ -115,24 +116,25 @@ TEST_F(CompositeAssociation, ReferencesBothEnds) {
   }
 }
 
-TEST_F(CompositeAssociation, ReferencesEndsByTheNamesOfTheirRoles) {
+TEST_F(CompositeAssociationTest, ReferencesEndsByTheNamesOfTheirRoles) {
   const auto ends = [&](const char* association, const std::string& source) {
     return endsOf(stack_.instances(scoped("ri", "-arc", association), source).front());
   };
-  EXPECT_EQ(ends(hosted, endpoint("eth1")), (Ends{{"Antecedent", computerSystem()}, {"Dependent", endpoint("eth1")}}));
-  EXPECT_EQ(ends(remoteHosted, remoteAccessPoint("DNS:1")),
+  EXPECT_EQ(ends(Classes::hostedAccessPoint, endpoint("eth1")),
+            (Ends{{"Antecedent", computerSystem()}, {"Dependent", endpoint("eth1")}}));
+  EXPECT_EQ(ends(Classes::remoteHostedAccessPoint, remoteAccessPoint("DNS:1")),
             (Ends{{"Antecedent", computerSystem()}, {"Dependent", remoteAccessPoint("DNS:1")}}));
-  EXPECT_EQ(ends(clientAccess, endpoint("eth1")),
+  EXPECT_EQ(ends(Classes::clientAccess, endpoint("eth1")),
             (Ends{{"Antecedent", remoteAccessPoint("Gateway:eth0")}, {"Dependent", endpoint("eth1")}}));
-  EXPECT_EQ(ends(elementSetting, endpoint("eth1")),
+  EXPECT_EQ(ends(Classes::elementSettingData, endpoint("eth1")),
             (Ends{{"Antecedent", sequence("eth0:static")}, {"Dependent", endpoint("eth1")}}));
-  EXPECT_EQ(ends(staticMember, sequence("eth1:dhcp")),
+  EXPECT_EQ(ends(Classes::staticOrderedMember, sequence("eth1:dhcp")),
             (Ends{{"GroupComponent", sequence("eth1:dhcp")}, {"PartComponent", staticSetting("eth1")}}));
-  EXPECT_EQ(ends(dhcpMember, dhcpSetting("eth1")),
+  EXPECT_EQ(ends(Classes::dhcpOrderedMember, dhcpSetting("eth1")),
             (Ends{{"GroupComponent", sequence("eth1:dhcp")}, {"PartComponent", dhcpSetting("eth1")}}));
 }
 
-TEST_F(CompositeAssociation, NamesItsReferencesByBothEnds) {
+TEST_F(CompositeAssociationTest, NamesItsReferencesByBothEnds) {
   for (const View& view : views()) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     const Objects names = stack_.names(scoped("rin", "-arc", view.association), view.source);
@@ -140,13 +142,13 @@ TEST_F(CompositeAssociation, NamesItsReferencesByBothEnds) {
     for (std::size_t i = 0; i < names.size(); ++i) {
       EXPECT_THAT(names[i], StartsWith(std::string(view.association) + '.'));
       // The keys of this one are references that its References does not set, so its names have none.
-      if (view.association == std::string(elementSetting)) continue;
+      if (view.association == std::string(Classes::elementSettingData)) continue;
       EXPECT_THAT(names[i], AllOf(HasSubstr(view.source), HasSubstr(view.referenceNames[i])));
     }
   }
 }
 
-class CompositeAssociationClass : public CompositeAssociation, public testing::WithParamInterface<Enumeration> {
+class CompositeAssociationClassTest : public CompositeAssociationTest, public testing::WithParamInterface<Enumeration> {
  protected:
   static std::string pathOf(const std::pair<std::string, std::string>& ends) {
     const Enumeration& row = GetParam();
@@ -159,7 +161,7 @@ class CompositeAssociationClass : public CompositeAssociation, public testing::W
   }
 };
 
-TEST_P(CompositeAssociationClass, EnumeratesItsPairs) {
+TEST_P(CompositeAssociationClassTest, EnumeratesItsPairs) {
   const auto found = stack_.instances("ei", GetParam().association);
   const auto& pairs = GetParam().pairs;
   ASSERT_THAT(found, SizeIs(pairs.size()));
@@ -169,13 +171,13 @@ TEST_P(CompositeAssociationClass, EnumeratesItsPairs) {
   }
 }
 
-TEST_P(CompositeAssociationClass, EnumeratesItsNames) {
+TEST_P(CompositeAssociationClassTest, EnumeratesItsNames) {
   Objects expected;
   for (const auto& pair : GetParam().pairs) expected.push_back(pathOf(pair));
   EXPECT_EQ(stack_.names("ein", GetParam().association), expected);
 }
 
-TEST_P(CompositeAssociationClass, GetsEachInstanceByTheNameThatItEnumerated) {
+TEST_P(CompositeAssociationClassTest, GetsEachInstanceByTheNameThatItEnumerated) {
   const Objects names = stack_.names("ein", GetParam().association);
   ASSERT_THAT(names, SizeIs(GetParam().pairs.size()));
   for (std::size_t i = 0; i < names.size(); ++i) {
@@ -185,43 +187,43 @@ TEST_P(CompositeAssociationClass, GetsEachInstanceByTheNameThatItEnumerated) {
   }
 }
 
-TEST_P(CompositeAssociationClass, DoesNotFindAPairThatIsNone) {
+TEST_P(CompositeAssociationClassTest, DoesNotFindAPairThatIsNone) {
   std::string strange = asArgument(stack_.names("ein", GetParam().association).front());
   strange.replace(strange.find("\"BMC"), 4, "\"Strange");
   EXPECT_THAT(stack_.failure("gi", strange), HasSubstr("(6) CIM_ERR_NOT_FOUND"));
 }
 
-INSTANTIATE_TEST_SUITE_P(Every, CompositeAssociationClass, testing::ValuesIn(enumerations()),
+INSTANTIATE_TEST_SUITE_P(Every, CompositeAssociationClassTest, testing::ValuesIn(enumerations()),
                          [](const auto& row) { return row.param.association; });
 
-TEST_F(CompositeAssociation, OfSequencesToEndpointsSaysHowTheyRelate) {
-  for (const Printed& instance : stack_.instances("ei", elementSetting)) {
+TEST_F(CompositeAssociationTest, OfSequencesToEndpointsSaysHowTheyRelate) {
+  for (const Printed& instance : stack_.instances("ei", Classes::elementSettingData)) {
     EXPECT_EQ(instance.values.at("IsDefault"), "2");
     EXPECT_EQ(instance.values.at("IsCurrent"), "2");
     EXPECT_EQ(instance.values.at("IsNext"), "3");
   }
-  for (const Printed& instance : stack_.instances(scoped("ri", "-arc", elementSetting), endpoint("eth0")))
+  for (const Printed& instance : stack_.instances(scoped("ri", "-arc", Classes::elementSettingData), endpoint("eth0")))
     EXPECT_THAT(instance.values, Not(Contains(Key("IsNext"))));
 }
 
-TEST_F(CompositeAssociation, AnswersForItsSuperclass) {
+TEST_F(CompositeAssociationTest, AnswersForItsSuperclass) {
   EXPECT_THAT(stack_.names("ein", "CIM_HostedAccessPoint"), SizeIs(5));
   EXPECT_THAT(stack_.names("ain -ac CIM_HostedAccessPoint", computerSystem()), SizeIs(5));
   EXPECT_THAT(stack_.names("ain -ac CIM_Component", sequence("eth0:dhcp")),
               ElementsAre(staticSetting("eth0"), dhcpSetting("eth0")));
 }
 
-TEST_F(CompositeAssociation, IsFoundInAnyLetterCase) {
+TEST_F(CompositeAssociationTest, IsFoundInAnyLetterCase) {
   EXPECT_EQ(stack_.names("ain -ac yrnx_mgmthwiphostedaccesspoint", endpoint("eth0")), Objects{computerSystem()});
 }
 
-TEST_F(CompositeAssociation, AnswersNothingForAnObjectThatHasNoPartInIt) {
-  EXPECT_THAT(stack_.names(scoped("ain", "-ac", staticMember), endpoint("eth0")), IsEmpty());
-  EXPECT_THAT(stack_.names(scoped("rin", "-arc", hosted), dhcpSetting("eth0")), IsEmpty());
-  EXPECT_THAT(stack_.names(scoped("ain", "-ac", staticMember), staticSetting("eth9")), IsEmpty());
+TEST_F(CompositeAssociationTest, AnswersNothingForAnObjectThatHasNoPartInIt) {
+  EXPECT_THAT(stack_.names(scoped("ain", "-ac", Classes::staticOrderedMember), endpoint("eth0")), IsEmpty());
+  EXPECT_THAT(stack_.names(scoped("rin", "-arc", Classes::hostedAccessPoint), dhcpSetting("eth0")), IsEmpty());
+  EXPECT_THAT(stack_.names(scoped("ain", "-ac", Classes::staticOrderedMember), staticSetting("eth9")), IsEmpty());
 }
 
-TEST_F(CompositeAssociation, OfAnUnknownClassIsAnError) {
+TEST_F(CompositeAssociationTest, OfAnUnknownClassIsAnError) {
   EXPECT_THAT(stack_.failure("ain -ac YRNx_MgmtHwNothing", endpoint("eth0")),
               HasSubstr("(4) CIM_ERR_INVALID_PARAMETER: unknown association class \"YRNx_MgmtHwNothing\""));
 }

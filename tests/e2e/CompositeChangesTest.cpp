@@ -4,8 +4,9 @@
 
 #include <future>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/CompositeStack.h"
+#include "tests/support/Classes.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/CompositeStack.h"
 
 namespace {
 
@@ -13,7 +14,7 @@ using namespace Testing;
 using testing::AllOf;
 using testing::HasSubstr;
 
-class CompositeChange : public testing::Test {
+class CompositeChangeTest : public testing::Test {
  protected:
   // An interface's address and mask, as the state file, the underlying and the composite class tell them.
   void expectAddress(const std::string& interface, const std::string& address, const std::string& mask) const {
@@ -29,7 +30,7 @@ class CompositeChange : public testing::Test {
 
   // The factory state is written when somebody first asks for it.
   std::string factoryState() const {
-    stack_.names("ein", "YRNx_MgmtHwComputerSystem");
+    stack_.names("ein", Classes::computerSystem);
     return contentOf(state_);
   }
 
@@ -38,18 +39,18 @@ class CompositeChange : public testing::Test {
   const CompositeStack stack_{simulatedProcessor(state_)};
 };
 
-TEST_F(CompositeChange, OfAnEndpointReachesTheProcessor) {
+TEST_F(CompositeChangeTest, OfAnEndpointReachesTheProcessor) {
   stack_.modify(endpoint("eth0"), "IPv4Address=203.0.113.77,SubnetMask=255.255.255.128");
   expectAddress("eth0", "203.0.113.77", "255.255.255.128");
   expectAddress("eth1", "198.51.100.23", "255.255.255.0");
 }
 
-TEST_F(CompositeChange, OfStaticSettingsReachesTheProcessor) {
+TEST_F(CompositeChangeTest, OfStaticSettingsReachesTheProcessor) {
   stack_.modify(staticSetting("eth0"), "IPv4Address=203.0.113.77,SubnetMask=255.255.255.128");
   expectAddress("eth0", "203.0.113.77", "255.255.255.128");
 }
 
-TEST_F(CompositeChange, OfOneValueLeavesTheOther) {
+TEST_F(CompositeChangeTest, OfOneValueLeavesTheOther) {
   stack_.modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   expectAddress("eth0", "192.0.2.77", "255.255.255.0");
   stack_.modify(endpoint("eth0"), "SubnetMask=255.255.0.0");
@@ -60,13 +61,13 @@ TEST_F(CompositeChange, OfOneValueLeavesTheOther) {
   expectAddress("eth1", "198.51.100.99", "255.255.0.0");
 }
 
-TEST_F(CompositeChange, OfALeasedAddressMakesItStatic) {
+TEST_F(CompositeChangeTest, OfALeasedAddressMakesItStatic) {
   EXPECT_EQ(stack_.get(endpoint("eth1")).at("AddressOrigin"), "4");
   stack_.modify(endpoint("eth1"), "IPv4Address=198.51.100.99");
   EXPECT_EQ(stack_.get(endpoint("eth1")).at("AddressOrigin"), "3");
 }
 
-TEST_F(CompositeChange, OfWhatNoInterfaceCanHaveIsRefusedWithTheReasonInTheLog) {
+TEST_F(CompositeChangeTest, OfWhatNoInterfaceCanHaveIsRefusedWithTheReasonInTheLog) {
   const std::string before = factoryState();
   const std::pair<const char*, const char*> refusals[] = {
       {"IPv4Address=192.0.2", "interface eth0: the IPv4 address '192.0.2' is not four decimal numbers"},
@@ -91,32 +92,32 @@ TEST_F(CompositeChange, OfWhatNoInterfaceCanHaveIsRefusedWithTheReasonInTheLog) 
   EXPECT_EQ(contentOf(state_), before);
 }
 
-TEST_F(CompositeChange, OfARemoteAccessPointIsAcceptedWithoutEffect) {
+TEST_F(CompositeChangeTest, OfARemoteAccessPointIsAcceptedWithoutEffect) {
   const std::string before = factoryState();
   stack_.modify(remoteAccessPoint("DNS:1"), "AccessInfo=203.0.113.53");
   EXPECT_EQ(stack_.get(remoteAccessPoint("DNS:1")).at("AccessInfo"), quoted("192.0.2.53"));
   EXPECT_EQ(contentOf(state_), before);
 }
 
-TEST_F(CompositeChange, OfAnUnknownInterfaceIsRefused) {
+TEST_F(CompositeChangeTest, OfAnUnknownInterfaceIsRefused) {
   const std::string before = factoryState();
   EXPECT_THAT(stack_.failure("mi", endpoint("eth9"), {"IPv4Address=192.0.2.77"}), HasSubstr("CIM_ERR_NOT_FOUND"));
   EXPECT_THAT(stack_.failure("mi", staticSetting("eth9"), {"IPv4Address=192.0.2.77"}), HasSubstr("CIM_ERR_NOT_FOUND"));
   EXPECT_EQ(contentOf(state_), before);
 }
 
-TEST_F(CompositeChange, OfAnUndeclaredPropertyIsRefused) {
+TEST_F(CompositeChangeTest, OfAnUndeclaredPropertyIsRefused) {
   EXPECT_THAT(stack_.failure("mi", endpoint("eth0"), {"Undeclared=1"}), HasSubstr("Undeclared"));
 }
 
-TEST_F(CompositeChange, OfClassesThatCannotChangeIsNotSupported) {
+TEST_F(CompositeChangeTest, OfClassesThatCannotChangeIsNotSupported) {
   const std::string before = factoryState();
   for (const std::string& object : {computerSystem(), sequence("eth0:static"), dhcpSetting("eth0")})
     EXPECT_THAT(stack_.failure("mi", object, {"ElementName=other"}), HasSubstr("(7) CIM_ERR_NOT_SUPPORTED"));
   EXPECT_EQ(contentOf(state_), before);
 }
 
-TEST_F(CompositeChange, BySeveralClientsAtOnceLosesNone) {
+TEST_F(CompositeChangeTest, BySeveralClientsAtOnceLosesNone) {
   std::vector<std::future<void>> clients;
   for (const char* change : {"eth0 IPv4Address=192.0.2.77", "eth0 SubnetMask=255.255.0.0",
                              "eth1 IPv4Address=198.51.100.99", "eth1 SubnetMask=255.255.0.0"}) {
@@ -126,15 +127,14 @@ TEST_F(CompositeChange, BySeveralClientsAtOnceLosesNone) {
     }));
   }
   for (int i = 0; i < 4; ++i)
-    clients.push_back(std::async(std::launch::async, [this] {
-      EXPECT_THAT(stack_.names("ein", "YRNx_MgmtHwClientAccess"), testing::SizeIs(6));
-    }));
+    clients.push_back(std::async(
+        std::launch::async, [this] { EXPECT_THAT(stack_.names("ein", Classes::clientAccess), testing::SizeIs(6)); }));
   for (auto& client : clients) client.get();
   expectAddress("eth0", "192.0.2.77", "255.255.0.0");
   expectAddress("eth1", "198.51.100.99", "255.255.0.0");
 }
 
-TEST_F(CompositeChange, ByTwoObjectManagersOnOneProcessorLosesNone) {
+TEST_F(CompositeChangeTest, ByTwoObjectManagersOnOneProcessorLosesNone) {
   const CompositeStack other(simulatedProcessor(state_));
   const auto change = [](const CompositeStack& stack, const std::string& interface, const std::string& prefix) {
     for (int i = 1; i <= 8; ++i) stack.modify(staticSetting(interface), "IPv4Address=" + prefix + std::to_string(i));
@@ -148,19 +148,19 @@ TEST_F(CompositeChange, ByTwoObjectManagersOnOneProcessorLosesNone) {
   EXPECT_EQ(other.get(endpoint("eth0")), stack_.get(endpoint("eth0")));
 }
 
-TEST_F(CompositeChange, OutlivesTheObjectManager) {
+TEST_F(CompositeChangeTest, OutlivesTheObjectManager) {
   stack_.modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   const CompositeStack later(simulatedProcessor(state_));
   EXPECT_EQ(later.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.77"));
 }
 
-TEST_F(CompositeChange, OfADamagedStateIsRefusedAndTheFileKeptUntilItIsRepaired) {
+TEST_F(CompositeChangeTest, OfADamagedStateIsRefusedAndTheFileKeptUntilItIsRepaired) {
   const std::string sound = factoryState();
   for (const std::string& damaged : {std::string("{\"name\""), std::string(), sound.substr(0, sound.size() / 2),
                                      std::string("\0\xFF\xFE", 3), std::string("[]")}) {
     directory_.write("processor.json", damaged);
-    for (const char* className : {"YRNx_MgmtHwComputerSystem", "YRNx_MgmtHwIPProtocolEndPoint",
-                                  "YRNx_MgmtHwStaticIPAssignmentSettingData", "YRNx_MgmtHwRemoteServiceAccessPoint"})
+    for (const char* className :
+         {Classes::computerSystem, Classes::endpoint, Classes::staticSetting, Classes::remoteAccessPoint})
       EXPECT_THAT(stack_.failure("ei", className), AllOf(HasSubstr("(1) CIM_ERR_FAILED"), HasSubstr(state_.string())));
     EXPECT_THAT(stack_.failure("gi", endpoint("eth0")), HasSubstr(state_.string()));
     EXPECT_THAT(stack_.failure("mi", endpoint("eth0"), {"IPv4Address=192.0.2.77"}), HasSubstr(state_.string()));

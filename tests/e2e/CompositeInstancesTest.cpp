@@ -2,9 +2,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/CompositeStack.h"
-#include "tests/e2e/support/FactoryState.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/CompositeStack.h"
+#include "tests/support/client/FactoryState.h"
 
 namespace {
 
@@ -22,13 +22,13 @@ class Composite {
   CompositeStack stack{simulatedProcessor(directory.path() / "processor.json")};
 };
 
-class CompositeClass : public testing::TestWithParam<ClassCase> {
+class CompositeClassTest : public testing::TestWithParam<ClassCase> {
  protected:
   Composite composite_;
   const CompositeStack& stack_ = composite_.stack;
 };
 
-TEST_P(CompositeClass, EnumeratesItsInstancesWithEveryValue) {
+TEST_P(CompositeClassTest, EnumeratesItsInstancesWithEveryValue) {
   const std::vector<Printed> found = stack_.instances("ei", GetParam().className);
   ASSERT_THAT(found, SizeIs(GetParam().objects.size()));
   for (std::size_t i = 0; i < found.size(); ++i) {
@@ -37,7 +37,7 @@ TEST_P(CompositeClass, EnumeratesItsInstancesWithEveryValue) {
   }
 }
 
-TEST_P(CompositeClass, EnumeratesItsNamesInTheRequestsNamespace) {
+TEST_P(CompositeClassTest, EnumeratesItsNamesInTheRequestsNamespace) {
   std::vector<std::string> expected;
   for (const std::string& object : GetParam().objects) expected.push_back("root/cimv2:" + object);
   std::vector<std::string> found = stack_.paths("ein", GetParam().className);
@@ -45,26 +45,26 @@ TEST_P(CompositeClass, EnumeratesItsNamesInTheRequestsNamespace) {
   EXPECT_EQ(found, expected);
 }
 
-TEST_P(CompositeClass, GetsEachInstanceByTheNameThatItEnumerated) {
+TEST_P(CompositeClassTest, GetsEachInstanceByTheNameThatItEnumerated) {
   const std::vector<std::string> names = stack_.names("ein", GetParam().className);
   ASSERT_THAT(names, SizeIs(GetParam().values.size()));
   for (std::size_t i = 0; i < names.size(); ++i) EXPECT_EQ(stack_.get(names[i]), GetParam().values[i]);
 }
 
-TEST_P(CompositeClass, IsFoundInAnyLetterCase) {
+TEST_P(CompositeClassTest, IsFoundInAnyLetterCase) {
   std::string shouted = GetParam().className;
   for (char& letter : shouted) letter = static_cast<char>(std::toupper(static_cast<unsigned char>(letter)));
   EXPECT_EQ(stack_.names("ein", shouted), GetParam().objects);
   EXPECT_THAT(stack_.instances("ei", shouted), SizeIs(GetParam().objects.size()));
 }
 
-TEST_P(CompositeClass, RefusesKeysThatMatchNothing) {
+TEST_P(CompositeClassTest, RefusesKeysThatMatchNothing) {
   std::string strange = GetParam().objects.front();
   strange.replace(strange.find('"'), 1, "\"strange");
   EXPECT_THAT(stack_.failure("gi", strange), HasSubstr("(6) CIM_ERR_NOT_FOUND"));
 }
 
-TEST_P(CompositeClass, KeepsEveryPropertyThatAnEnumerationNamesInAPropertyList) {
+TEST_P(CompositeClassTest, KeepsEveryPropertyThatAnEnumerationNamesInAPropertyList) {
   const Values& all = GetParam().values.front();
   for (const auto& [name, value] : all) {
     const std::vector<Printed> found = stack_.instances("ei", GetParam().className, name);
@@ -75,10 +75,10 @@ TEST_P(CompositeClass, KeepsEveryPropertyThatAnEnumerationNamesInAPropertyList) 
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Every, CompositeClass, testing::ValuesIn(classCases()),
+INSTANTIATE_TEST_SUITE_P(Every, CompositeClassTest, testing::ValuesIn(classCases()),
                          [](const auto& row) { return row.param.className; });
 
-class CompositeInstances : public testing::Test {
+class CompositeInstancesTest : public testing::Test {
  protected:
   std::string namesUnder(const std::string& underlyingClass) const {
     return stack_.wbemcli("ein", underlyingClass, {}, "root/yrnse").output;
@@ -88,7 +88,7 @@ class CompositeInstances : public testing::Test {
   const CompositeStack& stack_ = composite_.stack;
 };
 
-TEST_F(CompositeInstances, LeaveOutWhatBelongsToTheHost) {
+TEST_F(CompositeInstancesTest, LeaveOutWhatBelongsToTheHost) {
   // Every machine has a loopback interface, which the underlying provider tells of as the host's.
   EXPECT_THAT(namesUnder("YRNQV_IPProtocolEndpoint"),
               AllOf(HasSubstr(R"(SystemCreationClassName="YRNQV_ComputerSystem",SystemName="managed.example")"),
@@ -104,7 +104,7 @@ TEST_F(CompositeInstances, LeaveOutWhatBelongsToTheHost) {
       EXPECT_THAT(name, AllOf(Not(HasSubstr("\"lo\"")), Not(HasSubstr("Host:")), Not(HasSubstr("managed.example"))));
 }
 
-TEST_F(CompositeInstances, ShowWithSeveralPropertiesWhatWasAskedInAnyLetterCase) {
+TEST_F(CompositeInstancesTest, ShowWithSeveralPropertiesWhatWasAskedInAnyLetterCase) {
   const auto found = stack_.instances("gi", endpoint("eth0"), "ipv4address,SUBNETMASK,ElementName");
   ASSERT_THAT(found, SizeIs(1));
   EXPECT_EQ(found[0].values, (Values{{"IPv4Address", R"("192.0.2.10")"},
@@ -112,7 +112,7 @@ TEST_F(CompositeInstances, ShowWithSeveralPropertiesWhatWasAskedInAnyLetterCase)
                                      {"ElementName", R"("BMC IP endpoint eth0")"}}));
 }
 
-TEST_F(CompositeInstances, AnswerForTheirSuperclasses) {
+TEST_F(CompositeInstancesTest, AnswerForTheirSuperclasses) {
   std::vector<std::string> accessPoints = {endpoint("eth0"), endpoint("eth1"), remoteAccessPoint("Gateway:eth0"),
                                            remoteAccessPoint("DNS:1"), remoteAccessPoint("DNS:2")};
   EXPECT_THAT(stack_.names("ein", "CIM_ServiceAccessPoint"), testing::UnorderedElementsAreArray(accessPoints));
@@ -123,12 +123,12 @@ TEST_F(CompositeInstances, AnswerForTheirSuperclasses) {
   EXPECT_THAT(stack_.names("ein", "CIM_ManagedElement"), IsSupersetOf(accessPoints));
 }
 
-TEST_F(CompositeInstances, AreNotInAnUnknownClassOrNamespace) {
+TEST_F(CompositeInstancesTest, AreNotInAnUnknownClassOrNamespace) {
   EXPECT_THAT(stack_.failure("ei", "YRNx_MgmtHwNothing"), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
   EXPECT_THAT(stack_.failure("ein", "YRNx_MgmtHwNothing"), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
-  EXPECT_THAT(stack_.failure("ei", "YRNx_MgmtHwComputerSystem", {}, "root/nowhere"),
+  EXPECT_THAT(stack_.failure("ei", Classes::computerSystem, {}, "root/nowhere"),
               HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
-  EXPECT_EQ(stack_.names("ein", "YRNx_MgmtHwComputerSystem"), std::vector{computerSystem()});
+  EXPECT_EQ(stack_.names("ein", Classes::computerSystem), std::vector{computerSystem()});
 }
 
 }  // namespace

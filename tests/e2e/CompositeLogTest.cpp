@@ -2,8 +2,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/CompositeStack.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/CompositeStack.h"
 
 namespace {
 
@@ -14,7 +14,7 @@ using testing::ElementsAre;
 using testing::EndsWith;
 using testing::HasSubstr;
 
-class CompositeLog : public testing::Test {
+class CompositeLogTest : public testing::Test {
  protected:
   static std::vector<std::string> having(const std::string& log, const std::string& part) {
     std::vector<std::string> lines;
@@ -28,7 +28,7 @@ class CompositeLog : public testing::Test {
   TemporaryDirectory directory_;
 };
 
-TEST_F(CompositeLog, FramesEveryOperationAtLevel4000) {
+TEST_F(CompositeLogTest, FramesEveryOperationAtLevel4000) {
   const CompositeStack stack(processor(), 4000);
   stack.instances("ei", "YRNx_MgmtHwIPProtocolEndPoint");
   const std::string rule(78, '=');
@@ -46,7 +46,7 @@ TEST_F(CompositeLog, FramesEveryOperationAtLevel4000) {
   EXPECT_THAT(having(stack.log(), "ENTERING: makeIPProtocolEndptInstance()"), testing::SizeIs(2));
 }
 
-TEST_F(CompositeLog, TellsOfAChangeDownToTheInterface) {
+TEST_F(CompositeLogTest, TellsOfAChangeDownToTheInterface) {
   const CompositeStack stack(processor(), 4000);
   stack.modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   for (const char* line :
@@ -56,14 +56,14 @@ TEST_F(CompositeLog, TellsOfAChangeDownToTheInterface) {
     EXPECT_THAT(stack.log(), HasSubstr(line));
 }
 
-TEST_F(CompositeLog, HoldsNothingOfARequestThatSucceedsAtLevel6000) {
+TEST_F(CompositeLogTest, HoldsNothingOfARequestThatSucceedsAtLevel6000) {
   const CompositeStack stack(processor(), 6000);
   stack.instances("ei", "YRNx_MgmtHwIPProtocolEndPoint");
   stack.modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   EXPECT_EQ(stack.log(), "");
 }
 
-TEST_F(CompositeLog, NamesThePartThatFailsAtLevel6000) {
+TEST_F(CompositeLogTest, NamesThePartThatFailsAtLevel6000) {
   const CompositeStack stack(processor(), 6000);
   stack.names("ain -ac YRNx_MgmtHwStaticIPOrderedMemberOfCollection", endpoint("eth0"));
   EXPECT_THAT(linesOf(stack.log()),
@@ -71,7 +71,7 @@ TEST_F(CompositeLog, NamesThePartThatFailsAtLevel6000) {
                                 EndsWith("Object Path is NULL in AssociatorNames."))));
 }
 
-TEST_F(CompositeLog, ShowsLineFeedsOfAClientAsEscapes) {
+TEST_F(CompositeLogTest, ShowsLineFeedsOfAClientAsEscapes) {
   const CompositeStack stack(processor(), 6000);
   stack.modify(endpoint("eth0"), "IPv4Address=1\n2026 6000 Forged forged (forged:1): line");
   EXPECT_THAT(having(stack.log(), "Forged"), Contains(HasSubstr("'1\\n2026 6000 Forged")));

@@ -4,8 +4,9 @@
 
 #include <regex>
 
+#include "Paths.h"
 #include "cimom/schema/ClassRepository.h"
-#include "tests/e2e/support/CompositeStack.h"
+#include "tests/support/client/CompositeStack.h"
 
 namespace {
 
@@ -50,12 +51,12 @@ TEST_F(CompositeSchemaTest, DeclaresEveryValueThatAnInstanceShows) {
     if (!definition->name.starts_with("YRN")) {
       continue;
     }
-    const char* const nameSpace = definition->name.starts_with("YRNQV_") ? "root/yrnse" : "root/cimv2";
+    const char* nameSpace = definition->name.starts_with("YRNQV_") ? "root/yrnse" : "root/cimv2";
     const std::vector<Printed> instances = stack_.instances("ei", definition->name, {}, nameSpace);
     EXPECT_THAT(instances, Not(IsEmpty())) << definition->name;
     for (const Printed& instance : instances) {
       for (const auto& [name, value] : instance.values) {
-        const Cimom::PropertyDeclaration* const property = definition->findProperty(name);
+        const Cimom::PropertyDeclaration* property = definition->findProperty(name);
         ASSERT_TRUE(property) << definition->name << '.' << name;
         EXPECT_TRUE(Cimom::findQualifier(property->qualifiers, "Description") ||
                     value == property->defaultValue.toString())

@@ -5,9 +5,10 @@
 #include <filesystem>
 #include <future>
 
-#include "tests/cimom/http/HttpClient.h"
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/CompositeStack.h"
+#include "Paths.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/CompositeStack.h"
+#include "tests/support/client/HttpClient.h"
 
 namespace {
 
@@ -18,14 +19,14 @@ using testing::HasSubstr;
 using testing::Not;
 using testing::SizeIs;
 
-class CompositeServer : public testing::Test {
+class CompositeServerTest : public testing::Test {
  protected:
   std::string processor() const { return simulatedProcessor(directory_.path() / "processor.json"); }
 
   TemporaryDirectory directory_;
 };
 
-class RawRequest : public CompositeServer {
+class RawRequestTest : public CompositeServerTest {
  protected:
   // A GetInstance, ModifyInstance and the like, whose parameters are given as they stand in the message.
   std::string call(const std::string& method, const std::string& parameters) {
@@ -71,7 +72,7 @@ class RawRequest : public CompositeServer {
   CompositeStack stack_{processor()};
 };
 
-TEST_F(RawRequest, ToGetAnInstanceWithoutKeysFailsAsTheProviderSays) {
+TEST_F(RawRequestTest, ToGetAnInstanceWithoutKeysFailsAsTheProviderSays) {
   for (const char* className : {"YRNx_MgmtHwComputerSystem", "YRNx_MgmtHwIPProtocolEndPoint",
                                 "YRNx_MgmtHwIPAssignmentSettingSequence", "YRNx_MgmtHwStaticIPAssignmentSettingData",
                                 "YRNx_MgmtHwDHCPAssignmentSettingData", "YRNx_MgmtHwRemoteServiceAccessPoint"})
@@ -84,13 +85,13 @@ TEST_F(RawRequest, ToGetAnInstanceWithoutKeysFailsAsTheProviderSays) {
   EXPECT_THAT(stack_.log(), HasSubstr("At least one key should be passed"));
 }
 
-TEST_F(RawRequest, WithSomeOfTheKeysFindsNothing) {
+TEST_F(RawRequestTest, WithSomeOfTheKeysFindsNothing) {
   EXPECT_THAT(call("GetInstance",
                    parameter("InstanceName", instanceName("YRNx_MgmtHwIPProtocolEndPoint", key("Name", "eth0")))),
               HasSubstr("<ERROR CODE=\"6\""));
 }
 
-TEST_F(RawRequest, ToModifyOneValueNeedsNoOther) {
+TEST_F(RawRequestTest, ToModifyOneValueNeedsNoOther) {
   EXPECT_THAT(modifyStatic("eth0", property("SubnetMask", "255.255.0.0")), Not(HasSubstr("<ERROR")));
   EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
   EXPECT_EQ(stack_.get(endpoint("eth0")).at("SubnetMask"), quoted("255.255.0.0"));
@@ -98,7 +99,7 @@ TEST_F(RawRequest, ToModifyOneValueNeedsNoOther) {
   EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.77"));
 }
 
-TEST_F(RawRequest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
+TEST_F(RawRequestTest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
   stack_.names("ein", "YRNx_MgmtHwComputerSystem");
   const std::string before = contentOf(directory_.path() / "processor.json");
   EXPECT_THAT(modifyStatic("eth9", property("IPv4Address", "192.0.2.77")), Not(HasSubstr("<ERROR")));
@@ -106,13 +107,13 @@ TEST_F(RawRequest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
   EXPECT_EQ(contentOf(directory_.path() / "processor.json"), before);
 }
 
-TEST_F(RawRequest, WithAnUndeclaredPropertyIsRefusedWhole) {
+TEST_F(RawRequestTest, WithAnUndeclaredPropertyIsRefusedWhole) {
   EXPECT_THAT(modifyStatic("eth0", property("IPv4Address", "192.0.2.77") + property("Undeclared", "1")),
               AllOf(HasSubstr("<ERROR CODE=\"12\""), HasSubstr("Undeclared")));
   EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
 }
 
-TEST_F(RawRequest, WithoutAUsableValueChangesNothing) {
+TEST_F(RawRequestTest, WithoutAUsableValueChangesNothing) {
   stack_.names("ein", "YRNx_MgmtHwComputerSystem");
   const std::string before = contentOf(directory_.path() / "processor.json");
   for (const std::string& value :
@@ -127,7 +128,7 @@ TEST_F(RawRequest, WithoutAUsableValueChangesNothing) {
   }
 }
 
-TEST_F(CompositeServer, DoesNotStartWithoutTheLibraryOfAProvider) {
+TEST_F(CompositeServerTest, DoesNotStartWithoutTheLibraryOfAProvider) {
   for (const char* missing : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
     const TemporaryDirectory providers;
     for (const char* present : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"})
@@ -142,7 +143,7 @@ TEST_F(CompositeServer, DoesNotStartWithoutTheLibraryOfAProvider) {
   }
 }
 
-TEST_F(CompositeServer, AnswersAnErrorWhereNoUnderlyingProviderIsRegistered) {
+TEST_F(CompositeServerTest, AnswersAnErrorWhereNoUnderlyingProviderIsRegistered) {
   const Cimomd cimomd({"--schema", BINARY_DIR "/share/cimomd", "--registration",
                        BINARY_DIR "/share/cimomd/CompositeIPConfig.reg", "--provider-dir", BINARY_DIR "/lib"},
                       {{"QV_AGENT_INI", directory_.write("agent.ini", "[log]\ndestination = off\n").string()}});
@@ -151,7 +152,7 @@ TEST_F(CompositeServer, AnswersAnErrorWhereNoUnderlyingProviderIsRegistered) {
   EXPECT_THAT(completed.errors, HasSubstr("CIM_ERR_INVALID_NAMESPACE"));
 }
 
-TEST_F(CompositeServer, SaysWhatIsWrongWithTheAgentsConfiguration) {
+TEST_F(CompositeServerTest, SaysWhatIsWrongWithTheAgentsConfiguration) {
   const auto ini = directory_.write("agent.ini", "[log]\ndestination = nowhere\n");
   const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
   const Completed completed = run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
@@ -159,7 +160,7 @@ TEST_F(CompositeServer, SaysWhatIsWrongWithTheAgentsConfiguration) {
   EXPECT_THAT(completed.errors, HasSubstr("agent.ini:2"));
 }
 
-TEST_F(CompositeServer, InventsNoManagementProcessorWhereNoneIsChosen) {
+TEST_F(CompositeServerTest, InventsNoManagementProcessorWhereNoneIsChosen) {
   // What the requests are answered, and what the administrator finds.
   const auto answers = [](const Cimomd& cimomd, const std::string& sentence) {
     for (const char* className : {"YRNx_MgmtHwComputerSystem", "YRNx_MgmtHwIPProtocolEndPoint",
@@ -185,7 +186,7 @@ TEST_F(CompositeServer, InventsNoManagementProcessorWhereNoneIsChosen) {
   answers(cimomd, sentence);
 }
 
-TEST_F(CompositeServer, SaysAtItsStartThatTheStateCannotBeWritten) {
+TEST_F(CompositeServerTest, SaysAtItsStartThatTheStateCannotBeWritten) {
   const std::string log = directory_ / "agent.log";
   const auto ini = directory_.write(
       "agent.ini", "[log]\ndestination = file\nfile = " + log + '\n' + simulatedProcessor("/proc/none/processor.json"));
@@ -194,7 +195,7 @@ TEST_F(CompositeServer, SaysAtItsStartThatTheStateCannotBeWritten) {
   EXPECT_THAT(contentOf(log), HasSubstr("name another file with state in [simulated] of agent.ini"));
 }
 
-TEST_F(CompositeServer, LogsOnceThatItsManagementProcessorIsSimulated) {
+TEST_F(CompositeServerTest, LogsOnceThatItsManagementProcessorIsSimulated) {
   const std::string log = directory_ / "agent.log";
   const auto ini = directory_.write("agent.ini", "[log]\ndestination = file\nfile = " + log + '\n' + processor());
   const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
@@ -205,7 +206,7 @@ TEST_F(CompositeServer, LogsOnceThatItsManagementProcessorIsSimulated) {
               ElementsAre(AllOf(HasSubstr(" 6000 Tarnwick.SimulatedProcessor "), HasSubstr("its values are made up"))));
 }
 
-TEST_F(CompositeServer, ShowsNothingOfTheHostUnlessAgentIniAsksForIt) {
+TEST_F(CompositeServerTest, ShowsNothingOfTheHostUnlessAgentIniAsksForIt) {
   const auto ini =
       directory_.write("agent.ini", "[log]\ndestination = off\n[system]\nname = managed.example\n" + processor());
   const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
@@ -220,7 +221,7 @@ TEST_F(CompositeServer, ShowsNothingOfTheHostUnlessAgentIniAsksForIt) {
   }
 }
 
-TEST_F(CompositeServer, AnswersManyClientsAtOnceAlike) {
+TEST_F(CompositeServerTest, AnswersManyClientsAtOnceAlike) {
   const CompositeStack stack(processor());
   const std::vector<std::string> expected = stack.paths("ein", "YRNx_MgmtHwClientAccess");
   ASSERT_THAT(expected, SizeIs(6));
@@ -230,7 +231,7 @@ TEST_F(CompositeServer, AnswersManyClientsAtOnceAlike) {
   for (auto& client : clients) EXPECT_EQ(client.get(), expected);
 }
 
-TEST_F(CompositeServer, EndsCleanlyAfterRequests) {
+TEST_F(CompositeServerTest, EndsCleanlyAfterRequests) {
   CompositeStack stack(processor());
   stack.instances("ei", "YRNx_MgmtHwIPElementSettingData");
   EXPECT_EQ(stack.cimomd().stop(), 0);

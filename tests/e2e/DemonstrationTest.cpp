@@ -4,8 +4,9 @@
 
 #include <filesystem>
 
-#include "tests/e2e/support/CompositeStack.h"
-#include "tests/e2e/support/Demonstration.h"
+#include "Paths.h"
+#include "tests/e2e/DemonstrationFixture.h"
+#include "tests/support/client/CompositeStack.h"
 
 namespace {
 
@@ -18,7 +19,7 @@ using testing::StartsWith;
 
 namespace fs = std::filesystem;
 
-TEST_F(Demonstration, ShowsTheSystemAChangeAndTheModel) {
+TEST_F(DemonstrationTest, ShowsTheSystemAChangeAndTheModel) {
   const Completed completed = demonstrate({});
   ASSERT_EQ(completed.status, 0) << completed.errors;
   const std::string& shown = completed.output;
@@ -32,7 +33,7 @@ TEST_F(Demonstration, ShowsTheSystemAChangeAndTheModel) {
   expectNothingLeft();
 }
 
-TEST_F(Demonstration, LeavesNothingBehindWhereItFails) {
+TEST_F(DemonstrationTest, LeavesNothingBehindWhereItFails) {
   fs::remove(build() / "share");
   const Completed completed = demonstrate({});
   EXPECT_NE(completed.status, 0);
@@ -40,7 +41,7 @@ TEST_F(Demonstration, LeavesNothingBehindWhereItFails) {
   expectNothingLeft();
 }
 
-class ModelGraph : public testing::Test {
+class ModelGraphTest : public testing::Test {
  protected:
   Completed draw(const std::string& form, const std::string& nameSpace = "root/cimv2") const {
     std::string url = stack_.url("", nameSpace);
@@ -52,7 +53,7 @@ class ModelGraph : public testing::Test {
   CompositeStack stack_{simulatedProcessor(directory_.path() / "processor.json")};
 };
 
-TEST_F(ModelGraph, HasEveryInstanceAsANodeAndEveryAssociationAsAnEdge) {
+TEST_F(ModelGraphTest, HasEveryInstanceAsANodeAndEveryAssociationAsAnEdge) {
   const Completed graph = draw("dot");
   ASSERT_EQ(graph.status, 0) << graph.errors;
   std::vector<std::string> nodes;
@@ -67,7 +68,7 @@ TEST_F(ModelGraph, HasEveryInstanceAsANodeAndEveryAssociationAsAnEdge) {
   EXPECT_THAT(edges, SizeIs(23));
 }
 
-TEST_F(ModelGraph, IsAGraphThatGraphvizTakes) {
+TEST_F(ModelGraphTest, IsAGraphThatGraphvizTakes) {
   if (run({"sh", "-c", "command -v dot"}).status != 0) GTEST_SKIP() << "dot (graphviz) is not there";
   const auto file = directory_.write("model.dot", draw("dot").output);
   const Completed drawn = run({"dot", "-Tplain", file.string()});
@@ -82,7 +83,7 @@ TEST_F(ModelGraph, IsAGraphThatGraphvizTakes) {
   EXPECT_EQ(edges, 23U);
 }
 
-TEST_F(ModelGraph, FailsWhereNothingIsFound) {
+TEST_F(ModelGraphTest, FailsWhereNothingIsFound) {
   const Completed completed = draw("tree", "root/nowhere");
   EXPECT_NE(completed.status, 0);
   EXPECT_THAT(completed.output, IsEmpty());

@@ -6,7 +6,8 @@
 #include <set>
 #include <sstream>
 
-#include "tests/e2e/support/CompositeStack.h"
+#include "Paths.h"
+#include "tests/support/client/CompositeStack.h"
 
 namespace {
 
@@ -20,7 +21,7 @@ using testing::StartsWith;
 
 constexpr const char* library = BINARY_DIR "/lib/libcompositeipconfigprovider.so.1";
 
-TEST(CompositeLibrary, ExportsExactlyItsEighteenFactories) {
+TEST(CompositeLibraryTest, ExportsExactlyItsEighteenFactories) {
   std::set<std::string> found;
   for (const std::string& line : linesOf(run({"nm", "-D", "--defined-only", library}).output)) {
     EXPECT_THAT(line, ContainsRegex(" T "));
@@ -40,19 +41,19 @@ TEST(CompositeLibrary, ExportsExactlyItsEighteenFactories) {
   EXPECT_THAT(expected, SizeIs(18));
 }
 
-TEST(CompositeLibrary, IsNamedAsObjectManagersAndLoadersFindIt) {
+TEST(CompositeLibraryTest, IsNamedAsObjectManagersAndLoadersFindIt) {
   EXPECT_THAT(run({"readelf", "-d", library}).output, HasSubstr("Library soname: [libcompositeipconfigprovider.so.1]"));
   EXPECT_EQ(std::filesystem::canonical(BINARY_DIR "/lib/libcompositeipconfigprovider.so"),
             std::filesystem::canonical(library));
 }
 
-TEST(CompositeLibrary, NeedsTheAgentAndNothingOfIpmi) {
+TEST(CompositeLibraryTest, NeedsTheAgentAndNothingOfIpmi) {
   const std::string everything = run({"ldd", library}).output;
   EXPECT_THAT(everything, AllOf(HasSubstr("libqvhelper.so.1"), HasSubstr("libqvinstrumentation.so.1"),
                                 HasSubstr("libtwlog.so.1"), Not(HasSubstr("freeipmi")), Not(HasSubstr("not found"))));
 }
 
-class Registration : public testing::Test {
+class RegistrationToolTest : public testing::Test {
  protected:
   static Completed registration(std::vector<std::string> arguments) {
     arguments.insert(arguments.begin(), SOURCE_DIR "/tools/registration");
@@ -79,7 +80,7 @@ class Registration : public testing::Test {
   TemporaryDirectory directory_;
 };
 
-TEST_F(Registration, WritesAStanzaForEachClass) {
+TEST_F(RegistrationToolTest, WritesAStanzaForEachClass) {
   const Completed completed = registration({"sfcb", table("CompositeIPConfig"), table("UnderlyingIPConfig")});
   ASSERT_EQ(completed.status, 0) << completed.errors;
   const std::string end = "\n   group: compositeipconfig\n#\n";
@@ -93,7 +94,7 @@ TEST_F(Registration, WritesAStanzaForEachClass) {
                                           "   type: instance association\n"));
 }
 
-TEST_F(Registration, WritesTheInstancesThatOpenPegasusWants) {
+TEST_F(RegistrationToolTest, WritesTheInstancesThatOpenPegasusWants) {
   const Completed completed = registration({"pegasus", table("CompositeIPConfig"), table("UnderlyingIPConfig")});
   ASSERT_EQ(completed.status, 0) << completed.errors;
   EXPECT_EQ(count(completed.output, "instance of PG_ProviderModule {"), 2U);
@@ -105,7 +106,7 @@ TEST_F(Registration, WritesTheInstancesThatOpenPegasusWants) {
   EXPECT_EQ(count(completed.output, "Namespaces = { \"root/yrnse\" };"), 6U);
 }
 
-TEST_F(Registration, NamesEveryFactoryOfTheLibraryAndNoOther) {
+TEST_F(RegistrationToolTest, NamesEveryFactoryOfTheLibraryAndNoOther) {
   std::set<std::string> registered;
   std::istringstream lines(contentOf(table("CompositeIPConfig")));
   for (std::string line; std::getline(lines, line);) {
@@ -121,14 +122,14 @@ TEST_F(Registration, NamesEveryFactoryOfTheLibraryAndNoOther) {
   EXPECT_EQ(registered, exported);
 }
 
-TEST_F(Registration, RefusesATableOfAnotherShape) {
+TEST_F(RegistrationToolTest, RefusesATableOfAnotherShape) {
   expectRefused("Class root/cimv2 Provider", "expected class, namespace, provider, library and at least one kind");
   expectRefused("Class root/cimv2 Provider library", "at least one kind");
   expectRefused("Class root/cimv2 Provider library method", "unknown kind \"method\"");
   expectRefused("Class root/cimv2 Provider library instance indication", "unknown kind \"indication\"");
 }
 
-TEST_F(Registration, ShowsHowItIsUsed) {
+TEST_F(RegistrationToolTest, ShowsHowItIsUsed) {
   EXPECT_EQ(registration({}).status, 2);
   EXPECT_EQ(registration({"sfcb"}).status, 2);
   const Completed completed = registration({"other", table("CompositeIPConfig")});

@@ -4,15 +4,15 @@
 
 #include <filesystem>
 
-#include "tests/e2e/support/Cimomd.h"
-#include "tests/e2e/support/Poll.h"
+#include "tests/support/client/Cimomd.h"
+#include "tests/support/system/Poll.h"
 
 namespace {
 
 using namespace Testing;
 using namespace std::chrono_literals;
 
-class Shutdown : public testing::Test {
+class ShutdownTest : public testing::Test {
  protected:
   static std::vector<std::string> options(const std::string& timeout) {
     auto options = Cimomd::probeOptions();
@@ -26,7 +26,7 @@ class Shutdown : public testing::Test {
   TemporaryDirectory directory_;
 };
 
-TEST_F(Shutdown, CleansTheProvidersUpOnSigterm) {
+TEST_F(ShutdownTest, CleansTheProvidersUpOnSigterm) {
   Cimomd cimomd(Cimomd::probeOptions(), environment());
   ASSERT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
   EXPECT_FALSE(has("cleaned"));
@@ -35,13 +35,13 @@ TEST_F(Shutdown, CleansTheProvidersUpOnSigterm) {
   EXPECT_EQ(cimomd.process().errors(), "");
 }
 
-TEST_F(Shutdown, EndsOnSigintToo) {
+TEST_F(ShutdownTest, EndsOnSigintToo) {
   Cimomd cimomd(Cimomd::probeOptions());
   cimomd.process().signal(SIGINT);
   EXPECT_EQ(cimomd.process().wait(), 0);
 }
 
-TEST_F(Shutdown, WaitsForARequestThatIsBeingAnswered) {
+TEST_F(ShutdownTest, WaitsForARequestThatIsBeingAnswered) {
   Cimomd cimomd(options("30"), environment());
   Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
   ASSERT_TRUE(poll([&] { return has("reached"); }));
@@ -56,7 +56,7 @@ TEST_F(Shutdown, WaitsForARequestThatIsBeingAnswered) {
   EXPECT_TRUE(has("cleaned"));
 }
 
-TEST_F(Shutdown, GivesUpOnARequestThatTakesTooLong) {
+TEST_F(ShutdownTest, GivesUpOnARequestThatTakesTooLong) {
   Cimomd cimomd(options("0"), environment());
   Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
   ASSERT_TRUE(poll([&] { return has("reached"); }));
@@ -65,7 +65,7 @@ TEST_F(Shutdown, GivesUpOnARequestThatTakesTooLong) {
   EXPECT_FALSE(has("cleaned"));
 }
 
-TEST_F(Shutdown, OutlivesAClientThatGoesAway) {
+TEST_F(ShutdownTest, OutlivesAClientThatGoesAway) {
   Cimomd cimomd(Cimomd::probeOptions(), environment());
   {
     Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});

@@ -4,7 +4,7 @@
 
 #include <future>
 
-#include "tests/e2e/support/Cimomd.h"
+#include "tests/support/client/Cimomd.h"
 
 namespace {
 
@@ -16,7 +16,7 @@ using testing::Not;
 const std::string thing = "TEST_Thing.Name=\"thing\",Number=1";
 const std::string part = "TEST_Part.Name=\"thing\",Number=3";
 
-class Wbemcli : public testing::Test {
+class WbemcliTest : public testing::Test {
  protected:
   // What a successful run wrote.
   std::string ask(const std::vector<std::string>& operation, const std::string& object,
@@ -37,7 +37,7 @@ class Wbemcli : public testing::Test {
   Cimomd cimomd_{Cimomd::probeOptions()};
 };
 
-TEST_F(Wbemcli, EnumeratesInstancesWithEveryTypeOfProperty) {
+TEST_F(WbemcliTest, EnumeratesInstancesWithEveryTypeOfProperty) {
   const std::string output = ask({"ei", "-nl"}, "TEST_Thing");
   for (const char* line : {"-Name=\"thing\"",
                            "-Number=1",
@@ -62,37 +62,37 @@ TEST_F(Wbemcli, EnumeratesInstancesWithEveryTypeOfProperty) {
     EXPECT_THAT(output, HasSubstr(line));
 }
 
-TEST_F(Wbemcli, EnumeratesSubclassesToo) {
+TEST_F(WbemcliTest, EnumeratesSubclassesToo) {
   EXPECT_THAT(ask({"ei", "-nl"}, "TEST_Thing"), HasSubstr("-Number=3"));
   EXPECT_THAT(ask({"ein"}, "TEST_Thing"), HasSubstr("root/test:TEST_Part.Name=\"thing\",Number=3"));
 }
 
-TEST_F(Wbemcli, EnumeratesNames) {
+TEST_F(WbemcliTest, EnumeratesNames) {
   EXPECT_THAT(ask({"ein"}, "TEST_Thing"), HasSubstr("root/test:TEST_Thing.Name=\"thing\",Number=1\n"));
 }
 
-TEST_F(Wbemcli, GetsAnInstanceByItsNumericKeys) {
+TEST_F(WbemcliTest, GetsAnInstanceByItsNumericKeys) {
   EXPECT_THAT(ask({"gi", "-nl"}, thing), AllOf(HasSubstr("-Number=1"), Not(HasSubstr("-Number=2"))));
   EXPECT_THAT(ask({"gi", "-nl"}, "TEST_Numbered.Id=-7", {"Id"}), HasSubstr("-Id=-7"));
 }
 
-TEST_F(Wbemcli, GetsOnlyThePropertiesAskedFor) {
+TEST_F(WbemcliTest, GetsOnlyThePropertiesAskedFor) {
   const std::string output = ask({"gi", "-nl"}, thing, {"Flag,U8"});
   EXPECT_THAT(output, AllOf(HasSubstr("-Flag=TRUE"), HasSubstr("-U8=255"), Not(HasSubstr("-U32"))));
 }
 
-TEST_F(Wbemcli, ModifiesAnInstance) {
+TEST_F(WbemcliTest, ModifiesAnInstance) {
   ask({"mi"}, thing, {"Text=\"changed\""});
   EXPECT_THAT(ask({"gi", "-nl"}, thing), HasSubstr("-Text=\"changed\""));
 }
 
-TEST_F(Wbemcli, ReadsTheSchema) {
+TEST_F(WbemcliTest, ReadsTheSchema) {
   EXPECT_THAT(ask({"gc", "-nl"}, "TEST_Part"),
               AllOf(HasSubstr("test:TEST_Part"), HasSubstr("-Extra="), HasSubstr("-Name=")));
   EXPECT_THAT(ask({"ecn"}, ""), AllOf(HasSubstr("TEST_Thing"), HasSubstr("TEST_Link")));
 }
 
-TEST_F(Wbemcli, TraversesAssociationsFromEitherEnd) {
+TEST_F(WbemcliTest, TraversesAssociationsFromEitherEnd) {
   EXPECT_THAT(ask({"ai", "-nl"}, thing), AllOf(HasSubstr("TEST_Part."), HasSubstr("-Extra=\"extra\"")));
   EXPECT_THAT(ask({"ain"}, thing), HasSubstr("root/test:" + part));
   EXPECT_THAT(ask({"ain"}, part), HasSubstr("root/test:" + thing));
@@ -101,15 +101,15 @@ TEST_F(Wbemcli, TraversesAssociationsFromEitherEnd) {
   EXPECT_THAT(ask({"ain", "-ac", "TEST_Link"}, thing), HasSubstr("root/test:" + part));
 }
 
-TEST_F(Wbemcli, FindsNothingWhereNothingIsAssociated) {
+TEST_F(WbemcliTest, FindsNothingWhereNothingIsAssociated) {
   EXPECT_EQ(ask({"ain"}, "TEST_Thing.Name=\"thing\",Number=2"), "");
 }
 
-TEST_F(Wbemcli, ShowsWhatXmlCannotCarryAsAReplacement) {
+TEST_F(WbemcliTest, ShowsWhatXmlCannotCarryAsAReplacement) {
   EXPECT_THAT(ask({"ei", "-nl"}, "TEST_Numbered", {"Text"}), HasSubstr("control \xEF\xBF\xBD and \xEF\xBF\xBD"));
 }
 
-TEST_F(Wbemcli, IsToldWhatFailed) {
+TEST_F(WbemcliTest, IsToldWhatFailed) {
   EXPECT_THAT(fail({"ei"}, "TEST_Failing"), AllOf(HasSubstr("CIM_ERR_ACCESS_DENIED"), HasSubstr("out of <order>")));
   EXPECT_THAT(fail({"ei"}, "TEST_Nowhere"), HasSubstr("CIM_ERR_INVALID_CLASS"));
   EXPECT_THAT(fail({"gi"}, "TEST_Thing.Name=\"thing\",Number=9"), HasSubstr("CIM_ERR_NOT_FOUND"));
@@ -118,9 +118,9 @@ TEST_F(Wbemcli, IsToldWhatFailed) {
   EXPECT_THAT(elsewhere.errors + elsewhere.output, HasSubstr("CIM_ERR_INVALID_NAMESPACE"));
 }
 
-TEST_F(Wbemcli, GetsAnEmptyAnswerFromAClassWithoutAProvider) { EXPECT_EQ(ask({"ei"}, "TEST_Unserved"), ""); }
+TEST_F(WbemcliTest, GetsAnEmptyAnswerFromAClassWithoutAProvider) { EXPECT_EQ(ask({"ei"}, "TEST_Unserved"), ""); }
 
-TEST_F(Wbemcli, IsServedBesideOthers) {
+TEST_F(WbemcliTest, IsServedBesideOthers) {
   std::vector<std::future<Completed>> clients;
   for (int i = 0; i < 16; ++i)
     clients.push_back(std::async(std::launch::async, [this] { return cimomd_.wbemcli({"ein"}, "TEST_Thing"); }));
@@ -128,7 +128,7 @@ TEST_F(Wbemcli, IsServedBesideOthers) {
   for (auto& client : clients) EXPECT_EQ(client.get().output, expected);
 }
 
-TEST(WbemcliWithPassword, IsServedWhenItIsRight) {
+TEST(WbemcliWithPasswordTest, IsServedWhenItIsRight) {
   const TemporaryDirectory directory;
   const auto passwords =
       directory.write("passwords", "admin:$5$saltsalt$0IyaXrmV7.sGNS6tirgqHLqX/G.FBvgkYA.lpPdS5sA\n");
@@ -144,7 +144,7 @@ TEST(WbemcliWithPassword, IsServedWhenItIsRight) {
   EXPECT_NE(ask("").status, 0);
 }
 
-TEST(WbemcliOverTls, IsServed) {
+TEST(WbemcliOverTlsTest, IsServed) {
   const TemporaryDirectory directory;
   const std::string key = (directory.path() / "key.pem").string();
   const std::string certificate = (directory.path() / "certificate.pem").string();

@@ -1,58 +1,30 @@
 // The class at the far end of an association: the table, the traces, and the path that is made of it.
 #include "factory/IPConfigObjectFactory.h"
-#include "support/CompositeTest.h"
+#include "tests/support/composite/AssociationModel.h"
+#include "tests/support/composite/CompositeTest.h"
 
 namespace {
 
+using namespace Testing;
 using QV::IPConfigComposite::IPConfigObjectFactory;
-using Testing::messages;
 using Strings = std::vector<std::string>;
 
-struct Row {
-  std::string source;
-  std::string association;
-  std::string target;
-};
+using namespace Classes;
 
-const std::string system_ = "YRNx_MgmtHwComputerSystem";
-const std::string endpoint = "YRNx_MgmtHwIPProtocolEndPoint";
-const std::string remoteAccessPoint = "YRNx_MgmtHwRemoteServiceAccessPoint";
-const std::string sequence = "YRNx_MgmtHwIPAssignmentSettingSequence";
-const std::string staticSetting = "YRNx_MgmtHwStaticIPAssignmentSettingData";
-const std::string dhcpSetting = "YRNx_MgmtHwDHCPAssignmentSettingData";
-
-const std::string hostedAccessPoint = "YRNx_MgmtHwIPHostedAccessPoint";
-const std::string remoteHostedAccessPoint = "YRNx_MgmtHwIPRemoteHostedAccessPoint";
-const std::string clientAccess = "YRNx_MgmtHwClientAccess";
-const std::string elementSettingData = "YRNx_MgmtHwIPElementSettingData";
-const std::string staticOrderedMember = "YRNx_MgmtHwStaticIPOrderedMemberOfCollection";
-const std::string dhcpOrderedMember = "YRNx_MgmtHwDHCPOrderedMemberOfCollection";
-
-const std::vector<Row> rows = {
-    {endpoint, hostedAccessPoint, system_},
-    {system_, hostedAccessPoint, endpoint},
-    {system_, remoteHostedAccessPoint, remoteAccessPoint},
-    {remoteAccessPoint, remoteHostedAccessPoint, system_},
-    {endpoint, elementSettingData, sequence},
-    {sequence, elementSettingData, endpoint},
-    {sequence, dhcpOrderedMember, dhcpSetting},
-    {dhcpSetting, dhcpOrderedMember, sequence},
-    {staticSetting, staticOrderedMember, sequence},
-    {sequence, staticOrderedMember, staticSetting},
-    {remoteAccessPoint, clientAccess, endpoint},
-    {endpoint, clientAccess, remoteAccessPoint},
-};
-
+// The class at the far end from a source; empty if the association does not end at it.
 std::string targetOf(const std::string& source, const std::string& association) {
-  for (const Row& row : rows) {
-    if (row.source == source && row.association == association) {
-      return row.target;
+  for (const AssociationModel& model : associationModels()) {
+    if (model.className == association && model.endA == source) {
+      return model.endB;
+    }
+    if (model.className == association && model.endB == source) {
+      return model.endA;
     }
   }
   return "";
 }
 
-class AssociationTargetsTest : public Testing::CompositeTest {
+class AssociationTargetsTest : public CompositeTest {
  protected:
   std::string name(const CMPIObjectPath* source, const char* association, const char* resultClass = nullptr) {
     return IPConfigObjectFactory().get_assoc_targetClass_Name(broker(), source, association, resultClass, &status);
@@ -64,10 +36,10 @@ class AssociationTargetsTest : public Testing::CompositeTest {
 };
 
 // The lines of the log without their numbers.
-Strings linesOf(Testing::Channel channel) {
+Strings linesOf(Channel channel) {
   Strings lines = messages(channel);
   for (std::string& line : lines) {
-    for (const char* const mark : {"Line: ", "at line "}) {
+    for (const char* mark : {"Line: ", "at line "}) {
       const std::size_t start = line.find(mark);
       if (start != std::string::npos) {
         const std::size_t digits = start + std::string(mark).size();
@@ -87,8 +59,8 @@ std::string variable(const std::string& name, const std::string& value) {
 }
 
 TEST_F(AssociationTargetsTest, EveryPairOfSourceAndAssociationHasItsTargetOrNone) {
-  const Strings sources = {system_,       endpoint,    remoteAccessPoint,   sequence,
-                           staticSetting, dhcpSetting, "CIM_ManagedElement"};
+  const Strings sources = {computerSystem, endpoint,    remoteAccessPoint,   sequence,
+                           staticSetting,  dhcpSetting, "CIM_ManagedElement"};
   const Strings associations = {hostedAccessPoint,   remoteHostedAccessPoint, clientAccess,    elementSettingData,
                                 staticOrderedMember, dhcpOrderedMember,       "CIM_Dependency"};
   int found = 0;
@@ -98,10 +70,10 @@ TEST_F(AssociationTargetsTest, EveryPairOfSourceAndAssociationHasItsTargetOrNone
       const std::string target = targetOf(source, association);
       found += target.empty() ? 0 : 1;
       EXPECT_EQ(name(makePath(source), association.c_str()), target);
-      const CMPIObjectPath* const targetPath = path(makePath(source), association.c_str());
+      const CMPIObjectPath* targetPath = path(makePath(source), association.c_str());
       ASSERT_EQ(targetPath == nullptr, target.empty());
-      if (targetPath != nullptr) {
-        EXPECT_EQ(Testing::classOf(targetPath), target);
+      if (targetPath) {
+        EXPECT_EQ(classOf(targetPath), target);
       }
       EXPECT_EQ(status.rc, CMPI_RC_OK);
     }
@@ -114,22 +86,22 @@ TEST_F(AssociationTargetsTest, ClassNamesAreComparedWithoutRegardToCase) {
 }
 
 TEST_F(AssociationTargetsTest, TheResultClassChangesNothing) {
-  for (const char* const resultClass : {"YRNx_MgmtHwComputerSystem", "CIM_ManagedElement", "", "NoSuchClass"}) {
-    EXPECT_EQ(name(makePath(system_), hostedAccessPoint.c_str(), resultClass), endpoint);
-    EXPECT_EQ(Testing::classOf(path(makePath(system_), hostedAccessPoint.c_str(), resultClass)), endpoint);
+  for (const char* resultClass : {computerSystem, "CIM_ManagedElement", "", "NoSuchClass"}) {
+    EXPECT_EQ(name(makePath(computerSystem), hostedAccessPoint, resultClass), endpoint);
+    EXPECT_EQ(classOf(path(makePath(computerSystem), hostedAccessPoint, resultClass)), endpoint);
   }
 }
 
 TEST_F(AssociationTargetsTest, ANullAssociationClassHasNoTarget) {
-  EXPECT_EQ(name(makePath(system_), nullptr), "");
-  EXPECT_EQ(path(makePath(system_), nullptr), nullptr);
+  EXPECT_EQ(name(makePath(computerSystem), nullptr), "");
+  EXPECT_EQ(path(makePath(computerSystem), nullptr), nullptr);
 }
 
 TEST_F(AssociationTargetsTest, TheNameIsTracedWithTheTargetFound) {
-  name(makePath(system_), hostedAccessPoint.c_str());
-  EXPECT_EQ(linesOf(Testing::Channel::Log), (Strings{enteringName, message(endpoint)}));
-  EXPECT_EQ(linesOf(Testing::Channel::Trace), linesOf(Testing::Channel::Log));
-  for (const Testing::LogLine& line : Testing::logLines()) {
+  name(makePath(computerSystem), hostedAccessPoint);
+  EXPECT_EQ(linesOf(Channel::Log), (Strings{enteringName, message(endpoint)}));
+  EXPECT_EQ(linesOf(Channel::Trace), linesOf(Channel::Log));
+  for (const LogLine& line : logLines()) {
     EXPECT_EQ(line.component, "Tarnwick.IPObjectFactory");
     EXPECT_EQ(line.level, 4000);
     EXPECT_EQ(line.function, "get_assoc_targetClass_Name");
@@ -138,46 +110,44 @@ TEST_F(AssociationTargetsTest, TheNameIsTracedWithTheTargetFound) {
 }
 
 TEST_F(AssociationTargetsTest, APairOutsideTheTableIsTracedWithItsSource) {
-  name(makePath(sequence), hostedAccessPoint.c_str());
-  EXPECT_EQ(linesOf(Testing::Channel::Log),
+  name(makePath(sequence), hostedAccessPoint);
+  EXPECT_EQ(linesOf(Channel::Log),
             (Strings{enteringName, message("Target Assoc Class Not Found"), variable("sourceclass", sequence)}));
 }
 
 TEST_F(AssociationTargetsTest, ThePathIsTracedUpToItsMaking) {
-  path(makePath(system_), hostedAccessPoint.c_str());
-  EXPECT_EQ(linesOf(Testing::Channel::Log),
-            (Strings{enteringPath, enteringName, message(endpoint), variable("targetName", endpoint),
-                     message(" Creating CMNewObjectPath")}));
+  path(makePath(computerSystem), hostedAccessPoint);
+  EXPECT_EQ(linesOf(Channel::Log), (Strings{enteringPath, enteringName, message(endpoint),
+                                            variable("targetName", endpoint), message(" Creating CMNewObjectPath")}));
 }
 
 TEST_F(AssociationTargetsTest, ANullPathIsTracedUpToItsEmptyName) {
-  path(makePath(sequence), hostedAccessPoint.c_str());
-  EXPECT_EQ(linesOf(Testing::Channel::Log),
-            (Strings{enteringPath, enteringName, message("Target Assoc Class Not Found"),
-                     variable("sourceclass", sequence), variable("targetName", "")}));
+  path(makePath(sequence), hostedAccessPoint);
+  EXPECT_EQ(linesOf(Channel::Log), (Strings{enteringPath, enteringName, message("Target Assoc Class Not Found"),
+                                            variable("sourceclass", sequence), variable("targetName", "")}));
 }
 
 TEST_F(AssociationTargetsTest, ThePathHasTheSourcesNamespaceTheSystemsNameAndNoKeys) {
-  CMPIObjectPath* const source = makePath(system_, {{"Name", "bmc0"}});
+  CMPIObjectPath* source = makePath(computerSystem, {{"Name", "bmc0"}});
   CMSetNameSpace(source, "root/other");
   CMSetHostname(source, "client.example");
-  const CMPIObjectPath* const target = path(source, hostedAccessPoint.c_str());
-  EXPECT_EQ(Testing::nameSpaceOf(target), "root/other");
-  EXPECT_EQ(Testing::hostOf(target), Testing::systemName());
-  EXPECT_EQ(Testing::keysWithValues(target), 0U);
-  EXPECT_EQ(Testing::hostOf(source), "client.example");
+  const CMPIObjectPath* target = path(source, hostedAccessPoint);
+  EXPECT_EQ(nameSpaceOf(target), "root/other");
+  EXPECT_EQ(hostOf(target), systemName());
+  EXPECT_EQ(keysWithValues(target), 0U);
+  EXPECT_EQ(hostOf(source), "client.example");
 }
 
 TEST_F(AssociationTargetsTest, APathThatTheBrokerCannotMakeIsNullAndTheBrokersStatusTellsWhy) {
   faults.failNewObjectPath = [](const std::string&, int) { return true; };
-  EXPECT_EQ(path(makePath(system_), hostedAccessPoint.c_str()), nullptr);
+  EXPECT_EQ(path(makePath(computerSystem), hostedAccessPoint), nullptr);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
 }
 
 TEST_F(AssociationTargetsTest, APathWithoutHandleIsGivenAsItIs) {
   faults.failNewObjectPath = [](const std::string&, int) { return true; };
-  faults.unmadePath = Testing::pathWithoutHandle();
-  EXPECT_EQ(path(makePath(system_), hostedAccessPoint.c_str()), Testing::pathWithoutHandle());
+  faults.unmadePath = pathWithoutHandle();
+  EXPECT_EQ(path(makePath(computerSystem), hostedAccessPoint), pathWithoutHandle());
 }
 
 }  // namespace

@@ -2,7 +2,7 @@
 #include <ostream>
 
 #include "factory/IPConfigObjectFactory.h"
-#include "support/Samples.h"
+#include "tests/support/composite/Samples.h"
 
 namespace {
 
@@ -24,15 +24,12 @@ void PrintTo(const Pair& pair, std::ostream* stream) { *stream << pair.className
   { className, &IPConfigObjectFactory::getAll, &IPConfigObjectFactory::make }
 
 const Pair pairs[] = {
-    PAIR("YRNx_MgmtHwComputerSystem", getAllSPComputerCMPIInstances, makeSPComputerInstance),
-    PAIR("YRNx_MgmtHwIPProtocolEndPoint", getAllIPProtocolendptCMPIInstances, makeIPProtocolEndptInstance),
-    PAIR("YRNx_MgmtHwIPAssignmentSettingSequence", getAllIPAssignmentSettingCMPIInstances,
-         makeIPAssignmentSettingInstance),
-    PAIR("YRNx_MgmtHwStaticIPAssignmentSettingData", getAllStaticIPAssignmentSettingCMPIInstances,
-         makeStaticIPAssignmentSettingInstance),
-    PAIR("YRNx_MgmtHwDHCPAssignmentSettingData", getAllDHCPAssignmentSettingCMPIInstances,
-         makeDHCPAssignmentSettingInstance),
-    PAIR("YRNx_MgmtHwRemoteServiceAccessPoint", getAllIPRemoteSAPCMPIInstances, makeIPRemoteSAPInstance),
+    PAIR(Classes::computerSystem, getAllSPComputerCMPIInstances, makeSPComputerInstance),
+    PAIR(Classes::endpoint, getAllIPProtocolendptCMPIInstances, makeIPProtocolEndptInstance),
+    PAIR(Classes::sequence, getAllIPAssignmentSettingCMPIInstances, makeIPAssignmentSettingInstance),
+    PAIR(Classes::staticSetting, getAllStaticIPAssignmentSettingCMPIInstances, makeStaticIPAssignmentSettingInstance),
+    PAIR(Classes::dhcpSetting, getAllDHCPAssignmentSettingCMPIInstances, makeDHCPAssignmentSettingInstance),
+    PAIR(Classes::remoteAccessPoint, getAllIPRemoteSAPCMPIInstances, makeIPRemoteSAPInstance),
 };
 
 class CompositeInstancesTest : public CompositeTest, public ::testing::WithParamInterface<Pair> {
@@ -70,7 +67,7 @@ TEST_P(CompositeInstancesTest, EveryAcceptedUnderlyingInstanceBecomesOneOfTheReq
   EXPECT_EQ(status.rc, CMPI_RC_OK);
   ASSERT_EQ(out.size(), 2u);
   for (int n = 1; n <= 2; ++n) {
-    const CMPIObjectPath* const path = pathOf(out[n - 1]);
+    const CMPIObjectPath* path = pathOf(out[n - 1]);
     EXPECT_EQ(classOf(path), GetParam().className);
     EXPECT_EQ(nameSpaceOf(path), requestNameSpace);
     for (const auto& [name, value] : keysOf(sample(), n)) {
@@ -119,7 +116,7 @@ TEST_P(CompositeInstancesTest, AFailedEnumerationIsToldByTheStatusAlone) {
 
 TEST_P(CompositeInstancesTest, OnlyTheSequenceEndsWithTheMarkersRule) {
   EXPECT_EQ(getAll(), 0);
-  const bool sequence = GetParam().className == "YRNx_MgmtHwIPAssignmentSettingSequence";
+  const bool sequence = GetParam().className == Classes::sequence;
   EXPECT_EQ(messages().back() == std::string(78, '='), sequence);
   EXPECT_EQ(messagesWith(line("EXITING: ", sample().getAll)).size(), 1u);
 }
@@ -160,14 +157,14 @@ TEST_P(CompositeInstancesTest, MakingWithoutAnInstanceAnswersNull) {
 }
 
 TEST_P(CompositeInstancesTest, ANewInstanceHasItsConstantPropertiesAndNoOthers) {
-  const CMPIInstance* const instance = make();
+  const CMPIInstance* instance = make();
   const bool setting = sample().keys.size() == 1;
   EXPECT_EQ(hasProperty(instance, "CreationClassName"), !setting);
   if (!setting) {
     EXPECT_EQ(text(instance, "CreationClassName"), GetParam().className);
   }
   if (sample().keys.size() == 4) {
-    EXPECT_EQ(text(instance, "SystemCreationClassName"), "YRNx_MgmtHwComputerSystem");
+    EXPECT_EQ(text(instance, "SystemCreationClassName"), Classes::computerSystem);
   }
   EXPECT_FALSE(hasProperty(instance, "ElementName"));
 }
@@ -175,7 +172,7 @@ TEST_P(CompositeInstancesTest, ANewInstanceHasItsConstantPropertiesAndNoOthers) 
 TEST_P(CompositeInstancesTest, NoFilterLeavesEveryPropertyVisible) {
   const char* properties[] = {"Caption", nullptr};
   for (const bool noFilter : {false, true}) {
-    CMPIInstance* const instance = make(properties, noFilter);
+    CMPIInstance* instance = make(properties, noFilter);
     CMSetProperty(instance, "Description", "seen", CMPI_chars);
     // OpenPegasus filters what it sends instead of what is set.
     EXPECT_EQ(hasProperty(instance, "Description"), noFilter || !personality().filterDropsOthers);
@@ -192,8 +189,8 @@ TEST_P(CompositeInstancesTest, AnInstanceThatCannotBeMadeIsAppendedAsNull) {
 TEST_P(CompositeInstancesTest, WronglyTypedUnderlyingPropertiesCountAsUnset) {
   CMPIData numbers = {CMPI_uint32, CMPI_goodValue, {}};
   numbers.value.uint32 = 7;
-  CMPIInstance* const underlying = addUnderlying(sample().underlying, acceptable(sample(), 1));
-  for (const char* const name : {"ElementName", "NameFormat", "Description", "AccessInfo"}) {
+  CMPIInstance* underlying = addUnderlying(sample().underlying, acceptable(sample(), 1));
+  for (const char* name : {"ElementName", "NameFormat", "Description", "AccessInfo"}) {
     withProperty(underlying, name, numbers);
   }
   EXPECT_EQ(getAll(), 0);
@@ -205,7 +202,7 @@ TEST_P(CompositeInstancesTest, WronglyTypedUnderlyingPropertiesCountAsUnset) {
 class ComputerSystemsTest : public CompositeTest {};
 
 TEST_F(ComputerSystemsTest, ThoseReadBeforeTheBrokerRanOutOfMemoryStay) {
-  for (const char* const name : {"sp1", "sp2", "sp3"}) {
+  for (const char* name : {"sp1", "sp2", "sp3"}) {
     addUnderlying("YRNQV_SPComputerSystem", {{"Name", name}});
   }
   faults.failNewInstance = [&](const std::string&, int call) {
@@ -214,8 +211,8 @@ TEST_F(ComputerSystemsTest, ThoseReadBeforeTheBrokerRanOutOfMemoryStay) {
   };
   std::vector<CMPIInstance*> out;
   EXPECT_EQ(
-      IPConfigObjectFactory().getAllSPComputerCMPIInstances(broker(), context(), makePath("YRNx_MgmtHwComputerSystem"),
-                                                            "YRNx_MgmtHwComputerSystem", nullptr, false, out, &status),
+      IPConfigObjectFactory().getAllSPComputerCMPIInstances(broker(), context(), makePath(Classes::computerSystem),
+                                                            Classes::computerSystem, nullptr, false, out, &status),
       1);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
   ASSERT_EQ(out.size(), 1u);

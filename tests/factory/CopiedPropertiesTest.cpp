@@ -1,5 +1,5 @@
 // What a composite instance of each class carries, property by property.
-#include "support/Samples.h"
+#include "tests/support/composite/Samples.h"
 
 namespace {
 
@@ -13,14 +13,14 @@ class CopiedPropertiesTest : public CompositeTest {
     Properties all = acceptable(sample, 1);
     all.insert(all.end(), properties.begin(), properties.end());
     addUnderlying(sample.underlying, all);
-    CMPIInstanceMI* const mi = unitOf(className).createInstanceMI(broker(), context(), nullptr);
+    CMPIInstanceMI* mi = unitOf(className).createInstanceMI(broker(), context(), nullptr);
     mi->ft->enumerateInstances(mi, context(), result_.result(), makePath(className), nullptr);
     EXPECT_EQ(result_.instances.size(), 1u);
     return result_.instances.front();
   }
 
   const std::vector<const CMPIInstance*>& composeAll(const std::string& className) {
-    CMPIInstanceMI* const mi = unitOf(className).createInstanceMI(broker(), context(), nullptr);
+    CMPIInstanceMI* mi = unitOf(className).createInstanceMI(broker(), context(), nullptr);
     status = mi->ft->enumerateInstances(mi, context(), result_.result(), makePath(className), nullptr);
     return result_.instances;
   }
@@ -29,19 +29,19 @@ class CopiedPropertiesTest : public CompositeTest {
 };
 
 TEST_F(CopiedPropertiesTest, AnEndpointCarriesItsFourteen) {
-  const CMPIInstance* const endpoint = compose("YRNx_MgmtHwIPProtocolEndPoint", {{"NameFormat", "Other"},
-                                                                                 {"ElementName", "Port 1"},
-                                                                                 {"IPv4Address", "192.0.2.1"},
-                                                                                 {"IPv6Address", "2001:db8::1"},
-                                                                                 {"SubnetMask", "255.255.255.0"},
-                                                                                 {"PrefixLength", CMPIUint8(64)},
-                                                                                 {"AddressType", CMPIUint16(1)},
-                                                                                 {"IPVersionSupport", CMPIUint16(3)},
-                                                                                 {"ProtocolIFType", CMPIUint16(4098)},
-                                                                                 {"EnabledState", CMPIUint16(2)},
-                                                                                 {"RequestedState", CMPIUint16(11)},
-                                                                                 {"AddressOrigin", CMPIUint16(4)},
-                                                                                 {"Caption", "not copied"}});
+  const CMPIInstance* endpoint = compose(Classes::endpoint, {{"NameFormat", "Other"},
+                                                             {"ElementName", "Port 1"},
+                                                             {"IPv4Address", "192.0.2.1"},
+                                                             {"IPv6Address", "2001:db8::1"},
+                                                             {"SubnetMask", "255.255.255.0"},
+                                                             {"PrefixLength", CMPIUint8(64)},
+                                                             {"AddressType", CMPIUint16(1)},
+                                                             {"IPVersionSupport", CMPIUint16(3)},
+                                                             {"ProtocolIFType", CMPIUint16(4098)},
+                                                             {"EnabledState", CMPIUint16(2)},
+                                                             {"RequestedState", CMPIUint16(11)},
+                                                             {"AddressOrigin", CMPIUint16(4)},
+                                                             {"Caption", "not copied"}});
   EXPECT_EQ(text(endpoint, "Name"), "point1");
   EXPECT_EQ(text(endpoint, "SystemName"), "sp1");
   EXPECT_EQ(text(endpoint, "NameFormat"), "Other");
@@ -56,39 +56,37 @@ TEST_F(CopiedPropertiesTest, AnEndpointCarriesItsFourteen) {
   EXPECT_EQ(number(endpoint, "EnabledState"), 2);
   EXPECT_EQ(number(endpoint, "RequestedState"), 11);
   EXPECT_EQ(number(endpoint, "AddressOrigin"), 4);
-  EXPECT_EQ(text(endpoint, "CreationClassName"), "YRNx_MgmtHwIPProtocolEndPoint");
-  EXPECT_EQ(text(endpoint, "SystemCreationClassName"), "YRNx_MgmtHwComputerSystem");
+  EXPECT_EQ(text(endpoint, "CreationClassName"), Classes::endpoint);
+  EXPECT_EQ(text(endpoint, "SystemCreationClassName"), Classes::computerSystem);
   EXPECT_FALSE(hasProperty(endpoint, "Caption"));
 }
 
 TEST_F(CopiedPropertiesTest, ARemoteAccessPointKeepsItsPathsClassAndShowsAnotherInItsProperty) {
-  const CMPIInstance* const point = compose("YRNx_MgmtHwRemoteServiceAccessPoint", {{"OtherAccessContext", "other"},
-                                                                                    {"AccessInfo", "192.0.2.254"},
-                                                                                    {"AccessContext", CMPIUint16(2)},
-                                                                                    {"InfoFormat", CMPIUint16(3)},
-                                                                                    {"ElementName", "not copied"}});
+  const CMPIInstance* point = compose(Classes::remoteAccessPoint, {{"OtherAccessContext", "other"},
+                                                                   {"AccessInfo", "192.0.2.254"},
+                                                                   {"AccessContext", CMPIUint16(2)},
+                                                                   {"InfoFormat", CMPIUint16(3)},
+                                                                   {"ElementName", "not copied"}});
   EXPECT_EQ(text(point, "OtherAccessContext"), "other");
   EXPECT_EQ(text(point, "AccessInfo"), "192.0.2.254");
   EXPECT_EQ(number(point, "AccessContext"), 2);
   EXPECT_EQ(number(point, "InfoFormat"), 3);
   EXPECT_FALSE(hasProperty(point, "ElementName"));
-  EXPECT_EQ(text(point, "SystemCreationClassName"), "YRNx_MgmtHwComputerSystem");
+  EXPECT_EQ(text(point, "SystemCreationClassName"), Classes::computerSystem);
   EXPECT_EQ(text(point, "CreationClassName"), "YRNx_RemoteAccessPoint");
-  EXPECT_EQ(classOf(pathOf(point)), "YRNx_MgmtHwRemoteServiceAccessPoint");
+  EXPECT_EQ(classOf(pathOf(point)), Classes::remoteAccessPoint);
   EXPECT_EQ(key(pathOf(point), "CreationClassName"), "YRNx_RemoteAccessPoint");
 }
 
 TEST_F(CopiedPropertiesTest, ASettingCarriesItsThreeAndOnlyTheDhcpSettingACaption) {
-  for (const std::string className :
-       {"YRNx_MgmtHwIPAssignmentSettingSequence", "YRNx_MgmtHwStaticIPAssignmentSettingData",
-        "YRNx_MgmtHwDHCPAssignmentSettingData"}) {
+  for (const std::string className : {Classes::sequence, Classes::staticSetting, Classes::dhcpSetting}) {
     result_.instances.clear();
-    const CMPIInstance* const setting = compose(className, {{"Caption", "underlying"}, {"Description", "not copied"}});
+    const CMPIInstance* setting = compose(className, {{"Caption", "underlying"}, {"Description", "not copied"}});
     EXPECT_EQ(text(setting, "InstanceID"), keysOf(sampleOf(className), 1).front().second);
     EXPECT_EQ(text(setting, "ElementName"), "setting 1");
     EXPECT_EQ(number(setting, "AddressOrigin"), 3);
     EXPECT_FALSE(hasProperty(setting, "Description"));
-    if (className == "YRNx_MgmtHwDHCPAssignmentSettingData") {
+    if (className == Classes::dhcpSetting) {
       EXPECT_EQ(text(setting, "Caption"), "DNS Configuration Setting");
     } else {
       EXPECT_FALSE(hasProperty(setting, "Caption"));
@@ -97,11 +95,11 @@ TEST_F(CopiedPropertiesTest, ASettingCarriesItsThreeAndOnlyTheDhcpSettingACaptio
 }
 
 TEST_F(CopiedPropertiesTest, AComputerSystemCarriesItsDedicationAndItsPosition) {
-  addUnderlying("YRNQV_SPComputerSystem", acceptable(sampleOf("YRNx_MgmtHwComputerSystem"), 1));
-  addUnderlying("YRNQV_SPComputerSystem", acceptable(sampleOf("YRNx_MgmtHwComputerSystem"), 2));
-  ASSERT_EQ(composeAll("YRNx_MgmtHwComputerSystem").size(), 2u);
+  addUnderlying("YRNQV_SPComputerSystem", acceptable(sampleOf(Classes::computerSystem), 1));
+  addUnderlying("YRNQV_SPComputerSystem", acceptable(sampleOf(Classes::computerSystem), 2));
+  ASSERT_EQ(composeAll(Classes::computerSystem).size(), 2u);
   for (int n = 1; n <= 2; ++n) {
-    const CMPIInstance* const system = result_.instances[n - 1];
+    const CMPIInstance* system = result_.instances[n - 1];
     EXPECT_EQ(text(system, "Name"), "sp" + std::to_string(n));
     EXPECT_EQ(text(system, "Description"), "processor " + std::to_string(n));
     EXPECT_EQ(text(system, "NameFormat"), "Other");
@@ -115,7 +113,7 @@ TEST_F(CopiedPropertiesTest, AComputerSystemCarriesItsDedicationAndItsPosition) 
 }
 
 TEST_F(CopiedPropertiesTest, EachComputerSystemIsAnnouncedStepByStep) {
-  compose("YRNx_MgmtHwComputerSystem", {});
+  compose(Classes::computerSystem, {});
   std::vector<std::string> told;
   for (const std::string& message : messagesWith("MESSAGE [File: IPConfigObjectFactory")) {
     told.push_back(message.substr(message.find("]: ") + 3));
@@ -135,7 +133,7 @@ TEST_F(CopiedPropertiesTest, AComputerSystemWithoutADedicationStillHasItsPositio
   withProperty(addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp2"}}), "Dedicated", withoutArray);
   CMPIData notAnArray = {CMPI_uint16, CMPI_goodValue, {}};
   withProperty(addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp3"}}), "Dedicated", notAnArray);
-  ASSERT_EQ(composeAll("YRNx_MgmtHwComputerSystem").size(), 3u);
+  ASSERT_EQ(composeAll(Classes::computerSystem).size(), 3u);
   for (int n = 1; n <= 3; ++n) {
     EXPECT_FALSE(hasProperty(result_.instances[n - 1], "Dedicated")) << n;
     EXPECT_EQ(number(result_.instances[n - 1], "Index"), n);
@@ -149,7 +147,7 @@ TEST_F(CopiedPropertiesTest, ABrokerWithoutMemoryForAnArrayEndsTheReadingOfCompu
   addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp1"}});
   addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp2"}});
   faults.failNewArray = true;
-  EXPECT_TRUE(composeAll("YRNx_MgmtHwComputerSystem").empty());
+  EXPECT_TRUE(composeAll(Classes::computerSystem).empty());
   EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
   EXPECT_EQ(text(status.msg), "Create Array for Property Dedicated failed.");
   EXPECT_EQ(faults.traces, (std::vector<BrokerTrace>{{CMPI_LEV_WARNING, "CompositeIPConfigProvider",
@@ -159,18 +157,18 @@ TEST_F(CopiedPropertiesTest, ABrokerWithoutMemoryForAnArrayEndsTheReadingOfCompu
 }
 
 TEST_F(CopiedPropertiesTest, AnUnsetUnderlyingPropertyStaysUnset) {
-  const CMPIInstance* const endpoint = compose("YRNx_MgmtHwIPProtocolEndPoint", {});
-  for (const char* const name : {"IPv4Address", "IPv6Address", "SubnetMask", "PrefixLength", "ElementName"}) {
+  const CMPIInstance* endpoint = compose(Classes::endpoint, {});
+  for (const char* name : {"IPv4Address", "IPv6Address", "SubnetMask", "PrefixLength", "ElementName"}) {
     EXPECT_FALSE(hasProperty(endpoint, name)) << name;
   }
 }
 
 TEST_F(CopiedPropertiesTest, ANumberThatDoesNotFitItsTypeStaysUnset) {
-  const Sample& sample = sampleOf("YRNx_MgmtHwIPProtocolEndPoint");
+  const Sample& sample = sampleOf(Classes::endpoint);
   CMPIData big = {CMPI_uint32, CMPI_goodValue, {}};
   big.value.uint32 = 300;
   withProperty(addUnderlying(sample.underlying, acceptable(sample, 1)), "PrefixLength", big);
-  ASSERT_EQ(composeAll("YRNx_MgmtHwIPProtocolEndPoint").size(), 1u);
+  ASSERT_EQ(composeAll(Classes::endpoint).size(), 1u);
   EXPECT_FALSE(hasProperty(result_.instances[0], "PrefixLength"));
 }
 

@@ -2,14 +2,13 @@
 #include <gtest/gtest.h>
 
 #include "factory/IPConfigObjectFactory.h"
-#include "support/RecordingLog.h"
-#include "support/ScriptedInstrumentation.h"
+#include "tests/support/agent/RecordingLog.h"
+#include "tests/support/composite/ScriptedInstrumentation.h"
 
 namespace {
 
+using namespace Testing;
 using QV::IPConfigComposite::IPConfigObjectFactory;
-using Testing::instrumentation;
-using Testing::messages;
 using Calls = std::vector<std::string>;
 
 const std::string entering = "ENTERING: executeModifyInstance() in IPConfigObjectFactory [Line: 498]";
@@ -24,7 +23,7 @@ class ExecuteModifyTest : public ::testing::Test {
   ExecuteModifyTest() {
     instrumentation() = {};
     instrumentation().nodes = {{"eth0"}, {"eth1"}};
-    Testing::logLines().clear();
+    logLines().clear();
   }
 
   int execute(const std::string& name, const std::string& address, const std::string& mask) {
@@ -108,23 +107,23 @@ TEST_F(ExecuteModifyTest, TheInstrumentationIsGoneBeforeTheExitIsReported) {
   EXPECT_EQ(messages().back(), exiting);
 }
 
-class ExecuteModifyThrows : public ExecuteModifyTest, public ::testing::WithParamInterface<const char*> {};
+class ExecuteModifyThrowsTest : public ExecuteModifyTest, public ::testing::WithParamInterface<const char*> {};
 
-TEST_P(ExecuteModifyThrows, IsCaughtAndReportedWithoutAnExitLine) {
+TEST_P(ExecuteModifyThrowsTest, IsCaughtAndReportedWithoutAnExitLine) {
   instrumentation().throwAt = GetParam();
   EXPECT_EQ(execute("eth1", "10.0.0.1", "255.0.0.0"), 1);
-  const Testing::LogLine last = Testing::logLines().back();
+  const LogLine last = logLines().back();
   EXPECT_EQ(last.message, "MESSAGE [File: IPConfigObjectFactory, Line: 533]: Caught Exception : ");
-  EXPECT_EQ(last.channel, Testing::Channel::Trace);
+  EXPECT_EQ(last.channel, Channel::Trace);
   EXPECT_EQ(last.level, 6000);
-  EXPECT_EQ(Testing::lineWith(last.message).level, 6000);
-  EXPECT_TRUE(Testing::messagesWith("EXITING").empty());
+  EXPECT_EQ(lineWith(last.message).level, 6000);
+  EXPECT_TRUE(messagesWith("EXITING").empty());
   if (std::string(GetParam()) != "construct") {
     EXPECT_EQ(instrumentation().calls.back(), "destroy");
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(AtEveryCall, ExecuteModifyThrows,
+INSTANTIATE_TEST_SUITE_P(AtEveryCall, ExecuteModifyThrowsTest,
                          ::testing::Values("construct", "selectNode(29)", "bool", "getProperty(108)", "++",
                                            "setProperty(25, 10.0.0.1)", "setProperty(26, 255.0.0.0)"));
 
@@ -137,7 +136,7 @@ TEST_F(ExecuteModifyTest, AnAddressWrittenBeforeTheExceptionStaysWritten) {
 TEST_F(ExecuteModifyTest, TheRemoteAccessPointsWriterReportsItsEntryAndNothingElse) {
   IPConfigObjectFactory().executeSAPModifyInstance(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr);
   EXPECT_EQ(messages(), Calls{"ENTERING: executeSAPModifyInstance() in IPConfigObjectFactory [Line: 550]"});
-  EXPECT_EQ(messages(Testing::Channel::Trace), messages());
+  EXPECT_EQ(messages(Channel::Trace), messages());
   EXPECT_TRUE(instrumentation().calls.empty());
 }
 

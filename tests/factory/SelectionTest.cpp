@@ -2,7 +2,7 @@
 #include <ostream>
 
 #include "factory/IPConfigObjectFactory.h"
-#include "support/Samples.h"
+#include "tests/support/composite/Samples.h"
 
 namespace {
 
@@ -13,7 +13,7 @@ class SelectionTest : public CompositeTest {
  protected:
   // How many composites of a class the underlying instances yield.
   std::size_t taken(const std::string& className) {
-    CMPIInstanceMI* const mi = unitOf(className).createInstanceMI(broker(), context(), nullptr);
+    CMPIInstanceMI* mi = unitOf(className).createInstanceMI(broker(), context(), nullptr);
     RecordingResult result;
     mi->ft->enumerateInstances(mi, context(), result.result(), makePath(className), nullptr);
     return result.instances.size();
@@ -32,7 +32,7 @@ class OwnedSelectionTest : public SelectionTest, public ::testing::WithParamInte
 };
 
 INSTANTIATE_TEST_SUITE_P(AccessPoints, OwnedSelectionTest,
-                         ::testing::Values("YRNx_MgmtHwIPProtocolEndPoint", "YRNx_MgmtHwRemoteServiceAccessPoint"));
+                         ::testing::Values(Classes::endpoint, Classes::remoteAccessPoint));
 
 TEST_P(OwnedSelectionTest, OnlyThoseOwnedByTheProcessorsClassAreTakenLetterCaseAndAll) {
   for (const std::string owner : {"CIM_UnitaryComputerSystem", "yrnqv_spcomputersystem", "YRNQV_SPComputerSystem2",
@@ -46,7 +46,7 @@ TEST_P(OwnedSelectionTest, OnlyThoseOwnedByTheProcessorsClassAreTakenLetterCaseA
 
 TEST_P(OwnedSelectionTest, AnOwnerOfAnotherTypeOrWithoutCharactersIsNone) {
   std::vector<CMPIData> owners = {{CMPI_uint16, CMPI_goodValue, {}}, {CMPI_chars, CMPI_goodValue, {}}};
-  for (CMPIString* const none : stringsWithoutCharacters()) {
+  for (CMPIString* none : stringsWithoutCharacters()) {
     CMPIData owner = {CMPI_string, CMPI_goodValue, {}};
     owner.value.string = none;
     owners.push_back(owner);
@@ -68,7 +68,7 @@ TEST_P(OwnedSelectionTest, AnOwnerMayComeAsBareCharacters) {
 TEST_F(SelectionTest, EveryComputerSystemIsTaken) {
   addUnderlying("YRNQV_SPComputerSystem", {});
   addUnderlying("YRNQV_SPComputerSystem", {{"CreationClassName", "another"}, {"Name", "host"}});
-  EXPECT_EQ(taken("YRNx_MgmtHwComputerSystem"), 2u);
+  EXPECT_EQ(taken(Classes::computerSystem), 2u);
 }
 
 struct Identifier {
@@ -90,23 +90,21 @@ INSTANTIATE_TEST_SUITE_P(Forms, IdentifierTest,
                                            Identifier{"BMCa:b", 0, 0}, Identifier{"", 0, 0}, Identifier{":::", 0, 0}));
 
 TEST_P(IdentifierTest, DecidesBetweenSequenceAndSetting) {
-  EXPECT_EQ(takenWithIdentifier("YRNx_MgmtHwIPAssignmentSettingSequence", GetParam().text), GetParam().asSequence);
-  EXPECT_EQ(takenWithIdentifier("YRNx_MgmtHwStaticIPAssignmentSettingData", GetParam().text), GetParam().asSetting);
-  EXPECT_EQ(takenWithIdentifier("YRNx_MgmtHwDHCPAssignmentSettingData", GetParam().text), GetParam().asSetting);
+  EXPECT_EQ(takenWithIdentifier(Classes::sequence, GetParam().text), GetParam().asSequence);
+  EXPECT_EQ(takenWithIdentifier(Classes::staticSetting, GetParam().text), GetParam().asSetting);
+  EXPECT_EQ(takenWithIdentifier(Classes::dhcpSetting, GetParam().text), GetParam().asSetting);
 }
 
 TEST_F(SelectionTest, ASettingWithoutAnIdentifierIsLeftOut) {
   addUnderlying("YRNQV_IPAssignmentSettingData", {{"ElementName", "nameless"}});
-  EXPECT_EQ(taken("YRNx_MgmtHwIPAssignmentSettingSequence"), 0u);
+  EXPECT_EQ(taken(Classes::sequence), 0u);
 }
 
 TEST_F(SelectionTest, AnIdentifierStaysAsItIs) {
   addUnderlying("YRNQV_StaticIPAssignmentSettingData", {{"InstanceID", "BMC::a:"}});
-  CMPIInstanceMI* const mi =
-      unitOf("YRNx_MgmtHwStaticIPAssignmentSettingData").createInstanceMI(broker(), context(), nullptr);
+  CMPIInstanceMI* mi = unitOf(Classes::staticSetting).createInstanceMI(broker(), context(), nullptr);
   RecordingResult result;
-  mi->ft->enumerateInstances(mi, context(), result.result(), makePath("YRNx_MgmtHwStaticIPAssignmentSettingData"),
-                             nullptr);
+  mi->ft->enumerateInstances(mi, context(), result.result(), makePath(Classes::staticSetting), nullptr);
   ASSERT_EQ(result.instances.size(), 1u);
   EXPECT_EQ(text(result.instances[0], "InstanceID"), "BMC::a:");
 }

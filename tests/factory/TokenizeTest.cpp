@@ -13,23 +13,25 @@ Tokens tokensOf(const std::string& text, const std::string& delimiters = ":") {
   return tokens;
 }
 
-TEST(Tokenize, SplitsAtEveryDelimiter) { EXPECT_EQ(tokensOf("BMC:eth0:static"), (Tokens{"BMC", "eth0", "static"})); }
+TEST(TokenizeTest, SplitsAtEveryDelimiter) {
+  EXPECT_EQ(tokensOf("BMC:eth0:static"), (Tokens{"BMC", "eth0", "static"}));
+}
 
-TEST(Tokenize, ATextWithoutDelimitersIsOnePiece) { EXPECT_EQ(tokensOf("BMC"), Tokens{"BMC"}); }
+TEST(TokenizeTest, ATextWithoutDelimitersIsOnePiece) { EXPECT_EQ(tokensOf("BMC"), Tokens{"BMC"}); }
 
-TEST(Tokenize, EmptyPiecesVanish) {
+TEST(TokenizeTest, EmptyPiecesVanish) {
   EXPECT_EQ(tokensOf("BMC::a:"), (Tokens{"BMC", "a"}));
   EXPECT_EQ(tokensOf(":BMC:a"), (Tokens{"BMC", "a"}));
   EXPECT_EQ(tokensOf(":::"), Tokens{});
   EXPECT_EQ(tokensOf(""), Tokens{});
 }
 
-TEST(Tokenize, TheDelimitersAreASetOfCharacters) {
+TEST(TokenizeTest, TheDelimitersAreASetOfCharacters) {
   EXPECT_EQ(tokensOf("a:b;c", ":;"), (Tokens{"a", "b", "c"}));
   EXPECT_EQ(tokensOf("a:;b", ":;"), (Tokens{"a", "b"}));
 }
 
-TEST(Tokenize, AppendsToWhatIsThere) {
+TEST(TokenizeTest, AppendsToWhatIsThere) {
   Tokens tokens = {"first"};
   IPConfigObjectFactory().Tokenize("a:b", tokens, ":");
   EXPECT_EQ(tokens, (Tokens{"first", "a", "b"}));

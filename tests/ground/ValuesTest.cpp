@@ -3,11 +3,12 @@
 
 #include "ground/Settings.h"
 #include "ground/Values.h"
-#include "tests/agent/support/Throws.h"
+#include "tests/support/system/Throws.h"
 
-namespace Ground {
 namespace {
 
+using namespace Ground;
+using namespace Testing;
 using namespace std::chrono_literals;
 using testing::ElementsAre;
 
@@ -71,4 +72,3 @@ TEST(SettingsTest, LeavesTheTargetOfAMissingKeyAsItIs) {
 }
 
 }  // namespace
-}  // namespace Ground

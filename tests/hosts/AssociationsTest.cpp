@@ -4,9 +4,9 @@
 
 #include <set>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/FactoryState.h"
 #include "tests/hosts/HostTest.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/FactoryState.h"
 
 namespace {
 
@@ -20,7 +20,7 @@ using testing::UnorderedElementsAreArray;
 
 using Ends = std::map<std::string, std::string>;
 
-class HostAssociations : public HostTest {
+class HostAssociationsTest : public HostTest {
  protected:
   static std::string scoped(const char* operation, const char* option, const std::string& className) {
     return std::string(operation) + ' ' + option + ' ' + className;
@@ -46,7 +46,7 @@ class HostAssociations : public HostTest {
   }
 };
 
-TEST_F(HostAssociations, AnswerTheFarEndsOfEachEnd) {
+TEST_F(HostAssociationsTest, AnswerTheFarEndsOfEachEnd) {
   for (const View& view : views()) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     const Objects far = canonical(view.far);
@@ -55,7 +55,7 @@ TEST_F(HostAssociations, AnswerTheFarEndsOfEachEnd) {
   }
 }
 
-TEST_F(HostAssociations, AnswerWholeInstances) {
+TEST_F(HostAssociationsTest, AnswerWholeInstances) {
   for (const std::string& source : {computerSystem(), sequence("eth1:dhcp")}) {
     for (const View& view : views()) {
       if (view.source != source) {
@@ -68,12 +68,13 @@ TEST_F(HostAssociations, AnswerWholeInstances) {
   }
 }
 
-TEST_F(HostAssociations, ReferToBothEnds) {
+TEST_F(HostAssociationsTest, ReferToBothEnds) {
   for (const View& view : views()) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     const auto found = host().instances(scoped("ri", "-arc", view.association), view.source);
     ASSERT_THAT(found, SizeIs(view.far.size()));
-    const bool members = view.association == std::string(staticMember) || view.association == std::string(dhcpMember);
+    const bool members = view.association == std::string(Classes::staticOrderedMember) ||
+                         view.association == std::string(Classes::dhcpOrderedMember);
     const std::vector<std::string> roles = members ? std::vector<std::string>{"GroupComponent", "PartComponent"}
                                                    : std::vector<std::string>{"Antecedent", "Dependent"};
     for (std::size_t i = 0; i < found.size(); ++i) {
@@ -85,14 +86,14 @@ TEST_F(HostAssociations, ReferToBothEnds) {
   }
 }
 
-TEST_F(HostAssociations, NameTheirReferencesByBothEnds) {
+TEST_F(HostAssociationsTest, NameTheirReferencesByBothEnds) {
   for (const View& view : views()) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     const Objects names = canonical(host().names(scoped("rin", "-arc", view.association), view.source));
     ASSERT_THAT(names, SizeIs(view.referenceNames.size()));
     EXPECT_THAT(names, Each(StartsWith(std::string(view.association) + '.')));
     // This class has no keys.
-    if (view.association == std::string(elementSetting)) {
+    if (view.association == std::string(Classes::elementSettingData)) {
       continue;
     }
     for (std::size_t i = 0; i < names.size(); ++i) {
@@ -102,7 +103,7 @@ TEST_F(HostAssociations, NameTheirReferencesByBothEnds) {
   }
 }
 
-TEST_F(HostAssociations, WithoutAClassReferToEverythingThatAnEndIsRelatedTo) {
+TEST_F(HostAssociationsTest, WithoutAClassReferToEverythingThatAnEndIsRelatedTo) {
   std::map<std::string, std::size_t> related;
   for (const View& view : views()) {
     related[view.source] += view.far.size();
@@ -114,7 +115,7 @@ TEST_F(HostAssociations, WithoutAClassReferToEverythingThatAnEndIsRelatedTo) {
   }
 }
 
-TEST_F(HostAssociations, WithoutAClassAnswerAllFarEndsOrNone) {
+TEST_F(HostAssociationsTest, WithoutAClassAnswerAllFarEndsOrNone) {
   std::map<std::string, Objects> everything;
   for (const View& view : views()) {
     Objects& far = everything[view.source];
@@ -130,7 +131,7 @@ TEST_F(HostAssociations, WithoutAClassAnswerAllFarEndsOrNone) {
   }
 }
 
-TEST_F(HostAssociations, EnumerateTheirPairs) {
+TEST_F(HostAssociationsTest, EnumerateTheirPairs) {
   for (const Enumeration& row : enumerations()) {
     const auto found = host().instances("ei", row.association);
     ASSERT_THAT(found, SizeIs(row.pairs.size())) << row.association;
@@ -141,11 +142,11 @@ TEST_F(HostAssociations, EnumerateTheirPairs) {
   }
 }
 
-TEST_F(HostAssociations, EnumerateTheirNames) {
+TEST_F(HostAssociationsTest, EnumerateTheirNames) {
   for (const Enumeration& row : enumerations()) {
     const Objects names = canonical(host().names("ein", row.association));
     ASSERT_THAT(names, SizeIs(row.pairs.size())) << row.association;
-    if (row.association == std::string(elementSetting)) {
+    if (row.association == std::string(Classes::elementSettingData)) {
       continue;
     }
     for (std::size_t i = 0; i < names.size(); ++i) {
@@ -156,10 +157,10 @@ TEST_F(HostAssociations, EnumerateTheirNames) {
   }
 }
 
-TEST_F(HostAssociations, AreGotByTheNamesThatWereEnumerated) {
+TEST_F(HostAssociationsTest, AreGotByTheNamesThatWereEnumerated) {
   for (const Enumeration& row : enumerations()) {
     // Without keys it cannot be asked for.
-    if (row.association == std::string(elementSetting)) {
+    if (row.association == std::string(Classes::elementSettingData)) {
       continue;
     }
     for (const auto& [first, second] : row.pairs) {
@@ -172,8 +173,8 @@ TEST_F(HostAssociations, AreGotByTheNamesThatWereEnumerated) {
   }
 }
 
-TEST_F(HostAssociations, OfSequencesSayHowTheyRelate) {
-  for (const Printed& instance : host().instances("ei", elementSetting)) {
+TEST_F(HostAssociationsTest, OfSequencesSayHowTheyRelate) {
+  for (const Printed& instance : host().instances("ei", Classes::elementSettingData)) {
     EXPECT_THAT(instance.values.at("IsDefault"), Eq("2"));
     EXPECT_THAT(instance.values.at("IsCurrent"), Eq("2"));
     EXPECT_THAT(instance.values.at("IsNext"), Eq("3"));

@@ -2,21 +2,20 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/FactoryState.h"
-#include "tests/e2e/support/Poll.h"
 #include "tests/hosts/HostTest.h"
+#include "tests/support/agent/SimulatedBmc.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/FactoryState.h"
+#include "tests/support/system/Poll.h"
 
 namespace {
 
 using namespace Testing;
-using IpmiFixture::SimulatedBmc;
 using testing::AllOf;
 
 using testing::HasSubstr;
 
-class HostBmc : public HostTest {
+class HostBmcTest : public HostTest {
  protected:
   void SetUp() override {
     QV::BackEndSettings settings = bmc_.settings();
@@ -41,7 +40,7 @@ class HostBmc : public HostTest {
   SimulatedBmc bmc_;
 };
 
-TEST_F(HostBmc, IsShownAsItIs) {
+TEST_F(HostBmcTest, IsShownAsItIs) {
   EXPECT_EQ(canonical(host().names("ein", "YRNx_MgmtHwIPProtocolEndPoint")), canonical(Objects{endpoint("lan1")}));
   EXPECT_EQ(shownAddress(), heldAddress());
   EXPECT_EQ(host().get(endpoint("lan1")).at("AddressOrigin"), "4");
@@ -51,7 +50,7 @@ TEST_F(HostBmc, IsShownAsItIs) {
             canonical(Objects{remoteAccessPoint("Gateway:lan1")}));
 }
 
-TEST_F(HostBmc, ShowsChangesAtOnce) {
+TEST_F(HostBmcTest, ShowsChangesAtOnce) {
   for (int i = 1; i <= 6; ++i) {
     const std::string address = "192.0.2." + std::to_string(100 + i);
     const std::string mask = i % 2 == 0 ? "255.255.255.0" : "255.255.255.128";
@@ -65,7 +64,7 @@ TEST_F(HostBmc, ShowsChangesAtOnce) {
   EXPECT_EQ(host().log(), "");
 }
 
-TEST_F(HostBmc, StaysAsItIsWhereAChangeIsRefused) {
+TEST_F(HostBmcTest, StaysAsItIsWhereAChangeIsRefused) {
   const std::string before = heldAddress();
   host().modify(endpoint("lan1"), "IPv4Address=127.0.0.1");
   host().modify(endpoint("lan1"), "SubnetMask=255.0.255.0");
@@ -77,7 +76,7 @@ TEST_F(HostBmc, StaysAsItIsWhereAChangeIsRefused) {
   EXPECT_THAT(host().log(), AllOf(HasSubstr("127.0.0.1"), HasSubstr("255.0.255.0"), HasSubstr("192.0.2.77")));
 }
 
-TEST_F(HostBmc, IsFoundAgainAfterItWasAway) {
+TEST_F(HostBmcTest, IsFoundAgainAfterItWasAway) {
   const std::string before = shownAddress();
   bmc_.kill();
   EXPECT_TRUE(poll([] { return host().wbemcli("ei", "YRNx_MgmtHwIPProtocolEndPoint").status != 0; }));

@@ -2,9 +2,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "tests/e2e/support/CompositeObjects.h"
 #include "tests/hosts/HostTest.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
@@ -12,7 +12,7 @@ using namespace Testing;
 
 using testing::HasSubstr;
 
-class HostChanges : public HostTest {
+class HostChangesTest : public HostTest {
  protected:
   // As the client and the state file tell it, at once.
   static void expectAddress(const std::string& interface, const std::string& address, const std::string& mask) {
@@ -24,18 +24,18 @@ class HostChanges : public HostTest {
   }
 };
 
-TEST_F(HostChanges, OfAnEndpointAreSeenAtOnce) {
+TEST_F(HostChangesTest, OfAnEndpointAreSeenAtOnce) {
   host().modify(endpoint("eth0"), "IPv4Address=203.0.113.77,SubnetMask=255.255.255.128");
   expectAddress("eth0", "203.0.113.77", "255.255.255.128");
   expectAddress("eth1", "198.51.100.23", "255.255.255.0");
 }
 
-TEST_F(HostChanges, OfStaticSettingsAreSeenAtOnce) {
+TEST_F(HostChangesTest, OfStaticSettingsAreSeenAtOnce) {
   host().modify(staticSetting("eth0"), "IPv4Address=203.0.113.78,SubnetMask=255.255.255.192");
   expectAddress("eth0", "203.0.113.78", "255.255.255.192");
 }
 
-TEST_F(HostChanges, OfOneValueLeaveTheOther) {
+TEST_F(HostChangesTest, OfOneValueLeaveTheOther) {
   host().modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   expectAddress("eth0", "192.0.2.77", "255.255.255.0");
   host().modify(endpoint("eth0"), "SubnetMask=255.255.0.0");
@@ -46,7 +46,7 @@ TEST_F(HostChanges, OfOneValueLeaveTheOther) {
   expectAddress("eth1", "198.51.100.99", "255.255.0.0");
 }
 
-TEST_F(HostChanges, OneAfterTheOtherAreEachSeenAtOnce) {
+TEST_F(HostChangesTest, OneAfterTheOtherAreEachSeenAtOnce) {
   for (int i = 1; i <= 20; ++i) {
     const std::string address = "192.0.2." + std::to_string(100 + i);
     host().modify(i % 2 == 0 ? endpoint("eth0") : staticSetting("eth0"), "IPv4Address=" + address);
@@ -54,13 +54,13 @@ TEST_F(HostChanges, OneAfterTheOtherAreEachSeenAtOnce) {
   }
 }
 
-TEST_F(HostChanges, OfALeasedAddressMakeItStatic) {
+TEST_F(HostChangesTest, OfALeasedAddressMakeItStatic) {
   EXPECT_EQ(host().get(endpoint("eth1")).at("AddressOrigin"), "4");
   host().modify(endpoint("eth1"), "IPv4Address=198.51.100.99");
   EXPECT_EQ(host().get(endpoint("eth1")).at("AddressOrigin"), "3");
 }
 
-TEST_F(HostChanges, ThatAreRefusedLeaveEverythingAndSayWhyInTheLog) {
+TEST_F(HostChangesTest, ThatAreRefusedLeaveEverythingAndSayWhyInTheLog) {
   host().names("ein", "YRNx_MgmtHwComputerSystem");
   const std::string before = readFile(ObjectManager::stateFile());
   for (const char* change :
@@ -74,7 +74,7 @@ TEST_F(HostChanges, ThatAreRefusedLeaveEverythingAndSayWhyInTheLog) {
   }
 }
 
-TEST_F(HostChanges, OfARemoteAccessPointHaveNoEffect) {
+TEST_F(HostChangesTest, OfARemoteAccessPointHaveNoEffect) {
   host().names("ein", "YRNx_MgmtHwComputerSystem");
   const std::string before = readFile(ObjectManager::stateFile());
   host().modify(remoteAccessPoint("DNS:1"), "AccessInfo=203.0.113.53");
@@ -82,13 +82,13 @@ TEST_F(HostChanges, OfARemoteAccessPointHaveNoEffect) {
   EXPECT_EQ(readFile(ObjectManager::stateFile()), before);
 }
 
-TEST_F(HostChanges, OfOtherClassesAreNotSupported) {
+TEST_F(HostChangesTest, OfOtherClassesAreNotSupported) {
   for (const std::string& object : {computerSystem(), sequence("eth0:static"), dhcpSetting("eth0")}) {
     EXPECT_THAT(host().failure("mi", object, {"ElementName=other"}), HasSubstr("(7) CIM_ERR_NOT_SUPPORTED"));
   }
 }
 
-TEST_F(HostChanges, OutliveTheObjectManager) {
+TEST_F(HostChangesTest, OutliveTheObjectManager) {
   host().modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   host().restart();
   expectAddress("eth0", "192.0.2.77", "255.255.255.0");

@@ -8,11 +8,11 @@
 #include <optional>
 
 #include "tests/cimom/cimxml/Messages.h"
-#include "tests/cimom/http/HttpClient.h"
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/FactoryState.h"
 #include "tests/hosts/HostProcesses.h"
 #include "tests/hosts/HostTest.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/FactoryState.h"
+#include "tests/support/client/HttpClient.h"
 
 namespace {
 
@@ -85,7 +85,7 @@ std::vector<Call> calls() {
        {std::pair{"Associators", "AssocClass"}, std::pair{"AssociatorNames", "AssocClass"},
         std::pair{"References", "ResultClass"}, std::pair{"ReferenceNames", "ResultClass"}}) {
     all.push_back({method, parameter("ObjectName", endpointPath("eth1")) +
-                               parameter(filter, "<CLASSNAME NAME=\"" + std::string(clientAccess) + "\"/>")});
+                               parameter(filter, "<CLASSNAME NAME=\"" + std::string(Classes::clientAccess) + "\"/>")});
   }
   return all;
 }
@@ -99,7 +99,7 @@ Call changeOfAddress(const std::string& address) {
                         address + "</VALUE></PROPERTY></INSTANCE></VALUE.NAMEDINSTANCE>")};
 }
 
-class HostEndurance : public HostTest {
+class HostEnduranceTest : public HostTest {
  protected:
   static long residentProviders() {
     long sum = 0;
@@ -110,7 +110,7 @@ class HostEndurance : public HostTest {
   }
 };
 
-TEST_F(HostEndurance, ServesThousandsOfRequestsInTheSameMemory) {
+TEST_F(HostEnduranceTest, ServesThousandsOfRequestsInTheSameMemory) {
   // Given the answers to what only reads, and a change of address that is made and taken back in every ten requests
   const std::vector<Call> reading = calls();
   const Call changes[] = {changeOfAddress("192.0.2.77"), changeOfAddress("192.0.2.10")};

@@ -11,13 +11,13 @@ using testing::AllOf;
 using testing::HasSubstr;
 using testing::Not;
 
-class HostFirstLook : public HostTest {};
+class HostFirstLookTest : public HostTest {};
 
-TEST_F(HostFirstLook, ShowsTheEndpoints) {
+TEST_F(HostFirstLookTest, ShowsTheEndpoints) {
   EXPECT_THAT(host().carryOut("look"), AllOf(HasSubstr(R"(Name="eth0")"), HasSubstr(R"(Name="eth1")")));
 }
 
-TEST_F(HostFirstLook, ChangesAnAddressAndReadsItBack) {
+TEST_F(HostFirstLookTest, ChangesAnAddressAndReadsItBack) {
   const std::string said = host().carryOut("change");
   EXPECT_THAT(said, AllOf(HasSubstr(R"(IPv4Address="192.0.2.77")"), HasSubstr(R"(SubnetMask="255.255.255.128")")));
   EXPECT_THAT(said, Not(HasSubstr("wbemcli:")));

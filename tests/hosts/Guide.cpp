@@ -3,7 +3,8 @@
 #include <regex>
 #include <stdexcept>
 
-#include "tests/support/TemporaryDirectory.h"
+#include "Paths.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
 namespace {

@@ -5,7 +5,7 @@
 #include <functional>
 #include <sstream>
 
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
 namespace {

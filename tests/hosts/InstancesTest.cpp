@@ -4,10 +4,10 @@
 
 #include <algorithm>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/FactoryState.h"
 #include "tests/hosts/HostProcesses.h"
 #include "tests/hosts/HostTest.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/FactoryState.h"
 
 namespace {
 
@@ -16,16 +16,16 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::SizeIs;
 
-class HostInstances : public HostTest {};
+class HostInstancesTest : public HostTest {};
 
-TEST_F(HostInstances, RunInAsManyProcessesAsTheyAreRegisteredFor) {
+TEST_F(HostInstancesTest, RunInAsManyProcessesAsTheyAreRegisteredFor) {
   host().names("ein", "YRNx_MgmtHwComputerSystem");
   EXPECT_THAT(ObjectManager::providerProcesses(), SizeIs(host().processes()));
   EXPECT_EQ(ObjectManager::providerProcesses("composite") == ObjectManager::providerProcesses("underlying"),
             host().processes() == 1);
 }
 
-TEST_F(HostInstances, AreEnumeratedWithEveryValue) {
+TEST_F(HostInstancesTest, AreEnumeratedWithEveryValue) {
   for (const ClassCase& row : classCases()) {
     const auto found = host().instances("ei", row.className);
     ASSERT_THAT(found, SizeIs(row.objects.size())) << row.className;
@@ -36,13 +36,13 @@ TEST_F(HostInstances, AreEnumeratedWithEveryValue) {
   }
 }
 
-TEST_F(HostInstances, AreEnumeratedByName) {
+TEST_F(HostInstancesTest, AreEnumeratedByName) {
   for (const ClassCase& row : classCases()) {
     EXPECT_EQ(canonical(host().names("ein", row.className)), canonical(row.objects));
   }
 }
 
-TEST_F(HostInstances, AreGotByTheNamesThatWereEnumerated) {
+TEST_F(HostInstancesTest, AreGotByTheNamesThatWereEnumerated) {
   for (const ClassCase& row : classCases()) {
     const auto names = host().names("ein", row.className);
     ASSERT_THAT(names, SizeIs(row.values.size())) << row.className;
@@ -52,7 +52,7 @@ TEST_F(HostInstances, AreGotByTheNamesThatWereEnumerated) {
   }
 }
 
-TEST_F(HostInstances, AreShownWithThePropertiesThatAreAskedFor) {
+TEST_F(HostInstancesTest, AreShownWithThePropertiesThatAreAskedFor) {
   for (const ClassCase& row : classCases()) {
     const auto& [name, value] = *row.values.front().begin();
     const auto found = host().instances("ei", row.className, name);
@@ -62,7 +62,7 @@ TEST_F(HostInstances, AreShownWithThePropertiesThatAreAskedFor) {
   }
 }
 
-TEST_F(HostInstances, ThatAreNotThereAreNotFound) {
+TEST_F(HostInstancesTest, ThatAreNotThereAreNotFound) {
   for (const ClassCase& row : classCases()) {
     std::string strange = row.objects.front();
     strange.replace(strange.find('"'), 1, "\"strange");
@@ -70,13 +70,13 @@ TEST_F(HostInstances, ThatAreNotThereAreNotFound) {
   }
 }
 
-TEST_F(HostInstances, AnswerForTheirSuperclasses) {
+TEST_F(HostInstancesTest, AnswerForTheirSuperclasses) {
   const auto names = canonical(host().names("ein", "CIM_ComputerSystem"));
   EXPECT_THAT(names, testing::Contains(canonical(computerSystem())));
   EXPECT_THAT(host().names("ein", "CIM_SettingData"), SizeIs(8));
 }
 
-TEST_F(HostInstances, OfTheUnderlyingClassesAreServedToo) {
+TEST_F(HostInstancesTest, OfTheUnderlyingClassesAreServedToo) {
   for (const char* underlying :
        {"YRNQV_SPComputerSystem", "YRNQV_IPProtocolEndpoint", "YRNQV_IPAssignmentSettingData",
         "YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData", "YRNQV_IPRemoteServiceAccessPoint"}) {
@@ -86,7 +86,7 @@ TEST_F(HostInstances, OfTheUnderlyingClassesAreServedToo) {
   EXPECT_EQ(settings.at("IPv4Address"), quoted("192.0.2.10"));
 }
 
-TEST_F(HostInstances, AreTheSameForManyClientsAtOnce) {
+TEST_F(HostInstancesTest, AreTheSameForManyClientsAtOnce) {
   const auto expected = host().names("ein", "YRNx_MgmtHwClientAccess");
   ASSERT_THAT(expected, SizeIs(6));
   std::vector<std::unique_ptr<Process>> clients;

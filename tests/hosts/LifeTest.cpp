@@ -7,11 +7,11 @@
 #include <chrono>
 #include <filesystem>
 
-#include "tests/e2e/support/CompositeObjects.h"
-#include "tests/e2e/support/FactoryState.h"
-#include "tests/e2e/support/Poll.h"
 #include "tests/hosts/HostProcesses.h"
 #include "tests/hosts/HostTest.h"
+#include "tests/support/client/CompositeObjects.h"
+#include "tests/support/client/FactoryState.h"
+#include "tests/support/system/Poll.h"
 
 namespace {
 
@@ -22,10 +22,10 @@ using testing::IsEmpty;
 using testing::Not;
 using testing::SizeIs;
 
-class HostLife : public HostTest {
+class HostLifeTest : public HostTest {
  protected:
   static void expectServing() {
-    EXPECT_THAT(host().names("ein", clientAccess), SizeIs(6));
+    EXPECT_THAT(host().names("ein", Classes::clientAccess), SizeIs(6));
     EXPECT_EQ(host().get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
   }
 
@@ -40,7 +40,7 @@ class HostLife : public HostTest {
   }
 };
 
-TEST_F(HostLife, GoesOnAfterTheProvidersWereUnloaded) {
+TEST_F(HostLifeTest, GoesOnAfterTheProvidersWereUnloaded) {
   expectServing();
   ASSERT_TRUE(host().unloadProviders());
   host().allowProviders();
@@ -48,7 +48,7 @@ TEST_F(HostLife, GoesOnAfterTheProvidersWereUnloaded) {
   EXPECT_THAT(ObjectManager::providerProcesses(), SizeIs(host().processes()));
 }
 
-TEST_F(HostLife, GoesOnAfterAProviderProcessWasKilled) {
+TEST_F(HostLifeTest, GoesOnAfterAProviderProcessWasKilled) {
   for (int i = 0; i < 3; ++i) {
     expectServing();
     const auto before = ObjectManager::providerProcesses();
@@ -61,14 +61,14 @@ TEST_F(HostLife, GoesOnAfterAProviderProcessWasKilled) {
   }
 }
 
-TEST_F(HostLife, GoesOnAfterAProviderProcessWasKilledDuringARequest) {
+TEST_F(HostLifeTest, GoesOnAfterAProviderProcessWasKilledDuringARequest) {
   // Given a request that the providers, halted, do not answer
   expectServing();
   const auto before = ObjectManager::providerProcesses();
   for (const pid_t process : before) {
     kill(process, SIGSTOP);
   }
-  Process request({"wbemcli", "ein", host().url(clientAccess)});
+  Process request({"wbemcli", "ein", host().url(Classes::clientAccess)});
   EXPECT_FALSE(poll([&] { return !request.isRunning(); }, std::chrono::milliseconds(500)));
 
   // When
@@ -86,7 +86,7 @@ TEST_F(HostLife, GoesOnAfterAProviderProcessWasKilledDuringARequest) {
   expectServing();
 }
 
-TEST_F(HostLife, EndsAndBeginsWithTheObjectManager) {
+TEST_F(HostLifeTest, EndsAndBeginsWithTheObjectManager) {
   expectServing();
   host().stop();
   EXPECT_THAT(ObjectManager::providerProcesses(), IsEmpty());
@@ -94,14 +94,14 @@ TEST_F(HostLife, EndsAndBeginsWithTheObjectManager) {
   expectServing();
 }
 
-TEST_F(HostLife, GoesOnAfterAnUpgrade) {
+TEST_F(HostLifeTest, GoesOnAfterAnUpgrade) {
   host().modify(endpoint("eth0"), "IPv4Address=192.0.2.77");
   host().upgrade();
   EXPECT_EQ(host().get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.77"));
-  EXPECT_THAT(host().names("ein", clientAccess), SizeIs(6));
+  EXPECT_THAT(host().names("ein", Classes::clientAccess), SizeIs(6));
 }
 
-TEST_F(HostLife, LeavesNothingWhereItIsRemoved) {
+TEST_F(HostLifeTest, LeavesNothingWhereItIsRemoved) {
   expectServing();
   host().remove();
   EXPECT_FALSE(std::filesystem::exists(INSTALL_PREFIX "/lib/cmpi/libcompositeipconfigprovider.so"));

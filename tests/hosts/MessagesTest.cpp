@@ -9,7 +9,7 @@
 #include <stdexcept>
 
 #include "tests/hosts/HostTest.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
@@ -53,7 +53,7 @@ Edit withoutRegistration(const std::string& set) {
   };
 }
 
-class HostMessages : public HostTest {
+class HostMessagesTest : public HostTest {
  protected:
   void SetUp() override { removeWhatIsThere(); }
 
@@ -103,44 +103,44 @@ class HostMessages : public HostTest {
   static std::string ipmi(const std::string& keys) { return "[processor]\nbackend = ipmi\n[ipmi]\n" + keys; }
 };
 
-TEST_F(HostMessages, OfMissingUnderlyingClassesAreExplained) {
+TEST_F(HostMessagesTest, OfMissingUnderlyingClassesAreExplained) {
   host().install(without({"yrnse"}));
   expectExplained(firstRequest(), "(3) CIM_ERR_INVALID_NAMESPACE");
 }
 
-TEST_F(HostMessages, OfMissingCompositeClassesAreExplained) {
+TEST_F(HostMessagesTest, OfMissingCompositeClassesAreExplained) {
   host().install(with(" CompositeIPConfig.mof", ""));
   expectExplained(firstRequest(), "(5) CIM_ERR_INVALID_CLASS");
 }
 
-TEST_F(HostMessages, OfAMissingProviderDirectoryAreExplained) {
+TEST_F(HostMessagesTest, OfAMissingProviderDirectoryAreExplained) {
   host().install(without({"/usr/local/lib/cmpi"}));
   expectExplained(firstRequest(), "IPProtocolendptProvider");
 }
 
-TEST_F(HostMessages, OfTheAgentsMissingLibrariesAreExplained) {
+TEST_F(HostMessagesTest, OfTheAgentsMissingLibrariesAreExplained) {
   host().install(without({"ldconfig"}));
   expectExplained(firstRequest(), "libqvhelper.so.1: cannot open shared object file");
 }
 
-TEST_F(HostMessages, AreNoneWhereARegistrationIsMissing) {
+TEST_F(HostMessagesTest, AreNoneWhereARegistrationIsMissing) {
   host().install(withoutRegistration("CompositeIPConfig"));
   expectNothing(firstRequest());
 }
 
-TEST_F(HostMessages, AreNoneWhereTheUnderlyingRegistrationIsMissing) {
+TEST_F(HostMessagesTest, AreNoneWhereTheUnderlyingRegistrationIsMissing) {
   host().install(withoutRegistration("UnderlyingIPConfig"));
   expectNothing(firstRequest());
 }
 
-TEST_F(HostMessages, OfAnObjectManagerThatDoesNotRunAreExplained) {
+TEST_F(HostMessagesTest, OfAnObjectManagerThatDoesNotRunAreExplained) {
   host().install();
   host().stop();
   expectExplained(firstRequest(), "Couldn't connect to server");
   host().start();
 }
 
-TEST_F(HostMessages, OfTheMissingSchemaAreExplained) {
+TEST_F(HostMessagesTest, OfTheMissingSchemaAreExplained) {
   // sfcb takes what it needs of its own schema into every namespace; the compiler of OpenPegasus refuses.
   std::string refusal;
   try {
@@ -155,7 +155,7 @@ TEST_F(HostMessages, OfTheMissingSchemaAreExplained) {
   }
 }
 
-TEST_F(HostMessages, OfAStateThatCannotBeWrittenAreExplained) {
+TEST_F(HostMessagesTest, OfAStateThatCannotBeWrittenAreExplained) {
   std::filesystem::create_directories("/var/lib/compositeipconfig");
   std::filesystem::permissions("/var/lib/compositeipconfig", std::filesystem::perms::owner_read);
   // Even root is held by permissions without these two capabilities.
@@ -165,7 +165,7 @@ TEST_F(HostMessages, OfAStateThatCannotBeWrittenAreExplained) {
   std::filesystem::remove_all("/var/lib/compositeipconfig");
 }
 
-TEST_F(HostMessages, OfAMistakeInAgentIniAreExplained) {
+TEST_F(HostMessagesTest, OfAMistakeInAgentIniAreExplained) {
   installOn("[processor]\nbakcend = simulated\n");
   expectExplained(firstRequest(), "agent.ini:11: ");
 }
@@ -182,12 +182,12 @@ TEST_F(HostMessages, OfAProcessorThatIsNotChosenAreExplained) {
   expectExplained(firstRequest(), "[processor] has no key 'backend'");
 }
 
-TEST_F(HostMessages, OfAnUnknownBackEndAreExplained) {
+TEST_F(HostMessagesTest, OfAnUnknownBackEndAreExplained) {
   installOn("[processor]\nbackend = simulatd\n");
   expectExplained(firstRequest(), "the back end simulatd cannot be loaded");
 }
 
-TEST_F(HostMessages, OfABmcThatDoesNotAnswerAreExplained) {
+TEST_F(HostMessagesTest, OfABmcThatDoesNotAnswerAreExplained) {
   TemporaryDirectory directory;
   const auto password = directory.write("password", "test\n");
   std::filesystem::permissions(password, std::filesystem::perms::owner_read);
@@ -196,12 +196,12 @@ TEST_F(HostMessages, OfABmcThatDoesNotAnswerAreExplained) {
   expectExplained(firstRequest(), "127.0.0.1");
 }
 
-TEST_F(HostMessages, OfAMachineWithoutABmcAreExplained) {
+TEST_F(HostMessagesTest, OfAMachineWithoutABmcAreExplained) {
   installOn(ipmi("connection = inband\ndevice = /dev/ipmi-none\n"));
   expectExplained(firstRequest(), "/dev/ipmi-none");
 }
 
-TEST_F(HostMessages, OfAMissingBackEndAreExplained) {
+TEST_F(HostMessagesTest, OfAMissingBackEndAreExplained) {
   installOn(ipmi("connection = inband\n"));
   std::filesystem::remove(INSTALL_PREFIX "/lib/libqvbmc-ipmi.so");
   host().restart();

@@ -10,12 +10,13 @@
 #include <filesystem>
 #include <stdexcept>
 
-#include "tests/e2e/support/CompositeStack.h"
-#include "tests/e2e/support/Poll.h"
+#include "Paths.h"
 #include "tests/hosts/HostProcesses.h"
 #include "tests/hosts/OpenPegasus.h"
 #include "tests/hosts/Sfcb.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Poll.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
 namespace {

@@ -7,8 +7,8 @@
 #include <string>
 #include <vector>
 
-#include "tests/e2e/support/WbemClient.h"
 #include "tests/hosts/Guide.h"
+#include "tests/support/client/WbemClient.h"
 
 namespace Testing {
 
@@ -18,7 +18,7 @@ class ObjectManager : public WbemClient {
  public:
   using Edit = std::function<std::string(const std::string& commands)>;
 
-  // The one of that name, "sfcb" or "openpegasus", as its environment variable says where it is. Gives null where the
+  // The one of that name, "sfcb" or "openpegasus", as its environment variable says where it is. Returns null where the
   // variable is not set, throws std::invalid_argument for another name.
   // @param processes how many the two libraries run in: 1, as they are registered, or 2
   static std::unique_ptr<ObjectManager> find(const std::string& name, int processes);
@@ -26,7 +26,7 @@ class ObjectManager : public WbemClient {
   // The environment variable that holds the prefix of an installation.
   static std::string variableOf(const std::string& name);
 
-  // What has to be there and is not, with what to do about it, in a line; empty where nothing is missing.
+  // What has to be there and is not, with what to do about it, in a line; empty if nothing is missing.
   std::string missing() const;
 
   const std::string& prefix() const { return prefix_; }
@@ -57,7 +57,7 @@ class ObjectManager : public WbemClient {
   static std::string simulatedProcessor();
 
   // Has the object manager end the processes that have the libraries loaded, which it starts again when asked. Gives
-  // false where they do not end.
+  // false if they do not end.
   virtual bool unloadProviders() = 0;
   // Takes back what keeps it from loading them.
   virtual void allowProviders() {}

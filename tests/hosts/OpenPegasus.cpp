@@ -1,6 +1,6 @@
 #include "tests/hosts/OpenPegasus.h"
 
-#include "tests/e2e/support/Poll.h"
+#include "tests/support/system/Poll.h"
 
 namespace Testing {
 namespace {

@@ -4,12 +4,13 @@
 
 #include <filesystem>
 
-#include "tests/e2e/support/Poll.h"
-#include "tests/e2e/support/Process.h"
-#include "tests/e2e/support/Wbem.h"
+#include "Paths.h"
 #include "tests/hosts/Guide.h"
 #include "tests/hosts/HostProcesses.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/client/WbemClient.h"
+#include "tests/support/system/Poll.h"
+#include "tests/support/system/Process.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
@@ -22,7 +23,7 @@ using testing::StartsWith;
 constexpr const char* program = BINARY_DIR "/bin/hosts_test";
 constexpr const char* privateMachine = SOURCE_DIR "/tests/hosts/private-machine";
 
-TEST(HostsProgram, IsSkippedWithALineWhereNoObjectManagerIsGiven) {
+TEST(HostsProgramTest, IsSkippedWithALineWhereNoObjectManagerIsGiven) {
   for (const auto& [name, variable] : {std::pair{"sfcb", "HOSTS_SFCB"}, std::pair{"openpegasus", "HOSTS_PEGASUS"}}) {
     const Completed completed = run({"env", "-u", variable, program, name});
     EXPECT_EQ(completed.status, 77);
@@ -31,7 +32,7 @@ TEST(HostsProgram, IsSkippedWithALineWhereNoObjectManagerIsGiven) {
   }
 }
 
-TEST(HostsProgram, SaysInALineWhatAnInstallationLacks) {
+TEST(HostsProgramTest, SaysInALineWhatAnInstallationLacks) {
   const TemporaryDirectory empty;
   const Completed completed = run({program, "sfcb"}, {{"HOSTS_SFCB", empty.path().string()}});
   EXPECT_EQ(completed.status, 1);
@@ -39,14 +40,14 @@ TEST(HostsProgram, SaysInALineWhatAnInstallationLacks) {
               ElementsAre(AllOf(StartsWith("hosts_test: HOSTS_SFCB: "), HasSubstr("sbin/sfcbd"), HasSubstr("prefix"))));
 }
 
-TEST(HostsProgram, RefusesAnObjectManagerThatItDoesNotKnow) {
+TEST(HostsProgramTest, RefusesAnObjectManagerThatItDoesNotKnow) {
   const Completed completed = run({program, "other"});
   EXPECT_EQ(completed.status, 1);
   EXPECT_THAT(completed.errors, HasSubstr("sfcb or openpegasus"));
   EXPECT_EQ(run({program}).status, 1);
 }
 
-class PrivateMachine : public testing::Test {
+class PrivateMachineTest : public testing::Test {
  protected:
   void SetUp() override {
     const Completed completed = enter("true");
@@ -62,7 +63,7 @@ class PrivateMachine : public testing::Test {
   TemporaryDirectory directory_;
 };
 
-TEST_F(PrivateMachine, KeepsToItselfWhatIsWrittenThere) {
+TEST_F(PrivateMachineTest, KeepsToItselfWhatIsWrittenThere) {
   const std::string file = directory_.write("file", "before").string();
   const Completed completed = enter("echo after > " + file + "; cat " + file + "; echo > /etc/of-private-machine");
   EXPECT_EQ(completed.output, "after\n") << completed.errors;
@@ -70,24 +71,24 @@ TEST_F(PrivateMachine, KeepsToItselfWhatIsWrittenThere) {
   EXPECT_FALSE(std::filesystem::exists("/etc/of-private-machine"));
 }
 
-TEST_F(PrivateMachine, EndsWithAllItsProcesses) {
+TEST_F(PrivateMachineTest, EndsWithAllItsProcesses) {
   const std::string sleeper = (directory_.path() / "sleeper").string();
   std::filesystem::copy_file("/bin/sleep", sleeper);
   EXPECT_EQ(enter(sleeper + " 60 & echo started").output, "started\n");
   EXPECT_TRUE(poll([&] { return processesRunning({sleeper}).empty(); }));
 }
 
-TEST_F(PrivateMachine, EndsAsItsCommandEnds) {
+TEST_F(PrivateMachineTest, EndsAsItsCommandEnds) {
   EXPECT_EQ(enter("exit 3").status, 3);
   EXPECT_EQ(enter("kill -9 $$").status, 137);
 }
 
-TEST(HostsGuide, GivesTheCommandsOfAStep) {
+TEST(HostsGuideTest, GivesTheCommandsOfAStep) {
   EXPECT_THAT(Guide().commands("install"), StartsWith("cmake --install build/default\n"));
   EXPECT_THROW(Guide().commands("no such step"), std::runtime_error);
 }
 
-TEST(HostsGuide, ExplainsTheMessagesOfItsTables) {
+TEST(HostsGuideTest, ExplainsTheMessagesOfItsTables) {
   EXPECT_TRUE(Guide().explains("* wbemcli: Cim: (3) CIM_ERR_INVALID_NAMESPACE: root/yrnse"));
   EXPECT_FALSE(Guide().explains("all is well"));
 }

@@ -2,8 +2,8 @@
 
 #include <filesystem>
 
-#include "tests/e2e/support/Poll.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/Poll.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
 namespace {

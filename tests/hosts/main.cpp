@@ -9,6 +9,7 @@
 #include <exception>
 #include <iostream>
 
+#include "Paths.h"
 #include "tests/hosts/HostTest.h"
 
 namespace {
@@ -23,7 +24,7 @@ int fail(const std::string& reason) {
   return 1;
 }
 
-// Runs the program once more, on a private machine. Comes back only where that cannot be.
+// Runs the program once more, on a private machine. Comes back only if that cannot be.
 int enterPrivateMachine(char** argv, const std::string& prefix) {
   setenv(insideVariable, "1", 1);
   std::vector<std::string> command = {SOURCE_DIR "/tests/hosts/private-machine", prefix, INSTALL_PREFIX, BINARY_DIR,

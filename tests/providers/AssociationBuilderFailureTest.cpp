@@ -2,18 +2,16 @@
 #include <algorithm>
 #include <tuple>
 
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace {
 
-using Testing::AssociationModel;
-using Testing::Outcome;
-using Testing::Strings;
+using namespace Testing;
 
 // The model, and whether what is unusable is a null pointer or an object without a handle.
 using Parameter = std::tuple<AssociationModel, bool>;
 
-class AssociationBuilderFailureTest : public Testing::AssociationTest, public ::testing::WithParamInterface<Parameter> {
+class AssociationBuilderFailureTest : public AssociationTest, public ::testing::WithParamInterface<Parameter> {
  protected:
   AssociationBuilderFailureTest() {
     attach(std::get<0>(GetParam()));
@@ -21,7 +19,7 @@ class AssociationBuilderFailureTest : public Testing::AssociationTest, public ::
   }
 
   static bool isNull() { return std::get<1>(GetParam()); }
-  static CMPIInstance* unusableInstance() { return isNull() ? nullptr : Testing::withoutHandle(); }
+  static CMPIInstance* unusableInstance() { return isNull() ? nullptr : withoutHandle(); }
 
   // Expects what the outcome says, with that many instances built where the builder ends or goes on.
   void expectOutcome(const Outcome& outcome, std::size_t builtAtEnd, std::size_t builtGoingOn) {
@@ -35,7 +33,7 @@ class AssociationBuilderFailureTest : public Testing::AssociationTest, public ::
 
   void expectMessage(const Outcome& outcome) {
     int found = 0;
-    for (const Testing::LogLine& line : Testing::logLines()) {
+    for (const LogLine& line : logLines()) {
       if (line.component == unit().component && line.message.starts_with("MESSAGE ")) {
         ++found;
         EXPECT_EQ(line.level, 6000);
@@ -60,7 +58,7 @@ TEST_P(AssociationBuilderFailureTest, TheOuterEndCannotBeRead) {
 TEST_P(AssociationBuilderFailureTest, AnOuterInstanceIsUnusable) {
   spoil(model().outer, 2, unusableInstance());
   expectOutcome(model().outerIsUnusable, 3, 6);
-  EXPECT_EQ(upCallsFor(Testing::underlyingClassOf(model().inner)),
+  EXPECT_EQ(upCallsFor(underlyingClassOf(model().inner)),
             model().outerIsUnusable.course == Outcome::Course::GoesOn ? 2 : 1);
 }
 
@@ -75,7 +73,7 @@ TEST_P(AssociationBuilderFailureTest, AnInnerInstanceIsUnusable) {
 }
 
 TEST_P(AssociationBuilderFailureTest, ThePathOfAnAssociationCannotBeMade) {
-  faults.unmadePath = isNull() ? nullptr : Testing::pathWithoutHandle();
+  faults.unmadePath = isNull() ? nullptr : pathWithoutHandle();
   faults.failNewObjectPath = [&](const std::string& className, int call) {
     return className == model().className && call == 2;
   };
@@ -97,7 +95,7 @@ TEST_P(AssociationBuilderFailureTest, AnInstanceOfTheAssociationCannotBeMade) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderFailureTest,
-                         ::testing::Combine(::testing::ValuesIn(Testing::associationModels()), ::testing::Bool()),
+                         ::testing::Combine(::testing::ValuesIn(associationModels()), ::testing::Bool()),
                          [](const auto& parameter) {
                            return std::get<0>(parameter.param).className +
                                   (std::get<1>(parameter.param) ? "_null" : "_withoutHandle");

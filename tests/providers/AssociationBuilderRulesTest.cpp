@@ -1,22 +1,21 @@
 // What single builders do beside the pairing: the systems that cannot be had, the flags of element setting data, the
 // markers of ordered members.
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace {
 
-using Testing::homedReference;
-using Testing::number;
-using Testing::Strings;
-namespace Classes = Testing::Classes;
+using namespace Testing;
 
-class HostedAccessPointBuilderTest : public Testing::AssociationTest {};
+namespace Classes = Classes;
+
+class HostedAccessPointBuilderTest : public AssociationTest {};
 
 TEST_F(HostedAccessPointBuilderTest, ABrokerOutOfMemoryForTheComputerSystemsIsAnEmptySuccess) {
-  for (const char* const className : {Classes::hostedAccessPoint, Classes::remoteHostedAccessPoint}) {
-    attach(Testing::modelOf(className));
+  for (const char* className : {Classes::hostedAccessPoint, Classes::remoteHostedAccessPoint}) {
+    attach(modelOf(className));
     addEnds({"bmc0"}, {"one"});
     faults.failNewArray = true;
-    Testing::logLines().clear();
+    logLines().clear();
     std::vector<CMPIInstance*> out;
     EXPECT_EQ(build(out), 0);
     EXPECT_TRUE(out.empty());
@@ -24,10 +23,10 @@ TEST_F(HostedAccessPointBuilderTest, ABrokerOutOfMemoryForTheComputerSystemsIsAn
   }
 }
 
-class ElementSettingDataBuilderTest : public Testing::AssociationTest {
+class ElementSettingDataBuilderTest : public AssociationTest {
  protected:
   ElementSettingDataBuilderTest() {
-    attach(Testing::modelOf(Classes::elementSettingData));
+    attach(modelOf(Classes::elementSettingData));
     addEnds({"eth0"}, {"BMC:eth0:static"});
   }
 
@@ -35,7 +34,7 @@ class ElementSettingDataBuilderTest : public Testing::AssociationTest {
   std::string flagsFor(CMPIObjectPath* sequencePath) {
     faults.onNewInstance = [=](const std::string& className, int, CMPIInstance* instance) {
       if (className == Classes::sequence) {
-        Testing::withPath(instance, sequencePath);
+        withPath(instance, sequencePath);
       }
     };
     std::vector<CMPIInstance*> out;
@@ -71,20 +70,18 @@ TEST_F(ElementSettingDataBuilderTest, EmptyFieldsDoNotCount) {
 TEST_F(ElementSettingDataBuilderTest, AnIdentifierThatCannotBeReadIsDefaultAndCurrent) {
   EXPECT_EQ(flagsFor(makePath(Classes::sequence)), "1 1 3");
   const CMPIData nullString = {CMPI_string, CMPI_keyValue, {}};
-  EXPECT_EQ(flagsFor(Testing::withKey(makePath(Classes::sequence), "InstanceID", nullString)), "1 1 3");
+  EXPECT_EQ(flagsFor(withKey(makePath(Classes::sequence), "InstanceID", nullString)), "1 1 3");
   const CMPIData nullValue = {CMPI_string, CMPI_keyValue | CMPI_nullValue, {}};
-  EXPECT_EQ(flagsFor(Testing::withKey(makePath(Classes::sequence), "InstanceID", nullValue)), "1 1 3");
+  EXPECT_EQ(flagsFor(withKey(makePath(Classes::sequence), "InstanceID", nullValue)), "1 1 3");
 }
 
 TEST_F(ElementSettingDataBuilderTest, AnIdentifierThatWasReadWithAnErrorIsDefaultAndCurrentEvenWithAValueBesideIt) {
   CMPIData identifier = {CMPI_string, CMPI_keyValue, {}};
   identifier.value.string = CMNewString(faults.real(), "BMC:eth0:static", nullptr);
-  const auto path = [&](CMPIrc rc) {
-    return Testing::withKey(makePath(Classes::sequence), "InstanceID", identifier, rc);
-  };
+  const auto path = [&](CMPIrc rc) { return withKey(makePath(Classes::sequence), "InstanceID", identifier, rc); };
   EXPECT_EQ(flagsFor(path(CMPI_RC_OK)), "2 2 3");
   EXPECT_EQ(flagsFor(path(CMPI_RC_ERR_FAILED)), "1 1 3");
-  identifier.value.string = Testing::withCode(identifier.value.string, CMPI_RC_ERR_FAILED);
+  identifier.value.string = withCode(identifier.value.string, CMPI_RC_ERR_FAILED);
   EXPECT_EQ(flagsFor(path(CMPI_RC_OK)), "1 1 3");
 }
 
@@ -98,13 +95,13 @@ TEST_F(ElementSettingDataBuilderTest, TheEndpointPlaysNoPart) {
   EXPECT_EQ(flagsOf(out[1]), "2 2 3");
 }
 
-class OrderedMemberBuilderTest : public Testing::AssociationTest, public ::testing::WithParamInterface<const char*> {
+class OrderedMemberBuilderTest : public AssociationTest, public ::testing::WithParamInterface<const char*> {
  protected:
   OrderedMemberBuilderTest()
       : isStatic(GetParam() == std::string(Classes::staticOrderedMember)),
         marker(isStatic ? "static" : "dhcp"),
         othersMarker(isStatic ? "dhcp" : "static") {
-    attach(Testing::modelOf(GetParam()));
+    attach(modelOf(GetParam()));
   }
 
   // The group components of what is built, in order.
@@ -112,8 +109,8 @@ class OrderedMemberBuilderTest : public Testing::AssociationTest, public ::testi
     std::vector<CMPIInstance*> out;
     EXPECT_EQ(build(out), 0);
     Strings all;
-    for (const CMPIInstance* const instance : out) {
-      all.push_back(Testing::render(Testing::reference(instance, "GroupComponent")));
+    for (const CMPIInstance* instance : out) {
+      all.push_back(render(reference(instance, "GroupComponent")));
     }
     return all;
   }
@@ -151,8 +148,8 @@ TEST_P(OrderedMemberBuilderTest, ASettingsIdentifierIsReadOnceForEverySetting) {
   Strings read;
   faults.onNewInstance = [&](const std::string& className, int call, CMPIInstance* instance) {
     if (className == model().outer) {
-      Testing::withPath(instance, Testing::withKeysRecorded(
-                                      makePath(className, {{"InstanceID", "BMC:eth" + std::to_string(call)}}), read));
+      withPath(instance,
+               withKeysRecorded(makePath(className, {{"InstanceID", "BMC:eth" + std::to_string(call)}}), read));
     }
   };
   EXPECT_EQ(groups(), (Strings{sequence("BMC:eth0:" + marker), sequence("BMC:eth0:" + marker)}));
@@ -163,7 +160,7 @@ TEST_P(OrderedMemberBuilderTest, ASequenceWithoutReadableIdentifierHasNoMembers)
   addEnds({"BMC:eth0"}, {"BMC:eth0:" + marker});
   faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
     if (className == Classes::sequence) {
-      Testing::withPath(instance, makePath(Classes::sequence));
+      withPath(instance, makePath(Classes::sequence));
     }
   };
   EXPECT_EQ(groups(), Strings{});

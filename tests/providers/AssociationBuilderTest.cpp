@@ -1,21 +1,18 @@
 // What the six builders make when nothing goes wrong: pairs, order, properties, paths, up-calls and the frame.
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace {
 
-using Testing::AssociationModel;
-using Testing::homedReference;
-using Testing::renderPair;
-using Testing::Strings;
+using namespace Testing;
 
-class AssociationBuilderTest : public Testing::AssociationTest, public ::testing::WithParamInterface<AssociationModel> {
+class AssociationBuilderTest : public AssociationTest, public ::testing::WithParamInterface<AssociationModel> {
  protected:
   AssociationBuilderTest() { attach(GetParam()); }
 
   // "outer -> inner" of every instance.
   Strings pairs() const {
     Strings all;
-    for (const CMPIInstance* const instance : out) {
+    for (const CMPIInstance* instance : out) {
       all.push_back(renderPair(instance, model().propertyOfOuter, model().propertyOfInner));
     }
     return all;
@@ -41,7 +38,7 @@ TEST_P(AssociationBuilderTest, PairsEveryOuterWithEveryInnerOuterByOuter) {
 
 TEST_P(AssociationBuilderTest, AppendsToWhatIsThere) {
   addEnds(1, 1);
-  CMPIInstance* const earlier = Testing::withoutHandle();
+  CMPIInstance* earlier = withoutHandle();
   out = {earlier};
   EXPECT_EQ(build(out), 0);
   ASSERT_EQ(out.size(), 2U);
@@ -73,27 +70,27 @@ TEST_P(AssociationBuilderTest, TheClientsPropertyListFiltersTheAssociationAndNot
 
 TEST_P(AssociationBuilderTest, EveryPathHasTheRequestsNamespaceAndTheSystemsName) {
   addEnds(1, 1);
-  CMPIObjectPath* const request = makePath(model().className);
+  CMPIObjectPath* request = makePath(model().className);
   CMSetNameSpace(request, "root/other");
   CMSetHostname(request, "client.example");
   EXPECT_EQ(model().build(request, nullptr, context(), out), 0);
   ASSERT_EQ(out.size(), 1U);
   const auto rehomed = [](const std::string& className, const std::string& name) {
-    return Testing::rendered(Testing::hostOfReference(Testing::systemName()), "root/other", className, name);
+    return rendered(hostOfReference(systemName()), "root/other", className, name);
   };
   EXPECT_EQ(renderPair(out[0], model().propertyOfOuter, model().propertyOfInner),
             rehomed(model().outer, model().outerNames[0]) + " -> " + rehomed(model().inner, model().innerNames[0]));
-  const CMPIObjectPath* const path = Testing::pathOf(out[0]);
-  EXPECT_EQ(Testing::classOf(path), model().className);
-  EXPECT_EQ(Testing::nameSpaceOf(path), "root/other");
-  EXPECT_EQ(Testing::hostOf(path), Testing::hostOfInstance(Testing::systemName()));
+  const CMPIObjectPath* path = pathOf(out[0]);
+  EXPECT_EQ(classOf(path), model().className);
+  EXPECT_EQ(nameSpaceOf(path), "root/other");
+  EXPECT_EQ(hostOf(path), hostOfInstance(systemName()));
 }
 
 TEST_P(AssociationBuilderTest, ThePathsOfTheInstancesHaveTheReferencesAsKeys) {
   addEnds(1, 1);
   EXPECT_EQ(build(out), 0);
   ASSERT_EQ(out.size(), 1U);
-  const CMPIObjectPath* const path = Testing::pathOf(out[0]);
+  const CMPIObjectPath* path = pathOf(out[0]);
   EXPECT_EQ(CMGetKeyCount(path, nullptr), 2U);
   EXPECT_EQ(renderPair(path, model().propertyOfOuter, model().propertyOfInner), pairOf(0, 0));
 }
@@ -101,14 +98,14 @@ TEST_P(AssociationBuilderTest, ThePathsOfTheInstancesHaveTheReferencesAsKeys) {
 TEST_P(AssociationBuilderTest, ReadsTheOuterEndOnceAndTheInnerEndAfreshForEveryOuter) {
   addEnds(2, 1);
   // What appears while the builder runs is seen by the next outer instance.
-  faults.onUpCall = [&](const Testing::UpCall&) {
+  faults.onUpCall = [&](const UpCall&) {
     if (faults.upCalls.size() == 3) {
       AssociationTest::add(model().inner, model().innerNames[1]);
     }
   };
   EXPECT_EQ(build(out), 0);
-  const std::string outer = Testing::underlyingClassOf(model().outer);
-  const std::string inner = Testing::underlyingClassOf(model().inner);
+  const std::string outer = underlyingClassOf(model().outer);
+  const std::string inner = underlyingClassOf(model().inner);
   EXPECT_EQ(underlyingCalls(), (Strings{outer, inner, inner}));
   EXPECT_EQ(pairs(), (Strings{pairOf(0, 0), pairOf(1, 0), pairOf(1, 1)}));
 }
@@ -117,7 +114,7 @@ TEST_P(AssociationBuilderTest, WithoutOuterInstancesNothingIsBuiltAndTheInnerEnd
   addEnds(0, 2);
   EXPECT_EQ(build(out), 0);
   EXPECT_TRUE(out.empty());
-  EXPECT_EQ(underlyingCalls(), (Strings{Testing::underlyingClassOf(model().outer)}));
+  EXPECT_EQ(underlyingCalls(), (Strings{underlyingClassOf(model().outer)}));
   EXPECT_EQ(unitLines(), framed(model().builderName));
 }
 
@@ -131,10 +128,10 @@ TEST_P(AssociationBuilderTest, WithoutInnerInstancesNothingIsBuilt) {
 
 TEST_P(AssociationBuilderTest, AnEnumerationThatTheBrokerRefusesYieldsAnEmptyEnd) {
   addEnds(2, 2);
-  faults.upCallScripts[Testing::underlyingClassOf(model().inner)].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+  faults.upCallScripts[underlyingClassOf(model().inner)].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
   EXPECT_EQ(build(out), 0);
   EXPECT_EQ(faults.upCalls.size(), 3U);
-  faults.upCallScripts[Testing::underlyingClassOf(model().outer)].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+  faults.upCallScripts[underlyingClassOf(model().outer)].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
   EXPECT_EQ(build(out), 0);
   EXPECT_EQ(faults.upCalls.size(), 4U);
   EXPECT_TRUE(out.empty());
@@ -144,15 +141,15 @@ TEST_P(AssociationBuilderTest, IsFramedByItsMarkersAtTheirSourceLines) {
   addEnds(1, 1);
   EXPECT_EQ(build(out), 0);
   EXPECT_EQ(unitLines(), framed(model().builderName));
-  for (const Testing::LogLine& line : Testing::logLines()) {
+  for (const LogLine& line : logLines()) {
     if (line.component == unit().component) {
       EXPECT_EQ(line.level, 4000) << line.message;
     }
   }
   if (model().entryLine != 0) {
     const std::string location = model().builderName + "() in " + unit().file + " [Line: ";
-    Testing::lineWith("ENTERING: " + location + std::to_string(model().entryLine) + "]");
-    Testing::lineWith("EXITING: " + location + std::to_string(model().exitLine) + "]");
+    lineWith("ENTERING: " + location + std::to_string(model().entryLine) + "]");
+    lineWith("EXITING: " + location + std::to_string(model().exitLine) + "]");
   }
 }
 
@@ -160,7 +157,7 @@ TEST_P(AssociationBuilderTest, EndsWithoutPathAreSkipped) {
   addEnds(2, 2);
   faults.onNewInstance = [&](const std::string& className, int call, CMPIInstance* instance) {
     if ((className == model().outer || className == model().inner) && call == 1) {
-      Testing::withoutPath(instance);
+      withoutPath(instance);
     }
   };
   EXPECT_EQ(build(out), 0);
@@ -169,7 +166,7 @@ TEST_P(AssociationBuilderTest, EndsWithoutPathAreSkipped) {
   EXPECT_EQ(unitLines(), framed(model().builderName));
 }
 
-INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderTest, ::testing::ValuesIn(Testing::associationModels()),
+INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderTest, ::testing::ValuesIn(associationModels()),
                          [](const auto& parameter) { return parameter.param.className; });
 
 }  // namespace

@@ -1,4 +1,4 @@
-#include "AssociationDirection.h"
+#include "tests/providers/AssociationDirection.h"
 
 namespace Testing {
 

@@ -4,7 +4,7 @@
 
 #include <tuple>
 
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace Testing {
 

@@ -1,21 +1,13 @@
 // GetInstance, EnumInstances and EnumInstanceNames of the six association classes.
 #include <algorithm>
 
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace {
 
-using Testing::Answer;
-using Testing::AssociationModel;
-using Testing::homedReference;
-using Testing::Outcome;
-using Testing::Reading;
-using Testing::readings;
-using Testing::renderPair;
-using Testing::Strings;
+using namespace Testing;
 
-class AssociationInstancesTest : public Testing::AssociationTest,
-                                 public ::testing::WithParamInterface<AssociationModel> {
+class AssociationInstancesTest : public AssociationTest, public ::testing::WithParamInterface<AssociationModel> {
  protected:
   AssociationInstancesTest() { attach(GetParam()); }
 
@@ -38,7 +30,7 @@ class AssociationInstancesTest : public Testing::AssociationTest,
   template <typename Objects>
   Strings pairsOf(const Objects& objects) const {
     Strings pairs;
-    for (const auto* const object : objects) {
+    for (const auto* object : objects) {
       pairs.push_back(renderPair(object, model().propertyOfOuter, model().propertyOfInner));
     }
     return pairs;
@@ -47,7 +39,7 @@ class AssociationInstancesTest : public Testing::AssociationTest,
   // The path of the association of that number, from 0, as a client sends it back: with hosts of its own.
   CMPIObjectPath* clientPathOf(std::size_t number) {
     const Answer names = read(Reading::EnumInstanceNames, classPath());
-    CMPIObjectPath* const path = classPath();
+    CMPIObjectPath* path = classPath();
     for (const std::string& key : {model().propertyOfOuter, model().propertyOfInner}) {
       const CMPIData data = CMGetKey(names.paths.at(number), key.c_str(), nullptr);
       CMSetHostname(data.value.ref, "client.example");
@@ -57,7 +49,7 @@ class AssociationInstancesTest : public Testing::AssociationTest,
     return path;
   }
   void forget() {
-    Testing::logLines().clear();
+    logLines().clear();
     faults.upCalls.clear();
     faults.instanceCalls.clear();
   }
@@ -86,11 +78,11 @@ TEST_P(AssociationInstancesTest, EnumInstanceNamesAnswersAllPathsAndIsDone) {
   const Answer answer = read(Reading::EnumInstanceNames, classPath());
   EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
   EXPECT_EQ(pairsOf(answer.paths), allPairs());
-  for (const CMPIObjectPath* const path : answer.paths) {
-    EXPECT_EQ(Testing::classOf(path), model().className);
-    EXPECT_EQ(Testing::nameSpaceOf(path), Testing::requestNameSpace);
+  for (const CMPIObjectPath* path : answer.paths) {
+    EXPECT_EQ(classOf(path), model().className);
+    EXPECT_EQ(nameSpaceOf(path), requestNameSpace);
     // The path goes out as the instance has it.
-    EXPECT_EQ(Testing::hostOf(path), Testing::hostOfInstance(Testing::systemName()));
+    EXPECT_EQ(hostOf(path), hostOfInstance(systemName()));
     EXPECT_EQ(CMGetKeyCount(path, nullptr), 2U);
   }
   Strings order(9, "path");
@@ -108,7 +100,7 @@ TEST_P(AssociationInstancesTest, GetInstanceAnswersTheOneThatTheClientNames) {
 
 TEST_P(AssociationInstancesTest, GetInstanceAnswersTheFirstOfSeveralMatches) {
   addEnds({model().outerNames[0], model().outerNames[0]}, {model().innerNames[0]});
-  const CMPIObjectPath* const path = clientPathOf(1);
+  const CMPIObjectPath* path = clientPathOf(1);
   std::vector<const CMPIInstance*> made;
   faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
     if (className == model().className) {
@@ -123,7 +115,7 @@ TEST_P(AssociationInstancesTest, GetInstanceAnswersTheFirstOfSeveralMatches) {
 
 TEST_P(AssociationInstancesTest, GetInstanceOfNoSuchAssociationIsNoErrorAndAnswersNothing) {
   addThreeOfEach();
-  const CMPIObjectPath* const path = clientPathOf(0);
+  const CMPIObjectPath* path = clientPathOf(0);
   faults.upCallScripts.clear();
   addEnds({model().outerNames[1]}, {model().innerNames[1]});
   const Answer answer = read(Reading::GetInstance, path);
@@ -133,11 +125,11 @@ TEST_P(AssociationInstancesTest, GetInstanceOfNoSuchAssociationIsNoErrorAndAnswe
 
 TEST_P(AssociationInstancesTest, GetInstanceComparesTheNamespaceToo) {
   addEnds({model().outerNames[0]}, {model().innerNames[0]});
-  const CMPIObjectPath* const path = clientPathOf(0);
-  CMPIObjectPath* const candidate = clientPathOf(0);
+  const CMPIObjectPath* path = clientPathOf(0);
+  CMPIObjectPath* candidate = clientPathOf(0);
   faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
     if (className == model().className) {
-      Testing::withPath(instance, candidate);
+      withPath(instance, candidate);
     }
   };
   EXPECT_EQ(read(Reading::GetInstance, path).order, (Strings{"instance", "done"}));
@@ -147,14 +139,14 @@ TEST_P(AssociationInstancesTest, GetInstanceComparesTheNamespaceToo) {
 
 TEST_P(AssociationInstancesTest, GetInstanceWithoutKeysIsNoErrorSaysSoAndReadsNothing) {
   addThreeOfEach();
-  const Answer answer = read(Reading::GetInstance, Testing::countingNoKeys(classPath()));
+  const Answer answer = read(Reading::GetInstance, countingNoKeys(classPath()));
   EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
   EXPECT_EQ(answer.status.msg, nullptr);
   EXPECT_EQ(answer.order, (Strings{"done"}));
   EXPECT_TRUE(faults.upCalls.empty());
   EXPECT_TRUE(faults.traces.empty());
   EXPECT_EQ(unitLines(), framedAround(Reading::GetInstance, {messageLine("At least one key should be passed")}));
-  for (const Testing::LogLine& line : Testing::logLines()) {
+  for (const LogLine& line : logLines()) {
     EXPECT_EQ(line.level, line.message.starts_with("MESSAGE ") ? 6000 : 4000) << line.message;
   }
 }
@@ -163,7 +155,7 @@ TEST_P(AssociationInstancesTest, IsFramedByTheProvidersMarkersAroundTheBuilders)
   addThreeOfEach();
   for (const Reading reading : readings) {
     SCOPED_TRACE(nameOf(reading));
-    const CMPIObjectPath* const path = clientPathOf(0);
+    const CMPIObjectPath* path = clientPathOf(0);
     read(reading, path);
     EXPECT_EQ(unitLines(), framedAround(reading, framed(model().builderName)));
     EXPECT_EQ(faults.upCalls.size(), 4U);
@@ -175,7 +167,7 @@ TEST_P(AssociationInstancesTest, ThePropertyListFiltersInstancesAndNotNames) {
   const char* properties[] = {"Caption", nullptr};
   for (const Reading reading : readings) {
     SCOPED_TRACE(nameOf(reading));
-    const CMPIObjectPath* const path = clientPathOf(0);
+    const CMPIObjectPath* path = clientPathOf(0);
     read(reading, path, properties);
     EXPECT_EQ(filterOfAssociation(), std::string("setPropertyFilter(") +
                                          (reading == Reading::EnumInstanceNames ? "null" : "Caption") + "; " +
@@ -185,7 +177,7 @@ TEST_P(AssociationInstancesTest, ThePropertyListFiltersInstancesAndNotNames) {
 
 TEST_P(AssociationInstancesTest, AnUnmadeInstanceIsAnsweredAsItIsAndHasNoName) {
   addThreeOfEach();
-  for (CMPIInstance* const unusable : {static_cast<CMPIInstance*>(nullptr), Testing::withoutHandle()}) {
+  for (CMPIInstance* unusable : {static_cast<CMPIInstance*>(nullptr), withoutHandle()}) {
     faults.unmadeInstance = unusable;
     faults.failNewInstance = [&](const std::string& className, int call) {
       return className == model().className && call % 9 == 2;  // the second of each nine
@@ -208,10 +200,10 @@ TEST_P(AssociationInstancesTest, AnUnmadeInstanceIsAnsweredAsItIsAndHasNoName) {
 
 TEST_P(AssociationInstancesTest, AnInstanceWithoutPathHasNoNameAndMatchesNothing) {
   addThreeOfEach();
-  const CMPIObjectPath* const path = clientPathOf(0);
+  const CMPIObjectPath* path = clientPathOf(0);
   faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
     if (className == model().className) {
-      Testing::withoutPath(instance);
+      withoutPath(instance);
     }
   };
   EXPECT_EQ(read(Reading::EnumInstances, classPath()).instances.size(), 9U);
@@ -221,7 +213,7 @@ TEST_P(AssociationInstancesTest, AnInstanceWithoutPathHasNoNameAndMatchesNothing
 
 TEST_P(AssociationInstancesTest, AFailedBuilderAnswersNothingAndIsDoneAllTheSame) {
   addThreeOfEach();
-  const CMPIObjectPath* const path = clientPathOf(0);
+  const CMPIObjectPath* path = clientPathOf(0);
   for (const Reading reading : readings) {
     SCOPED_TRACE(nameOf(reading));
     forget();
@@ -240,7 +232,7 @@ TEST_P(AssociationInstancesTest, AFailedBuilderAnswersNothingAndIsDoneAllTheSame
 
 TEST_P(AssociationInstancesTest, AnOuterEndThatCannotBeReadAnswersNothingWithoutError) {
   addThreeOfEach();
-  const CMPIObjectPath* const path = clientPathOf(0);
+  const CMPIObjectPath* path = clientPathOf(0);
   for (const Reading reading : readings) {
     SCOPED_TRACE(nameOf(reading));
     forget();
@@ -254,8 +246,8 @@ TEST_P(AssociationInstancesTest, AnOuterEndThatCannotBeReadAnswersNothingWithout
 
 TEST_P(AssociationInstancesTest, AnEnumerationThatTheBrokerRefusesAnswersNothingWithoutError) {
   addThreeOfEach();
-  const CMPIObjectPath* const path = clientPathOf(0);
-  faults.upCallScripts[Testing::underlyingClassOf(model().outer)].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+  const CMPIObjectPath* path = clientPathOf(0);
+  faults.upCallScripts[underlyingClassOf(model().outer)].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
   for (const Reading reading : readings) {
     SCOPED_TRACE(nameOf(reading));
     const Answer answer = read(reading, path);
@@ -264,7 +256,7 @@ TEST_P(AssociationInstancesTest, AnEnumerationThatTheBrokerRefusesAnswersNothing
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Six, AssociationInstancesTest, ::testing::ValuesIn(Testing::associationModels()),
+INSTANTIATE_TEST_SUITE_P(Six, AssociationInstancesTest, ::testing::ValuesIn(associationModels()),
                          [](const auto& parameter) { return parameter.param.className; });
 
 }  // namespace

@@ -3,14 +3,11 @@
 #include <algorithm>
 #include <cctype>
 
-#include "AssociationDirection.h"
+#include "tests/providers/AssociationDirection.h"
 
 namespace {
 
-using Testing::Answer;
-using Testing::Navigation;
-using Testing::navigations;
-using Testing::Strings;
+using namespace Testing;
 
 bool isReference(Navigation navigation) {
   return navigation == Navigation::References || navigation == Navigation::ReferenceNames;
@@ -21,12 +18,12 @@ std::string nullMessage(Navigation navigation) {
   return "Object Path is NULL in " + std::string(isReference(navigation) ? "References" : nameOf(navigation)) + ".";
 }
 
-class AssociationNavigationFailureTest : public Testing::AssociationDirectionTest {
+class AssociationNavigationFailureTest : public AssociationDirectionTest {
  protected:
   // Runs an operation that finds no far end: nothing is read or answered, and it breaks off with its message.
   void expectNoFarEnd(Navigation navigation, const CMPIObjectPath* path, const char* associationClass, CMPIrc rc) {
     SCOPED_TRACE(nameOf(navigation));
-    Testing::logLines().clear();
+    logLines().clear();
     const Answer answer = navigate(navigation, path, associationClass);
     EXPECT_EQ(answer.status.rc, rc);
     EXPECT_TRUE(answer.order.empty());
@@ -40,7 +37,7 @@ class AssociationNavigationFailureTest : public Testing::AssociationDirectionTes
 
   std::vector<int> failureLevels() const {
     std::vector<int> levels;
-    for (const Testing::LogLine& line : Testing::logLines()) {
+    for (const LogLine& line : logLines()) {
       if (line.component == unit().component && line.message.starts_with("MESSAGE ")) {
         levels.push_back(line.level);
       }
@@ -53,13 +50,13 @@ class AssociationNavigationFailureTest : public Testing::AssociationDirectionTes
     const Answer answer = navigate(navigation, source());
     EXPECT_EQ(unitLines(), framed(unit().prefix + nameOf(navigation)));
     Strings result;
-    for (const CMPIInstance* const instance : answer.instances) {
+    for (const CMPIInstance* instance : answer.instances) {
       result.push_back(CMIsNullObject(instance) ? "null" : "instance");
     }
-    for (const CMPIObjectPath* const path : answer.paths) {
+    for (const CMPIObjectPath* path : answer.paths) {
       result.push_back(CMIsNullObject(path) ? "null" : "path");
     }
-    Testing::logLines().clear();
+    logLines().clear();
     return result;
   }
 
@@ -70,10 +67,8 @@ class AssociationNavigationFailureTest : public Testing::AssociationDirectionTes
   }
 
   // How many of three there are where the object manager does not know the class.
-  const std::size_t instancesOfUnknownClass =
-      Testing::personality().unknownClass == Testing::UnknownClass::HasNoInstance ? 0 : 3;
-  const std::size_t namesOfUnknownClass =
-      Testing::personality().unknownClass == Testing::UnknownClass::HasKeylessPaths ? 3 : 0;
+  const std::size_t instancesOfUnknownClass = personality().unknownClass == UnknownClass::HasNoInstance ? 0 : 3;
+  const std::size_t namesOfUnknownClass = personality().unknownClass == UnknownClass::HasKeylessPaths ? 3 : 0;
 
   void spoilFar(CMPIInstance* unusable) {
     // Every reading counts on from the one before: the second of each three.
@@ -91,14 +86,14 @@ TEST_P(AssociationNavigationFailureTest, ASourceOutsideTheModelIsNoErrorAndAnswe
 }
 
 TEST_P(AssociationNavigationFailureTest, AnAssociationOutsideTheModelIsNoErrorAndAnswersNothing) {
-  for (const char* const associationClass : {"CIM_Dependency", "", static_cast<const char*>(nullptr)}) {
+  for (const char* associationClass : {"CIM_Dependency", "", static_cast<const char*>(nullptr)}) {
     expectNoFarEnd(Navigation::Associators, source(), associationClass, CMPI_RC_OK);
     expectNoFarEnd(Navigation::AssociatorNames, source(), associationClass, CMPI_RC_OK);
   }
 }
 
 TEST_P(AssociationNavigationFailureTest, ATargetPathThatTheBrokerCannotMakeBreaksOff) {
-  for (CMPIObjectPath* const unusable : {static_cast<CMPIObjectPath*>(nullptr), Testing::pathWithoutHandle()}) {
+  for (CMPIObjectPath* unusable : {static_cast<CMPIObjectPath*>(nullptr), pathWithoutHandle()}) {
     faults.unmadePath = unusable;
     faults.failNewObjectPath = [this](const std::string& className, int) { return className == farClass(); };
     for (const Navigation navigation : navigations) {
@@ -117,7 +112,7 @@ TEST_P(AssociationNavigationFailureTest, TheTargetsClassIsComparedToTheLetter) {
   faults.failNewObjectPath = [this](const std::string& className, int) { return className == farClass(); };
   for (const Navigation navigation : navigations) {
     SCOPED_TRACE(nameOf(navigation));
-    Testing::logLines().clear();
+    logLines().clear();
     EXPECT_TRUE(navigate(navigation, source()).order.empty());
     EXPECT_TRUE(faults.upCalls.empty());
     EXPECT_EQ(unitLines(), framed(unit().prefix + nameOf(navigation)));
@@ -127,7 +122,7 @@ TEST_P(AssociationNavigationFailureTest, TheTargetsClassIsComparedToTheLetter) {
 TEST_P(AssociationNavigationFailureTest, AFarEndThatCannotBeReadEndsWithoutExitMarker) {
   for (const Navigation navigation : navigations) {
     SCOPED_TRACE(nameOf(navigation));
-    Testing::logLines().clear();
+    logLines().clear();
     refuseReading(farClass(), 1);
     const Answer answer = navigate(navigation, source());
     EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
@@ -139,9 +134,9 @@ TEST_P(AssociationNavigationFailureTest, AFarEndThatCannotBeReadEndsWithoutExitM
 TEST_P(AssociationNavigationFailureTest, AnEnumerationThatTheBrokerRefusesLeavesItsStatus) {
   for (const Navigation navigation : navigations) {
     SCOPED_TRACE(nameOf(navigation));
-    Testing::logLines().clear();
-    const CMPIObjectPath* const path = source();
-    faults.upCallScripts[Testing::underlyingClassOf(farClass())].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    logLines().clear();
+    const CMPIObjectPath* path = source();
+    faults.upCallScripts[underlyingClassOf(farClass())].status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
     const Answer answer = navigate(navigation, path);
     EXPECT_EQ(answer.status.rc, CMPI_RC_ERR_ACCESS_DENIED);
     EXPECT_TRUE(answer.order.empty());
@@ -150,7 +145,7 @@ TEST_P(AssociationNavigationFailureTest, AnEnumerationThatTheBrokerRefusesLeaves
 }
 
 TEST_P(AssociationNavigationFailureTest, AFarInstanceThatCouldNotBeMadeIsAnsweredAsItIsAndHasNoName) {
-  for (CMPIInstance* const unusable : {static_cast<CMPIInstance*>(nullptr), Testing::withoutHandle()}) {
+  for (CMPIInstance* unusable : {static_cast<CMPIInstance*>(nullptr), withoutHandle()}) {
     spoilFar(unusable);
     // Without an "InstanceID" nothing is associated where the identifiers decide.
     const bool skips = model().pairsByIdentifier;
@@ -170,15 +165,15 @@ TEST_P(AssociationNavigationFailureTest, AReferenceToAnUnmadeFarInstanceHasItsSo
   spoilFar(nullptr);
   const Answer answer = navigate(Navigation::References, source());
   ASSERT_EQ(answer.instances.size(), 3U);
-  const CMPIInstance* const reference = answer.instances[1];
-  EXPECT_EQ(Testing::render(Testing::reference(reference, referenceToSource())), sourceReference());
+  const CMPIInstance* reference = answer.instances[1];
+  EXPECT_EQ(render(Testing::reference(reference, referenceToSource())), sourceReference());
   EXPECT_EQ(Testing::reference(reference, referenceToFar()), nullptr);
 }
 
 TEST_P(AssociationNavigationFailureTest, AFarInstanceWithoutPathHasNoName) {
   faults.onNewInstance = [this](const std::string& className, int call, CMPIInstance* instance) {
     if (className == farClass() && call % 3 == 2) {
-      Testing::withoutPath(instance);
+      withoutPath(instance);
     }
   };
   EXPECT_EQ(answered(Navigation::Associators), (Strings{"instance", "instance", "instance"}));
@@ -187,7 +182,7 @@ TEST_P(AssociationNavigationFailureTest, AFarInstanceWithoutPathHasNoName) {
 }
 
 TEST_P(AssociationNavigationFailureTest, AReferenceThatCouldNotBeMadeIsAnsweredAsItIsAndHasNoName) {
-  for (CMPIInstance* const unusable : {static_cast<CMPIInstance*>(nullptr), Testing::withoutHandle()}) {
+  for (CMPIInstance* unusable : {static_cast<CMPIInstance*>(nullptr), withoutHandle()}) {
     faults.unmadeInstance = unusable;
     faults.failNewInstance = [this](const std::string& className, int call) {
       return className == model().className && call % 3 == 2;
@@ -204,18 +199,18 @@ TEST_P(AssociationNavigationFailureTest, WithoutAPathForTheAssociationNoReferenc
 }
 
 TEST_P(AssociationNavigationFailureTest, AFarEndOfAClassThatTheObjectManagerDoesNotKnowIsAnsweredAsFarAsItCanBeMade) {
-  const CMPIObjectPath* const path = source();
+  const CMPIObjectPath* path = source();
   faults.forgetClass(farClass());
   EXPECT_EQ(usable(navigate(Navigation::Associators, path)), instancesOfUnknownClass);
   EXPECT_EQ(navigate(Navigation::AssociatorNames, path).order.size(), namesOfUnknownClass);
   EXPECT_EQ(navigate(Navigation::ReferenceNames, path).order.size(), namesOfUnknownClass);
-  for (const CMPIInstance* const reference : navigate(Navigation::References, path).instances) {
+  for (const CMPIInstance* reference : navigate(Navigation::References, path).instances) {
     EXPECT_EQ(Testing::reference(reference, referenceToFar()) != nullptr, namesOfUnknownClass > 0);
   }
 }
 
 TEST_P(AssociationNavigationFailureTest, AnAssociationThatTheObjectManagerDoesNotKnowIsAnsweredAsFarAsItCanBeMade) {
-  const CMPIObjectPath* const path = source();
+  const CMPIObjectPath* path = source();
   faults.forgetClass(model().className);
   EXPECT_EQ(usable(navigate(Navigation::Associators, path)), 3U);
   EXPECT_EQ(navigate(Navigation::AssociatorNames, path).paths.size(), 3U);

@@ -1,4 +1,4 @@
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 #include <regex>
 #include <stdexcept>
@@ -8,31 +8,6 @@ namespace Testing {
 namespace {
 
 const std::string rule(78, '=');
-
-struct Composite {
-  std::string compositeClass;
-  std::string underlyingClass;
-  const char* key;
-  Properties properties;  // besides the key, that make it belong to the processor
-};
-
-const Composite& compositeOf(const std::string& compositeClass) {
-  static const Properties owned = {{"SystemCreationClassName", "YRNQV_SPComputerSystem"}, {"SystemName", "bmc0"}};
-  static const std::vector<Composite> composites = {
-      {Classes::computerSystem, "YRNQV_SPComputerSystem", "Name", {}},
-      {Classes::endpoint, "YRNQV_IPProtocolEndpoint", "Name", owned},
-      {Classes::remoteAccessPoint, "YRNQV_IPRemoteServiceAccessPoint", "Name", owned},
-      {Classes::sequence, "YRNQV_IPAssignmentSettingData", "InstanceID", {}},
-      {Classes::staticSetting, "YRNQV_StaticIPAssignmentSettingData", "InstanceID", {}},
-      {Classes::dhcpSetting, "YRNQV_DHCPSettingData", "InstanceID", {}},
-  };
-  for (const Composite& composite : composites) {
-    if (composite.compositeClass == compositeClass) {
-      return composite;
-    }
-  }
-  throw std::invalid_argument("no composite class is called " + compositeClass);
-}
 
 }  // namespace
 
@@ -70,10 +45,13 @@ void AssociationTest::attach(const AssociationModel& model) {
 }
 
 CMPIInstance* AssociationTest::add(const std::string& compositeClass, const std::string& name) {
-  const Composite& composite = compositeOf(compositeClass);
-  Properties properties = composite.properties;
-  properties.emplace_back(composite.key, name);
-  return addUnderlying(composite.underlyingClass, properties);
+  const Sample& sample = sampleOf(compositeClass);
+  Properties properties = {{sample.keys.back(), name}};
+  if (sample.keys.front() == "SystemCreationClassName") {
+    properties.emplace_back("SystemCreationClassName", sampleOf(Classes::computerSystem).underlying);
+    properties.emplace_back("SystemName", "bmc0");
+  }
+  return addUnderlying(sample.underlying, properties);
 }
 
 void AssociationTest::add(const std::string& compositeClass, const Strings& names) {
@@ -201,9 +179,9 @@ void AssociationTest::spoil(const std::string& compositeClass, int number, CMPII
   };
 }
 
-std::string underlyingClassOf(const std::string& compositeClass) { return compositeOf(compositeClass).underlyingClass; }
+std::string underlyingClassOf(const std::string& compositeClass) { return sampleOf(compositeClass).underlying; }
 
-const char* keyOf(const std::string& compositeClass) { return compositeOf(compositeClass).key; }
+const char* keyOf(const std::string& compositeClass) { return sampleOf(compositeClass).keys.back().c_str(); }
 
 std::string rendered(const std::string& host, const std::string& nameSpace, const std::string& compositeClass,
                      const std::string& name) {
@@ -211,8 +189,8 @@ std::string rendered(const std::string& host, const std::string& nameSpace, cons
 }
 
 std::string render(const CMPIObjectPath* path) {
-  return path == nullptr ? text(static_cast<const CMPIString*>(nullptr))
-                         : rendered(hostOf(path), nameSpaceOf(path), classOf(path), key(path, keyOf(classOf(path))));
+  return !path ? text(static_cast<const CMPIString*>(nullptr))
+               : rendered(hostOf(path), nameSpaceOf(path), classOf(path), key(path, keyOf(classOf(path))));
 }
 
 std::string homed(const std::string& compositeClass, const std::string& name) {

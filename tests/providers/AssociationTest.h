@@ -6,10 +6,11 @@
 #include <string>
 #include <vector>
 
-#include "AssociationModel.h"
-#include "support/CompositeTest.h"
-#include "support/RefusedReading.h"
-#include "support/Units.h"
+#include "tests/support/composite/AssociationModel.h"
+#include "tests/support/composite/CompositeTest.h"
+#include "tests/support/composite/RefusedReading.h"
+#include "tests/support/composite/Samples.h"
+#include "tests/support/composite/Units.h"
 
 namespace Testing {
 
@@ -94,7 +95,7 @@ std::string homedReference(const std::string& compositeClass, const std::string&
 std::string rendered(const std::string& host, const std::string& nameSpace, const std::string& compositeClass,
                      const std::string& name);
 
-// A key that is a reference; null where there is none.
+// A key that is a reference; null if there is none.
 const CMPIObjectPath* referenceKey(const CMPIObjectPath* path, const std::string& name);
 
 // "first -> second" of the two references of an association instance, or of the two keys of its path.

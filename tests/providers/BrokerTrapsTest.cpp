@@ -2,7 +2,7 @@
 // classes that they do not know, keys that nobody set, values of other types.
 #include <algorithm>
 
-#include "support/Samples.h"
+#include "tests/support/composite/Samples.h"
 
 namespace {
 
@@ -13,8 +13,8 @@ class UnitTest : public CompositeTest, public ::testing::WithParamInterface<Unit
  protected:
   UnitTest() {
     for (const Sample& sample : samples()) {
-      CMPIInstance* const underlying = addUnderlying(sample.underlying, acceptable(sample, 1));
-      if (sample.className == "YRNx_MgmtHwIPAssignmentSettingSequence") {
+      CMPIInstance* underlying = addUnderlying(sample.underlying, acceptable(sample, 1));
+      if (sample.className == Classes::sequence) {
         // Of both kinds, so that every association has one instance.
         CMSetProperty(underlying, "InstanceID", "BMC:eth1:static-dhcp", CMPI_chars);
       }
@@ -63,11 +63,11 @@ class UnitTest : public CompositeTest, public ::testing::WithParamInterface<Unit
     enumInstances(path);
     enumInstanceNames(path);
     getInstance(path);
-    const CMPIInstance* const instance = makeInstance(requestNameSpace, className(), {});
+    const CMPIInstance* instance = makeInstance(requestNameSpace, className(), {});
     instances_->ft->modifyInstance(instances_, context(), result.result(), path, instance, nullptr);
     if (associations_) {
       const CMPIAssociationMIFT& table = *associations_->ft;
-      const char* const association = className().c_str();
+      const char* association = className().c_str();
       table.associators(associations_, context(), result.result(), path, association, nullptr, nullptr, nullptr,
                         nullptr);
       table.associatorNames(associations_, context(), result.result(), path, association, nullptr, nullptr, nullptr);
@@ -121,8 +121,8 @@ TEST_P(UnitTest, NothingIsReadPastTheEndOfAnEnumeration) {
 }
 
 TEST_P(UnitTest, ARequestWithoutAHostIsServed) {
-  for (CMPIString* const none : stringsWithoutCharacters()) {
-    CMPIObjectPath* const path = withText(makePath(className()), &CMPIObjectPathFT::getHostname, none);
+  for (CMPIString* none : stringsWithoutCharacters()) {
+    CMPIObjectPath* path = withText(makePath(className()), &CMPIObjectPathFT::getHostname, none);
     result.order.clear();
     EXPECT_EQ(enumInstances(path).rc, CMPI_RC_OK);
     EXPECT_EQ(enumInstanceNames(path).rc, CMPI_RC_OK);
@@ -132,8 +132,8 @@ TEST_P(UnitTest, ARequestWithoutAHostIsServed) {
 }
 
 TEST_P(UnitTest, ARequestWithoutANamespaceIsAnsweredInNone) {
-  for (CMPIString* const none : stringsWithoutCharacters()) {
-    CMPIObjectPath* const path = withText(makePath(className()), &CMPIObjectPathFT::getNameSpace, none);
+  for (CMPIString* none : stringsWithoutCharacters()) {
+    CMPIObjectPath* path = withText(makePath(className()), &CMPIObjectPathFT::getNameSpace, none);
     enumInstances(path);
     enumInstanceNames(path);
     ASSERT_FALSE(result.paths.empty());
@@ -144,8 +144,8 @@ TEST_P(UnitTest, ARequestWithoutANamespaceIsAnsweredInNone) {
 
 TEST_P(UnitTest, ARequestWithoutAClassIsAnsweredWithoutHarm) {
   const bool isAssociation = GetParam().createAssociationMI;
-  for (CMPIString* const none : stringsWithoutCharacters()) {
-    CMPIObjectPath* const path =
+  for (CMPIString* none : stringsWithoutCharacters()) {
+    CMPIObjectPath* path =
         withText(makePath(className(), {{"InstanceID", "BMC:eth1"}}), &CMPIObjectPathFT::getClassName, none);
     result.order.clear();
     enumInstances(path);
@@ -156,18 +156,18 @@ TEST_P(UnitTest, ARequestWithoutAClassIsAnsweredWithoutHarm) {
 }
 
 TEST_P(UnitTest, ARequestThatCannotBeRenderedIsAnswered) {
-  for (CMPIString* const none : stringsWithoutCharacters()) {
+  for (CMPIString* none : stringsWithoutCharacters()) {
     callEverything(withText(makePath(className(), {{"InstanceID", "BMC:eth1"}}), &CMPIObjectPathFT::toString, none));
   }
   EXPECT_GE(result.done, 4);
 }
 
 TEST_P(UnitTest, AKeyWithoutCharactersMatchesNothing) {
-  for (CMPIString* const none : stringsWithoutCharacters()) {
+  for (CMPIString* none : stringsWithoutCharacters()) {
     CMPIData nothing = {CMPI_string, CMPI_goodValue, {}};
     nothing.value.string = none;
-    for (const char* const name : {"Name", "InstanceID"}) {
-      CMPIObjectPath* const path = withKey(makePath(className(), {{name, "x"}}), name, nothing);
+    for (const char* name : {"Name", "InstanceID"}) {
+      CMPIObjectPath* path = withKey(makePath(className(), {{name, "x"}}), name, nothing);
       result.order.clear();
       EXPECT_EQ(getInstance(path).rc, CMPI_RC_OK);
       EXPECT_EQ(result.order, (Strings{"done"}));
@@ -179,8 +179,8 @@ TEST_P(UnitTest, AKeyWithoutCharactersMatchesNothing) {
 TEST_P(UnitTest, AKeyOfAnotherTypeMatchesNothing) {
   const CMPISint64 number = 7;
   for (const CMPIType type : {CMPI_sint64, CMPI_uint64, CMPI_boolean}) {
-    for (const char* const name : {"Name", "InstanceID", "Antecedent", "GroupComponent"}) {
-      CMPIObjectPath* const path = makePath(className());
+    for (const char* name : {"Name", "InstanceID", "Antecedent", "GroupComponent"}) {
+      CMPIObjectPath* path = makePath(className());
       CMAddKey(path, name, &number, type);
       result.order.clear();
       EXPECT_EQ(getInstance(path).rc, CMPI_RC_OK);
@@ -200,7 +200,7 @@ TEST_P(UnitTest, APathWithoutKeysIsKeylessUnlessItCountsThoseOfItsClass) {
 }
 
 TEST_P(UnitTest, AClassThatTheObjectManagerDoesNotKnowIsAnsweredAsFarAsItsInstancesCanBeMade) {
-  CMPIObjectPath* const path = makePath(className(), {{"InstanceID", "BMC:eth1"}});
+  CMPIObjectPath* path = makePath(className(), {{"InstanceID", "BMC:eth1"}});
   faults.forgetClass(className());
   EXPECT_EQ(enumInstances(path).rc, CMPI_RC_OK);
   const auto usable = std::count_if(result.instances.begin(), result.instances.end(),
@@ -211,7 +211,7 @@ TEST_P(UnitTest, AClassThatTheObjectManagerDoesNotKnowIsAnsweredAsFarAsItsInstan
   EXPECT_EQ(answer.rc,
             personality().unknownClass == UnknownClass::HasNoInstancePath ? CMPI_RC_ERR_INVALID_CLASS : CMPI_RC_OK);
   ASSERT_EQ(result.paths.size(), personality().unknownClass == UnknownClass::HasKeylessPaths ? 1u : 0u);
-  for (const CMPIObjectPath* const name : result.paths) {
+  for (const CMPIObjectPath* name : result.paths) {
     EXPECT_EQ(keysWithValues(name), GetParam().provider == "IPConfigClientAccessProvider" ? 2u : 0u);
   }
   result.order.clear();
@@ -242,13 +242,13 @@ TEST_P(InstanceUnitTest, UnsetKeysDoNoHarm) {
 using UnderlyingTypesTest = CompositeTest;
 
 TEST_F(UnderlyingTypesTest, AnIntegerOfAnotherTypeIsCopiedWhereTheObjectManagerLeavesItItsType) {
-  const Sample& sample = sampleOf("YRNx_MgmtHwIPProtocolEndPoint");
-  CMPIInstance* const underlying = addUnderlying(sample.underlying, acceptable(sample, 1));
+  const Sample& sample = sampleOf(Classes::endpoint);
+  CMPIInstance* underlying = addUnderlying(sample.underlying, acceptable(sample, 1));
   const CMPIUint32 length = 64;
   const CMPISint8 origin = 4;
   CMSetProperty(underlying, "PrefixLength", &length, CMPI_uint32);
   CMSetProperty(underlying, "AddressOrigin", &origin, CMPI_sint8);
-  CMPIInstanceMI* const mi = unitOf(sample.className).createInstanceMI(broker(), context(), nullptr);
+  CMPIInstanceMI* mi = unitOf(sample.className).createInstanceMI(broker(), context(), nullptr);
   RecordingResult result;
   mi->ft->enumerateInstances(mi, context(), result.result(), makePath(sample.className), nullptr);
   ASSERT_EQ(result.instances.size(), 1u);

@@ -9,10 +9,11 @@
 #include <thread>
 #include <vector>
 
+#include "Paths.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
-#include "support/TemporaryDirectory.h"
-#include "support/Units.h"
+#include "tests/support/composite/Units.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 extern "C" Testing::CreateInstanceMI UnderlyingIPConfigProvider_Create_InstanceMI;
 
@@ -20,9 +21,9 @@ namespace {
 
 using namespace Testing;
 
-class Concurrency : public ::testing::Test {
+class ConcurrentRequestsTest : public ::testing::Test {
  protected:
-  Concurrency() {
+  ConcurrentRequestsTest() {
     const std::string agent =
         directory_.write("agent.ini",
                          "[system]\nname = concurrency\n[log]\ndestination = file\n"
@@ -41,7 +42,7 @@ class Concurrency : public ::testing::Test {
                             .registeredAt = "here"},
                            unit.createInstanceMI, unit.createAssociationMI);
     }
-    for (const char* const name :
+    for (const char* name :
          {"YRNQV_SPComputerSystem", "YRNQV_IPProtocolEndpoint", "YRNQV_IPAssignmentSettingData",
           "YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData", "YRNQV_IPRemoteServiceAccessPoint"}) {
       manager_.addProvider({.className = name,
@@ -55,14 +56,14 @@ class Concurrency : public ::testing::Test {
     }
   }
 
-  // The number of instances of a class, as a client's request counts them; -1 where the request failed.
+  // The number of instances of a class, as a client's request counts them; -1 if the request failed.
   int count(const std::string& className) {
-    const CMPIBroker* const broker = manager_.broker();
+    const CMPIBroker* broker = manager_.broker();
     Cimom::RequestScope scope(broker);
     CMPIStatus status = {CMPI_RC_OK, nullptr};
-    const CMPIObjectPath* const path = CMNewObjectPath(broker, "root/cimv2", className.c_str(), &status);
-    const CMPIEnumeration* const answer = CBEnumInstances(broker, scope.context(), path, nullptr, &status);
-    if (status.rc != CMPI_RC_OK || answer == nullptr) {
+    const CMPIObjectPath* path = CMNewObjectPath(broker, "root/cimv2", className.c_str(), &status);
+    const CMPIEnumeration* answer = CBEnumInstances(broker, scope.context(), path, nullptr, &status);
+    if (status.rc != CMPI_RC_OK || !answer) {
       return -1;
     }
     int instances = 0;
@@ -74,11 +75,11 @@ class Concurrency : public ::testing::Test {
 
   // Writes an address through the endpoint's ModifyInstance.
   CMPIrc modify(const std::string& interface, const std::string& address) {
-    const CMPIBroker* const broker = manager_.broker();
+    const CMPIBroker* broker = manager_.broker();
     Cimom::RequestScope scope(broker);
-    CMPIObjectPath* const path = CMNewObjectPath(broker, "root/cimv2", "YRNx_MgmtHwIPProtocolEndPoint", nullptr);
+    CMPIObjectPath* path = CMNewObjectPath(broker, "root/cimv2", Classes::endpoint, nullptr);
     CMAddKey(path, "Name", interface.c_str(), CMPI_chars);
-    const CMPIInstance* const instance = CMNewInstance(broker, path, nullptr);
+    const CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
     CMSetProperty(instance, "IPv4Address", address.c_str(), CMPI_chars);
     CMSetProperty(instance, "SubnetMask", "255.255.255.0", CMPI_chars);
     return CBModifyInstance(broker, scope.context(), path, instance, nullptr).rc;
@@ -89,7 +90,7 @@ class Concurrency : public ::testing::Test {
   Cimom::ObjectManager manager_;
 };
 
-TEST_F(Concurrency, ReadersOfEveryClassAndAWriterGetInNobodysWay) {
+TEST_F(ConcurrentRequestsTest, ReadersOfEveryClassAndAWriterGetInNobodysWay) {
   std::vector<std::pair<std::string, int>> expected;
   for (const Unit& unit : allUnits()) {
     expected.emplace_back(unit.className, count(unit.className));

@@ -1,6 +1,6 @@
 // The eighteen factories, their function tables, and the operations that no provider of the library carries out.
-#include "support/CompositeTest.h"
-#include "support/Units.h"
+#include "tests/support/composite/CompositeTest.h"
+#include "tests/support/composite/Units.h"
 
 namespace {
 
@@ -13,7 +13,7 @@ std::string nameOf(const ::testing::TestParamInfo<Unit>& info) { return info.par
 INSTANTIATE_TEST_SUITE_P(All, FactoriesTest, ::testing::ValuesIn(allUnits()), nameOf);
 
 TEST_P(FactoriesTest, TheInstanceTableCarriesVersionNameAndAllOperations) {
-  const CMPIInstanceMI* const mi = GetParam().createInstanceMI(broker(), context(), &status);
+  const CMPIInstanceMI* mi = GetParam().createInstanceMI(broker(), context(), &status);
   ASSERT_NE(mi, nullptr);
   EXPECT_EQ(mi->hdl, nullptr);
   EXPECT_EQ(mi->ft->ftVersion, 200);
@@ -34,7 +34,7 @@ class AssociationFactoriesTest : public FactoriesTest {};
 INSTANTIATE_TEST_SUITE_P(Six, AssociationFactoriesTest, ::testing::ValuesIn(associationUnits()), nameOf);
 
 TEST_P(AssociationFactoriesTest, TheAssociationTableCarriesVersionNameAndAllOperations) {
-  CMPIAssociationMI* const mi = GetParam().createAssociationMI(broker(), context(), &status);
+  CMPIAssociationMI* mi = GetParam().createAssociationMI(broker(), context(), &status);
   ASSERT_NE(mi, nullptr);
   EXPECT_EQ(mi->hdl, nullptr);
   EXPECT_EQ(mi->ft->ftVersion, 200);
@@ -53,7 +53,7 @@ TEST_P(AssociationFactoriesTest, TheAssociationTableCarriesVersionNameAndAllOper
 }
 
 TEST_P(FactoriesTest, AFactoryAnswersTheSameObjectOnEveryCall) {
-  const CMPIInstanceMI* const first = GetParam().createInstanceMI(broker(), context(), &status);
+  const CMPIInstanceMI* first = GetParam().createInstanceMI(broker(), context(), &status);
   EXPECT_EQ(GetParam().createInstanceMI(faults.real(), context(), &status), first);
 }
 
@@ -70,8 +70,8 @@ TEST_P(FactoriesTest, AFactoryTouchesNeitherContextNorStatusAndWritesNothing) {
 }
 
 TEST_P(FactoriesTest, OperationsThatNobodyCarriesOutAreNotSupportedAndSilent) {
-  CMPIInstanceMI* const mi = GetParam().createInstanceMI(broker(), context(), &status);
-  const CMPIObjectPath* const path = makePath(GetParam().className);
+  CMPIInstanceMI* mi = GetParam().createInstanceMI(broker(), context(), &status);
+  const CMPIObjectPath* path = makePath(GetParam().className);
   RecordingResult result;
   std::vector<CMPIStatus> answers = {
       mi->ft->createInstance(mi, context(), result.result(), path, nullptr),
@@ -91,7 +91,7 @@ TEST_P(FactoriesTest, OperationsThatNobodyCarriesOutAreNotSupportedAndSilent) {
 }
 
 TEST_P(FactoriesTest, CleanupAlwaysAgreesToUnload) {
-  CMPIInstanceMI* const mi = GetParam().createInstanceMI(broker(), context(), &status);
+  CMPIInstanceMI* mi = GetParam().createInstanceMI(broker(), context(), &status);
   for (const CMPIBoolean terminating : {0, 1}) {
     const CMPIStatus cleaned = mi->ft->cleanup(mi, context(), terminating);
     EXPECT_EQ(cleaned.rc, CMPI_RC_OK);
@@ -101,7 +101,7 @@ TEST_P(FactoriesTest, CleanupAlwaysAgreesToUnload) {
 }
 
 TEST_P(AssociationFactoriesTest, TheLastBrokerOfAUnitServesBothOfItsInterfaces) {
-  CMPIInstanceMI* const mi = GetParam().createInstanceMI(faults.real(), context(), &status);
+  CMPIInstanceMI* mi = GetParam().createInstanceMI(faults.real(), context(), &status);
   GetParam().createAssociationMI(broker(), context(), &status);
   RecordingResult result;
   mi->ft->enumerateInstances(mi, context(), result.result(), makePath(GetParam().className), nullptr);
@@ -109,8 +109,8 @@ TEST_P(AssociationFactoriesTest, TheLastBrokerOfAUnitServesBothOfItsInterfaces) 
 }
 
 TEST_F(CompositeTest, TwoUnitsNeverShareABroker) {
-  const Unit& computerSystem = unitOf("YRNx_MgmtHwComputerSystem");
-  CMPIInstanceMI* const mi = computerSystem.createInstanceMI(broker(), context(), &status);
+  const Unit& computerSystem = unitOf(Classes::computerSystem);
+  CMPIInstanceMI* mi = computerSystem.createInstanceMI(broker(), context(), &status);
   for (const Unit& unit : allUnits()) {
     if (unit.provider != computerSystem.provider) {
       unit.createInstanceMI(nullptr, nullptr, nullptr);

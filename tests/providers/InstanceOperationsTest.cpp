@@ -2,7 +2,7 @@
 // agent's log and trace, and the broker's trace.
 #include <stdexcept>
 
-#include "support/Samples.h"
+#include "tests/support/composite/Samples.h"
 
 namespace {
 
@@ -159,7 +159,7 @@ TEST_P(InstanceOperationsTest, EnumInstanceNamesAnswersThePathsOfTheRequestsName
   EXPECT_EQ(answer.rc, CMPI_RC_OK);
   EXPECT_EQ(result.order, (std::vector<std::string>{"path", "path", "done"}));
   for (int n = 1; n <= 2; ++n) {
-    const CMPIObjectPath* const path = result.paths[n - 1];
+    const CMPIObjectPath* path = result.paths[n - 1];
     EXPECT_EQ(classOf(path), GetParam().className);
     EXPECT_EQ(nameSpaceOf(path), requestNameSpace);
     EXPECT_EQ(hostOf(path), systemName());
@@ -216,7 +216,7 @@ TEST_P(InstanceOperationsTest, GetInstanceWithoutKeysIsRefusedBeforeAnythingIsRe
 }
 
 TEST_P(InstanceOperationsTest, GetInstanceWithoutKeysAndBrokerHasNoMessage) {
-  CMPIInstanceMI* const mi = GetParam().createInstanceMI(nullptr, nullptr, nullptr);
+  CMPIInstanceMI* mi = GetParam().createInstanceMI(nullptr, nullptr, nullptr);
   const CMPIStatus answer = mi->ft->getInstance(mi, context(), result.result(), countingNoKeys(classPath()), nullptr);
   EXPECT_EQ(answer.rc, CMPI_RC_ERR_FAILED);
   EXPECT_EQ(answer.msg, nullptr);
@@ -226,17 +226,17 @@ TEST_P(InstanceOperationsTest, GetInstanceWithoutKeysAndBrokerHasNoMessage) {
 // Of each class two properties that are copied from the underlying instance and are no keys.
 // The first has a default in the DMTF's class where one of the two has: a default shows also when nothing was set.
 const std::map<std::string, std::pair<std::string, std::string>> copiedBesideTheKeys = {
-    {"YRNx_MgmtHwComputerSystem", {"Description", "NameFormat"}},
-    {"YRNx_MgmtHwIPProtocolEndPoint", {"IPv4Address", "SubnetMask"}},
-    {"YRNx_MgmtHwIPAssignmentSettingSequence", {"AddressOrigin", "ElementName"}},
-    {"YRNx_MgmtHwStaticIPAssignmentSettingData", {"AddressOrigin", "ElementName"}},
-    {"YRNx_MgmtHwDHCPAssignmentSettingData", {"AddressOrigin", "ElementName"}},
-    {"YRNx_MgmtHwRemoteServiceAccessPoint", {"AccessInfo", "OtherAccessContext"}},
+    {Classes::computerSystem, {"Description", "NameFormat"}},
+    {Classes::endpoint, {"IPv4Address", "SubnetMask"}},
+    {Classes::sequence, {"AddressOrigin", "ElementName"}},
+    {Classes::staticSetting, {"AddressOrigin", "ElementName"}},
+    {Classes::dhcpSetting, {"AddressOrigin", "ElementName"}},
+    {Classes::remoteAccessPoint, {"AccessInfo", "OtherAccessContext"}},
 };
 
 TEST_P(InstanceOperationsTest, APropertyListShowsWhatItNamesAndTheKeys) {
   const auto& [listed, other] = copiedBesideTheKeys.at(GetParam().className);
-  CMPIInstance* const underlying = add(1);
+  CMPIInstance* underlying = add(1);
   if (sample().keys.size() == 4) {
     CMSetProperty(underlying, listed.c_str(), "listed", CMPI_chars);
     CMSetProperty(underlying, other.c_str(), "other", CMPI_chars);
@@ -245,7 +245,7 @@ TEST_P(InstanceOperationsTest, APropertyListShowsWhatItNamesAndTheKeys) {
   enumInstances(classPath(), properties);
   getInstance(instancePath(1), properties);
   ASSERT_EQ(result.instances.size(), 2u);
-  for (const CMPIInstance* const instance : result.instances) {
+  for (const CMPIInstance* instance : result.instances) {
     for (const auto& [name, value] : keysOf(sample(), 1)) {
       EXPECT_EQ(key(pathOf(instance), name), value);
     }
@@ -294,7 +294,7 @@ TEST_P(InstanceOperationsTest, AnUnderlyingPathThatCannotBeMadeIsAskedForAllTheS
 }
 
 TEST_P(InstanceOperationsTest, AnItemIsItsInstanceWhateverItsStateSays) {
-  CMPIInstance* const underlying = makeInstance("root/yrnse", sample().underlying, acceptable(sample(), 1));
+  CMPIInstance* underlying = makeInstance("root/yrnse", sample().underlying, acceptable(sample(), 1));
   for (const CMPIValueState state : {CMPI_goodValue, CMPI_nullValue, CMPI_keyValue, CMPI_notFound, CMPI_badValue}) {
     CMPIData item = {CMPI_instance, state, {}};
     item.value.inst = underlying;
@@ -320,9 +320,9 @@ TEST_P(InstanceOperationsTest, AnItemThatIsNoInstanceIsNeverFollowed) {
   }
   EXPECT_EQ(enumInstances(classPath()).rc, CMPI_RC_OK);
   // Only the computer systems are taken without a look at a property.
-  const bool takesEvery = GetParam().className == "YRNx_MgmtHwComputerSystem";
+  const bool takesEvery = GetParam().className == Classes::computerSystem;
   ASSERT_EQ(result.instances.size(), takesEvery ? std::size(types) : 0u);
-  for (const CMPIInstance* const instance : result.instances) {
+  for (const CMPIInstance* instance : result.instances) {
     EXPECT_FALSE(hasProperty(instance, "Name"));
     EXPECT_FALSE(hasProperty(instance, "Dedicated"));
     EXPECT_TRUE(hasProperty(instance, "Index"));

@@ -1,6 +1,6 @@
 // ModifyInstance of the endpoint, the static settings and the remote access point, down to the instrumentation.
 #include "cimom/broker/Handle.h"
-#include "support/Samples.h"
+#include "tests/support/composite/Samples.h"
 
 namespace {
 
@@ -15,7 +15,7 @@ class ModifyOperationTest : public CompositeTest {
                     const CMPIBroker* unitBroker) {
     // OpenPegasus names what the client sent and then the rest of the class.
     const char* sent[] = {"IPv4Address", "SubnetMask", "Caption", "ElementName", nullptr};
-    CMPIInstanceMI* const mi = unitOf(className).createInstanceMI(unitBroker, nullptr, nullptr);
+    CMPIInstanceMI* mi = unitOf(className).createInstanceMI(unitBroker, nullptr, nullptr);
     return mi->ft->modifyInstance(mi, context(), result.result(), path, instance,
                                   personality().listsModifiedProperties ? sent : nullptr);
   }
@@ -31,7 +31,7 @@ class ModifyOperationTest : public CompositeTest {
   }
   // An instance as it reaches a provider from a client: all that its class declares.
   CMPIInstance* makeSent(const std::string& className, const Properties& properties) {
-    CMPIInstance* const instance = makeInstance(requestNameSpace, className, properties);
+    CMPIInstance* instance = makeInstance(requestNameSpace, className, properties);
     if (!personality().sendsDefaults) {
       auto& model = Cimom::modelOf<Cimom::Instance>(instance);
       model = model.withoutDefaults();
@@ -58,9 +58,9 @@ class ModifyOperationTest : public CompositeTest {
     return lines;
   }
 
-  const std::string endpointClass = "YRNx_MgmtHwIPProtocolEndPoint";
-  const std::string staticClass = "YRNx_MgmtHwStaticIPAssignmentSettingData";
-  const std::string remoteClass = "YRNx_MgmtHwRemoteServiceAccessPoint";
+  const std::string endpointClass = Classes::endpoint;
+  const std::string staticClass = Classes::staticSetting;
+  const std::string remoteClass = Classes::remoteAccessPoint;
   const Properties addressAndMask = {{"IPv4Address", "192.0.2.7"}, {"SubnetMask", "255.255.255.0"}};
   RecordingResult result;
 };
@@ -108,7 +108,7 @@ TEST_F(ModifyOperationTest, TheEntryIsFramedTracesBothPathsAndMarksNoExit) {
 }
 
 TEST_F(ModifyOperationTest, WhatTheClientDidNotSendStaysAsItIs) {
-  const CMPIInstance* const instance = makeSent(endpointClass, {{"IPv4Address", "192.0.2.7"}});
+  const CMPIInstance* instance = makeSent(endpointClass, {{"IPv4Address", "192.0.2.7"}});
   EXPECT_TRUE(CMIsNullValue(CMGetProperty(instance, "SubnetMask", &status)));
   EXPECT_EQ(hasProperty(instance, "EnabledState"), personality().sendsDefaults) << "which has a default";
   EXPECT_EQ(modify(endpointClass, endpointPath("eth0"), instance).rc, CMPI_RC_OK);
@@ -118,8 +118,8 @@ TEST_F(ModifyOperationTest, WhatTheClientDidNotSendStaysAsItIs) {
 TEST_F(ModifyOperationTest, ThePropertyListPlaysNoPart) {
   const char* none[] = {nullptr};
   const char* another[] = {"ElementName", nullptr};
-  CMPIInstanceMI* const mi = unitOf(endpointClass).createInstanceMI(broker(), nullptr, nullptr);
-  for (const char** const properties : {static_cast<const char**>(nullptr), none, another}) {
+  CMPIInstanceMI* mi = unitOf(endpointClass).createInstanceMI(broker(), nullptr, nullptr);
+  for (const char** properties : {static_cast<const char**>(nullptr), none, another}) {
     instrumentation().nodes[0].values.clear();
     EXPECT_EQ(mi->ft
                   ->modifyInstance(mi, context(), result.result(), endpointPath("eth0"),
@@ -131,7 +131,7 @@ TEST_F(ModifyOperationTest, ThePropertyListPlaysNoPart) {
 }
 
 TEST_F(ModifyOperationTest, AMissingPropertyIsNotWrittenAndItsCodeIsTheAnswerOnlyWhenReadLast) {
-  CMPIInstance* const instance = makeInstance(requestNameSpace, endpointClass, {{"IPv4Address", "192.0.2.7"}});
+  CMPIInstance* instance = makeInstance(requestNameSpace, endpointClass, {{"IPv4Address", "192.0.2.7"}});
   // As object managers answer that know no such property.
   withProperty(instance, "SubnetMask", {CMPI_null, CMPI_nullValue | CMPI_notFound, {}}, CMPI_RC_ERR_NO_SUCH_PROPERTY);
   const CMPIStatus answer = modify(endpointClass, endpointPath("eth0"), instance);
@@ -146,7 +146,7 @@ TEST_F(ModifyOperationTest, TheStatusIsThatOfTheLastReadAndNotOfItsConversion) {
   mask.value.string = withCode(CMNewString(faults.real(), "255.255.255.0", nullptr), CMPI_RC_ERR_FAILED);
   for (const auto& [className, path] :
        {std::pair{endpointClass, endpointPath("eth0")}, std::pair{staticClass, staticPath("BMC:eth0")}}) {
-    CMPIInstance* const instance = makeInstance(requestNameSpace, className, {{"IPv4Address", "192.0.2.7"}});
+    CMPIInstance* instance = makeInstance(requestNameSpace, className, {{"IPv4Address", "192.0.2.7"}});
     EXPECT_EQ(modify(className, path, withProperty(instance, "SubnetMask", mask)).rc, CMPI_RC_OK) << className;
     EXPECT_EQ(modify(className, path, withProperty(instance, "SubnetMask", mask, CMPI_RC_ERR_ACCESS_DENIED)).rc,
               CMPI_RC_ERR_ACCESS_DENIED)
@@ -211,7 +211,7 @@ TEST_F(ModifyOperationTest, EmptyFieldsOfAnIdentifierVanish) {
 
 TEST_F(ModifyOperationTest, WithoutAnIdentifierNothingIsReadOrWritten) {
   constexpr CMPIData null = {CMPI_string, CMPI_keyValue | CMPI_nullValue, {}};
-  const CMPIObjectPath* const path = withKey(makePath(staticClass), "InstanceID", null, CMPI_RC_ERR_NOT_FOUND);
+  const CMPIObjectPath* path = withKey(makePath(staticClass), "InstanceID", null, CMPI_RC_ERR_NOT_FOUND);
   const CMPIStatus answer = modifyStatic(path, addressAndMask);
   EXPECT_EQ(answer.rc, CMPI_RC_ERR_NOT_FOUND) << "the code of the key's read is the answer";
   EXPECT_EQ(answer.msg, nullptr);
@@ -236,7 +236,7 @@ TEST_F(ModifyOperationTest, AnIdentifierThatIsNotThereIsNullOrNamesTheEmptyInter
 TEST_F(ModifyOperationTest, WronglyTypedValuesCountAsEmpty) {
   CMPIData number = {CMPI_uint32, CMPI_goodValue, {}};
   number.value.uint32 = 7;
-  CMPIInstance* const instance = withProperty(
+  CMPIInstance* instance = withProperty(
       withProperty(makeInstance(requestNameSpace, endpointClass, {}), "IPv4Address", number), "SubnetMask", number);
   EXPECT_EQ(modify(endpointClass, endpointPath("eth0"), instance).rc, CMPI_RC_OK);
   EXPECT_TRUE(instrumentation().nodes[0].values.empty());
@@ -259,15 +259,14 @@ TEST_F(ModifyOperationTest, ARemoteAccessPointAcceptsAnythingAndChangesNothing) 
 class NullInstanceTest : public ModifyOperationTest, public ::testing::WithParamInterface<const char*> {};
 
 INSTANTIATE_TEST_SUITE_P(Three, NullInstanceTest,
-                         ::testing::Values("YRNx_MgmtHwIPProtocolEndPoint", "YRNx_MgmtHwStaticIPAssignmentSettingData",
-                                           "YRNx_MgmtHwRemoteServiceAccessPoint"));
+                         ::testing::Values(Classes::endpoint, Classes::staticSetting, Classes::remoteAccessPoint));
 
 TEST_P(NullInstanceTest, IsRefusedWithTheTextInTheLogOnly) {
   const Unit& unit = unitOf(GetParam());
   const std::string expected = "MESSAGE [File: " + unit.file + ", Line: 353]: Modify instance Passed is NULL";
-  for (const CMPIInstance* const instance :
+  for (const CMPIInstance* instance :
        {static_cast<const CMPIInstance*>(nullptr), static_cast<const CMPIInstance*>(withoutHandle())}) {
-    for (const CMPIBroker* const unitBroker : {broker(), static_cast<const CMPIBroker*>(nullptr)}) {
+    for (const CMPIBroker* unitBroker : {broker(), static_cast<const CMPIBroker*>(nullptr)}) {
       logLines().clear();
       faults.strings.clear();
       const CMPIStatus answer = modify(GetParam(), makePath(GetParam(), {{"Name", "x"}}), instance, unitBroker);

@@ -1,13 +1,11 @@
 // How the association operations of the two ordered members decide by "InstanceID" what belongs together.
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace {
 
-using Testing::Answer;
-using Testing::Navigation;
-using Testing::navigations;
-using Testing::Strings;
-namespace Classes = Testing::Classes;
+using namespace Testing;
+
+namespace Classes = Classes;
 
 struct Parameter {
   const char* className;
@@ -15,34 +13,32 @@ struct Parameter {
   std::string kindWord;
 };
 
-class OrderedMemberNavigationTest : public Testing::AssociationTest, public ::testing::WithParamInterface<Parameter> {
+class OrderedMemberNavigationTest : public AssociationTest, public ::testing::WithParamInterface<Parameter> {
  protected:
-  OrderedMemberNavigationTest() { attach(Testing::modelOf(GetParam().className)); }
+  OrderedMemberNavigationTest() { attach(modelOf(GetParam().className)); }
 
   const std::string& settingClass() const { return model().endB; }
   static std::string othersWord() { return GetParam().kindWord == "static" ? "dhcp" : "static"; }
 
   // The identifiers of what the operation associates with the source, in order.
   Strings associated(const CMPIObjectPath* source) {
-    Testing::logLines().clear();
+    logLines().clear();
     const Answer answer = navigate(GetParam().navigation, source);
     EXPECT_EQ(answer.status.rc, CMPI_RC_OK);
     EXPECT_EQ(unitLines(), framed(unit().prefix + nameOf(GetParam().navigation)));
-    const bool fromSequence = Testing::classOf(source) == Classes::sequence;
+    const bool fromSequence = classOf(source) == Classes::sequence;
     Strings identifiers;
-    for (const CMPIInstance* const instance : answer.instances) {
-      identifiers.push_back(
-          Testing::key(GetParam().navigation == Navigation::Associators
-                           ? Testing::pathOf(instance)
-                           : Testing::reference(instance, fromSequence ? "PartComponent" : "GroupComponent"),
-                       "InstanceID"));
+    for (const CMPIInstance* instance : answer.instances) {
+      identifiers.push_back(key(GetParam().navigation == Navigation::Associators
+                                    ? pathOf(instance)
+                                    : reference(instance, fromSequence ? "PartComponent" : "GroupComponent"),
+                                "InstanceID"));
     }
-    for (const CMPIObjectPath* const path : answer.paths) {
-      identifiers.push_back(
-          Testing::key(GetParam().navigation == Navigation::AssociatorNames
-                           ? path
-                           : Testing::referenceKey(path, fromSequence ? "PartComponent" : "GroupComponent"),
-                       "InstanceID"));
+    for (const CMPIObjectPath* path : answer.paths) {
+      identifiers.push_back(key(GetParam().navigation == Navigation::AssociatorNames
+                                    ? path
+                                    : referenceKey(path, fromSequence ? "PartComponent" : "GroupComponent"),
+                                "InstanceID"));
     }
     return identifiers;
   }
@@ -73,7 +69,7 @@ TEST_P(OrderedMemberNavigationTest, ContainmentHasRegardToCase) {
 
 TEST_P(OrderedMemberNavigationTest, ASequenceHasTheSettingsThatItContainsWhateverItsKind) {
   add(settingClass(), Strings{"BMC:eth0", "BMC:eth1", "BMC:eth"});
-  for (const char* const kind : {"static", "dhcp", "none"}) {
+  for (const char* kind : {"static", "dhcp", "none"}) {
     EXPECT_EQ(settingsOf(std::string("BMC:eth0:") + kind), (Strings{"BMC:eth0", "BMC:eth"}));
   }
 }
@@ -87,14 +83,14 @@ TEST_P(OrderedMemberNavigationTest, ASourceWithoutReadableIdentifierCountsAsEmpt
   const CMPIData nullString = {CMPI_string, CMPI_keyValue, {}};
   const auto sources = [&](const std::string& className) {
     return std::vector<const CMPIObjectPath*>{makePath(className), makePath(className, {{"InstanceID", ""}}),
-                                              Testing::withKey(makePath(className), "InstanceID", wrongType),
-                                              Testing::withKey(makePath(className), "InstanceID", nullValue),
-                                              Testing::withKey(makePath(className), "InstanceID", nullString)};
+                                              withKey(makePath(className), "InstanceID", wrongType),
+                                              withKey(makePath(className), "InstanceID", nullValue),
+                                              withKey(makePath(className), "InstanceID", nullString)};
   };
-  for (const CMPIObjectPath* const source : sources(settingClass())) {
+  for (const CMPIObjectPath* source : sources(settingClass())) {
     EXPECT_EQ(associated(source), (Strings{"BMC:eth1:" + GetParam().kindWord})) << "the empty text is in every text";
   }
-  for (const CMPIObjectPath* const source : sources(Classes::sequence)) {
+  for (const CMPIObjectPath* source : sources(Classes::sequence)) {
     EXPECT_EQ(associated(source), Strings{});
   }
 }
@@ -108,7 +104,7 @@ TEST_P(OrderedMemberNavigationTest, AFarInstanceWithoutReadableIdentifierIsSkipp
   add(settingClass(), Strings{"BMC:eth0"});
   for (const CMPIData& identifier : {nullValue, nullString, wrongType}) {
     faults.onNewInstance = [&](const std::string&, int, CMPIInstance* instance) {
-      Testing::withProperty(instance, "InstanceID", identifier);
+      withProperty(instance, "InstanceID", identifier);
     };
     EXPECT_EQ(sequencesOf(""), Strings{});
     EXPECT_EQ(settingsOf("BMC:eth0:" + GetParam().kindWord), Strings{});

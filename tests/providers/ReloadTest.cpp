@@ -6,12 +6,13 @@
 #include <fstream>
 #include <sstream>
 
+#include "Paths.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
-#include "support/Faults.h"
-#include "support/Personality.h"
-#include "support/TemporaryDirectory.h"
-#include "support/Units.h"
+#include "tests/support/broker/Faults.h"
+#include "tests/support/broker/Personality.h"
+#include "tests/support/composite/Units.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
@@ -54,8 +55,8 @@ class ReloadTest : public ::testing::Test {
              1);
     manager_.loadSchema(SOURCE_DIR "/schema");
     manager_.loadSchemaText("", "root/cimv2");
-    const CMPIObjectPath* const path = CMNewObjectPath(faults.real(), "root/yrnse", "YRNQV_SPComputerSystem", nullptr);
-    CMPIInstance* const system = CMNewInstance(faults.real(), path, nullptr);
+    const CMPIObjectPath* path = CMNewObjectPath(faults.real(), "root/yrnse", "YRNQV_SPComputerSystem", nullptr);
+    CMPIInstance* system = CMNewInstance(faults.real(), path, nullptr);
     CMSetProperty(system, "Name", "sp1", CMPI_chars);
     faults.upCallScripts["YRNQV_SPComputerSystem"].instances = {system};
   }
@@ -66,7 +67,7 @@ class ReloadTest : public ::testing::Test {
 
   template <typename Create>
   Create* factory(void* handle, const std::string& name) {
-    void* const symbol = ::dlsym(handle, name.c_str());
+    void* symbol = ::dlsym(handle, name.c_str());
     EXPECT_NE(symbol, nullptr) << name;
     return reinterpret_cast<Create*>(symbol);
   }
@@ -77,22 +78,21 @@ class ReloadTest : public ::testing::Test {
 TEST_F(ReloadTest, ServesAfterEveryLoadingAndLeavesTheProcessWhenItIsUnloaded) {
   for (int loading = 1; loading <= 3; ++loading) {
     SCOPED_TRACE(loading);
-    void* const handle = ::dlopen(library, personality().loadFlags);
+    void* handle = ::dlopen(library, personality().loadFlags);
     ASSERT_NE(handle, nullptr) << ::dlerror();
     for (const Registered& registered : registrations()) {
       SCOPED_TRACE(registered.className);
-      CMPIInstanceMI* const instances =
+      CMPIInstanceMI* instances =
           factory<CreateInstanceMI>(handle, registered.provider + "_Create_InstanceMI")(broker(), context(), nullptr);
       RecordingResult result;
-      const CMPIObjectPath* const path =
-          CMNewObjectPath(faults.real(), "root/cimv2", registered.className.c_str(), nullptr);
+      const CMPIObjectPath* path = CMNewObjectPath(faults.real(), "root/cimv2", registered.className.c_str(), nullptr);
       EXPECT_EQ(instances->ft->enumerateInstances(instances, context(), result.result(), path, nullptr).rc, CMPI_RC_OK);
-      EXPECT_EQ(result.instances.size(), registered.className == "YRNx_MgmtHwComputerSystem" ? 1u : 0u);
+      EXPECT_EQ(result.instances.size(), registered.className == Classes::computerSystem ? 1u : 0u);
       EXPECT_EQ(result.done, 1);
       constexpr CMPIBoolean terminating = 0;
       EXPECT_EQ(instances->ft->cleanup(instances, context(), terminating).rc, CMPI_RC_OK);
       if (registered.association) {
-        CMPIAssociationMI* const associations = factory<CreateAssociationMI>(
+        CMPIAssociationMI* associations = factory<CreateAssociationMI>(
             handle, registered.provider + "_Create_AssociationMI")(broker(), context(), nullptr);
         EXPECT_EQ(associations->ft->cleanup(associations, context(), terminating).rc, CMPI_RC_OK);
       }

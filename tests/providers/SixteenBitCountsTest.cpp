@@ -2,21 +2,19 @@
 // over instances. What an object manager is like plays no part, so that these run under the standard personality alone.
 #include <algorithm>
 
-#include "AssociationTest.h"
+#include "tests/providers/AssociationTest.h"
 
 namespace {
 
-using Testing::Answer;
-using Testing::Navigation;
-using Testing::Reading;
-using Testing::Strings;
-namespace Classes = Testing::Classes;
+using namespace Testing;
+
+namespace Classes = Classes;
 
 constexpr int tooMany = 65537;
 
-class SixteenBitCountsTest : public Testing::AssociationTest {
+class SixteenBitCountsTest : public AssociationTest {
  private:
-  Testing::UnrecordedLog unrecorded_;
+  UnrecordedLog unrecorded_;
 
  protected:
   // Composites of the class under one name, of which those of the given numbers, from 1, can be made. Their number
@@ -24,7 +22,7 @@ class SixteenBitCountsTest : public Testing::AssociationTest {
   void addTooMany(const std::string& compositeClass, const std::string& name, const std::vector<int>& made,
                   int pathsBefore = 0) {
     add(compositeClass, name);
-    std::vector<CMPIInstance*>& underlying = faults.upCallScripts[Testing::underlyingClassOf(compositeClass)].instances;
+    std::vector<CMPIInstance*>& underlying = faults.upCallScripts[underlyingClassOf(compositeClass)].instances;
     underlying.resize(tooMany, underlying.front());
     faults.failNewObjectPath = [=](const std::string& className, int call) {
       return className == compositeClass && call > pathsBefore &&
@@ -32,25 +30,22 @@ class SixteenBitCountsTest : public Testing::AssociationTest {
     };
   }
 
-  CMPIInstanceMI* endpoints() {
-    return Testing::unitOf(Classes::endpoint).createInstanceMI(broker(), context(), nullptr);
-  }
+  CMPIInstanceMI* endpoints() { return unitOf(Classes::endpoint).createInstanceMI(broker(), context(), nullptr); }
 
   // Two endpoints with 32769 sequences, which make 65538 associations, two more than are counted. Of these only those
   // of the given numbers can be made; all sequences are one and the same.
   void addTooManyAssociations(const std::vector<int>& made) {
-    attach(Testing::modelOf(Classes::elementSettingData));
+    attach(modelOf(Classes::elementSettingData));
     addEnds({"eth0", "eth1"}, {"BMC:eth0:static"});
-    std::vector<CMPIInstance*>& sequences =
-        faults.upCallScripts[Testing::underlyingClassOf(Classes::sequence)].instances;
+    std::vector<CMPIInstance*>& sequences = faults.upCallScripts[underlyingClassOf(Classes::sequence)].instances;
     sequences.resize(32769, sequences.front());
-    CMPIObjectPath* const sequencePath = makePath(Classes::sequence);
+    CMPIObjectPath* sequencePath = makePath(Classes::sequence);
     faults.failNewObjectPath = [=, this](const std::string& className, int) {
       faults.unmadePath = className == Classes::sequence ? sequencePath : associationPath;
       return className == Classes::sequence || className == model().className;
     };
-    CMPIInstance* const sequence = makeInstance(Testing::requestNameSpace, Classes::sequence, {});
-    Testing::withPath(sequence, sequencePath);
+    CMPIInstance* sequence = makeInstance(requestNameSpace, Classes::sequence, {});
+    withPath(sequence, sequencePath);
     faults.failNewInstance = [=, this](const std::string& className, int call) {
       faults.unmadeInstance = className == Classes::sequence ? sequence : nullptr;
       return className == Classes::sequence ||
@@ -58,37 +53,37 @@ class SixteenBitCountsTest : public Testing::AssociationTest {
     };
     faults.onNewInstance = [this](const std::string& className, int, CMPIInstance* instance) {
       if (className == model().className) {
-        Testing::withPath(instance, associationPath);
+        withPath(instance, associationPath);
       }
     };
   }
 
-  CMPIObjectPath* const associationPath =
+  CMPIObjectPath* associationPath =
       makePath(Classes::elementSettingData, {{"ManagedElement", "a"}, {"SettingData", "b"}});
-  Testing::RecordingResult result;
+  RecordingResult result;
 };
 
 TEST_F(SixteenBitCountsTest, OfEnumInstances) {
   addTooMany(Classes::endpoint, "eth0", {1});
-  CMPIInstanceMI* const mi = endpoints();
+  CMPIInstanceMI* mi = endpoints();
   mi->ft->enumerateInstances(mi, context(), result.result(), makePath(Classes::endpoint), nullptr);
   EXPECT_EQ(result.order, (Strings{"instance", "done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfEnumInstanceNames) {
   addTooMany(Classes::endpoint, "eth0", {1, tooMany});
-  CMPIInstanceMI* const mi = endpoints();
+  CMPIInstanceMI* mi = endpoints();
   mi->ft->enumerateInstanceNames(mi, context(), result.result(), makePath(Classes::endpoint));
   EXPECT_EQ(result.order, (Strings{"path", "done"}));
 }
 
 TEST_F(SixteenBitCountsTest, OfGetInstance) {
   addTooMany(Classes::endpoint, "eth0", {tooMany});
-  const CMPIObjectPath* const path = makePath(Classes::endpoint, {{"SystemCreationClassName", Classes::computerSystem},
-                                                                  {"SystemName", "bmc0"},
-                                                                  {"CreationClassName", Classes::endpoint},
-                                                                  {"Name", "eth0"}});
-  CMPIInstanceMI* const mi = endpoints();
+  const CMPIObjectPath* path = makePath(Classes::endpoint, {{"SystemCreationClassName", Classes::computerSystem},
+                                                            {"SystemName", "bmc0"},
+                                                            {"CreationClassName", Classes::endpoint},
+                                                            {"Name", "eth0"}});
+  CMPIInstanceMI* mi = endpoints();
   mi->ft->getInstance(mi, context(), result.result(), path, nullptr);
   EXPECT_EQ(result.order, (Strings{"done"}));
 }
@@ -109,7 +104,7 @@ TEST_F(SixteenBitCountsTest, OfAnAssociationsGetInstance) {
 }
 
 TEST_F(SixteenBitCountsTest, OfTheFarEndOfAnAssociation) {
-  attach(Testing::modelOf(Classes::hostedAccessPoint));
+  attach(modelOf(Classes::hostedAccessPoint));
   // The first path of the class is that of the target.
   addTooMany(Classes::endpoint, "eth0", {1}, 1);
   const Answer answer = navigate(Navigation::Associators, clientPath(Classes::computerSystem, "bmc0"));
@@ -117,7 +112,7 @@ TEST_F(SixteenBitCountsTest, OfTheFarEndOfAnAssociation) {
 }
 
 TEST_F(SixteenBitCountsTest, OfTheOuterEndOfABuilder) {
-  attach(Testing::modelOf(Classes::elementSettingData));
+  attach(modelOf(Classes::elementSettingData));
   addTooMany(Classes::endpoint, "eth0", {1, tooMany});
   add(Classes::sequence, Strings{"BMC:eth0:static"});
   std::vector<CMPIInstance*> out;
@@ -126,7 +121,7 @@ TEST_F(SixteenBitCountsTest, OfTheOuterEndOfABuilder) {
 }
 
 TEST_F(SixteenBitCountsTest, OfTheInnerEndOfABuilder) {
-  attach(Testing::modelOf(Classes::hostedAccessPoint));
+  attach(modelOf(Classes::hostedAccessPoint));
   add(Classes::computerSystem, Strings{"bmc0"});
   addTooMany(Classes::endpoint, "eth0", {1});
   std::vector<CMPIInstance*> out;

@@ -7,6 +7,7 @@
 #include <map>
 #include <sstream>
 
+#include "Paths.h"
 #include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 #include "tests/schema/ClassText.h"
@@ -115,7 +116,7 @@ TEST_P(ClassFilesTest, LetReferencesNameTheEndsOfElementSettingDataWithoutKeysWh
   MofReader reader;
   repository.add(reader.readPath(SOURCE_DIR "/schema/CIM_Subset.mof"));
   repository.add(reader.readPath(fileOf(GetParam(), "CompositeIPConfig.mof")));
-  const Cimom::ClassDefinition* const found = repository.find("YRNx_MgmtHwIPElementSettingData");
+  const Cimom::ClassDefinition* found = repository.find("YRNx_MgmtHwIPElementSettingData");
   ASSERT_TRUE(found);
   EXPECT_TRUE(found->isAssociation());
   EXPECT_EQ(found->isA("CIM_ElementSettingData"), keyed);

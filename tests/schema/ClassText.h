@@ -14,7 +14,7 @@ std::string textOf(
     const Cimom::ClassDeclaration& declaration,
     const std::function<bool(const std::string&)>& isLeftOut = [](const std::string&) { return false; });
 
-// The declaration of that name; null where there is none.
+// The declaration of that name; null if there is none.
 const Cimom::ClassDeclaration* findClass(const Cimom::MofDeclarations& declarations, const std::string& name);
 
 }  // namespace Testing

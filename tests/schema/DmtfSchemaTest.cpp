@@ -8,8 +8,9 @@
 #include <regex>
 #include <set>
 
+#include "Paths.h"
 #include "tests/schema/ClassText.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
 
@@ -41,7 +42,7 @@ std::map<std::string, std::string> qualifierDeclarations(const std::filesystem::
 class DmtfSchemaTest : public testing::Test {
  protected:
   void SetUp() override {
-    const char* const named = std::getenv("DMTF_SCHEMA");
+    const char* named = std::getenv("DMTF_SCHEMA");
     if (!named) {
       GTEST_SKIP() << "DMTF_SCHEMA does not name the DMTF's schema (.../cim_schema_2.41.0.mof): nothing is compared";
     }
@@ -56,7 +57,7 @@ TEST_F(DmtfSchemaTest, DeclaresTheClassesOfTheSubsetAsItDoes) {
   Cimom::MofDeclarations theirs = Cimom::MofReader().readPath(whole_);
   ASSERT_THAT(ours.classes, Not(IsEmpty()));
   for (const Cimom::ClassDeclaration& our : ours.classes) {
-    const Cimom::ClassDeclaration* const found = findClass(theirs, our.own.name);
+    const Cimom::ClassDeclaration* found = findClass(theirs, our.own.name);
     ASSERT_TRUE(found) << our.own.name << " is not the DMTF's";
     Cimom::ClassDeclaration their = *found;
     their.own.methods.clear();

@@ -1,13 +1,11 @@
 #include <gtest/gtest.h>
 
-#include "support/RecordingLog.h"
+#include "tests/support/agent/RecordingLog.h"
 #include "trace/Trace.h"
 
 namespace {
 
-using Testing::Channel;
-using Testing::logLines;
-using Testing::messages;
+using namespace Testing;
 
 const std::string component = "Tarnwick.Test";
 const std::string rule = "==============================================================================";
@@ -40,14 +38,14 @@ TEST_F(TraceTest, AVariableLineNamesVariableValueLineAndFile) {
 }
 
 TEST_F(TraceTest, AShorterTextLeavesNothingOfALongerOneBehind) {
-  const char* const buffer = QV::trace("file", std::string(300, 'x').c_str(), 1, QV::FreeMessage);
+  const char* buffer = QV::trace("file", std::string(300, 'x').c_str(), 1, QV::FreeMessage);
   QV::trace("f", "g", 1, QV::EntryMessage);
   const std::size_t length = std::string(buffer).size();
   for (std::size_t i = length; i < 512; ++i) {
     ASSERT_EQ(buffer[i], '\0') << i;
   }
 
-  const char* const variable = QV::trace("n", "file", 1, std::string(300, 'x').c_str());
+  const char* variable = QV::trace("n", "file", 1, std::string(300, 'x').c_str());
   QV::trace("n", "file", 1, "v");
   for (std::size_t i = std::string(variable).size(); i < 512; ++i) {
     ASSERT_EQ(variable[i], '\0') << i;
@@ -68,8 +66,8 @@ TEST_F(TraceTest, ANullTextCountsAsEmpty) {
 }
 
 TEST_F(TraceTest, TheTwoOverloadsOwnABufferEach) {
-  const char* const message = QV::trace("file", "f", 10, QV::EntryMessage);
-  const char* const variable = QV::trace("n", "file", 5, "v");
+  const char* message = QV::trace("file", "f", 10, QV::EntryMessage);
+  const char* variable = QV::trace("n", "file", 5, "v");
   EXPECT_NE(message, variable);
   EXPECT_STREQ(message, "ENTERING: f() in file [Line: 10]");
 }
@@ -94,7 +92,7 @@ TEST_F(TraceTest, MarkersReportFromTheirOwnPlace) {
   const std::vector<int> expectedLines = {336, 336, 337, 337, 348, 348, 349, 349};
   ASSERT_EQ(logLines().size(), expectedLines.size());
   for (std::size_t i = 0; i < logLines().size(); ++i) {
-    const Testing::LogLine& line = logLines()[i];
+    const LogLine& line = logLines()[i];
     EXPECT_EQ(line.line, expectedLines[i]);
     EXPECT_EQ(line.file, "Trace.h");
     EXPECT_EQ(line.function, i < 4 ? "markProviderEntry" : "markProviderExit");
@@ -118,7 +116,7 @@ TEST_F(TraceTest, AFunctionsLinesCarryItsOwnPlaceAndReachTheLogBeforeTheTrace) {
   EXPECT_EQ(messages(Channel::Log), expected);
   EXPECT_EQ(messages(Channel::Trace), expected);
   for (std::size_t i = 0; i < logLines().size(); ++i) {
-    const Testing::LogLine& line = logLines()[i];
+    const LogLine& line = logLines()[i];
     EXPECT_EQ(line.channel, i % 2 == 0 ? Channel::Log : Channel::Trace);
     EXPECT_EQ(line.line, static_cast<int>(i / 2 + 1));
     EXPECT_EQ(line.file, "Unit");

@@ -9,7 +9,7 @@
 namespace QV::Ipmi {
 namespace {
 
-// Runs on the operation's thread, so that the log tells how it ended even where the caller has left.
+// Runs on the operation's thread, so that the log tells how it ended even if the caller has left.
 template <typename Operation>
 auto logged(const std::string& what, Operation operation) try {
   return operation();

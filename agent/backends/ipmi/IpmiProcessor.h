@@ -17,7 +17,7 @@
 namespace QV::Ipmi {
 
 // Not safe to share between threads without a lock. Every operation sends nothing any more once its deadline has
-// passed, save what it needs to give a lock back, and throws IpmiError where it fails.
+// passed, save what it needs to give a lock back, and throws IpmiError if it fails.
 class IpmiProcessor {
  public:
   explicit IpmiProcessor(const IpmiSettings& settings)

@@ -1,8 +1,6 @@
 #include "agent/backends/simulated/FileLock.h"
 
-#include <fcntl.h>
 #include <sys/file.h>
-#include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
@@ -12,17 +10,16 @@
 namespace QV {
 
 FileLock::FileLock(const std::string& path, std::chrono::milliseconds timeout)
-    : descriptor_(::open(path.c_str(), O_RDWR | O_CREAT | O_CLOEXEC | O_NOFOLLOW, 0660)) {
-  if (descriptor_ < 0) {
+    : file_(path, O_RDWR | O_CREAT | O_NOFOLLOW, 0660) {
+  if (!file_.isOpen()) {
     throw std::runtime_error("the lock " + path + " cannot be opened: " + std::strerror(errno));
   }
   const auto deadline = std::chrono::steady_clock::now() + timeout;
   // flock alone would wait for ever on a holder that was stopped.
-  while (::flock(descriptor_, LOCK_EX | LOCK_NB) != 0) {
+  while (::flock(file_.number(), LOCK_EX | LOCK_NB) != 0) {
     const int error = errno;
     const bool late = std::chrono::steady_clock::now() >= deadline;
     if (error != EINTR && (error != EWOULDBLOCK || late)) {
-      ::close(descriptor_);
       throw std::runtime_error(
           "the lock " + path +
           (late ? " is still held by another process after " + std::to_string(timeout.count()) + " ms"
@@ -31,7 +28,5 @@ FileLock::FileLock(const std::string& path, std::chrono::milliseconds timeout)
     std::this_thread::sleep_for(std::chrono::milliseconds(1));
   }
 }
-
-FileLock::~FileLock() { ::close(descriptor_); }
 
 }  // namespace QV

@@ -4,19 +4,18 @@
 #include <chrono>
 #include <string>
 
+#include "ground/Descriptor.h"
+
 namespace QV {
 
 class FileLock {
  public:
-  // Locks the file, which is created where it is missing and stays. Throws std::runtime_error where it cannot be opened
-  // or where another holder has not let go of it when the time is up.
+  // Locks the file, which is created if it is missing and stays. Throws std::runtime_error if it cannot be opened,
+  // or if another holder has not let go of it when the time is up.
   FileLock(const std::string& path, std::chrono::milliseconds timeout);
-  ~FileLock();
-  FileLock(const FileLock&) = delete;
-  FileLock& operator=(const FileLock&) = delete;
 
  private:
-  int descriptor_;
+  Ground::Descriptor file_;
 };
 
 }  // namespace QV

@@ -42,7 +42,7 @@ fs::path followLinks(fs::path path) {
 fs::path withSuffix(const fs::path& path, const char* suffix) { return path.string() + suffix; }
 
 std::optional<std::string> readAll(const fs::path& path) {
-  const Descriptor file(path, O_RDONLY);
+  const Ground::Descriptor file(path, O_RDONLY);
   if (!file.isOpen()) {
     if (errno == ENOENT) {
       return std::nullopt;
@@ -64,7 +64,7 @@ std::optional<std::string> readAll(const fs::path& path) {
   }
 }
 
-void writeAll(const Descriptor& file, const fs::path& path, std::string_view text) {
+void writeAll(const Ground::Descriptor& file, const fs::path& path, std::string_view text) {
   while (!text.empty()) {
     const ssize_t count = ::write(file.number(), text.data(), text.size());
     if (count > 0) {
@@ -76,7 +76,7 @@ void writeAll(const Descriptor& file, const fs::path& path, std::string_view tex
 }
 
 // A writer without the right to give files away still keeps the state; only then does the owner change to it.
-void keepModeAndOwner(const Descriptor& file, const fs::path& path, const struct stat& original) {
+void keepModeAndOwner(const Ground::Descriptor& file, const fs::path& path, const struct stat& original) {
   if (::fchown(file.number(), original.st_uid, original.st_gid) != 0 && errno != EPERM) {
     fail(path, "cannot be given its owner");
   }
@@ -90,7 +90,7 @@ void replace(const fs::path& target, std::string_view text) {
   const fs::path fresh = withSuffix(target, ".new");
   ::unlink(fresh.c_str());
   try {
-    const Descriptor file(fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, 0640);
+    const Ground::Descriptor file(fresh, O_WRONLY | O_CREAT | O_EXCL | O_NOFOLLOW, 0640);
     if (!file.isOpen()) {
       fail(fresh, "cannot be created");
     }
@@ -109,7 +109,7 @@ void replace(const fs::path& target, std::string_view text) {
     ::unlink(fresh.c_str());
     throw;
   }
-  const Descriptor directory(target.parent_path(), O_RDONLY | O_DIRECTORY);
+  const Ground::Descriptor directory(target.parent_path(), O_RDONLY | O_DIRECTORY);
   if (!directory.isOpen() || ::fsync(directory.number()) != 0) {
     fail(target, "cannot be brought to the disk");
   }

@@ -15,17 +15,17 @@ class StateFile {
 
   const std::filesystem::path& path() const { return path_; }
 
-  // Throws std::runtime_error where this user cannot read or replace the file. A missing directory is made, else
+  // Throws std::runtime_error if this user cannot read or replace the file. A missing directory is made, else
   // nothing.
   void requireWritable() const;
 
-  // The text; nothing where there is no file. Throws std::runtime_error where it cannot be read.
+  // The text; nothing if there is no file. Throws std::runtime_error if it cannot be read.
   std::optional<std::string> read() const;
 
   // Replaces the text by what `edit` makes of the current one, alone among all processes (the lock is the file's name
   // with ".lock" after it); a missing directory is made. What `edit` throws passes through, and the file stays. Returns
   // when the new text is on the disk; a new file is for its owner and group, an existing one keeps mode and owner.
-  // Throws std::runtime_error where it cannot be written; the file is then the old one.
+  // Throws std::runtime_error if it cannot be written; the file is then the old one.
   void update(const std::function<std::string(const std::optional<std::string>& current)>& edit) const;
 
  private:

@@ -6,7 +6,7 @@
 //                       "ipv6": { "origin": "dhcp", "address": "...", "prefixLength": 64 } } ] }
 //
 // "name", "description", "dnsServers", "interfaces", each "enabled" and each "origin" ("static", "dhcp" or "unknown")
-// are required; every other field may be left out where the processor does not have or does not report the value.
+// are required; every other field may be left out if the processor does not have or does not report the value.
 #pragma once
 
 #include <string>

@@ -33,13 +33,13 @@ class Instrumentation {
   Instrumentation(const Instrumentation&) = delete;
   Instrumentation& operator=(const Instrumentation&) = delete;
 
-  // Puts the cursor on the first node of the type, or past the end where there is none.
+  // Puts the cursor on the first node of the type, or past the end if there is none.
   void selectNode(NodeLexicon::NodeType type);
 
   // Whether the cursor stands on a node.
   operator bool();
 
-  // Reads a property of the current node; false where it cannot be read. A node whose NodeName cannot be read is passed
+  // Reads a property of the current node; false if it cannot be read. A node whose NodeName cannot be read is passed
   // over: the call returns false and the cursor has moved to the next node.
   bool getProperty(NodeLexicon::Properties property, std::string& value);
 

@@ -26,7 +26,7 @@ std::string getSystemName();
 
 // Whether two object paths name the same instance: class and key names without regard to case, the same number of keys,
 // values equal by type and value (strings exactly, numbers across integer widths, references by class and keys). Hosts
-// never take part. With `flag` the namespaces must agree too where both paths carry one. A null path equals nothing,
+// never take part. With `flag` the namespaces must agree too if both paths carry one. A null path equals nothing,
 // nor does one whose class or keys the object manager does not tell.
 bool isObjPathsEqual(const CMPIObjectPath* requested, const CMPIObjectPath* candidate, bool flag);
 

@@ -1,4 +1,4 @@
-// Which back end agent.ini chooses, and what is said where it cannot be had. A process has one back end, so each case
+// Which back end agent.ini chooses, and what is said if it cannot be had. A process has one back end, so each case
 // runs in a child, on a copy of the instrumentation library beside which the case puts what it needs.
 #include <dlfcn.h>
 #include <gmock/gmock.h>
@@ -10,22 +10,23 @@
 #include <memory>
 
 #include "agent/processor/BackEnd.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using SharedBackEnd = std::shared_ptr<BackEnd>();
 
-class ABackEndChoice : public testing::Test {
+class BackEndChoiceTest : public testing::Test {
  protected:
-  ABackEndChoice() {
+  BackEndChoiceTest() {
     std::filesystem::copy_file(INSTRUMENTATION, library_);
     ::setenv("QV_AGENT_INI", ini_.c_str(), 1);
   }
-  ~ABackEndChoice() override { ::unsetenv("QV_AGENT_INI"); }
+  ~BackEndChoiceTest() override { ::unsetenv("QV_AGENT_INI"); }
 
-  void choose(const std::string& text) const { Testing::writeFile(ini_, text + "[log]\ndestination = off\n"); }
+  void choose(const std::string& text) const { writeFile(ini_, text + "[log]\ndestination = off\n"); }
 
   void chooseSimulated(const std::string& keys = {}) const {
     choose("[processor]\nbackend = simulated\n" + keys + "[simulated]\nstate = " + (directory_ / "state.json") + '\n');
@@ -53,18 +54,18 @@ class ABackEndChoice : public testing::Test {
     EXPECT_EXIT(child(), testing::ExitedWithCode(0), pattern);
   }
 
-  const Testing::TemporaryDirectory directory_;
+  const TemporaryDirectory directory_;
   const std::string ini_ = directory_ / "agent.ini";
   const std::string library_ = directory_ / "libqvinstrumentation.so.1";
   const std::string ipmi_ = directory_ / "libqvbmc-ipmi.so";
 };
 
-TEST_F(ABackEndChoice, IsTheSimulatedProcessorWhereAgentIniSaysSo) {
+TEST_F(BackEndChoiceTest, IsTheSimulatedProcessorWhereAgentIniSaysSo) {
   chooseSimulated();
   expect(describe, "^BMC: Simulated management processor$");
 }
 
-TEST_F(ABackEndChoice, IsNeverMadeForTheAdministrator) {
+TEST_F(BackEndChoiceTest, IsNeverMadeForTheAdministrator) {
   // Neither without the key, whatever else there is, nor without the file
   choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
   expect(
@@ -76,42 +77,42 @@ TEST_F(ABackEndChoice, IsNeverMadeForTheAdministrator) {
   EXPECT_FALSE(std::filesystem::exists(directory_ / "state.json"));
 }
 
-TEST_F(ABackEndChoice, IsLoggedOnceWhereItIsTheSimulatedProcessor) {
+TEST_F(BackEndChoiceTest, IsLoggedOnceWhereItIsTheSimulatedProcessor) {
   const std::string log = directory_ / "agent.log";
-  Testing::writeFile(ini_, "[processor]\nbackend = simulated\n[simulated]\nstate = " + (directory_ / "state.json") +
-                               "\n[log]\ndestination = file\nfile = " + log + '\n');
+  writeFile(ini_, "[processor]\nbackend = simulated\n[simulated]\nstate = " + (directory_ / "state.json") +
+                      "\n[log]\ndestination = file\nfile = " + log + '\n');
   expect(
       [](SharedBackEnd* sharedBackEnd) {
         sharedBackEnd()->read();
         return describe(sharedBackEnd);
       },
       "^BMC: ");
-  EXPECT_THAT(Testing::readFile(log),
+  EXPECT_THAT(readFile(log),
               testing::MatchesRegex("[^\n]* 6000 Tarnwick.SimulatedProcessor [^\n]*: the management processor is "
                                     "simulated \\(.*/agent.ini: backend = simulated\\): its values are made up, and "
                                     "changes reach no hardware but .*/state.json\n"));
 }
 
-TEST_F(ABackEndChoice, givesTheProcessorItsConfiguredNames) {
+TEST_F(BackEndChoiceTest, GivesTheProcessorItsConfiguredNames) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\nname = a\ndescription = b\n[ipmi]\nname = loaded\n");
   expect(describe, "^a: b$");
 }
 
-TEST_F(ABackEndChoice, SaysOfASimulatedProcessorWhatItIsUnderAnyDescription) {
+TEST_F(BackEndChoiceTest, SaysOfSimulatedBackEndTestWhatItIsUnderAnyDescription) {
   chooseSimulated("name = a\ndescription = b\n");
   expect(describe, "^a: b .simulated.$");
   chooseSimulated("description = SIMULATED on rack 7\n");
   expect(describe, "^BMC: SIMULATED on rack 7$");
 }
 
-TEST_F(ABackEndChoice, loadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSettings) {
+TEST_F(BackEndChoiceTest, LoadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSettings) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\n[ipmi]\nname = loaded\n");
   expect(describe, "^loaded: a stand-in$");
 }
 
-TEST_F(ABackEndChoice, passesOnWhyTheIpmiBackEndRefusesItsSettings) {
+TEST_F(BackEndChoiceTest, PassesOnWhyTheIpmiBackEndRefusesItsSettings) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^/.*/agent.ini: .ipmi. name = : the key is missing and has no default$");
@@ -119,19 +120,19 @@ TEST_F(ABackEndChoice, passesOnWhyTheIpmiBackEndRefusesItsSettings) {
   expect(describe, "^/.*/agent.ini:5: .ipmi. colour = red: unknown$");
 }
 
-TEST_F(ABackEndChoice, tellsWhyTheIpmiBackEndCannotBeLoaded) {
-  Testing::writeFile(ipmi_, "no library");
+TEST_F(BackEndChoiceTest, TellsWhyTheIpmiBackEndCannotBeLoaded) {
+  writeFile(ipmi_, "no library");
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^the back end ipmi cannot be loaded: .*libqvbmc-ipmi.so: ");
 }
 
-TEST_F(ABackEndChoice, tellsThatALibraryIsNoBackEnd) {
+TEST_F(BackEndChoiceTest, TellsThatALibraryIsNoBackEnd) {
   std::filesystem::copy_file(INSTRUMENTATION, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^the back end ipmi cannot be used: .*qvCreateBackEnd");
 }
 
-TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
+TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
   choose("[processor]\nbackend = magic\n");
   expect(
       [this](SharedBackEnd* sharedBackEnd) {
@@ -143,14 +144,14 @@ TEST_F(ABackEndChoice, tellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse) {
       ".processor. of agent.ini; then BMC: Simulated");
 }
 
-TEST_F(ABackEndChoice, tellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
+TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
   choose("[processor]\nbackend = simulated\n[simulated]\nstate = here\n");
   expect(describe, "^/.*/agent.ini:4: .simulated. state = here: must be an absolute path$");
   choose("[processor]\nbackend = simulated\n[simulated]\nstatus = /here\n");
   expect(describe, "^/.*/agent.ini:4: .simulated. status = /here: there is no such key: must be one of state$");
 }
 
-TEST_F(ABackEndChoice, TellsThatTheStateCannotBeWrittenBeforeItIsAskedForAnything) {
+TEST_F(BackEndChoiceTest, TellsThatTheStateCannotBeWrittenBeforeItIsAskedForAnything) {
   choose("[processor]\nbackend = simulated\n[simulated]\nstate = /proc/none/state.json\n");
   expect(
       [](SharedBackEnd* sharedBackEnd) {
@@ -165,7 +166,7 @@ TEST_F(ABackEndChoice, TellsThatTheStateCannotBeWrittenBeforeItIsAskedForAnythin
       "with state in .simulated. of agent.ini$");
 }
 
-TEST_F(ABackEndChoice, isMadeOnceAndShared) {
+TEST_F(BackEndChoiceTest, IsMadeOnceAndShared) {
   chooseSimulated();
   expect(
       [](SharedBackEnd* sharedBackEnd) {
@@ -175,4 +176,3 @@ TEST_F(ABackEndChoice, isMadeOnceAndShared) {
 }
 
 }  // namespace
-}  // namespace QV

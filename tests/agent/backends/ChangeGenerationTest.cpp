@@ -9,11 +9,13 @@
 #include <vector>
 
 #include "agent/backends/ChangeGeneration.h"
-#include "tests/agent/support/Throws.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
+
+using namespace QV;
+using namespace Testing;
 
 namespace fs = std::filesystem;
 using testing::HasSubstr;
@@ -43,7 +45,7 @@ class ChangeGenerationTest : public testing::Test {
     EXPECT_THAT(thrownBy([&] { generation.renew(); }), AllOf(StartsWith(file + ": "), HasSubstr(reason)));
   }
 
-  const Testing::TemporaryDirectory directory;
+  const TemporaryDirectory directory;
   const std::string file = directory / "generation";
   const ChangeGeneration generation{file};
 };
@@ -176,23 +178,23 @@ TEST_F(ChangeGenerationTest, IsNotToldByAFileThatCanOnlyBeRead) {
 
 TEST_F(ChangeGenerationTest, RefusesASymbolicLink) {
   const std::string target = directory / "target";
-  Testing::writeFile(target, "12345678");
+  writeFile(target, "12345678");
   fs::create_symlink(target, file);
 
   expectRefusal("is a symbolic link");
 
-  EXPECT_EQ(Testing::readFile(target), "12345678");
+  EXPECT_EQ(readFile(target), "12345678");
 }
 
 TEST_F(ChangeGenerationTest, RefusesAHardLink) {
   const std::string target = directory / "target";
-  Testing::writeFile(target, "");
+  writeFile(target, "");
   fs::permissions(target, fs::perms::owner_read | fs::perms::owner_write);
   fs::create_hard_link(target, file);
 
   expectRefusal("a hard link");
 
-  EXPECT_EQ(Testing::readFile(target), "");
+  EXPECT_EQ(readFile(target), "");
   EXPECT_EQ(modeOfFile(), 0600U);
 }
 
@@ -212,9 +214,9 @@ TEST_F(ChangeGenerationTest, RefusesADirectory) {
 
 TEST_F(ChangeGenerationTest, RefusesAFileOfAnotherSizeAndLeavesIt) {
   for (const std::string content : {"1234567", "123456789", "the root of all evil"}) {
-    Testing::writeFile(file, content);
+    writeFile(file, content);
     expectRefusal("is not a generation file: it must have 8 bytes");
-    EXPECT_EQ(Testing::readFile(file), content);
+    EXPECT_EQ(readFile(file), content);
   }
 }
 
@@ -222,10 +224,9 @@ TEST_F(ChangeGenerationTest, TellsThatItsDirectoryCannotBeMade) {
   const ChangeGeneration nowhere("/proc/nowhere/generation");
   EXPECT_THAT(thrownBy([&] { nowhere.current(); }), StartsWith("/proc/nowhere: cannot be created: "));
 
-  Testing::writeFile(directory / "blocked", "");
+  writeFile(directory / "blocked", "");
   const ChangeGeneration blocked(directory / "blocked/generation");
   EXPECT_THAT(thrownBy([&] { blocked.current(); }), HasSubstr("blocked/generation: cannot be opened: Not a directory"));
 }
 
 }  // namespace
-}  // namespace QV

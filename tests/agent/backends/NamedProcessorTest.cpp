@@ -3,28 +3,30 @@
 
 #include "agent/backends/NamedProcessor.h"
 #include "tests/agent/instrumentation/RecordingBackEnd.h"
-#include "tests/agent/support/Addresses.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
-namespace QV {
 namespace {
 
-TEST(NamedProcessor, bearsTheGivenNames) {
-  const Testing::TemporaryDirectory directory;
+using namespace QV;
+using namespace Testing;
+
+TEST(NamedProcessorTest, BearsTheGivenNames) {
+  const TemporaryDirectory directory;
   NamedProcessor processor(std::make_shared<RecordingBackEnd>(directory / "state"), "bmc7", "in rack 7");
   EXPECT_EQ(processor.read().name, "bmc7");
   EXPECT_EQ(processor.read().description, "in rack 7");
   EXPECT_EQ(processor.read().interfaces, factoryConfiguration().interfaces);
 }
 
-TEST(NamedProcessor, keepsItsOwnNamesWhereNoneIsGiven) {
-  const Testing::TemporaryDirectory directory;
+TEST(NamedProcessorTest, KeepsItsOwnNamesWhereNoneIsGiven) {
+  const TemporaryDirectory directory;
   NamedProcessor processor(std::make_shared<RecordingBackEnd>(directory / "state"), "", "");
   EXPECT_EQ(processor.read(), factoryConfiguration());
 }
 
-TEST(NamedProcessor, passesChangesOn) {
-  const Testing::TemporaryDirectory directory;
+TEST(NamedProcessorTest, PassesChangesOn) {
+  const TemporaryDirectory directory;
   const auto inner = std::make_shared<RecordingBackEnd>(directory / "state");
   NamedProcessor(inner, "a", "b").change("eth1", {ipv4("192.0.2.99"), {}});
   EXPECT_THAT(inner->changes, testing::ElementsAre("eth1 192.0.2.99 -"));
@@ -32,4 +34,3 @@ TEST(NamedProcessor, passesChangesOn) {
 }
 
 }  // namespace
-}  // namespace QV

@@ -7,14 +7,16 @@
 #include <filesystem>
 #include <sstream>
 
+#include "Paths.h"
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/config/AgentConfiguration.h"
-#include "tests/agent/support/Throws.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using Destination = ChannelSettings::Destination;
 using testing::HasSubstr;
 using testing::StartsWith;
@@ -35,7 +37,7 @@ class AgentIniVariable {
   ~AgentIniVariable() { ::unsetenv("QV_AGENT_INI"); }
 };
 
-TEST(AgentConfiguration, anEmptyFileMeansTheDefaults) {
+TEST(AgentConfigurationTest, AnEmptyFileMeansTheDefaults) {
   const AgentConfiguration configuration = parse("");
   EXPECT_EQ(configuration.systemName, "");
   EXPECT_EQ(configuration.log.destination, Destination::Syslog);
@@ -47,7 +49,7 @@ TEST(AgentConfiguration, anEmptyFileMeansTheDefaults) {
   EXPECT_FALSE(configuration.publishesHost);
 }
 
-TEST(AgentConfiguration, everyKeyIsTaken) {
+TEST(AgentConfigurationTest, EveryKeyIsTaken) {
   const AgentConfiguration configuration = parse(
       "[system]\nname = rack7.example\n"
       "[log]\ndestination = file\nfile = /l/log\nthreshold = 5000\nthreshold.Tarnwick.IPConfigProvider = 4000\n"
@@ -73,9 +75,9 @@ TEST(AgentConfiguration, everyKeyIsTaken) {
             (std::map<std::string, std::string>{{"host", "192.0.2.10"}, {"anything", "at all"}}));
 }
 
-TEST(AgentConfiguration, theSampleIsAFileOfDefaults) {
+TEST(AgentConfigurationTest, TheSampleIsAFileOfDefaults) {
   // Given the sample as it is shipped, and the same with every key put into force
-  const std::string sample = Testing::readFile(SOURCE_DIR "/agent/agent.ini.sample");
+  const std::string sample = readFile(SOURCE_DIR "/agent/agent.ini.sample");
   std::string inForce;
   std::istringstream lines(sample);
   for (std::string line; std::getline(lines, line);) {
@@ -102,14 +104,14 @@ struct Fault {
   const char* complaint;
 };
 
-class FaultyAgentIni : public testing::TestWithParam<Fault> {};
+class FaultyAgentIniTest : public testing::TestWithParam<Fault> {};
 
-TEST_P(FaultyAgentIni, isRefusedWithTheLineAndTheReason) {
+TEST_P(FaultyAgentIniTest, IsRefusedWithTheLineAndTheReason) {
   EXPECT_EQ(complaintAbout(GetParam().text), GetParam().complaint);
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Each, FaultyAgentIni,
+    Each, FaultyAgentIniTest,
     testing::Values(
         Fault{"name = x\n", "agent.ini:1: the key 'name' stands before any section: move it below its [section]"},
         Fault{"[system]\nname = x\n[sytem]\nname = y\n",
@@ -144,49 +146,49 @@ INSTANTIATE_TEST_SUITE_P(
         Fault{"[system\nname = a\n", "agent.ini:1: must be a [section] or a key = value"}),
     [](const auto& fault) { return "fault" + std::to_string(fault.index); });
 
-TEST(AgentConfiguration, theFirstOfSeveralFaultsIsReported) {
+TEST(AgentConfigurationTest, TheFirstOfSeveralFaultsIsReported) {
   EXPECT_EQ(complaintAbout("[system]\nwords\n[nowhere]\na = b\n"), "agent.ini:2: must be a [section] or a key = value");
   EXPECT_THAT(complaintAbout("[nowhere]\na = b\nwords\n"), StartsWith("agent.ini:2: there is no section [nowhere]"));
 }
 
-TEST(AgentConfiguration, anIndentedKeyIsAKeyAndNoContinuation) {
+TEST(AgentConfigurationTest, AnIndentedKeyIsAKeyAndNoContinuation) {
   const AgentConfiguration configuration = parse("[processor]\n  name = a\n\tdescription = b\n");
   EXPECT_EQ(configuration.processorName, "a");
   EXPECT_EQ(configuration.processorDescription, "b");
 }
 
-TEST(AgentConfiguration, theSectionOfTheChosenBackEndIsPassedOnWhereverItStands) {
+TEST(AgentConfigurationTest, TheSectionOfTheChosenBackEndIsPassedOnWhereverItStands) {
   const AgentConfiguration configuration = parse("[magic]\nwand = 1\n[processor]\nbackend = magic\n[ipmi]\nhost = a\n");
   EXPECT_EQ(configuration.backEnd, "magic");
   EXPECT_EQ(configuration.backEndSettings, (std::map<std::string, std::string>{{"wand", "1"}}));
 }
 
-TEST(AgentConfiguration, commentsBlankLinesAndCarriageReturnsMeanNothing) {
+TEST(AgentConfigurationTest, CommentsBlankLinesAndCarriageReturnsMeanNothing) {
   const AgentConfiguration configuration = parse("; a\r\n# b\r\n\r\n[processor]\r\nname = a;b ; a comment\r\n");
   EXPECT_EQ(configuration.processorName, "a;b");
 }
 
-TEST(AgentConfiguration, theLongestLineIsTakenWholeAndALongerOneRefused) {
+TEST(AgentConfigurationTest, TheLongestLineIsTakenWholeAndALongerOneRefused) {
   const std::string key = "[system]\nname = ";
   const std::string longest(198 - 7, 'x');
   EXPECT_EQ(parse(key + longest + '\n').systemName, longest);
   EXPECT_EQ(complaintAbout(key + longest + "x\n"), "agent.ini:2: the line is longer than 198 characters");
 }
 
-TEST(AgentConfiguration, aNullCharacterIsRefused) {
+TEST(AgentConfigurationTest, ANullCharacterIsRefused) {
   EXPECT_EQ(complaintAbout(std::string("[system]\nname = a\0b\n", 20)),
             "agent.ini:2: the line contains a null character");
 }
 
-TEST(AgentConfiguration, theFileThatTheVariableNamesIsRead) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "a.ini", "[system]\nname = chosen\n");
+TEST(AgentConfigurationTest, TheFileThatTheVariableNamesIsRead) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "a.ini", "[system]\nname = chosen\n");
   const AgentIniVariable variable(directory / "a.ini");
   EXPECT_EQ(readAgentConfiguration().systemName, "chosen");
 }
 
-TEST(AgentConfiguration, aFileThatTheVariableNamesAndThatIsMissingIsAnError) {
-  const Testing::TemporaryDirectory directory;
+TEST(AgentConfigurationTest, AFileThatTheVariableNamesAndThatIsMissingIsAnError) {
+  const TemporaryDirectory directory;
   const AgentIniVariable variable(directory / "none.ini");
   EXPECT_EQ(thrownBy(readAgentConfiguration),
             directory / "none.ini" +
@@ -194,9 +196,9 @@ TEST(AgentConfiguration, aFileThatTheVariableNamesAndThatIsMissingIsAnError) {
                 "[processor] with backend = ipmi for a BMC, or backend = simulated for made-up values");
 }
 
-TEST(AgentConfiguration, AFileThatThisUserMayNotReadIsAnError) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "a.ini", "");
+TEST(AgentConfigurationTest, AFileThatThisUserMayNotReadIsAnError) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "a.ini", "");
   std::filesystem::permissions(directory / "a.ini", std::filesystem::perms::none);
   const AgentIniVariable variable(directory / "a.ini");
   // Even root is held by permissions once it is somebody else.
@@ -210,24 +212,23 @@ TEST(AgentConfiguration, AFileThatThisUserMayNotReadIsAnError) {
               "a.ini: cannot be opened: Permission denied; let the object manager's user read it$");
 }
 
-TEST(AgentConfiguration, IsLookedForInOnePlaceWhateverTheInstallPrefix) {
+TEST(AgentConfigurationTest, IsLookedForInOnePlaceWhateverTheInstallPrefix) {
   EXPECT_EQ(agentConfigurationFile(), CONFIGURATION_DIR "/agent.ini");
   const AgentIniVariable variable("/elsewhere/agent.ini");
   EXPECT_EQ(agentConfigurationFile(), "/elsewhere/agent.ini");
 }
 
-TEST(AgentConfiguration, aDirectoryInPlaceOfTheFileIsAnError) {
-  const Testing::TemporaryDirectory directory;
+TEST(AgentConfigurationTest, ADirectoryInPlaceOfTheFileIsAnError) {
+  const TemporaryDirectory directory;
   const AgentIniVariable variable(directory.path().string());
   EXPECT_THAT(thrownBy(readAgentConfiguration), HasSubstr(directory.path().string() + ": cannot be read"));
 }
 
-TEST(AgentConfiguration, aFaultNamesTheFile) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "a.ini", "[x]\ny = z\n");
+TEST(AgentConfigurationTest, AFaultNamesTheFile) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "a.ini", "[x]\ny = z\n");
   const AgentIniVariable variable(directory / "a.ini");
   EXPECT_THAT(thrownBy(readAgentConfiguration), StartsWith(directory / "a.ini" + ":2: there is no section [x]"));
 }
 
 }  // namespace
-}  // namespace QV

@@ -6,12 +6,14 @@
 #include <string>
 #include <vector>
 
-#include "tests/agent/helper/BrokerFixture.h"
+#include "tests/agent/helper/SampleFixture.h"
 
-namespace QV {
 namespace {
 
-class MapProperty : public WithBroker {
+using namespace QV;
+using namespace Testing;
+
+class MapPropertyTest : public SampleFixture {
  protected:
   // The target's property after mapping the source's: its status is kept in status_.
   CMPIData map(const char* name, DataType type) {
@@ -36,7 +38,7 @@ class MapProperty : public WithBroker {
   CMPIStatus status_{CMPI_RC_ERROR, nullptr};
 };
 
-TEST_F(MapProperty, copiesAString) {
+TEST_F(MapPropertyTest, CopiesAString) {
   CMSetProperty(source_, "Text", "größe", CMPI_chars);
   const CMPIData data = map("Text", String);
   ASSERT_EQ(data.type, CMPI_string);
@@ -44,14 +46,14 @@ TEST_F(MapProperty, copiesAString) {
   EXPECT_EQ(status_.rc, CMPI_RC_OK);
 }
 
-TEST_F(MapProperty, copiesAnEmptyString) {
+TEST_F(MapPropertyTest, CopiesAnEmptyString) {
   CMSetProperty(source_, "Text", "", CMPI_chars);
   const CMPIData data = map("Text", String);
   ASSERT_FALSE(CMIsNullValue(data));
   EXPECT_EQ(characters(data.value.string), "");
 }
 
-TEST_F(MapProperty, copiesAUint16AndAUint8) {
+TEST_F(MapPropertyTest, CopiesAUint16AndAUint8) {
   CMPIValue value{};
   value.uint16 = 65535;
   set("U16", value, CMPI_uint16);
@@ -68,7 +70,7 @@ TEST_F(MapProperty, copiesAUint16AndAUint8) {
   EXPECT_EQ(narrow.value.uint8, 255);
 }
 
-TEST_F(MapProperty, refusesWhatTheTypeCannotRepresent) {
+TEST_F(MapPropertyTest, RefusesWhatTheTypeCannotRepresent) {
   CMPIValue value{};
   value.boolean = 1;
   set("Truth", value, CMPI_boolean);
@@ -93,24 +95,24 @@ TEST_F(MapProperty, refusesWhatTheTypeCannotRepresent) {
   expectMismatch("Text", Uint8);
 }
 
-TEST_F(MapProperty, refusesAnArray) {
+TEST_F(MapPropertyTest, RefusesAnArray) {
   CMPIValue value{};
-  value.array = CMNewArray(broker(), 1, CMPI_uint16, nullptr);
+  value.array = CMNewArray(broker, 1, CMPI_uint16, nullptr);
   set("Numbers", value, CMPI_uint16A);
   expectMismatch("Numbers", Uint16);
 }
 
-TEST_F(MapProperty, leavesANullPropertyUnset) {
+TEST_F(MapPropertyTest, LeavesANullPropertyUnset) {
   EXPECT_TRUE(CMIsNullValue(map("Text", String)));
   EXPECT_EQ(status_.rc, CMPI_RC_OK);
 }
 
-TEST_F(MapProperty, tellsThatTheSourceHasNoSuchProperty) {
+TEST_F(MapPropertyTest, TellsThatTheSourceHasNoSuchProperty) {
   mapProperty(instanceData(source_), target_, "Missing", String, &status_);
   EXPECT_EQ(status_.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 }
 
-TEST_F(MapProperty, worksWithoutAStatus) {
+TEST_F(MapPropertyTest, WorksWithoutAStatus) {
   CMSetProperty(source_, "Text", "x", CMPI_chars);
   mapProperty(instanceData(source_), target_, "Text", String, nullptr);
   EXPECT_FALSE(CMIsNullValue(read("Text")));
@@ -118,7 +120,7 @@ TEST_F(MapProperty, worksWithoutAStatus) {
   mapProperty(instanceData(source_), target_, "Text", Uint8, nullptr);
 }
 
-TEST_F(MapProperty, readsAnInstanceWhateverItsStateSays) {
+TEST_F(MapPropertyTest, ReadsAnInstanceWhateverItsStateSays) {
   CMSetProperty(source_, "Text", "x", CMPI_chars);
   for (const int state : {CMPI_nullValue, CMPI_keyValue, CMPI_notFound, CMPI_badValue, 0xffff}) {
     CMPIData item = instanceData(source_);
@@ -132,9 +134,9 @@ TEST_F(MapProperty, readsAnInstanceWhateverItsStateSays) {
   }
 }
 
-TEST_F(MapProperty, neverFollowsAnItemThatIsNoInstance) {
-  CMPIString* string = CMNewString(broker(), "x", nullptr);
-  CMPIArray* instances = CMNewArray(broker(), 1, CMPI_instance, nullptr);
+TEST_F(MapPropertyTest, NeverFollowsAnItemThatIsNoInstance) {
+  CMPIString* string = CMNewString(broker, "x", nullptr);
+  CMPIArray* instances = CMNewArray(broker, 1, CMPI_instance, nullptr);
   CMPIValue element{};
   element.inst = source_;
   CMSetArrayElementAt(instances, 0, &element, CMPI_instance);
@@ -154,7 +156,7 @@ TEST_F(MapProperty, neverFollowsAnItemThatIsNoInstance) {
   add(CMPI_string, [&](CMPIValue& value) { value.string = string; });
   add(CMPI_chars, [&](CMPIValue& value) { value.chars = const_cast<char*>("x"); });
   add(CMPI_ref, [&](CMPIValue& value) { value.ref = path("Sample"); });
-  add(CMPI_dateTime, [&](CMPIValue& value) { value.dateTime = CMNewDateTime(broker(), nullptr); });
+  add(CMPI_dateTime, [&](CMPIValue& value) { value.dateTime = CMNewDateTime(broker, nullptr); });
   add(CMPI_instanceA, [&](CMPIValue& value) { value.array = instances; });
 
   for (const CMPIData& item : items) {
@@ -164,14 +166,14 @@ TEST_F(MapProperty, neverFollowsAnItemThatIsNoInstance) {
   EXPECT_TRUE(CMIsNullValue(read("Id")));
 }
 
-TEST_F(MapProperty, setsNothingThatIsReadBesideAnError) {
+TEST_F(MapPropertyTest, SetsNothingThatIsReadBesideAnError) {
   CMSetProperty(source_, "Text", "x", CMPI_chars);
   Altered altered(source_);
   static CMPIInstanceFT real;
   real = *target_->ft;
-  altered.table.getProperty = [](const CMPIInstance* instance, const char* name, CMPIStatus* status) {
+  altered.table.getProperty = [](const CMPIInstance* instance, const char* name, CMPIStatus* code) {
     const CMPIData data = real.getProperty(instance, name, nullptr);
-    *status = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
+    *code = {CMPI_RC_ERR_ACCESS_DENIED, nullptr};
     return data;
   };
 
@@ -180,12 +182,12 @@ TEST_F(MapProperty, setsNothingThatIsReadBesideAnError) {
 }
 
 // What getProperty answers with rc OK, and what becomes of it as a string and as a number.
-TEST_F(MapProperty, setsNothingWhereThePropertyHasNoValueOrNoObject) {
+TEST_F(MapPropertyTest, SetsNothingWhereThePropertyHasNoValueOrNoObject) {
   static CMPIData answer;
   Altered altered(source_);
   altered.table.getProperty = [](const CMPIInstance*, const char*, CMPIStatus*) { return answer; };
-  CMPIString withoutHandle{nullptr, CMNewString(broker(), "x", nullptr)->ft};
-  Altered withoutCharacters(CMNewString(broker(), "x", nullptr));
+  CMPIString withoutHandle{nullptr, CMNewString(broker, "x", nullptr)->ft};
+  Altered withoutCharacters(CMNewString(broker, "x", nullptr));
   withoutCharacters.table.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
   const auto expectUnset = [&](const char* what) {
     EXPECT_TRUE(CMIsNullValue(map("Text", String))) << what;
@@ -197,7 +199,7 @@ TEST_F(MapProperty, setsNothingWhereThePropertyHasNoValueOrNoObject) {
     answer = {CMPI_uint16, static_cast<CMPIValueState>(state), {}};
     expectUnset("a number without a value");
     answer = {CMPI_string, static_cast<CMPIValueState>(state), {}};
-    answer.value.string = CMNewString(broker(), "x", nullptr);
+    answer.value.string = CMNewString(broker, "x", nullptr);
     expectUnset("a string without a value");
   }
   answer = {CMPI_string, CMPI_goodValue, {}};
@@ -212,7 +214,7 @@ TEST_F(MapProperty, setsNothingWhereThePropertyHasNoValueOrNoObject) {
   expectUnset("no type");
 }
 
-TEST_F(MapProperty, copiesCharacters) {
+TEST_F(MapPropertyTest, CopiesCharacters) {
   static CMPIData answer;
   answer = {CMPI_chars, CMPI_goodValue, {}};
   answer.value.chars = const_cast<char*>("x");
@@ -223,7 +225,7 @@ TEST_F(MapProperty, copiesCharacters) {
   EXPECT_EQ(characters(data.value.string), "x");
 }
 
-TEST_F(MapProperty, leavesNullsAlone) {
+TEST_F(MapPropertyTest, LeavesNullsAlone) {
   CMSetProperty(source_, "Text", "x", CMPI_chars);
   CMPIInstance emptyHandle{nullptr, source_->ft};
   mapProperty(instanceData(nullptr), target_, "Text", String, &status_);
@@ -246,13 +248,13 @@ struct Number {
 
 void PrintTo(const Number& number, std::ostream* stream) { *stream << number.typeName << ' ' << number.value; }
 
-class MapNumber : public WithBroker, public testing::WithParamInterface<Number> {
+class MapNumberTest : public SampleFixture, public testing::WithParamInterface<Number> {
  protected:
   // An instance whose properties of the target's names have the number's type.
   CMPIInstance* source() {
     const std::string type = GetParam().typeName;
-    manager_.loadSchemaText("class Source { [key] string Id; " + type + " U16; " + type + " U8; };", "root/test");
-    CMPIInstance* made = CMNewInstance(broker(), path("Source"), nullptr);
+    manager.loadSchemaText("class Source { [key] string Id; " + type + " U16; " + type + " U8; };", "root/test");
+    CMPIInstance* made = CMNewInstance(broker, path("Source"), nullptr);
     const CMPIValue value = valueOf(GetParam());
     for (const char* name : {"U16", "U8"}) {
       EXPECT_EQ(CMSetProperty(made, name, &value, GetParam().type).rc, CMPI_RC_OK) << name;
@@ -291,7 +293,7 @@ class MapNumber : public WithBroker, public testing::WithParamInterface<Number> 
   }
 };
 
-TEST_P(MapNumber, reachesTheTargetWhereItFits) {
+TEST_P(MapNumberTest, ReachesTheTargetWhereItFits) {
   // When a number is mapped into both widths
   CMPIInstance* from = source();
   CMPIInstance* target = sample();
@@ -316,7 +318,7 @@ TEST_P(MapNumber, reachesTheTargetWhereItFits) {
 }
 
 INSTANTIATE_TEST_SUITE_P(
-    Each, MapNumber,
+    Each, MapNumberTest,
     testing::Values(Number{CMPI_uint8, "uint8", 255, true, true}, Number{CMPI_sint8, "sint8", 127, true, true},
                     Number{CMPI_sint8, "sint8", -1, false, false}, Number{CMPI_uint16, "uint16", 255, true, true},
                     Number{CMPI_uint16, "uint16", 256, true, false}, Number{CMPI_sint16, "sint16", 32767, true, false},
@@ -327,4 +329,3 @@ INSTANTIATE_TEST_SUITE_P(
                     Number{CMPI_sint64, "sint64", -65535, false, false}));
 
 }  // namespace
-}  // namespace QV

@@ -5,12 +5,14 @@
 #include <memory>
 #include <vector>
 
-#include "tests/agent/helper/BrokerFixture.h"
+#include "tests/agent/helper/SampleFixture.h"
 
-namespace QV {
 namespace {
 
-class ObjectPaths : public WithBroker {
+using namespace QV;
+using namespace Testing;
+
+class ObjectPathEqualityTest : public SampleFixture {
  protected:
   CMPIObjectPath* keyed(const char* a, const char* b) const {
     CMPIObjectPath* made = path("Keyed");
@@ -65,7 +67,7 @@ class ObjectPaths : public WithBroker {
   }
 };
 
-TEST_F(ObjectPaths, areEqualByClassAndKeys) {
+TEST_F(ObjectPathEqualityTest, AreEqualByClassAndKeys) {
   EXPECT_TRUE(equal(keyed("1", "2"), keyed("1", "2")));
   EXPECT_FALSE(equal(keyed("1", "2"), keyed("1", "3")));
   EXPECT_FALSE(equal(keyed("1", "2"), keyed("2", "1")));
@@ -73,34 +75,34 @@ TEST_F(ObjectPaths, areEqualByClassAndKeys) {
   EXPECT_TRUE(equal(path("Keyed"), path("Keyed"))) << "two paths without keys";
 }
 
-TEST_F(ObjectPaths, areEqualWhateverTheOrderOfTheirKeysAndTheCaseOfTheirNames) {
+TEST_F(ObjectPathEqualityTest, AreEqualWhateverTheOrderOfTheirKeysAndTheCaseOfTheirNames) {
   CMPIObjectPath* other = path("kEYED");
   CMAddKey(other, "b", "2", CMPI_chars);
   CMAddKey(other, "a", "1", CMPI_chars);
   EXPECT_TRUE(equal(keyed("1", "2"), other));
 }
 
-TEST_F(ObjectPaths, differWithTheNumberOfTheirKeys) {
+TEST_F(ObjectPathEqualityTest, DifferWithTheNumberOfTheirKeys) {
   CMPIObjectPath* fewer = path("Keyed");
   CMAddKey(fewer, "A", "1", CMPI_chars);
   EXPECT_FALSE(equal(keyed("1", "2"), fewer));
   EXPECT_FALSE(equal(keyed("1", "2"), path("Keyed")));
 }
 
-TEST_F(ObjectPaths, differWithTheNamesOfTheirKeys) {
+TEST_F(ObjectPathEqualityTest, DifferWithTheNamesOfTheirKeys) {
   CMPIObjectPath* other = path("Keyed");
   CMAddKey(other, "A", "1", CMPI_chars);
   CMAddKey(other, "C", "2", CMPI_chars);
   EXPECT_FALSE(equal(keyed("1", "2"), other));
 }
 
-TEST_F(ObjectPaths, compareStringsExactly) {
+TEST_F(ObjectPathEqualityTest, CompareStringsExactly) {
   EXPECT_FALSE(equal(ofText("eth0"), ofText("ETH0")));
   EXPECT_FALSE(equal(ofText("eth0"), ofText("eth0 ")));
   EXPECT_TRUE(equal(ofText(""), ofText("")));
 }
 
-TEST_F(ObjectPaths, compareNumbersAcrossWidthsAndSigns) {
+TEST_F(ObjectPathEqualityTest, CompareNumbersAcrossWidthsAndSigns) {
   EXPECT_TRUE(equal(ofUnsigned(7), ofSigned(7)));
   EXPECT_FALSE(equal(ofUnsigned(7), ofSigned(8)));
   EXPECT_FALSE(equal(ofUnsigned(65535), ofSigned(-1)));
@@ -109,24 +111,24 @@ TEST_F(ObjectPaths, compareNumbersAcrossWidthsAndSigns) {
   EXPECT_FALSE(equal(of(CMPI_uint64, all), ofSigned(-1)));
 }
 
-TEST_F(ObjectPaths, tellTheTypesOfValuesApart) {
+TEST_F(ObjectPathEqualityTest, TellTheTypesOfValuesApart) {
   EXPECT_FALSE(equal(ofText("7"), ofSigned(7)));
   EXPECT_FALSE(equal(ofText("true"), ofBoolean(true)));
   EXPECT_FALSE(equal(ofBoolean(true), ofSigned(1)));
 }
 
-TEST_F(ObjectPaths, compareBooleans) {
+TEST_F(ObjectPathEqualityTest, CompareBooleans) {
   EXPECT_TRUE(equal(ofBoolean(true), ofBoolean(true)));
   EXPECT_FALSE(equal(ofBoolean(true), ofBoolean(false)));
 }
 
-TEST_F(ObjectPaths, findNullKeysEqualToEachOtherAndToNothingElse) {
+TEST_F(ObjectPathEqualityTest, FindNullKeysEqualToEachOtherAndToNothingElse) {
   EXPECT_TRUE(equal(ofNull(), ofNull()));
   EXPECT_FALSE(equal(ofNull(), ofText("")));
   EXPECT_FALSE(equal(ofNull(), ofSigned(0)));
 }
 
-TEST_F(ObjectPaths, compareReferencesByClassAndKeys) {
+TEST_F(ObjectPathEqualityTest, CompareReferencesByClassAndKeys) {
   EXPECT_TRUE(equal(ofReference(keyed("1", "2")), ofReference(keyed("1", "2"))));
   EXPECT_FALSE(equal(ofReference(keyed("1", "2")), ofReference(keyed("1", "3"))));
   EXPECT_FALSE(equal(ofReference(keyed("1", "2")), ofReference(path("Keyed"))));
@@ -134,7 +136,7 @@ TEST_F(ObjectPaths, compareReferencesByClassAndKeys) {
   EXPECT_TRUE(equal(ofReference(ofReference(ofText("x"))), ofReference(ofReference(ofText("x")))));
 }
 
-TEST_F(ObjectPaths, doNotCompareHosts) {
+TEST_F(ObjectPathEqualityTest, DoNotCompareHosts) {
   CMPIObjectPath* here = keyed("1", "2");
   CMPIObjectPath* there = keyed("1", "2");
   CMSetHostname(here, "localhost");
@@ -143,7 +145,7 @@ TEST_F(ObjectPaths, doNotCompareHosts) {
   EXPECT_TRUE(equal(here, keyed("1", "2"), true));
 }
 
-TEST_F(ObjectPaths, compareNamespacesWhereTheyAreToldTo) {
+TEST_F(ObjectPathEqualityTest, CompareNamespacesWhereTheyAreToldTo) {
   CMPIObjectPath* other = path("Keyed", "root/other");
   EXPECT_TRUE(equal(path("Keyed"), other, false));
   EXPECT_FALSE(equal(path("Keyed"), other, true));
@@ -151,28 +153,28 @@ TEST_F(ObjectPaths, compareNamespacesWhereTheyAreToldTo) {
   EXPECT_TRUE(equal(path("Keyed"), path("Keyed", "ROOT/Test"), true));
 }
 
-TEST_F(ObjectPaths, doNotCompareANamespaceThatOneOfThemLacks) {
+TEST_F(ObjectPathEqualityTest, DoNotCompareANamespaceThatOneOfThemLacks) {
   EXPECT_TRUE(equal(path("Keyed"), path("Keyed", ""), true));
 }
 
 // What object managers may hand out: each makes the path equal to nothing, itself included, without a crash.
-TEST_F(ObjectPaths, whoseClassIsNotToldEqualNothing) {
+TEST_F(ObjectPathEqualityTest, WhoseClassIsNotToldEqualNothing) {
   static CMPIString withoutCharacters;
   static CMPIStringFT withoutCharactersTable;
-  withoutCharactersTable = *CMNewString(broker(), "x", nullptr)->ft;
+  withoutCharactersTable = *CMNewString(broker, "x", nullptr)->ft;
   withoutCharactersTable.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };
   withoutCharacters = {&withoutCharacters, &withoutCharactersTable};
   using Get = CMPIString*(const CMPIObjectPath*, CMPIStatus*);
   Get* const gets[] = {
       [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; },
       [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return &withoutCharacters; },
-      [](const CMPIObjectPath* path, CMPIStatus* status) {
+      [](const CMPIObjectPath* path, CMPIStatus* code) {
         CMPIString* name = CMGetNameSpace(path, nullptr);
-        *status = {CMPI_RC_ERR_FAILED, nullptr};
+        *code = {CMPI_RC_ERR_FAILED, nullptr};
         return name;
       },
   };
-  for (Get* const get : gets) {
+  for (Get* get : gets) {
     Altered one(keyed("1", "2"));
     Altered other(keyed("1", "2"));
     one.table.getClassName = get;
@@ -182,18 +184,18 @@ TEST_F(ObjectPaths, whoseClassIsNotToldEqualNothing) {
   }
 }
 
-TEST_F(ObjectPaths, withoutANamespaceAreComparedWithoutIt) {
+TEST_F(ObjectPathEqualityTest, WithoutANamespaceAreComparedWithoutIt) {
   Altered lacking(keyed("1", "2"));
   lacking.table.getNameSpace = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
   EXPECT_TRUE(equal(lacking, keyed("1", "2"), true));
-  lacking.table.getNameSpace = [](const CMPIObjectPath* path, CMPIStatus* status) {
-    *status = {CMPI_RC_ERR_FAILED, nullptr};
+  lacking.table.getNameSpace = [](const CMPIObjectPath* path, CMPIStatus* code) {
+    *code = {CMPI_RC_ERR_FAILED, nullptr};
     return CMGetClassName(path, nullptr);
   };
   EXPECT_TRUE(equal(lacking, keyed("1", "2"), true)) << "what is read beside an error is none";
 }
 
-TEST_F(ObjectPaths, whoseKeysCannotBeReadEqualNothing) {
+TEST_F(ObjectPathEqualityTest, WhoseKeysCannotBeReadEqualNothing) {
   static CMPIObjectPathFT real;
   real = *path("Keyed")->ft;
   const auto expectNoneEqual = [this](const auto& alter) {
@@ -206,31 +208,31 @@ TEST_F(ObjectPaths, whoseKeysCannotBeReadEqualNothing) {
     EXPECT_FALSE(equal(one, path("Keyed")));
   };
   expectNoneEqual([](CMPIObjectPathFT& table) {
-    table.getKeyCount = [](const CMPIObjectPath*, CMPIStatus* status) {
-      *status = {CMPI_RC_ERR_FAILED, nullptr};
+    table.getKeyCount = [](const CMPIObjectPath*, CMPIStatus* code) {
+      *code = {CMPI_RC_ERR_FAILED, nullptr};
       return CMPICount{0};
     };
   });
   expectNoneEqual([](CMPIObjectPathFT& table) {
-    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* status) {
+    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* code) {
       const CMPIData data = real.getKeyAt(path, index, name, nullptr);
-      *status = {CMPI_RC_ERR_FAILED, nullptr};
+      *code = {CMPI_RC_ERR_FAILED, nullptr};
       return data;
     };
   });
   expectNoneEqual([](CMPIObjectPathFT& table) {
-    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* status) {
-      const CMPIData data = real.getKeyAt(path, index, nullptr, status);
+    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus* code) {
+      const CMPIData data = real.getKeyAt(path, index, nullptr, code);
       *name = nullptr;
       return data;
     };
   });
 }
 
-TEST_F(ObjectPaths, areEqualInBothDirectionsWhereAKeyComesTwice) {
+TEST_F(ObjectPathEqualityTest, AreEqualInBothDirectionsWhereAKeyComesTwice) {
   Altered twice(keyed("1", "2"));
-  twice.table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* status) {
-    *status = {CMPI_RC_OK, nullptr};
+  twice.table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* code) {
+    *code = {CMPI_RC_OK, nullptr};
     *name = CMGetNameSpace(path, nullptr);
     CMPIData data{};
     data.type = CMPI_uint16;
@@ -241,15 +243,15 @@ TEST_F(ObjectPaths, areEqualInBothDirectionsWhereAKeyComesTwice) {
 }
 
 // A key as an object manager may deliver it, in a path with that key alone.
-class KeysAsDelivered : public ObjectPaths {
+class KeysAsDeliveredTest : public ObjectPathEqualityTest {
  protected:
   CMPIObjectPath* delivering(CMPIData data) {
     CMPIObjectPath* made = ofText("placeholder");
     const auto [entry, inserted] = delivered.emplace(made, data);
     EXPECT_TRUE(inserted);
     altered_.push_back(std::make_unique<Altered<CMPIObjectPath>>(made));
-    altered_.back()->table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* status) {
-      *status = {CMPI_RC_OK, nullptr};
+    altered_.back()->table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* code) {
+      *code = {CMPI_RC_OK, nullptr};
       *name = CMGetClassName(path, nullptr);
       return delivered.at(path);
     };
@@ -267,13 +269,13 @@ class KeysAsDelivered : public ObjectPaths {
   std::vector<std::unique_ptr<Altered<CMPIObjectPath>>> altered_;
 };
 
-TEST_F(KeysAsDelivered, areTheSameAsCharactersAndAsAString) {
+TEST_F(KeysAsDeliveredTest, AreTheSameAsCharactersAndAsAString) {
   CMPIData asCharacters{};
   asCharacters.type = CMPI_chars;
   asCharacters.value.chars = const_cast<char*>("eth0");
   CMPIData asString{};
   asString.type = CMPI_string;
-  asString.value.string = CMNewString(broker(), "eth0", nullptr);
+  asString.value.string = CMNewString(broker, "eth0", nullptr);
   EXPECT_TRUE(equal(delivering(asCharacters), delivering(asString)));
 
   CMPIData asKey = asString;
@@ -281,8 +283,8 @@ TEST_F(KeysAsDelivered, areTheSameAsCharactersAndAsAString) {
   EXPECT_TRUE(equal(delivering(asCharacters), delivering(asKey)));
 }
 
-TEST_F(KeysAsDelivered, withoutAValueEqualEachOtherAndNothingElse) {
-  CMPIString withoutHandle{nullptr, CMNewString(broker(), "x", nullptr)->ft};
+TEST_F(KeysAsDeliveredTest, WithoutAValueEqualEachOtherAndNothingElse) {
+  CMPIString withoutHandle{nullptr, CMNewString(broker, "x", nullptr)->ft};
   std::vector<CMPIData> withoutValue;
   for (const int type : {CMPI_string, CMPI_chars, CMPI_ref, CMPI_dateTime}) {
     withoutValue.push_back({static_cast<CMPIType>(type), CMPI_goodValue, {}});
@@ -296,7 +298,7 @@ TEST_F(KeysAsDelivered, withoutAValueEqualEachOtherAndNothingElse) {
   CMPIData seven{CMPI_uint64, CMPI_keyValue, {}};
   seven.value.uint64 = 7;
   CMPIData empty{CMPI_string, CMPI_keyValue, {}};
-  empty.value.string = CMNewString(broker(), "", nullptr);
+  empty.value.string = CMNewString(broker, "", nullptr);
 
   for (const CMPIData& data : withoutValue) {
     EXPECT_TRUE(equal(delivering(data), delivering(withoutValue.front()))) << data.type << ' ' << data.state;
@@ -305,7 +307,7 @@ TEST_F(KeysAsDelivered, withoutAValueEqualEachOtherAndNothingElse) {
   }
 }
 
-TEST_F(KeysAsDelivered, thatReferToAPathWhoseClassIsNotToldEqualNothing) {
+TEST_F(KeysAsDeliveredTest, ThatReferToAPathWhoseClassIsNotToldEqualNothing) {
   Altered nameless(keyed("1", "2"));
   CMPIData reference{CMPI_ref, CMPI_keyValue, {}};
   reference.value.ref = nameless;
@@ -315,7 +317,7 @@ TEST_F(KeysAsDelivered, thatReferToAPathWhoseClassIsNotToldEqualNothing) {
   EXPECT_FALSE(equal(delivering(reference), delivering(reference)));
 }
 
-TEST_F(KeysAsDelivered, areNotFollowedWhereTheirTypeIsNoneOfAKey) {
+TEST_F(KeysAsDeliveredTest, AreNotFollowedWhereTheirTypeIsNoneOfAKey) {
   for (const int type : {CMPI_null, CMPI_instance, CMPI_stringA, CMPI_refA, CMPI_uint16A, 0xffff}) {
     CMPIData data{static_cast<CMPIType>(type), CMPI_keyValue, {}};
     data.value.uint64 = 0x0101010101010101;
@@ -323,7 +325,7 @@ TEST_F(KeysAsDelivered, areNotFollowedWhereTheirTypeIsNoneOfAKey) {
   }
 }
 
-TEST_F(ObjectPaths, thatAreNullEqualNothing) {
+TEST_F(ObjectPathEqualityTest, ThatAreNullEqualNothing) {
   CMPIObjectPath emptyHandle{nullptr, path("Keyed")->ft};
   EXPECT_FALSE(equal(nullptr, path("Keyed")));
   EXPECT_FALSE(equal(&emptyHandle, path("Keyed")));
@@ -331,4 +333,3 @@ TEST_F(ObjectPaths, thatAreNullEqualNothing) {
 }
 
 }  // namespace
-}  // namespace QV

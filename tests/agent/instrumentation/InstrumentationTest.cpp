@@ -7,24 +7,25 @@
 #include <thread>
 #include <vector>
 
-#include "tests/agent/support/AgentEnvironment.h"
-#include "tests/agent/support/Throws.h"
+#include "tests/support/agent/AgentEnvironment.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using namespace NodeLexicon;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
 [[maybe_unused]] const auto* const environment = testing::AddGlobalTestEnvironment(&AgentEnvironment::instance());
 
-class AnInstrumentation : public testing::Test {
+class InstrumentationTest : public testing::Test {
  protected:
   void SetUp() override { AgentEnvironment::instance().reset(); }
 
-  static std::string log() { return Testing::readFile(AgentEnvironment::instance().log()); }
-  static std::string state() { return Testing::readFile(AgentEnvironment::instance().state()); }
+  static std::string log() { return readFile(AgentEnvironment::instance().log()); }
+  static std::string state() { return readFile(AgentEnvironment::instance().state()); }
 
   static std::string address() {
     Instrumentation reader;
@@ -34,7 +35,7 @@ class AnInstrumentation : public testing::Test {
   }
 };
 
-TEST_F(AnInstrumentation, walksTheInterfaces) {
+TEST_F(InstrumentationTest, WalksTheInterfaces) {
   Instrumentation instrumentation;
   EXPECT_FALSE(instrumentation);
   instrumentation.selectNode(IpInterfaceNode);
@@ -45,7 +46,7 @@ TEST_F(AnInstrumentation, walksTheInterfaces) {
   EXPECT_THAT(names, testing::ElementsAre("eth0", "eth1"));
 }
 
-TEST_F(AnInstrumentation, sendsAWaitingAddressWhenItIsDestroyed) {
+TEST_F(InstrumentationTest, SendsAWaitingAddressWhenItIsDestroyed) {
   {
     Instrumentation instrumentation;
     instrumentation.selectNode(IpInterfaceNode);
@@ -57,19 +58,19 @@ TEST_F(AnInstrumentation, sendsAWaitingAddressWhenItIsDestroyed) {
   EXPECT_THAT(log(), IsEmpty());
 }
 
-TEST_F(AnInstrumentation, throwsLogsAndTracesARefusal) {
+TEST_F(InstrumentationTest, ThrowsLogsAndTracesARefusal) {
   Instrumentation instrumentation;
   instrumentation.selectNode(IpInterfaceNode);
   std::string value = "192.0.2.0256";
   const std::string refusal = thrownBy([&] { instrumentation.setProperty(Ipv4Address, value); });
   EXPECT_THAT(refusal, HasSubstr("interface eth0: the IPv4 address '192.0.2.0256' is not four decimal numbers"));
-  for (const std::string& lines : {log(), Testing::readFile(AgentEnvironment::instance().trace())}) {
+  for (const std::string& lines : {log(), readFile(AgentEnvironment::instance().trace())}) {
     EXPECT_THAT(lines, HasSubstr(" 6000 Tarnwick.Instrumentation setProperty (Instrumentation:"));
     EXPECT_THAT(lines, testing::EndsWith(refusal + '\n'));
   }
 }
 
-TEST_F(AnInstrumentation, logsWhatItCannotThrowAnyMore) {
+TEST_F(InstrumentationTest, LogsWhatItCannotThrowAnyMore) {
   {
     Instrumentation instrumentation;
     instrumentation.selectNode(IpInterfaceNode);
@@ -81,8 +82,8 @@ TEST_F(AnInstrumentation, logsWhatItCannotThrowAnyMore) {
   EXPECT_THAT(log(), HasSubstr("its broadcast address; nothing was changed"));
 }
 
-TEST_F(AnInstrumentation, throwsAndLogsADamagedStateAndLeavesIt) {
-  Testing::writeFile(AgentEnvironment::instance().state(), "{");
+TEST_F(InstrumentationTest, ThrowsAndLogsADamagedStateAndLeavesIt) {
+  writeFile(AgentEnvironment::instance().state(), "{");
   Instrumentation instrumentation;
   EXPECT_THAT(thrownBy([&] { instrumentation.selectNode(IpInterfaceNode); }), HasSubstr("processor.json: "));
   EXPECT_THAT(log(), HasSubstr("processor.json: "));
@@ -90,7 +91,7 @@ TEST_F(AnInstrumentation, throwsAndLogsADamagedStateAndLeavesIt) {
   EXPECT_EQ(state(), "{");
 }
 
-TEST_F(AnInstrumentation, servesSeveralThreadsAtOnce) {
+TEST_F(InstrumentationTest, ServesSeveralThreadsAtOnce) {
   {
     std::vector<std::jthread> threads;
     for (int thread = 1; thread <= 4; ++thread) {
@@ -109,4 +110,3 @@ TEST_F(AnInstrumentation, servesSeveralThreadsAtOnce) {
 }
 
 }  // namespace
-}  // namespace QV

@@ -4,13 +4,14 @@
 #include "agent/backends/simulated/StateText.h"
 #include "agent/instrumentation/InterfaceCursor.h"
 #include "tests/agent/instrumentation/RecordingBackEnd.h"
-#include "tests/agent/support/Addresses.h"
-#include "tests/agent/support/Throws.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/system/TemporaryDirectory.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using NodeLexicon::IpInterfaceNode;
 using NodeLexicon::Ipv4Address;
 using NodeLexicon::Ipv4SubnetMask;
@@ -23,9 +24,9 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 
 // A cursor on the first of the factory configuration's interfaces: eth0, 192.0.2.10/24; eth1, DHCP.
-class AnInterfaceCursor : public testing::Test {
+class InterfaceCursorTest : public testing::Test {
  protected:
-  AnInterfaceCursor() { cursor_.select(IpInterfaceNode); }
+  InterfaceCursorTest() { cursor_.select(IpInterfaceNode); }
 
   std::string get(Properties property) {
     std::string value = "unread";
@@ -33,19 +34,19 @@ class AnInterfaceCursor : public testing::Test {
   }
 
   void install(const ManagementProcessor& processor) {
-    Testing::writeFile(state_, writeState(processor));
+    writeFile(state_, writeState(processor));
     cursor_.select(IpInterfaceNode);
   }
 
   NetworkInterface onProcessor(std::size_t index) { return backEnd_->read().interfaces.at(index); }
 
-  const Testing::TemporaryDirectory directory_;
+  const TemporaryDirectory directory_;
   const std::string state_ = directory_ / "state.json";
   const std::shared_ptr<RecordingBackEnd> backEnd_ = std::make_shared<RecordingBackEnd>(state_);
   InterfaceCursor cursor_{backEnd_};
 };
 
-TEST_F(AnInterfaceCursor, walksTheInterfacesInOrder) {
+TEST_F(InterfaceCursorTest, WalksTheInterfacesInOrder) {
   EXPECT_TRUE(cursor_.onNode());
   EXPECT_EQ(get(NodeName), "eth0");
   EXPECT_EQ(get(Ipv4Address), "192.0.2.10");
@@ -56,7 +57,7 @@ TEST_F(AnInterfaceCursor, walksTheInterfacesInOrder) {
   EXPECT_FALSE(cursor_.onNode());
 }
 
-TEST_F(AnInterfaceCursor, readsAndWritesNothingPastTheEnd) {
+TEST_F(InterfaceCursorTest, ReadsAndWritesNothingPastTheEnd) {
   cursor_.advance();
   cursor_.advance();
   cursor_.advance();
@@ -66,20 +67,20 @@ TEST_F(AnInterfaceCursor, readsAndWritesNothingPastTheEnd) {
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, standsNowhereBeforeItIsSet) { EXPECT_FALSE(InterfaceCursor(backEnd_).onNode()); }
+TEST_F(InterfaceCursorTest, StandsNowhereBeforeItIsSet) { EXPECT_FALSE(InterfaceCursor(backEnd_).onNode()); }
 
-TEST_F(AnInterfaceCursor, findsNoNodesOfAnotherType) {
+TEST_F(InterfaceCursorTest, FindsNoNodesOfAnotherType) {
   cursor_.select(static_cast<NodeType>(30));
   EXPECT_FALSE(cursor_.onNode());
 }
 
-TEST_F(AnInterfaceCursor, startsAgainWhenItIsSetAgain) {
+TEST_F(InterfaceCursorTest, StartsAgainWhenItIsSetAgain) {
   cursor_.advance();
   cursor_.select(IpInterfaceNode);
   EXPECT_EQ(get(NodeName), "eth0");
 }
 
-TEST_F(AnInterfaceCursor, passesOverANodeWhoseNameCannotBeRead) {
+TEST_F(InterfaceCursorTest, PassesOverANodeWhoseNameCannotBeRead) {
   ManagementProcessor processor = factoryConfiguration();
   processor.interfaces[0].name.reset();
   install(processor);
@@ -87,7 +88,7 @@ TEST_F(AnInterfaceCursor, passesOverANodeWhoseNameCannotBeRead) {
   EXPECT_EQ(get(NodeName), "eth1");
 }
 
-TEST_F(AnInterfaceCursor, writesNothingToANodeWithoutAName) {
+TEST_F(InterfaceCursorTest, WritesNothingToANodeWithoutAName) {
   ManagementProcessor processor = factoryConfiguration();
   processor.interfaces[0].name.reset();
   install(processor);
@@ -96,7 +97,7 @@ TEST_F(AnInterfaceCursor, writesNothingToANodeWithoutAName) {
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, staysOnANodeWhoseAddressCannotBeRead) {
+TEST_F(InterfaceCursorTest, StaysOnANodeWhoseAddressCannotBeRead) {
   ManagementProcessor processor = factoryConfiguration();
   processor.interfaces[0].ipv4Address.reset();
   install(processor);
@@ -104,13 +105,13 @@ TEST_F(AnInterfaceCursor, staysOnANodeWhoseAddressCannotBeRead) {
   EXPECT_EQ(get(NodeName), "eth0");
 }
 
-TEST_F(AnInterfaceCursor, knowsNoOtherProperties) {
+TEST_F(InterfaceCursorTest, KnowsNoOtherProperties) {
   EXPECT_EQ(get(static_cast<Properties>(27)), "unreadable");
   EXPECT_FALSE(cursor_.set(static_cast<Properties>(27), "x"));
   EXPECT_FALSE(cursor_.set(NodeName, "eth9"));
 }
 
-TEST_F(AnInterfaceCursor, sendsAddressAndMaskAsOneChange) {
+TEST_F(InterfaceCursorTest, SendsAddressAndMaskAsOneChange) {
   EXPECT_TRUE(cursor_.set(Ipv4Address, "198.51.100.7"));
   EXPECT_THAT(backEnd_->changes, IsEmpty()) << "the mask may follow";
   EXPECT_TRUE(cursor_.set(Ipv4SubnetMask, "255.255.0.0"));
@@ -119,32 +120,32 @@ TEST_F(AnInterfaceCursor, sendsAddressAndMaskAsOneChange) {
   EXPECT_THAT(backEnd_->changes, testing::SizeIs(1));
 }
 
-TEST_F(AnInterfaceCursor, sendsAnAddressAloneWhenItMovesOn) {
+TEST_F(InterfaceCursorTest, SendsAnAddressAloneWhenItMovesOn) {
   cursor_.set(Ipv4Address, "192.0.2.99");
   cursor_.advance();
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
 }
 
-TEST_F(AnInterfaceCursor, sendsAnAddressAloneWhenItIsSetAgain) {
+TEST_F(InterfaceCursorTest, SendsAnAddressAloneWhenItIsSetAgain) {
   cursor_.set(Ipv4Address, "192.0.2.99");
   cursor_.select(IpInterfaceNode);
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
   EXPECT_EQ(get(Ipv4Address), "192.0.2.99");
 }
 
-TEST_F(AnInterfaceCursor, sendsAMaskAlone) {
+TEST_F(InterfaceCursorTest, SendsAMaskAlone) {
   cursor_.set(Ipv4SubnetMask, "255.255.0.0");
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 - 255.255.0.0"));
 }
 
-TEST_F(AnInterfaceCursor, takesTheLastOfSeveralAddresses) {
+TEST_F(InterfaceCursorTest, TakesTheLastOfSeveralAddresses) {
   cursor_.set(Ipv4Address, "192.0.2.98");
   cursor_.set(Ipv4Address, "192.0.2.99");
   cursor_.flush();
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
 }
 
-TEST_F(AnInterfaceCursor, makesTheSourceStatic) {
+TEST_F(InterfaceCursorTest, MakesTheSourceStatic) {
   cursor_.advance();
   cursor_.set(Ipv4Address, "198.51.100.99");
   cursor_.flush();
@@ -153,7 +154,7 @@ TEST_F(AnInterfaceCursor, makesTheSourceStatic) {
   EXPECT_EQ(onProcessor(1).ipv4SubnetMask, mask("255.255.255.0"));
 }
 
-TEST_F(AnInterfaceCursor, readsWhatItWrote) {
+TEST_F(InterfaceCursorTest, ReadsWhatItWrote) {
   cursor_.set(Ipv4Address, "198.51.100.7");
   EXPECT_EQ(get(Ipv4Address), "192.0.2.10") << "not sent yet";
   cursor_.set(Ipv4SubnetMask, "255.255.0.0");
@@ -161,14 +162,14 @@ TEST_F(AnInterfaceCursor, readsWhatItWrote) {
   EXPECT_EQ(get(Ipv4SubnetMask), "255.255.0.0");
 }
 
-TEST_F(AnInterfaceCursor, refusesAnAddressBeforeAnythingIsSent) {
+TEST_F(InterfaceCursorTest, RefusesAnAddressBeforeAnythingIsSent) {
   EXPECT_EQ(thrownBy([&] { cursor_.set(Ipv4Address, "127.0.0.1"); }),
             "interface eth0: the IPv4 address '127.0.0.1' is a loopback address; nothing was changed");
   cursor_.flush();
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, abandonsTheAddressWithARefusedMask) {
+TEST_F(InterfaceCursorTest, AbandonsTheAddressWithARefusedMask) {
   cursor_.set(Ipv4Address, "192.0.2.99");
   EXPECT_EQ(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.0.255.0"); }),
             "interface eth0: the subnet mask '255.0.255.0' is not contiguous; nothing was changed");
@@ -177,34 +178,34 @@ TEST_F(AnInterfaceCursor, abandonsTheAddressWithARefusedMask) {
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, abandonsAnEarlierAddressWithARefusedOne) {
+TEST_F(InterfaceCursorTest, AbandonsAnEarlierAddressWithARefusedOne) {
   cursor_.set(Ipv4Address, "192.0.2.99");
   EXPECT_THROW(cursor_.set(Ipv4Address, "x"), std::invalid_argument);
   cursor_.flush();
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, takesANewChangeAfterARefusedOne) {
+TEST_F(InterfaceCursorTest, TakesANewChangeAfterARefusedOne) {
   EXPECT_THROW(cursor_.set(Ipv4Address, "x"), std::invalid_argument);
   cursor_.set(Ipv4Address, "192.0.2.99");
   cursor_.flush();
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.99 -"));
 }
 
-TEST_F(AnInterfaceCursor, refusesTheNetworkAndTheBroadcastAddressOfTheNewMask) {
+TEST_F(InterfaceCursorTest, RefusesTheNetworkAndTheBroadcastAddressOfTheNewMask) {
   cursor_.set(Ipv4Address, "192.0.3.255");
   EXPECT_THAT(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.255.254.0"); }), HasSubstr("its broadcast address"));
   cursor_.set(Ipv4Address, "192.0.2.255");
   EXPECT_NO_THROW(cursor_.set(Ipv4SubnetMask, "255.255.254.0")) << "a host's under the wider mask";
 }
 
-TEST_F(AnInterfaceCursor, refusesAnAddressAloneThatIsNoHostUnderTheCurrentMask) {
+TEST_F(InterfaceCursorTest, RefusesAnAddressAloneThatIsNoHostUnderTheCurrentMask) {
   cursor_.set(Ipv4Address, "192.0.2.255");
   EXPECT_THAT(thrownBy([&] { cursor_.flush(); }), EndsWith("its broadcast address; nothing was changed"));
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, refusesAMaskAloneUnderWhichTheCurrentAddressIsNoHost) {
+TEST_F(InterfaceCursorTest, RefusesAMaskAloneUnderWhichTheCurrentAddressIsNoHost) {
   ManagementProcessor processor = factoryConfiguration();
   processor.interfaces[0].ipv4Address = ipv4("192.0.2.8");
   install(processor);
@@ -212,7 +213,7 @@ TEST_F(AnInterfaceCursor, refusesAMaskAloneUnderWhichTheCurrentAddressIsNoHost) 
   EXPECT_THAT(backEnd_->changes, IsEmpty());
 }
 
-TEST_F(AnInterfaceCursor, doesNotHoldAnAddressAgainstACurrentMaskThatTellsNothing) {
+TEST_F(InterfaceCursorTest, DoesNotHoldAnAddressAgainstACurrentMaskThatTellsNothing) {
   ManagementProcessor processor = factoryConfiguration();
   processor.interfaces[0].ipv4Address = ipv4("0.0.0.0");
   processor.interfaces[0].ipv4SubnetMask = mask("0.0.0.0");
@@ -222,7 +223,7 @@ TEST_F(AnInterfaceCursor, doesNotHoldAnAddressAgainstACurrentMaskThatTellsNothin
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.255 -"));
 }
 
-TEST_F(AnInterfaceCursor, passesOnWhatTheProcessorThrowsAndSendsNothingTwice) {
+TEST_F(InterfaceCursorTest, PassesOnWhatTheProcessorThrowsAndSendsNothingTwice) {
   backEnd_->unreachable = true;
   cursor_.set(Ipv4Address, "192.0.2.99");
   EXPECT_EQ(thrownBy([&] { cursor_.set(Ipv4SubnetMask, "255.255.255.0"); }), "the processor does not answer");
@@ -231,7 +232,7 @@ TEST_F(AnInterfaceCursor, passesOnWhatTheProcessorThrowsAndSendsNothingTwice) {
   EXPECT_THAT(backEnd_->changes, testing::SizeIs(1));
 }
 
-TEST_F(AnInterfaceCursor, staysOnTheNodeWhoseChangeFailed) {
+TEST_F(InterfaceCursorTest, StaysOnTheNodeWhoseChangeFailed) {
   backEnd_->unreachable = true;
   cursor_.set(Ipv4Address, "192.0.2.99");
   EXPECT_THROW(cursor_.advance(), std::runtime_error);
@@ -241,4 +242,3 @@ TEST_F(AnInterfaceCursor, staysOnTheNodeWhoseChangeFailed) {
 }
 
 }  // namespace
-}  // namespace QV

@@ -12,10 +12,14 @@
 #include <vector>
 
 #include "agent/log/Channel.h"
-#include "tests/agent/support/AllocationCount.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/AllocationCount.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
+
+using namespace TWLog;
+using namespace Testing;
+
 std::vector<std::pair<int, std::string>> sentToSyslog;
 }  // namespace
 
@@ -29,20 +33,19 @@ extern "C" void syslog(int priority, const char* format, ...) {
   sentToSyslog.emplace_back(priority, text.data());
 }
 
-namespace TWLog {
 namespace {
 
 using QV::ChannelSettings;
 using Destination = ChannelSettings::Destination;
 
-TEST(Channel, letsPassWhatReachesItsThreshold) {
+TEST(ChannelTest, LetsPassWhatReachesItsThreshold) {
   const Channel channel({Destination::Stderr, "", 5000, {}});
   EXPECT_FALSE(channel.passes("C", 4999));
   EXPECT_TRUE(channel.passes("C", 5000));
   EXPECT_TRUE(channel.passes("C", 5001));
 }
 
-TEST(Channel, hasAThresholdOfItsOwnForAComponentThatIsNamed) {
+TEST(ChannelTest, HasAThresholdOfItsOwnForAComponentThatIsNamed) {
   const Channel channel({Destination::Stderr, "", 5000, {{"chatty", 9000}, {"watched", 1000}}});
   EXPECT_FALSE(channel.passes("chatty", 6000));
   EXPECT_TRUE(channel.passes("chatty", 9000));
@@ -51,13 +54,13 @@ TEST(Channel, hasAThresholdOfItsOwnForAComponentThatIsNamed) {
   EXPECT_FALSE(channel.passes("Watched", 1000)) << "components are told apart by letter case";
 }
 
-TEST(Channel, letsNothingPassWhereItIsOff) {
+TEST(ChannelTest, LetsNothingPassWhereItIsOff) {
   const Channel channel({Destination::Off, "", 0, {{"C", 0}}});
   EXPECT_FALSE(channel.passes("C", 9000));
   EXPECT_FALSE(channel.passes("C", std::numeric_limits<int>::max()));
 }
 
-TEST(Channel, refusesAMessageWithoutAnAllocation) {
+TEST(ChannelTest, RefusesAMessageWithoutAnAllocation) {
   const Channel channel({Destination::Stderr, "", 6000, {{"Tarnwick.SomeOtherComponent", 4000}}});
   const std::string component = "Tarnwick.IPConfigAssignmentSettingProvider";
   const long before = allocationCount();
@@ -66,16 +69,16 @@ TEST(Channel, refusesAMessageWithoutAnAllocation) {
   EXPECT_FALSE(passed);
 }
 
-TEST(Channel, writesALineToItsFile) {
-  const Testing::TemporaryDirectory directory;
+TEST(ChannelTest, WritesALineToItsFile) {
+  const TemporaryDirectory directory;
   Channel channel({Destination::File, directory / "log", 0, {}});
   const std::string component = "C";
   const std::string text = "one\ntwo";
   channel.send({"f", "F", 1, component, 6000, text});
-  EXPECT_THAT(Testing::readFile(directory / "log"), testing::EndsWith(" 6000 C f (F:1): one\\ntwo\n"));
+  EXPECT_THAT(readFile(directory / "log"), testing::EndsWith(" 6000 C f (F:1): one\\ntwo\n"));
 }
 
-TEST(Channel, writesALineToStderr) {
+TEST(ChannelTest, WritesALineToStderr) {
   Channel channel({Destination::Stderr, "", 0, {}});
   const std::string component = "C";
   const std::string text = "x";
@@ -84,8 +87,8 @@ TEST(Channel, writesALineToStderr) {
   EXPECT_EQ(testing::internal::GetCapturedStderr(), "6000 C f (F:1): x\n");
 }
 
-TEST(Channel, saysOnceThatItsFileCannotBeWritten) {
-  const Testing::TemporaryDirectory directory;
+TEST(ChannelTest, SaysOnceThatItsFileCannotBeWritten) {
+  const TemporaryDirectory directory;
   Channel channel({Destination::File, directory / "none/log", 0, {}});
   const std::string component = "C";
   const std::string text = "x";
@@ -100,8 +103,8 @@ TEST(Channel, saysOnceThatItsFileCannotBeWritten) {
   EXPECT_THAT(sentToSyslog, testing::ElementsAre(testing::_, lost, lost)) << "the notice, then each message";
 }
 
-TEST(Channel, saysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
-  const Testing::TemporaryDirectory directory;
+TEST(ChannelTest, SaysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
+  const TemporaryDirectory directory;
   Channel channel({Destination::File, directory / "later/log", 0, {}});
   const std::string component = "C";
   const std::string text = "x";
@@ -116,7 +119,7 @@ TEST(Channel, saysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
   EXPECT_EQ(std::count(notices.begin(), notices.end(), '\n'), 2);
 }
 
-TEST(Channel, tellsSyslogTheSeverity) {
+TEST(ChannelTest, TellsSyslogTheSeverity) {
   Channel channel({Destination::Syslog, "", 0, {}});
   const std::string component = "C";
   const std::string text = "100 %s";
@@ -133,4 +136,3 @@ TEST(Channel, tellsSyslogTheSeverity) {
 }
 
 }  // namespace
-}  // namespace TWLog

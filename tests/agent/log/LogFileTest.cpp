@@ -8,66 +8,68 @@
 #include <vector>
 
 #include "agent/log/LogFile.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
-namespace TWLog {
 namespace {
 
-TEST(LogFile, isMadeForItsOwnerAndGroup) {
-  const Testing::TemporaryDirectory directory;
+using namespace TWLog;
+using namespace Testing;
+
+TEST(LogFileTest, IsMadeForItsOwnerAndGroup) {
+  const TemporaryDirectory directory;
   LogFile file(directory / "log");
   EXPECT_EQ(file.append("one\n"), 0);
   struct stat status {};
   ASSERT_EQ(::stat((directory / "log").c_str(), &status), 0);
   EXPECT_EQ(status.st_mode & 0137, 0U) << "no more than rw-r-----";
-  EXPECT_EQ(Testing::readFile(directory / "log"), "one\n");
+  EXPECT_EQ(readFile(directory / "log"), "one\n");
 }
 
-TEST(LogFile, keepsWhatIsThere) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "log", "before\n");
+TEST(LogFileTest, KeepsWhatIsThere) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "log", "before\n");
   LogFile(directory / "log").append("after\n");
-  EXPECT_EQ(Testing::readFile(directory / "log"), "before\nafter\n");
+  EXPECT_EQ(readFile(directory / "log"), "before\nafter\n");
 }
 
-TEST(LogFile, followsARotationThatRenamesIt) {
-  const Testing::TemporaryDirectory directory;
+TEST(LogFileTest, FollowsARotationThatRenamesIt) {
+  const TemporaryDirectory directory;
   LogFile file(directory / "log");
   file.append("old\n");
   std::filesystem::rename(directory / "log", directory / "log.1");
   file.append("new\n");
-  EXPECT_EQ(Testing::readFile(directory / "log.1"), "old\n");
-  EXPECT_EQ(Testing::readFile(directory / "log"), "new\n");
+  EXPECT_EQ(readFile(directory / "log.1"), "old\n");
+  EXPECT_EQ(readFile(directory / "log"), "new\n");
 }
 
-TEST(LogFile, followsARotationThatTruncatesIt) {
-  const Testing::TemporaryDirectory directory;
+TEST(LogFileTest, FollowsARotationThatTruncatesIt) {
+  const TemporaryDirectory directory;
   LogFile file(directory / "log");
   file.append("old\n");
   std::filesystem::resize_file(directory / "log", 0);
   file.append("new\n");
-  EXPECT_EQ(Testing::readFile(directory / "log"), "new\n");
+  EXPECT_EQ(readFile(directory / "log"), "new\n");
 }
 
-TEST(LogFile, tellsWhyItCannotBeOpenedAndTriesAgainWithTheNextLine) {
-  const Testing::TemporaryDirectory directory;
+TEST(LogFileTest, TellsWhyItCannotBeOpenedAndTriesAgainWithTheNextLine) {
+  const TemporaryDirectory directory;
   LogFile file(directory / "later/log");
   EXPECT_EQ(file.append("lost\n"), ENOENT);
   std::filesystem::create_directory(directory / "later");
   EXPECT_EQ(file.append("kept\n"), 0);
-  EXPECT_EQ(Testing::readFile(directory / "later/log"), "kept\n");
+  EXPECT_EQ(readFile(directory / "later/log"), "kept\n");
 }
 
-TEST(LogFile, tellsThatTheDiskIsFull) { EXPECT_EQ(LogFile("/dev/full").append("x\n"), ENOSPC); }
+TEST(LogFileTest, TellsThatTheDiskIsFull) { EXPECT_EQ(LogFile("/dev/full").append("x\n"), ENOSPC); }
 
-TEST(LogFile, doesNotWaitForTheReaderOfAFifo) {
-  const Testing::TemporaryDirectory directory;
+TEST(LogFileTest, DoesNotWaitForTheReaderOfAFifo) {
+  const TemporaryDirectory directory;
   ASSERT_EQ(::mkfifo((directory / "log").c_str(), 0600), 0);
   EXPECT_EQ(LogFile(directory / "log").append("x\n"), ENXIO);
 }
 
-TEST(LogFile, isNotInheritedByPrograms) {
-  const Testing::TemporaryDirectory directory;
+TEST(LogFileTest, IsNotInheritedByPrograms) {
+  const TemporaryDirectory directory;
   LogFile file(directory / "log");
   file.append("x\n");
   int open = 0;
@@ -82,9 +84,9 @@ TEST(LogFile, isNotInheritedByPrograms) {
   EXPECT_EQ(open, 1);
 }
 
-TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
+TEST(LogFileTest, KeepsTheLinesOfSeveralThreadsAndWritersWhole) {
   // Given two writers of one file, as two processes have them, with two threads each
-  const Testing::TemporaryDirectory directory;
+  const TemporaryDirectory directory;
   LogFile first(directory / "log");
   LogFile second(directory / "log");
   constexpr int lines = 500;
@@ -104,7 +106,7 @@ TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
   }
 
   // Then every line is there, and is of one writer
-  std::istringstream text(Testing::readFile(directory / "log"));
+  std::istringstream text(readFile(directory / "log"));
   int count = 0;
   for (std::string line; std::getline(text, line); ++count) {
     ASSERT_EQ(line, std::string(200, line.at(0)));
@@ -113,4 +115,3 @@ TEST(LogFile, keepsTheLinesOfSeveralThreadsAndWritersWhole) {
 }
 
 }  // namespace
-}  // namespace TWLog

@@ -6,23 +6,23 @@
 #include <cstdlib>
 
 #include "agent/log/Report.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
+using namespace Testing;
 using testing::ExitedWithCode;
 using testing::IsEmpty;
 using testing::MatchesRegex;
 
-class Report : public testing::Test {
+class ReportTest : public testing::Test {
  protected:
-  Report() {
-    Testing::writeFile(directory_ / "agent.ini", "[log]\ndestination = file\nfile = " + (directory_ / "log") +
-                                                     "\n[trace]\ndestination = file\nfile = " + (directory_ / "trace") +
-                                                     "\n");
+  ReportTest() {
+    writeFile(directory_ / "agent.ini", "[log]\ndestination = file\nfile = " + (directory_ / "log") +
+                                            "\n[trace]\ndestination = file\nfile = " + (directory_ / "trace") + "\n");
     ::setenv("QV_AGENT_INI", (directory_ / "agent.ini").c_str(), 1);
   }
-  ~Report() override { ::unsetenv("QV_AGENT_INI"); }
+  ~ReportTest() override { ::unsetenv("QV_AGENT_INI"); }
 
   // Runs the statement in a child of its own.
   template <typename Statement>
@@ -30,28 +30,28 @@ class Report : public testing::Test {
     EXPECT_EXIT((statement(), std::exit(0)), ExitedWithCode(0), "");
   }
 
-  std::string log() const { return Testing::readFile(directory_ / "log"); }
-  std::string trace() const { return Testing::readFile(directory_ / "trace"); }
+  std::string log() const { return readFile(directory_ / "log"); }
+  std::string trace() const { return readFile(directory_ / "trace"); }
 
-  const Testing::TemporaryDirectory directory_;
+  const TemporaryDirectory directory_;
 };
 
 void failSomewhere() { TWLog::report("C", TWLog::failureLevel, "it failed"); }
 
-TEST_F(Report, sendsAFailureToTheLogAndTheTraceWithTheCallersPlace) {
+TEST_F(ReportTest, SendsAFailureToTheLogAndTheTraceWithTheCallersPlace) {
   inChild(failSomewhere);
   const auto line = MatchesRegex(".* 6000 C failSomewhere \\(ReportTest:[0-9]+\\): it failed\n");
   EXPECT_THAT(log(), line);
   EXPECT_THAT(trace(), line);
 }
 
-TEST_F(Report, sendsProgressUnderTheLogsThresholdToTheTraceAlone) {
+TEST_F(ReportTest, SendsProgressUnderTheLogsThresholdToTheTraceAlone) {
   inChild([] { TWLog::report("C", TWLog::progressLevel, "a step"); });
   EXPECT_THAT(log(), IsEmpty());
   EXPECT_THAT(trace(), MatchesRegex(".* 4000 C .* \\(ReportTest:[0-9]+\\): a step\n"));
 }
 
-TEST_F(Report, tracesWhatIsForTheTraceAlone) {
+TEST_F(ReportTest, TracesWhatIsForTheTraceAlone) {
   inChild([] { TWLog::trace("C", TWLog::failureLevel, "a detail"); });
   EXPECT_THAT(log(), IsEmpty());
   EXPECT_THAT(trace(), MatchesRegex(".* 6000 C .* \\(ReportTest:[0-9]+\\): a detail\n"));

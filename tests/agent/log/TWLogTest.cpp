@@ -10,10 +10,11 @@
 #include <thread>
 #include <vector>
 
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
+using namespace Testing;
 using testing::ExitedWithCode;
 
 void log(const std::string& component, int level, const std::string& text) {
@@ -37,13 +38,13 @@ void inChildWith(const std::string& ini, const Statements& statements) {
   ::unsetenv("QV_AGENT_INI");
 }
 
-TEST(MessageBuffer, collectsTextAndSkipsNulls) {
+TEST(MessageBufferTest, CollectsTextAndSkipsNulls) {
   TWLog::TWMessageBuffer buffer;
   buffer << "a" << nullptr << "b";
   EXPECT_EQ(str(buffer), "ab");
 }
 
-TEST(MessageBuffer, isEmptyOnceItsTextIsTaken) {
+TEST(MessageBufferTest, IsEmptyOnceItsTextIsTaken) {
   TWLog::TWMessageBuffer buffer;
   buffer << "line";
   EXPECT_EQ(str(buffer), "line");
@@ -52,11 +53,11 @@ TEST(MessageBuffer, isEmptyOnceItsTextIsTaken) {
   EXPECT_EQ(str(buffer), "line");
 }
 
-TEST(Logger, sendsTheLogAndTheTraceTheirOwnWays) {
-  const Testing::TemporaryDirectory directory;
+TEST(LoggerTest, SendsTheLogAndTheTraceTheirOwnWays) {
+  const TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
-  Testing::writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\nthreshold.watched = 4000\n" +
-                              "[trace]\ndestination = file\nfile = " + (directory / "trace") + "\n");
+  writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\nthreshold.watched = 4000\n" +
+                     "[trace]\ndestination = file\nfile = " + (directory / "trace") + "\n");
   inChildWith(ini, [] {
     log("C", 4000, "no");
     log("C", 6000, "failure");
@@ -64,15 +65,15 @@ TEST(Logger, sendsTheLogAndTheTraceTheirOwnWays) {
     trace("C", 3999, "no");
     trace("C", 4000, "step");
   });
-  EXPECT_THAT(Testing::readFile(directory / "log"),
+  EXPECT_THAT(readFile(directory / "log"),
               testing::MatchesRegex(".* 6000 C f \\(F:1\\): failure\n.* 4000 watched f \\(F:1\\): progress\n"));
-  EXPECT_THAT(Testing::readFile(directory / "trace"), testing::MatchesRegex(".* 4000 C f \\(F:1\\): step\n"));
+  EXPECT_THAT(readFile(directory / "trace"), testing::MatchesRegex(".* 4000 C f \\(F:1\\): step\n"));
 }
 
-TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
-  const Testing::TemporaryDirectory directory;
+TEST(LoggerTest, ReportsABrokenAgentIniOnceAndGoesOn) {
+  const TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
-  Testing::writeFile(ini, "[log]\ndestination = mail\n");
+  writeFile(ini, "[log]\ndestination = mail\n");
   ::setenv("QV_AGENT_INI", ini.c_str(), 1);
   const auto report = [] {
     log("C", 6000, "one");
@@ -86,7 +87,7 @@ TEST(Logger, reportsABrokenAgentIniOnceAndGoesOn) {
   ::unsetenv("QV_AGENT_INI");
 }
 
-TEST(Logger, ReportsAMissingAgentIniOnceWithWhatToDoAndGoesOn) {
+TEST(LoggerTest, ReportsAMissingAgentIniOnceWithWhatToDoAndGoesOn) {
   ::setenv("QV_AGENT_INI", "/nowhere/agent.ini", 1);
   const auto report = [] {
     log("C", 6000, "one");
@@ -99,10 +100,10 @@ TEST(Logger, ReportsAMissingAgentIniOnceWithWhatToDoAndGoesOn) {
   ::unsetenv("QV_AGENT_INI");
 }
 
-TEST(Logger, takesMessagesFromSeveralThreads) {
-  const Testing::TemporaryDirectory directory;
+TEST(LoggerTest, takesMessagesFromSeveralThreads) {
+  const TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
-  Testing::writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\n");
+  writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\n");
   inChildWith(ini, [] {
     std::vector<std::jthread> threads;
     for (int thread = 0; thread < 4; ++thread) {
@@ -113,7 +114,7 @@ TEST(Logger, takesMessagesFromSeveralThreads) {
       });
     }
   });
-  const std::string text = Testing::readFile(directory / "log");
+  const std::string text = readFile(directory / "log");
   EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 1000);
 }
 

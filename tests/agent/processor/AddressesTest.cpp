@@ -2,11 +2,13 @@
 #include <gtest/gtest.h>
 
 #include "agent/processor/Addresses.h"
-#include "tests/agent/support/Addresses.h"
-#include "tests/agent/support/Throws.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
+
+using namespace QV;
+using namespace Testing;
 
 std::string refusalOfAddress(const std::string& text) {
   return thrownBy([&] { Ipv4Address::requireHost(text); });
@@ -16,13 +18,13 @@ std::string refusalOfMask(const std::string& text) {
   return thrownBy([&] { SubnetMask::requireUsable(text); });
 }
 
-TEST(Ipv4Text, isFourDecimalOctets) {
+TEST(Ipv4TextTest, IsFourDecimalOctets) {
   EXPECT_EQ(ipv4("0.0.0.0").number(), 0U);
   EXPECT_EQ(ipv4("192.0.2.10").number(), 0xc000020aU);
   EXPECT_EQ(ipv4("255.255.255.255").number(), 0xffffffffU);
 }
 
-TEST(Ipv4Text, isNothingElse) {
+TEST(Ipv4TextTest, IsNothingElse) {
   for (const char* text :
        {"",         ".",         "...",       "1",         "1.2.3",      "1.2.3.",           ".1.2.3",
         "1..2.3",   "1.2.3.4.",  "1.2.3.4.5", "256.1.1.1", "1.1.1.999",  "1.1.1.4294967297", "01.2.3.4",
@@ -34,14 +36,14 @@ TEST(Ipv4Text, isNothingElse) {
   EXPECT_EQ(Ipv4Address::parse(std::string_view("1.2.3.4\0", 8)), std::nullopt);
 }
 
-TEST(HostAddress, isAcceptedUpToTheEdgesOfTheRangesThatHostsHave) {
+TEST(HostAddressTest, IsAcceptedUpToTheEdgesOfTheRangesThatHostsHave) {
   for (const char* text :
        {"1.0.0.0", "10.0.0.1", "126.255.255.255", "128.0.0.0", "169.254.1.1", "192.0.2.10", "223.255.255.255"}) {
     EXPECT_EQ(Ipv4Address::requireHost(text), Ipv4Address::parse(text)) << text;
   }
 }
 
-TEST(HostAddress, isRefusedWithTheTextAndTheReason) {
+TEST(HostAddressTest, IsRefusedWithTheTextAndTheReason) {
   EXPECT_EQ(refusalOfAddress("0.0.0.0"), "the IPv4 address '0.0.0.0' lies in 0.0.0.0/8, which names no host");
   EXPECT_EQ(refusalOfAddress("0.255.255.255"),
             "the IPv4 address '0.255.255.255' lies in 0.0.0.0/8, which names no host");
@@ -55,13 +57,13 @@ TEST(HostAddress, isRefusedWithTheTextAndTheReason) {
             "the IPv4 address '192.0.2' is not four decimal numbers from 0 to 255 with dots between them");
 }
 
-TEST(HostAddress, isCutInTheRefusalWhereItIsVeryLong) {
+TEST(HostAddressTest, IsCutInTheRefusalWhereItIsVeryLong) {
   const std::string refusal = refusalOfAddress(std::string(1000, '1'));
   EXPECT_THAT(refusal, testing::HasSubstr('\'' + std::string(64, '1') + "...'"));
   EXPECT_LT(refusal.size(), 200U);
 }
 
-TEST(SubnetMask, isAcceptedAtEveryUsableLength) {
+TEST(SubnetMaskTest, IsAcceptedAtEveryUsableLength) {
   for (int length = 1; length <= 31; ++length) {
     const std::uint32_t bits = ~std::uint32_t{0} << (32 - length);
     const auto octet = [&](int shift) { return static_cast<std::uint8_t>(bits >> shift); };
@@ -71,7 +73,7 @@ TEST(SubnetMask, isAcceptedAtEveryUsableLength) {
   }
 }
 
-TEST(SubnetMask, isRefusedWithTheTextAndTheReason) {
+TEST(SubnetMaskTest, IsRefusedWithTheTextAndTheReason) {
   EXPECT_EQ(refusalOfMask("0.0.0.0"), "the subnet mask '0.0.0.0' leaves no network");
   EXPECT_EQ(refusalOfMask("255.255.255.255"), "the subnet mask '255.255.255.255' leaves no other host");
   EXPECT_EQ(refusalOfMask("255.0.255.0"), "the subnet mask '255.0.255.0' is not contiguous");
@@ -81,7 +83,7 @@ TEST(SubnetMask, isRefusedWithTheTextAndTheReason) {
             "the subnet mask '255.255.255' is not four decimal numbers from 0 to 255 with dots between them");
 }
 
-TEST(HostOfSubnet, isNeitherTheNetworkNorItsBroadcastAddress) {
+TEST(HostOfSubnetTest, IsNeitherTheNetworkNorItsBroadcastAddress) {
   const SubnetMask mask = SubnetMask::requireUsable("255.255.255.0");
   EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.1"), mask));
   EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.254"), mask));
@@ -91,11 +93,11 @@ TEST(HostOfSubnet, isNeitherTheNetworkNorItsBroadcastAddress) {
             "the IPv4 address '192.0.2.255' is, under the subnet mask '255.255.255.0', its broadcast address");
 }
 
-TEST(SubnetMask, hasNoPrefixLengthWhereItIsNotContiguous) {
+TEST(SubnetMaskTest, HasNoPrefixLengthWhereItIsNotContiguous) {
   EXPECT_EQ(mask("255.0.255.0").prefixLength(), std::nullopt);
 }
 
-TEST(Ipv6Text, isPrintedInItsShortestForm) {
+TEST(Ipv6TextTest, IsPrintedInItsShortestForm) {
   EXPECT_EQ(ipv6("2001:DB8:0:0:0:0:0:10").text(), "2001:db8::10");
   EXPECT_TRUE(ipv6("::").isZero());
   for (const char* text : {"", "192.0.2.1", "2001:db8", "2001:db8::10%eth0", "2001:db8::10/64"}) {
@@ -103,7 +105,7 @@ TEST(Ipv6Text, isPrintedInItsShortestForm) {
   }
 }
 
-TEST(MacAddressText, isSixPairsOfHexadecimalDigits) {
+TEST(MacAddressTest, IsSixPairsOfHexadecimalDigits) {
   EXPECT_EQ(mac("02:00:00:00:AB:cd").text(), "02:00:00:00:ab:cd");
   for (const char* text : {"", "02:00:00:00:00", "02:00:00:00:00:01:", "02-00-00-00-00-01", "2:0:0:0:0:1",
                            "02:00:00:00:00:0g", "02:00:00:00:00:001"}) {
@@ -111,11 +113,10 @@ TEST(MacAddressText, isSixPairsOfHexadecimalDigits) {
   }
 }
 
-TEST(HostOfSubnet, isEitherAddressOfAPointToPointLink) {
+TEST(HostOfSubnetTest, IsEitherAddressOfAPointToPointLink) {
   const SubnetMask mask = SubnetMask::requireUsable("255.255.255.254");
   EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.0"), mask));
   EXPECT_NO_THROW(requireHostOfSubnet(Ipv4Address::requireHost("192.0.2.1"), mask));
 }
 
 }  // namespace
-}  // namespace QV

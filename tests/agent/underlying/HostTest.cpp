@@ -9,11 +9,11 @@
 #include <sstream>
 
 #include "agent/underlying/Host.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
@@ -27,7 +27,7 @@ std::map<std::string, Ipv4Address> gateways(const std::string& text) {
   return parseDefaultGateways(stream);
 }
 
-TEST(Host, hasItsNameAndTheInterfacesOfTheKernel) {
+TEST(HostTest, HasItsNameAndTheInterfacesOfTheKernel) {
   const ManagementProcessor host = readHost();
   EXPECT_EQ(host.name, getSystemName());
   EXPECT_FALSE(host.dnsServers.empty());
@@ -40,7 +40,7 @@ TEST(Host, hasItsNameAndTheInterfacesOfTheKernel) {
   }
 }
 
-TEST(Host, readsItsLoopbackInterface) {
+TEST(HostTest, ReadsItsLoopbackInterface) {
   const ManagementProcessor host = readHost();
   const auto loopback = std::find_if(host.interfaces.begin(), host.interfaces.end(),
                                      [](const NetworkInterface& interface) { return interface.name == "lo"; });
@@ -53,17 +53,17 @@ TEST(Host, readsItsLoopbackInterface) {
   EXPECT_EQ(loopback->macAddress, mac("00:00:00:00:00:00"));
 }
 
-TEST(ResolverConfiguration, listsItsNameServersInOrder) {
+TEST(ResolverConfigurationTest, ListsItsNameServersInOrder) {
   EXPECT_THAT(nameServers("# comment\nsearch example\nnameserver 192.0.2.53\n  nameserver\t2001:db8::53 # x\n"),
               ElementsAre("192.0.2.53", "2001:db8::53"));
 }
 
-TEST(ResolverConfiguration, meansTheHostItselfWhereItListsNone) {
+TEST(ResolverConfigurationTest, MeansTheHostItselfWhereItListsNone) {
   EXPECT_THAT(nameServers(""), ElementsAre("127.0.0.1"));
   EXPECT_THAT(nameServers("nameserver\nnameservers 192.0.2.53\n;nameserver 192.0.2.53\n"), ElementsAre("127.0.0.1"));
 }
 
-TEST(DefaultGateways, areThoseOfTheRoutesToEverywhere) {
+TEST(DefaultGatewaysTest, AreThoseOfTheRoutesToEverywhere) {
   const bool little = std::endian::native == std::endian::little;
   const std::string gateway = little ? "010200C0" : "C0000201";
   EXPECT_EQ(gateways("Iface\tDestination\tGateway\tFlags\tRefCnt\tUse\tMetric\tMask\n"
@@ -75,10 +75,9 @@ TEST(DefaultGateways, areThoseOfTheRoutesToEverywhere) {
             (std::map<std::string, Ipv4Address>{{"eth0", ipv4("192.0.2.1")}}));
 }
 
-TEST(DefaultGateways, areNoneInATextThatIsNoRouteTable) {
+TEST(DefaultGatewaysTest, AreNoneInATextThatIsNoRouteTable) {
   EXPECT_THAT(gateways(""), IsEmpty());
   EXPECT_THAT(gateways("eth0 00000000\nnonsense\n"), IsEmpty());
 }
 
 }  // namespace
-}  // namespace QV

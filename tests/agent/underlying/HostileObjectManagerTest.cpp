@@ -7,15 +7,15 @@
 
 #include <string>
 
-#include "tests/agent/helper/BrokerFixture.h"
-#include "tests/agent/support/AgentEnvironment.h"
+#include "tests/support/agent/AgentEnvironment.h"
+#include "tests/support/broker/BrokerFixture.h"
 
 extern "C" CMPIInstanceMI* UnderlyingIPConfigProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*,
                                                                         CMPIStatus*);
 
-namespace QV {
 namespace {
 
+using namespace Testing;
 using testing::HasSubstr;
 
 constexpr const char* className = "YRNQV_SPComputerSystem";
@@ -50,19 +50,19 @@ struct Results {
 
 Results& of(const CMPIResult* result) { return *static_cast<Results*>(result->hdl); }
 
-class AHostileObjectManager : public WithBroker {
+class HostileObjectManagerTest : public BrokerFixture {
  protected:
-  AHostileObjectManager() : encapsulation_(*broker()->eft), broker_(*broker()) {
+  HostileObjectManagerTest() : encapsulation_(*broker->eft), broker_(*broker) {
     AgentEnvironment::instance().reset();
-    manager_.loadSchemaText(R"(
+    manager.loadSchemaText(R"(
       class YRNQV_SPComputerSystem {
         [key] string CreationClassName; [key] string Name;
         string Description; string NameFormat; uint16 Dedicated[];
       };
     )",
-                            "root/yrnse");
+                           "root/yrnse");
     broker_.eft = &encapsulation_;
-    real = broker();
+    real = broker;
     provider_ = UnderlyingIPConfigProvider_Create_InstanceMI(&broker_, nullptr, nullptr);
     resultTable_.returnInstance = [](const CMPIResult* result, const CMPIInstance*) {
       ++of(result).delivered;
@@ -77,7 +77,7 @@ class AHostileObjectManager : public WithBroker {
       return CMPIStatus{CMPI_RC_OK, nullptr};
     };
   }
-  ~AHostileObjectManager() override { UnderlyingIPConfigProvider_Create_InstanceMI(broker(), nullptr, nullptr); }
+  ~HostileObjectManagerTest() override { UnderlyingIPConfigProvider_Create_InstanceMI(broker, nullptr, nullptr); }
 
   CMPIStatus enumerateNames(const CMPIObjectPath* of, const CMPIResult* to) {
     return provider_->ft->enumerateInstanceNames(provider_, nullptr, to, of);
@@ -97,7 +97,7 @@ class AHostileObjectManager : public WithBroker {
   void expectFailure(const CMPIStatus& status, const std::string& text) {
     EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
     EXPECT_THAT(message(status), HasSubstr(text));
-    EXPECT_THAT(Testing::readFile(AgentEnvironment::instance().log()), HasSubstr(text));
+    EXPECT_THAT(readFile(AgentEnvironment::instance().log()), HasSubstr(text));
     EXPECT_EQ(results_.ends, 0);
   }
 
@@ -111,13 +111,13 @@ class AHostileObjectManager : public WithBroker {
   const CMPIResult result_{&results_, &resultTable_};
 };
 
-TEST_F(AHostileObjectManager, isAnsweredWhereItBehaves) {
+TEST_F(HostileObjectManagerTest, IsAnsweredWhereItBehaves) {
   EXPECT_EQ(enumerate(classPath(), &result_).rc, CMPI_RC_OK);
   EXPECT_EQ(results_.delivered, 1);
   EXPECT_EQ(results_.ends, 1);
 }
 
-TEST_F(AHostileObjectManager, isToldThatItPassesNoPathOrNoResult) {
+TEST_F(HostileObjectManagerTest, IsToldThatItPassesNoPathOrNoResult) {
   CMPIObjectPath withoutHandle{nullptr, classPath()->ft};
   const CMPIStatus statuses[] = {enumerateNames(nullptr, &result_),
                                  enumerateNames(&withoutHandle, &result_),
@@ -135,7 +135,7 @@ TEST_F(AHostileObjectManager, isToldThatItPassesNoPathOrNoResult) {
   EXPECT_EQ(results_.delivered, 0);
 }
 
-TEST_F(AHostileObjectManager, isToldThatAPathWithoutAClassNamesNoneThatIsServed) {
+TEST_F(HostileObjectManagerTest, IsToldThatAPathWithoutAClassNamesNoneThatIsServed) {
   Altered altered(classPath());
   altered.table.getClassName = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
   EXPECT_EQ(enumerate(altered, &result_).rc, CMPI_RC_ERR_INVALID_CLASS);
@@ -151,7 +151,7 @@ TEST_F(AHostileObjectManager, isToldThatAPathWithoutAClassNamesNoneThatIsServed)
   EXPECT_EQ(enumerateNames(altered, &result_).rc, CMPI_RC_ERR_INVALID_CLASS);
 }
 
-TEST_F(AHostileObjectManager, mayLeaveTheNamespaceOut) {
+TEST_F(HostileObjectManagerTest, MayLeaveTheNamespaceOut) {
   static std::string asked;
   encapsulation_.newObjectPath = [](const CMPIBroker*, const char* nameSpace, const char* name, CMPIStatus* status) {
     asked = nameSpace;
@@ -164,7 +164,7 @@ TEST_F(AHostileObjectManager, mayLeaveTheNamespaceOut) {
   EXPECT_EQ(asked, "");
 }
 
-TEST_F(AHostileObjectManager, thatMakesNoObjectPathIsToldSo) {
+TEST_F(HostileObjectManagerTest, ThatMakesNoObjectPathIsToldSo) {
   encapsulation_.newObjectPath = [](const CMPIBroker*, const char* nameSpace, const char* name, CMPIStatus* status) {
     return misbehave(CMNewObjectPath(real, nameSpace, name, nullptr), status);
   };
@@ -179,7 +179,7 @@ TEST_F(AHostileObjectManager, thatMakesNoObjectPathIsToldSo) {
   EXPECT_EQ(results_.delivered, 0);
 }
 
-TEST_F(AHostileObjectManager, thatMakesNoInstanceIsToldSo) {
+TEST_F(HostileObjectManagerTest, ThatMakesNoInstanceIsToldSo) {
   encapsulation_.newInstance = [](const CMPIBroker*, const CMPIObjectPath* path, CMPIStatus* status) {
     return misbehave(CMNewInstance(real, path, nullptr), status);
   };
@@ -190,7 +190,7 @@ TEST_F(AHostileObjectManager, thatMakesNoInstanceIsToldSo) {
   EXPECT_EQ(results_.delivered, 0);
 }
 
-TEST_F(AHostileObjectManager, thatMakesNoArrayIsToldSo) {
+TEST_F(HostileObjectManagerTest, ThatMakesNoArrayIsToldSo) {
   encapsulation_.newArray = [](const CMPIBroker*, CMPICount count, CMPIType type, CMPIStatus* status) {
     return misbehave(CMNewArray(real, count, type, nullptr), status);
   };
@@ -201,7 +201,7 @@ TEST_F(AHostileObjectManager, thatMakesNoArrayIsToldSo) {
   EXPECT_EQ(results_.delivered, 0);
 }
 
-TEST_F(AHostileObjectManager, thatDoesNotFillAnArrayIsToldSo) {
+TEST_F(HostileObjectManagerTest, ThatDoesNotFillAnArrayIsToldSo) {
   encapsulation_.newArray = [](const CMPIBroker*, CMPICount count, CMPIType type, CMPIStatus* status) {
     CMPIArray* array = CMNewArray(real, count, type, status);
     static CMPIArrayFT table;
@@ -215,7 +215,7 @@ TEST_F(AHostileObjectManager, thatDoesNotFillAnArrayIsToldSo) {
   expectFailure(enumerate(classPath(), &result_), "does not fill an array for Dedicated: status 13");
 }
 
-TEST_F(AHostileObjectManager, thatDoesNotTakeAKeyIsToldSoAndWhy) {
+TEST_F(HostileObjectManagerTest, ThatDoesNotTakeAKeyIsToldSoAndWhy) {
   encapsulation_.newObjectPath = [](const CMPIBroker*, const char* nameSpace, const char* name, CMPIStatus* status) {
     CMPIObjectPath* path = CMNewObjectPath(real, nameSpace, name, status);
     static CMPIObjectPathFT table;
@@ -230,7 +230,7 @@ TEST_F(AHostileObjectManager, thatDoesNotTakeAKeyIsToldSoAndWhy) {
                 "does not take the key CreationClassName: status 100, no memory");
 }
 
-TEST_F(AHostileObjectManager, isAskedToFilterOnlyWhereThereIsAListAndThenWithTheKeys) {
+TEST_F(HostileObjectManagerTest, IsAskedToFilterOnlyWhereThereIsAListAndThenWithTheKeys) {
   static std::string filters;
   encapsulation_.newInstance = [](const CMPIBroker*, const CMPIObjectPath* path, CMPIStatus* status) {
     CMPIInstance* instance = CMNewInstance(real, path, status);
@@ -255,7 +255,7 @@ TEST_F(AHostileObjectManager, isAskedToFilterOnlyWhereThereIsAListAndThenWithThe
   EXPECT_EQ(filters, "list; CreationClassName Name");
 }
 
-TEST_F(AHostileObjectManager, thatMakesNoStringGetsAStatusWithoutAMessage) {
+TEST_F(HostileObjectManagerTest, ThatMakesNoStringGetsAStatusWithoutAMessage) {
   encapsulation_.newObjectPath = [](const CMPIBroker*, const char*, const char*, CMPIStatus*) -> CMPIObjectPath* {
     return nullptr;
   };
@@ -271,7 +271,7 @@ TEST_F(AHostileObjectManager, thatMakesNoStringGetsAStatusWithoutAMessage) {
   }
 }
 
-TEST_F(AHostileObjectManager, thatTakesNoResultsIsOfferedNoMoreOfThem) {
+TEST_F(HostileObjectManagerTest, ThatTakesNoResultsIsOfferedNoMoreOfThem) {
   results_.answer = CMPI_RC_ERR_FAILED;
   expectFailure(enumerate(classPath(), &result_), "does not take an instance of YRNQV_SPComputerSystem");
   expectFailure(enumerateNames(classPath(), &result_), "does not take an object path of YRNQV_SPComputerSystem");
@@ -279,4 +279,3 @@ TEST_F(AHostileObjectManager, thatTakesNoResultsIsOfferedNoMoreOfThem) {
 }
 
 }  // namespace
-}  // namespace QV

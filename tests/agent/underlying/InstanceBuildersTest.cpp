@@ -3,11 +3,11 @@
 
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/underlying/InstanceBuilders.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
@@ -62,14 +62,14 @@ std::string endpointProperty(const NetworkInterface& interface, const std::strin
   return "no " + name;
 }
 
-TEST(ComputerSystem, tellsTheProcessor) {
+TEST(ComputerSystemTest, TellsTheProcessor) {
   const Instances instances = computerSystem(processor({}));
   ASSERT_THAT(instances, SizeIs(1));
   EXPECT_THAT(textsOf(instances[0]), ElementsAre("CreationClassName=YRNQV_SPComputerSystem", "Name=bmc7",
                                                  "Description=in rack 7", "NameFormat=Other", "Dedicated=14u16,28u16"));
 }
 
-TEST(ProtocolEndpoints, tellAnInterfaceEach) {
+TEST(ProtocolEndpointsTest, TellAnInterfaceEach) {
   const Instances instances = protocolEndpoints(processor({eth0(), eth1()}));
   ASSERT_THAT(instances, SizeIs(2));
   EXPECT_THAT(textsOf(instances[0]),
@@ -86,13 +86,13 @@ TEST(ProtocolEndpoints, tellAnInterfaceEach) {
                           "ProtocolIFType=4096u16", "EnabledState=2u16", "RequestedState=12u16", "AddressOrigin=4u16"));
 }
 
-TEST(ProtocolEndpoints, tellThatAnInterfaceIsDisabled) {
+TEST(ProtocolEndpointsTest, TellThatAnInterfaceIsDisabled) {
   NetworkInterface interface = eth0();
   interface.enabled = false;
   EXPECT_EQ(endpointProperty(interface, "EnabledState"), "EnabledState=3u16");
 }
 
-TEST(ProtocolEndpoints, tellAnInterfaceOfIpv6Alone) {
+TEST(ProtocolEndpointsTest, TellAnInterfaceOfIpv6Alone) {
   NetworkInterface interface;
   interface.name = "eth2";
   interface.ipv6Address = ipv6("2001:db8::2");
@@ -103,7 +103,7 @@ TEST(ProtocolEndpoints, tellAnInterfaceOfIpv6Alone) {
   EXPECT_EQ(endpointProperty(interface, "AddressOrigin"), "AddressOrigin=4u16");
 }
 
-TEST(ProtocolEndpoints, tellAnInterfaceThatWaitsForALease) {
+TEST(ProtocolEndpointsTest, TellAnInterfaceThatWaitsForALease) {
   NetworkInterface interface;
   interface.name = "eth2";
   interface.ipv4Origin = AddressOrigin::Dhcp;
@@ -112,14 +112,14 @@ TEST(ProtocolEndpoints, tellAnInterfaceThatWaitsForALease) {
   EXPECT_EQ(endpointProperty(interface, "AddressOrigin"), "AddressOrigin=4u16");
 }
 
-TEST(ProtocolEndpoints, tellAnInterfaceOfWhichNothingIsKnown) {
+TEST(ProtocolEndpointsTest, TellAnInterfaceOfWhichNothingIsKnown) {
   NetworkInterface interface;
   interface.name = "eth2";
   EXPECT_EQ(endpointProperty(interface, "ProtocolIFType"), "ProtocolIFType=0u16");
   EXPECT_EQ(endpointProperty(interface, "AddressOrigin"), "AddressOrigin=0u16");
 }
 
-TEST(AssignmentSettings, areAStaticAndADhcpOneForEachInterface) {
+TEST(AssignmentSettingsTest, AreAStaticAndADhcpOneForEachInterface) {
   const Instances instances = assignmentSettings(processor({eth0(), eth1()}));
   ASSERT_THAT(instances, SizeIs(4));
   EXPECT_THAT(textsOf(instances[0]),
@@ -130,7 +130,7 @@ TEST(AssignmentSettings, areAStaticAndADhcpOneForEachInterface) {
   EXPECT_EQ(textOf(instances[3][0]), "InstanceID=BMC:eth1:dhcp");
 }
 
-TEST(StaticSettings, tellTheAddressesThatTheInterfaceHas) {
+TEST(StaticSettingsTest, TellTheAddressesThatTheInterfaceHas) {
   const Instances instances = staticSettings(processor({eth0(), eth1()}));
   ASSERT_THAT(instances, SizeIs(2));
   EXPECT_THAT(textsOf(instances[0]),
@@ -139,14 +139,14 @@ TEST(StaticSettings, tellTheAddressesThatTheInterfaceHas) {
   EXPECT_EQ(textOf(instances[1].back()), "GatewayIPv4Address");
 }
 
-TEST(DhcpSettings, areOneForEachInterface) {
+TEST(DhcpSettingsTest, AreOneForEachInterface) {
   const Instances instances = dhcpSettings(processor({eth0(), eth1()}));
   ASSERT_THAT(instances, SizeIs(2));
   EXPECT_THAT(textsOf(instances[1]),
               ElementsAre("InstanceID=BMC:eth1", "ElementName=DHCP settings of eth1", "AddressOrigin=4u16"));
 }
 
-TEST(RemoteAccessPoints, areTheGatewaysAndTheNameServers) {
+TEST(RemoteAccessPointsTest, AreTheGatewaysAndTheNameServers) {
   const Instances instances = remoteAccessPoints(processor({eth0(), eth1()}, {"192.0.2.53", "2001:db8::53"}));
   ASSERT_THAT(instances, SizeIs(3));
   EXPECT_THAT(textsOf(instances[0]),
@@ -159,14 +159,14 @@ TEST(RemoteAccessPoints, areTheGatewaysAndTheNameServers) {
                                                             "AccessInfo=2001:db8::53", "InfoFormat=4u16"}));
 }
 
-TEST(Interfaces, withoutANameAreInNoClass) {
+TEST(InterfacesTest, WithoutANameAreInNoClass) {
   const System system = processor({nameless()});
   for (const auto build : {protocolEndpoints, assignmentSettings, staticSettings, dhcpSettings, remoteAccessPoints}) {
     EXPECT_THAT(build(system), IsEmpty());
   }
 }
 
-TEST(AnotherSystem, isToldApartByItsClassAndItsSettingsPrefix) {
+TEST(AnotherSystemTest, IsToldApartByItsClassAndItsSettingsPrefix) {
   const System host{"YRNQV_ComputerSystem", "Host", {"node", "", {}, {eth0()}}};
   EXPECT_EQ(textOf(protocolEndpoints(host).at(0).at(0)), "SystemCreationClassName=YRNQV_ComputerSystem");
   EXPECT_EQ(textOf(remoteAccessPoints(host).at(0).at(0)), "SystemCreationClassName=YRNQV_ComputerSystem");
@@ -175,4 +175,3 @@ TEST(AnotherSystem, isToldApartByItsClassAndItsSettingsPrefix) {
 }
 
 }  // namespace
-}  // namespace QV

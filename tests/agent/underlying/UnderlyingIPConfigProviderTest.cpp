@@ -10,16 +10,16 @@
 #include <string>
 #include <vector>
 
-#include "cimom/ObjectManager.h"
-#include "cimom/broker/RequestScope.h"
-#include "tests/agent/support/AgentEnvironment.h"
+#include "tests/support/agent/AgentEnvironment.h"
+#include "tests/support/broker/BrokerFixture.h"
 
 extern "C" CMPIInstanceMI* UnderlyingIPConfigProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*,
                                                                         CMPIStatus*);
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using testing::AllOf;
 using testing::Contains;
 using testing::Each;
@@ -109,60 +109,56 @@ Properties keysOf(const CMPIObjectPath* path) {
   return keys;
 }
 
-class TheUnderlyingProvider : public testing::Test {
+class UnderlyingIPConfigProviderTest : public BrokerFixture {
  protected:
-  TheUnderlyingProvider() {
+  UnderlyingIPConfigProviderTest() {
     AgentEnvironment::instance().reset();
-    manager_.loadSchemaText(schema, "root/yrnse");
+    manager.loadSchemaText(schema, "root/yrnse");
     for (const char* name : classNames) {
-      manager_.addProvider({.className = name,
-                            .provider = "UnderlyingIPConfigProvider",
-                            .location = "",
-                            .instance = true,
-                            .association = false,
-                            .namespaces = {"root/yrnse"},
-                            .registeredAt = "here"},
-                           UnderlyingIPConfigProvider_Create_InstanceMI, nullptr);
+      manager.addProvider({.className = name,
+                           .provider = "UnderlyingIPConfigProvider",
+                           .location = "",
+                           .instance = true,
+                           .association = false,
+                           .namespaces = {"root/yrnse"},
+                           .registeredAt = "here"},
+                          UnderlyingIPConfigProvider_Create_InstanceMI, nullptr);
     }
   }
 
-  const CMPIBroker* broker() const { return manager_.broker(); }
-
   CMPIObjectPath* path(const char* className) const {
-    return CMNewObjectPath(broker(), "root/yrnse", className, nullptr);
+    return CMNewObjectPath(broker, "root/yrnse", className, nullptr);
   }
 
   std::vector<Properties> enumerate(const char* className, std::vector<const char*> wanted = {}) {
     wanted.push_back(nullptr);
-    CMPIEnumeration* instances = CBEnumInstances(broker(), scope_.context(), path(className),
-                                                 wanted.size() > 1 ? wanted.data() : nullptr, &status_);
+    CMPIEnumeration* instances = CBEnumInstances(broker, request.context(), path(className),
+                                                 wanted.size() > 1 ? wanted.data() : nullptr, &status);
     std::vector<Properties> all;
-    while (status_.rc == CMPI_RC_OK && CMHasNext(instances, nullptr)) {
+    while (status.rc == CMPI_RC_OK && CMHasNext(instances, nullptr)) {
       all.push_back(propertiesOf(CMGetNext(instances, nullptr).value.inst));
     }
     return all;
   }
 
   std::vector<CMPIObjectPath*> enumerateNames(const char* className) {
-    CMPIEnumeration* paths = CBEnumInstanceNames(broker(), scope_.context(), path(className), &status_);
+    CMPIEnumeration* paths = CBEnumInstanceNames(broker, request.context(), path(className), &status);
     std::vector<CMPIObjectPath*> all;
-    while (status_.rc == CMPI_RC_OK && CMHasNext(paths, nullptr)) {
+    while (status.rc == CMPI_RC_OK && CMHasNext(paths, nullptr)) {
       all.push_back(CMGetNext(paths, nullptr).value.ref);
     }
     return all;
   }
 
-  std::string message() const { return status_.msg ? CMGetCharsPtr(status_.msg, nullptr) : ""; }
+  std::string message() const { return status.msg ? CMGetCharsPtr(status.msg, nullptr) : ""; }
 
-  static std::string log() { return Testing::readFile(AgentEnvironment::instance().log()); }
-  static std::string trace() { return Testing::readFile(AgentEnvironment::instance().trace()); }
+  static std::string log() { return readFile(AgentEnvironment::instance().log()); }
+  static std::string trace() { return readFile(AgentEnvironment::instance().trace()); }
 
-  Cimom::ObjectManager manager_;
-  Cimom::RequestScope scope_{manager_.broker()};
-  CMPIStatus status_{CMPI_RC_OK, nullptr};
+  CMPIStatus status = {CMPI_RC_OK, nullptr};
 };
 
-TEST_F(TheUnderlyingProvider, servesTheProcessor) {
+TEST_F(UnderlyingIPConfigProviderTest, ServesTheProcessor) {
   EXPECT_THAT(enumerate("YRNQV_SPComputerSystem"),
               ElementsAre(Properties{{"CreationClassName", "YRNQV_SPComputerSystem"},
                                      {"Name", "BMC"},
@@ -171,7 +167,7 @@ TEST_F(TheUnderlyingProvider, servesTheProcessor) {
                                      {"Dedicated", "14,28"}}));
 }
 
-TEST_F(TheUnderlyingProvider, servesTheEndpointsOfTheProcessorAndOfTheHost) {
+TEST_F(UnderlyingIPConfigProviderTest, ServesTheEndpointsOfTheProcessorAndOfTheHost) {
   const auto all = enumerate("YRNQV_IPProtocolEndpoint");
   ASSERT_GE(all.size(), 2U);
   EXPECT_EQ(all[0], (Properties{{"SystemCreationClassName", "YRNQV_SPComputerSystem"},
@@ -199,7 +195,7 @@ TEST_F(TheUnderlyingProvider, servesTheEndpointsOfTheProcessorAndOfTheHost) {
   }
 }
 
-TEST_F(TheUnderlyingProvider, servesTheSettings) {
+TEST_F(UnderlyingIPConfigProviderTest, ServesTheSettings) {
   const auto idsOf = [this](const char* className) {
     std::vector<std::string> ids;
     for (Properties& properties : enumerate(className)) {
@@ -218,7 +214,7 @@ TEST_F(TheUnderlyingProvider, servesTheSettings) {
   EXPECT_THAT(idsOf("YRNQV_DHCPSettingData"), ElementsAre("BMC:eth0", "BMC:eth1"));
 }
 
-TEST_F(TheUnderlyingProvider, servesTheAccessPointsOfTheProcessorAndOfTheHost) {
+TEST_F(UnderlyingIPConfigProviderTest, ServesTheAccessPointsOfTheProcessorAndOfTheHost) {
   std::vector<std::string> own;
   int ofHost = 0;
   for (Properties& properties : enumerate("YRNQV_IPRemoteServiceAccessPoint")) {
@@ -233,7 +229,7 @@ TEST_F(TheUnderlyingProvider, servesTheAccessPointsOfTheProcessorAndOfTheHost) {
   EXPECT_GT(ofHost, 0);
 }
 
-TEST_F(TheUnderlyingProvider, namesEveryInstanceByItsKeysAndFindsItByThem) {
+TEST_F(UnderlyingIPConfigProviderTest, NamesEveryInstanceByItsKeysAndFindsItByThem) {
   for (const char* className : classNames) {
     if (className == std::string("YRNQV_Stranger")) {
       continue;
@@ -246,30 +242,30 @@ TEST_F(TheUnderlyingProvider, namesEveryInstanceByItsKeysAndFindsItByThem) {
       const Properties keys = keysOf(paths[index]);
       EXPECT_TRUE(different.insert(keys).second) << className << ": two instances of one name";
       EXPECT_THAT(instances[index], testing::IsSupersetOf(keys));
-      CMPIInstance* found = CBGetInstance(broker(), scope_.context(), paths[index], nullptr, &status_);
-      ASSERT_EQ(status_.rc, CMPI_RC_OK) << className;
+      CMPIInstance* found = CBGetInstance(broker, request.context(), paths[index], nullptr, &status);
+      ASSERT_EQ(status.rc, CMPI_RC_OK) << className;
       EXPECT_EQ(propertiesOf(found), instances[index]);
     }
   }
 }
 
-TEST_F(TheUnderlyingProvider, findsNothingByKeysThatNoInstanceHas) {
+TEST_F(UnderlyingIPConfigProviderTest, FindsNothingByKeysThatNoInstanceHas) {
   CMPIObjectPath* unknown = path("YRNQV_DHCPSettingData");
   CMAddKey(unknown, "InstanceID", "BMC:eth9", CMPI_chars);
-  EXPECT_EQ(CBGetInstance(broker(), scope_.context(), unknown, nullptr, &status_), nullptr);
-  EXPECT_EQ(status_.rc, CMPI_RC_ERR_NOT_FOUND);
-  CBGetInstance(broker(), scope_.context(), path("YRNQV_DHCPSettingData"), nullptr, &status_);
-  EXPECT_EQ(status_.rc, CMPI_RC_ERR_NOT_FOUND) << "a path without keys";
+  EXPECT_EQ(CBGetInstance(broker, request.context(), unknown, nullptr, &status), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
+  CBGetInstance(broker, request.context(), path("YRNQV_DHCPSettingData"), nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND) << "a path without keys";
 }
 
-TEST_F(TheUnderlyingProvider, showsNoMoreThanIsAskedForAndTheKeys) {
+TEST_F(UnderlyingIPConfigProviderTest, ShowsNoMoreThanIsAskedForAndTheKeys) {
   EXPECT_THAT(
       enumerate("YRNQV_SPComputerSystem", {"Description"}),
       Each(testing::UnorderedElementsAre(Pair("CreationClassName", "YRNQV_SPComputerSystem"), Pair("Name", "BMC"),
                                          Pair("Description", "Simulated management processor"))));
 }
 
-TEST_F(TheUnderlyingProvider, showsAtOnceWhatTheInstrumentationWrote) {
+TEST_F(UnderlyingIPConfigProviderTest, ShowsAtOnceWhatTheInstrumentationWrote) {
   {
     Instrumentation instrumentation;
     instrumentation.selectNode(NodeLexicon::IpInterfaceNode);
@@ -283,19 +279,19 @@ TEST_F(TheUnderlyingProvider, showsAtOnceWhatTheInstrumentationWrote) {
   EXPECT_THAT(enumerate("YRNQV_StaticIPAssignmentSettingData").at(1), Contains(Pair("IPv4Address", "198.51.100.77")));
 }
 
-TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsAndTracesIt) {
-  Testing::writeFile(AgentEnvironment::instance().state(), "{");
+TEST_F(UnderlyingIPConfigProviderTest, TellsWhyTheProcessorCannotBeReadAndLogsAndTracesIt) {
+  writeFile(AgentEnvironment::instance().state(), "{");
   for (const char* className : classNames) {
     if (className == std::string("YRNQV_Stranger")) {
       continue;
     }
     enumerate(className);
-    EXPECT_EQ(status_.rc, CMPI_RC_ERR_FAILED) << className;
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED) << className;
     EXPECT_THAT(message(), HasSubstr(AgentEnvironment::instance().state() + ": "));
     enumerateNames(className);
-    EXPECT_EQ(status_.rc, CMPI_RC_ERR_FAILED) << className;
-    CBGetInstance(broker(), scope_.context(), path(className), nullptr, &status_);
-    EXPECT_EQ(status_.rc, CMPI_RC_ERR_FAILED) << className;
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED) << className;
+    CBGetInstance(broker, request.context(), path(className), nullptr, &status);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED) << className;
   }
   for (const std::string& lines : {log(), trace()}) {
     EXPECT_THAT(lines, HasSubstr(" 6000 Tarnwick.UnderlyingIPConfigProvider serve (UnderlyingIPConfigProvider:"));
@@ -303,33 +299,32 @@ TEST_F(TheUnderlyingProvider, tellsWhyTheProcessorCannotBeReadAndLogsAndTracesIt
   }
 }
 
-TEST_F(TheUnderlyingProvider, refusesAClassThatItDoesNotServe) {
+TEST_F(UnderlyingIPConfigProviderTest, RefusesAClassThatItDoesNotServe) {
   enumerate("YRNQV_Stranger");
-  EXPECT_EQ(status_.rc, CMPI_RC_ERR_INVALID_CLASS);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_CLASS);
   EXPECT_THAT(message(), HasSubstr("YRNQV_Stranger"));
 }
 
-TEST_F(TheUnderlyingProvider, isReadOnly) {
+TEST_F(UnderlyingIPConfigProviderTest, IsReadOnly) {
   CMPIObjectPath* name = enumerateNames("YRNQV_DHCPSettingData").at(0);
-  CMPIInstance* instance = CMNewInstance(broker(), name, nullptr);
-  CBCreateInstance(broker(), scope_.context(), name, instance, &status_);
-  EXPECT_EQ(status_.rc, CMPI_RC_ERR_NOT_SUPPORTED);
-  EXPECT_EQ(CBModifyInstance(broker(), scope_.context(), name, instance, nullptr).rc, CMPI_RC_ERR_NOT_SUPPORTED);
-  EXPECT_EQ(CBDeleteInstance(broker(), scope_.context(), name).rc, CMPI_RC_ERR_NOT_SUPPORTED);
-  CBExecQuery(broker(), scope_.context(), name, "SELECT * FROM YRNQV_DHCPSettingData", "WQL", &status_);
-  EXPECT_EQ(status_.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  CMPIInstance* instance = CMNewInstance(broker, name, nullptr);
+  CBCreateInstance(broker, request.context(), name, instance, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  EXPECT_EQ(CBModifyInstance(broker, request.context(), name, instance, nullptr).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  EXPECT_EQ(CBDeleteInstance(broker, request.context(), name).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+  CBExecQuery(broker, request.context(), name, "SELECT * FROM YRNQV_DHCPSettingData", "WQL", &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_SUPPORTED);
 }
 
-TEST_F(TheUnderlyingProvider, isMadeAndCleanedUpAgainAndAgain) {
+TEST_F(UnderlyingIPConfigProviderTest, IsMadeAndCleanedUpAgainAndAgain) {
   for (int count = 0; count < 3; ++count) {
     CMPIStatus made{CMPI_RC_OK, nullptr};
-    CMPIInstanceMI* provider = UnderlyingIPConfigProvider_Create_InstanceMI(broker(), scope_.context(), &made);
+    CMPIInstanceMI* provider = UnderlyingIPConfigProvider_Create_InstanceMI(broker, request.context(), &made);
     ASSERT_NE(provider, nullptr);
     EXPECT_STREQ(provider->ft->miName, "instanceUnderlyingIPConfigProvider");
-    EXPECT_EQ(provider->ft->cleanup(provider, scope_.context(), 1).rc, CMPI_RC_OK);
+    EXPECT_EQ(provider->ft->cleanup(provider, request.context(), 1).rc, CMPI_RC_OK);
   }
   EXPECT_THAT(enumerate("YRNQV_DHCPSettingData"), Not(IsEmpty()));
 }
 
 }  // namespace
-}  // namespace QV

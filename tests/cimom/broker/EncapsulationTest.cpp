@@ -1,4 +1,5 @@
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
@@ -7,7 +8,7 @@ using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 
-class EncapsulationTest : public BrokerFixture {
+class EncapsulationTest : public ManagedElementsFixture {
  protected:
   MessageSink collector() {
     return [this](int level, std::string_view component, std::string_view text) {

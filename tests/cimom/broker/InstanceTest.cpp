@@ -1,11 +1,12 @@
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
 using namespace Cimom;
 using namespace Testing;
 
-class InstanceTest : public BrokerFixture {
+class InstanceTest : public ManagedElementsFixture {
  protected:
   std::string caption(const CMPIInstance* instance) {
     return shownText(CMGetProperty(instance, "Caption", nullptr).value.string);

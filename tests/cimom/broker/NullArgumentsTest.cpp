@@ -2,14 +2,15 @@
 #include <functional>
 
 #include "cimom/broker/Handle.h"
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
 using namespace Cimom;
 using namespace Testing;
 
-class NullArgumentsTest : public BrokerFixture {
+class NullArgumentsTest : public ManagedElementsFixture {
  protected:
   // A slot that reports through its result.
   void refused(const char* slot, const CMPIStatus& outcome) {

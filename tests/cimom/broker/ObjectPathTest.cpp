@@ -1,11 +1,12 @@
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
 using namespace Cimom;
 using namespace Testing;
 
-class ObjectPathTest : public BrokerFixture {};
+class ObjectPathTest : public ManagedElementsFixture {};
 
 TEST_F(ObjectPathTest, MayBeOfAClassThatNobodyKnows) {
   const CMPIObjectPath* unknown = CMNewObjectPath(broker, "root/far", "Far_Class", &status);

@@ -1,12 +1,13 @@
 #include "cimom/broker/Handle.h"
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
 using namespace Cimom;
 using namespace Testing;
 
-class ObjectsTest : public BrokerFixture {
+class ObjectsTest : public ManagedElementsFixture {
  protected:
   CMPIEnumeration* enumerationOf(std::vector<const char*> texts) {
     Enumeration model;

@@ -3,14 +3,15 @@
 #include <cstdlib>
 #include <ctime>
 
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
 using namespace Cimom;
 using namespace Testing;
 
-class ThreadServicesTest : public BrokerFixture {
+class ThreadServicesTest : public ManagedElementsFixture {
  protected:
   const CMPIBrokerExtFT& xft = *broker->xft;
 };

@@ -5,6 +5,7 @@
 #include <fstream>
 #include <iterator>
 
+#include "Paths.h"
 #include "cimom/cimxml/Document.h"
 
 CMPI_EXTERN_C CMPIInstanceMI* ProbeProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
@@ -15,9 +16,9 @@ namespace Testing {
 using namespace Cimom;
 
 EndpointTest::EndpointTest() : endpoint_(manager_.broker(), manager_.classes(), "server") {
-  std::ifstream mof(SOURCE_DIR "/tests/e2e/probe/Probe.mof");
+  std::ifstream mof(SOURCE_DIR "/tests/support/probe/Probe.mof");
   manager_.loadSchemaText(std::string{std::istreambuf_iterator<char>(mof), {}}, "root/test", "Probe.mof");
-  for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/e2e/probe/Probe.reg")) {
+  for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/support/probe/Probe.reg")) {
     manager_.addProvider(registration, &ProbeProvider_Create_InstanceMI, &ProbeProvider_Create_AssociationMI);
   }
 }

@@ -2,7 +2,7 @@
 #include <cmpidt.h>
 
 #include "tests/cimom/cimxml/EndpointTest.h"
-#include "tests/e2e/probe/ProbeObjects.h"
+#include "tests/support/probe/ProbeObjects.h"
 
 namespace {
 

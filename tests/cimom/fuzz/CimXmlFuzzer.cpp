@@ -6,6 +6,7 @@
 #include <iterator>
 #include <memory>
 
+#include "Paths.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Document.h"
 #include "cimom/cimxml/Errors.h"
@@ -20,7 +21,7 @@ using namespace Cimom;
 const ObjectManager& manager() {
   static const auto instance = [] {
     auto loaded = std::make_unique<ObjectManager>();
-    std::ifstream mof(SOURCE_DIR "/tests/e2e/probe/Probe.mof");
+    std::ifstream mof(SOURCE_DIR "/tests/support/probe/Probe.mof");
     loaded->loadSchemaText(std::string{std::istreambuf_iterator<char>(mof), {}}, "root/test", "Probe.mof");
     return loaded;
   }();

@@ -5,7 +5,7 @@
 #include <cstdlib>
 #include <string_view>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/schema/ClassRepository.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {

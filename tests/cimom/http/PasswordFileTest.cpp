@@ -2,7 +2,7 @@
 
 #include "cimom/http/Listener.h"
 #include "cimom/http/PasswordFile.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 

@@ -5,7 +5,7 @@
 #include <thread>
 
 #include "cimom/http/Server.h"
-#include "tests/cimom/http/HttpClient.h"
+#include "tests/support/client/HttpClient.h"
 
 namespace {
 

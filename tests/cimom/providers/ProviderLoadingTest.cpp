@@ -1,5 +1,7 @@
-#include "tests/cimom/support/BrokerFixture.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "Paths.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
@@ -14,7 +16,8 @@ class ProviderLoadingTest : public testing::Test {
   ProviderLoadingTest() {
     manager.loadSchemaText(testSchema, testNamespace);
     manager.addProviderDirectory(directory.path());
-    manager.addProviderDirectory(PROBE_DIRECTORY);
+    manager.addProviderDirectory(GARBAGE_DIRECTORY);
+    manager.addProviderDirectory(PROVIDER_DIRECTORY);
   }
 
   void registerProvider(const std::string& provider, const std::string& location,
@@ -45,16 +48,15 @@ class ProviderLoadingTest : public testing::Test {
 };
 
 TEST_F(ProviderLoadingTest, ASharedObjectServesItsClass) {
-  registerProvider("ProbeSystem", "probe");
+  manager.loadSchema(SOURCE_DIR "/tests/support/probe/Probe.mof");
+  registerProvider("ProbeProvider", "cimomprobe", "TEST_Thing");
   manager.checkProviders();
   const RequestScope scope(manager.broker());
-  const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "CIM_System", nullptr);
+  const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "TEST_Thing", nullptr);
   CMPIContext* context = RequestScope::current()->context();
-  const std::vector<std::string> expected = {
-      "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"",
-      "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"two\""};
-  EXPECT_EQ(pathsOf(CBEnumInstances(manager.broker(), context, path, nullptr, nullptr)), expected);
-  EXPECT_EQ(pathsOf(CBEnumInstanceNames(manager.broker(), context, path, nullptr)), expected);
+  const auto things = ElementsAre(HasSubstr("TEST_Thing.Name="), HasSubstr("TEST_Thing.Name="));
+  EXPECT_THAT(pathsOf(CBEnumInstances(manager.broker(), context, path, nullptr, nullptr)), things);
+  EXPECT_THAT(pathsOf(CBEnumInstanceNames(manager.broker(), context, path, nullptr)), things);
 }
 
 TEST_F(ProviderLoadingTest, AMissingLibraryIsNamedWithWhereItWasLookedFor) {
@@ -71,18 +73,18 @@ TEST_F(ProviderLoadingTest, AFileThatIsNotALibraryIsNamedWithTheLoadersReason) {
 }
 
 TEST_F(ProviderLoadingTest, AMissingFactoryIsNamed) {
-  registerProvider("ProbeSystem", "nofactory");
-  EXPECT_THAT(complaints(), ElementsAre(HasSubstr("libnofactory.so has no function ProbeSystem_Create_InstanceMI"),
+  registerProvider("ProbeSystem", "instanceonly");
+  EXPECT_THAT(complaints(), ElementsAre(HasSubstr("libinstanceonly.so has no function ProbeSystem_Create_InstanceMI"),
                                         HasSubstr("ProbeSystem_Create_InstanceMI")));
 }
 
 TEST_F(ProviderLoadingTest, AFactoryOfTheOtherTypeDoesNotDo) {
-  registerProvider("ProbeSystem", "probe", "TST_Hosted", "association");
+  registerProvider("InstanceOnly", "instanceonly", "TST_Hosted", "association");
   EXPECT_THROW(manager.checkProviders(), ConfigurationError);
 }
 
 TEST_F(ProviderLoadingTest, AClassThatTheSchemaLacksIsFoundByTheCheck) {
-  registerProvider("ProbeSystem", "probe", "TST_Nothing");
+  registerProvider("InstanceOnly", "instanceonly", "TST_Nothing");
   try {
     manager.checkProviders();
     FAIL();

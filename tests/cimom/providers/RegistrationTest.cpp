@@ -2,7 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "cimom/ObjectManager.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 

@@ -1,4 +1,5 @@
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
@@ -9,7 +10,7 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::SizeIs;
 
-class AssociationOperationsTest : public BrokerFixture {
+class AssociationOperationsTest : public ManagedElementsFixture {
  protected:
   AssociationOperationsTest() {
     hosted->serve(manager, "TST_Hosted", testNamespace, true);
@@ -25,8 +26,8 @@ class AssociationOperationsTest : public BrokerFixture {
     return CBReferences(broker, request.context(), source, association, "Antecedent", nullptr, &status);
   }
 
-  std::shared_ptr<ProbeProvider> hosted = std::make_shared<ProbeProvider>();
-  std::shared_ptr<ProbeProvider> peers = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> hosted = std::make_shared<RecordingProvider>();
+  std::shared_ptr<RecordingProvider> peers = std::make_shared<RecordingProvider>();
 };
 
 TEST_F(AssociationOperationsTest, TheNamedAssociationAloneIsAskedWithAllThatTheClientSays) {
@@ -132,7 +133,7 @@ TEST_F(AssociationOperationsTest, AnAssociationInstanceMadeOnAKeylessPathGetsIts
 }
 
 TEST_F(AssociationOperationsTest, AnAssociationThatIsRegisteredForInstancesOnlyIsNotTraversed) {
-  std::shared_ptr<ProbeProvider> quiet = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> quiet = std::make_shared<RecordingProvider>();
   ObjectManager other;
   other.loadSchemaText(testSchema, testNamespace);
   quiet->serve(other, "TST_Hosted", testNamespace, false);

@@ -1,7 +1,8 @@
 #include <atomic>
 #include <thread>
 
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 

@@ -1,4 +1,5 @@
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
@@ -9,12 +10,12 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::SizeIs;
 
-class InstanceOperationsTest : public BrokerFixture {
+class InstanceOperationsTest : public ManagedElementsFixture {
  protected:
   InstanceOperationsTest() { probe->serve(manager, "TST_Processor", testNamespace); }
 
   // A provider that returns systems of these names, of the class that it is asked for.
-  ProbeProvider::Answer returning(std::vector<std::string> names) {
+  RecordingProvider::Answer returning(std::vector<std::string> names) {
     return
         [this, names](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* asked, const CMPIInstance*) {
           const std::string className = shownText(CMGetClassName(asked, nullptr));
@@ -27,7 +28,7 @@ class InstanceOperationsTest : public BrokerFixture {
 
   CMPIContext* context() { return request.context(); }
 
-  std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> probe = std::make_shared<RecordingProvider>();
 };
 
 TEST_F(InstanceOperationsTest, AnUnknownNamespaceIsRefused) {
@@ -51,7 +52,7 @@ TEST_F(InstanceOperationsTest, AClassWithoutAProviderHasNoInstances) {
 }
 
 TEST_F(InstanceOperationsTest, AClassHasAProviderInItsRegisteredNamespacesOnly) {
-  std::shared_ptr<ProbeProvider> other = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> other = std::make_shared<RecordingProvider>();
   ObjectManager second;
   second.loadSchemaText(testSchema, "root/a");
   other->serve(second, "TST_Processor", "root/b");
@@ -67,7 +68,7 @@ TEST_F(InstanceOperationsTest, AClassHasAProviderInItsRegisteredNamespacesOnly) 
 }
 
 TEST_F(InstanceOperationsTest, EnumerationOfASuperclassCallsEachRegisteredSubclassWithItsName) {
-  std::shared_ptr<ProbeProvider> other = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> other = std::make_shared<RecordingProvider>();
   other->serve(manager, "TST_Other", testNamespace);
   probe->answer = returning({"one", "two"});
   other->answer = returning({"three"});

@@ -1,6 +1,7 @@
 #include <stdexcept>
 
-#include "tests/cimom/support/BrokerFixture.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/broker/RecordingProvider.h"
 
 namespace {
 
@@ -10,13 +11,13 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::SizeIs;
 
-class ProviderCallsTest : public BrokerFixture {
+class ProviderCallsTest : public ManagedElementsFixture {
  protected:
   ProviderCallsTest() { probe->serve(manager, "TST_Processor", testNamespace); }
 
   CMPIContext* context() { return request.context(); }
 
-  std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> probe = std::make_shared<RecordingProvider>();
 };
 
 TEST_F(ProviderCallsTest, AnEmptySlotOfAProviderIsNotSupported) {
@@ -55,7 +56,7 @@ TEST_F(ProviderCallsTest, TheProviderGetsTheRequestsContext) {
 }
 
 TEST_F(ProviderCallsTest, AProviderReachesAnotherThroughUpCalls) {
-  std::shared_ptr<ProbeProvider> lower = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> lower = std::make_shared<RecordingProvider>();
   lower->serve(manager, "TST_Other", "root/lower");
   lower->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
     CMReturnInstance(result, system("low", "TST_Other"));
@@ -148,7 +149,7 @@ TEST_F(ProviderCallsTest, ReturnDoneMakesNoDifferenceHoweverOftenItIsCalled) {
 }
 
 TEST(ProviderLifeTest, TheFactoryIsCalledOnceAndCleanupOncePerInterface) {
-  std::shared_ptr<ProbeProvider> probe = std::make_shared<ProbeProvider>();
+  std::shared_ptr<RecordingProvider> probe = std::make_shared<RecordingProvider>();
   {
     ObjectManager manager;
     manager.loadSchemaText(testSchema, testNamespace);

@@ -1,9 +1,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/schema/ClassRepository.h"
-#include "tests/cimom/support/ManagedElements.h"
+#include "tests/support/broker/ManagedElements.h"
 
 namespace {
 

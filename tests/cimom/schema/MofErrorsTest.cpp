@@ -1,10 +1,10 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include "cimom/ground/Errors.h"
+#include "cimom/model/Errors.h"
 #include "cimom/schema/Mof.h"
-#include "tests/cimom/support/ManagedElements.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/broker/ManagedElements.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 

@@ -23,7 +23,7 @@ struct AddressSettings {
 // Reads them in three round trips.
 AddressSettings readAddressSettings(IpmiTransport& transport, std::uint8_t channel);
 
-// What the change makes of the settings. Throws IpmiError where the interface would be static without an address or a
+// What the change makes of the settings. Throws IpmiError if the interface would be static without an address or a
 // mask, since it has none yet and the change brings none.
 AddressSettings withChange(const AddressSettings& present, const AddressChange& change);
 

@@ -48,15 +48,15 @@ enum class AddressSource : std::uint8_t { Unspecified = 0, Static = 1, Dhcp = 2,
 
 using ParameterData = std::vector<std::uint8_t>;
 
-// The data of a parameter, without the revision byte before it; nothing where the processor does not support the
-// parameter. Throws IpmiError that names channel and parameter where the processor refuses the request otherwise.
+// The data of a parameter, without the revision byte before it; nothing if the processor does not support the
+// parameter. Throws IpmiError that names channel and parameter if the processor refuses the request otherwise.
 std::optional<ParameterData> getParameter(IpmiTransport& transport, std::uint8_t channel, LanParameter parameter);
 
 // Writes a parameter; the answer's completion code is the caller's to judge.
 IpmiResponse setParameter(IpmiTransport& transport, std::uint8_t channel, LanParameter parameter,
                           const ParameterData& data, Repetition repetition);
 
-// The octets of a parameter's data as an address, nothing where there are fewer; and the address as a parameter's data.
+// The octets of a parameter's data as an address, nothing if there are fewer; and the address as a parameter's data.
 template <typename Address>
 std::optional<Address> toAddress(const std::optional<ParameterData>& data, std::size_t first = 0) {
   typename Address::Octets octets{};

@@ -23,14 +23,14 @@ void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held
 // written to all the same.
 class ParameterTransaction {
  public:
-  // Throws IpmiError, and nothing has been written, where another client holds the lock or it cannot be taken.
+  // Throws IpmiError, and nothing has been written, if another client holds the lock or it cannot be taken.
   ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held);
   ~ParameterTransaction();
   ParameterTransaction(const ParameterTransaction&) = delete;
   ParameterTransaction& operator=(const ParameterTransaction&) = delete;
 
   // Writes the values in their order and commits them. Where one is refused or the operation's time ends, what was
-  // written before it is put back, and IpmiError is thrown. Throws ConnectionLost where an answer did not come; what
+  // written before it is put back, and IpmiError is thrown. Throws ConnectionLost if an answer did not come; what
   // the processor has then is unknown.
   void write(const std::vector<ParameterWrite>& writes);
 

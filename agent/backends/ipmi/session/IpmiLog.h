@@ -1,21 +1,28 @@
 // The back end's lines in the agent's log and trace, under the component "Tarnwick.Ipmi".
 #pragma once
 
-#include <experimental/source_location>
 #include <string>
+
+#include "agent/log/Report.h"
 
 namespace QV::Ipmi {
 
+inline constexpr const char* logComponent = "Tarnwick.Ipmi";
+
 // What an administrator must know of: level 6000, to the log and to the trace.
-void logFailure(const std::string& text,
-                std::experimental::source_location where = std::experimental::source_location::current());
+inline void logFailure(const std::string& text, const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) {
+  TWLog::report(logComponent, TWLog::failureLevel, text, where);
+}
 
 // What went its ordinary way: level 4000, to the log and to the trace.
-void logProgress(const std::string& text,
-                 std::experimental::source_location where = std::experimental::source_location::current());
+inline void logProgress(const std::string& text,
+                        const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) {
+  TWLog::report(logComponent, TWLog::progressLevel, text, where);
+}
 
 // What only a look into the exchange with the hardware needs: level 4000, to the trace alone.
-void trace(const std::string& text,
-           std::experimental::source_location where = std::experimental::source_location::current());
+inline void trace(const std::string& text, const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) {
+  TWLog::trace(logComponent, TWLog::progressLevel, text, where);
+}
 
 }  // namespace QV::Ipmi

@@ -19,7 +19,7 @@ class IpmiSession {
   // retransmission time-outs. Throws NotSent in words that name the processor and what to do.
   explicit IpmiSession(const IpmiSettings& settings);
 
-  // Throws ConnectionLost where no answer came within the session time-out; the session is of no use any more then.
+  // Throws ConnectionLost if no answer came within the session time-out; the session is of no use any more then.
   IpmiResponse send(const IpmiRequest& request);
 
   // libfreeipmi counts the session time-out from the last answer, even while nothing is asked, and sends nothing any

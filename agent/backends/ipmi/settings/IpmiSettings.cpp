@@ -123,7 +123,7 @@ std::string readShortSecret(const std::string& key, const std::string& path) {
   return secret;
 }
 
-// The bytes that pairs of hexadecimal digits stand for; nothing where the text is of another form or empty.
+// The bytes that pairs of hexadecimal digits stand for; nothing if the text is of another form or empty.
 std::optional<std::string> parseHexadecimal(const std::string& digits) {
   if (digits.empty() || digits.size() % 2 != 0) {
     return std::nullopt;

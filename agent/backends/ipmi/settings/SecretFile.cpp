@@ -21,7 +21,7 @@ namespace {
 }  // namespace
 
 std::string readSecretFile(const std::string& path) {
-  const Descriptor file(path, O_RDONLY | O_NONBLOCK);
+  const Ground::Descriptor file(path, O_RDONLY | O_NONBLOCK);
   struct stat status {};
   if (!file.isOpen() || ::fstat(file.number(), &status) != 0) {
     failWithErrno(path);

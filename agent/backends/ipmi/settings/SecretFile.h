@@ -5,7 +5,7 @@
 
 namespace QV::Ipmi {
 
-// The first line of a file that only its owner can read. Throws std::runtime_error, naming the file, where it cannot be
+// The first line of a file that only its owner can read. Throws std::runtime_error, naming the file, if it cannot be
 // read, is no regular file, grants group or others anything, or its first line is empty.
 std::string readSecretFile(const std::string& path);
 

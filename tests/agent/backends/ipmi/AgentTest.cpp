@@ -4,27 +4,28 @@
 
 #include <cstdlib>
 
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
+#include "Paths.h"
+#include "tests/support/agent/SimulatedBmc.h"
 
 namespace {
 
-using IpmiFixture::SimulatedBmc;
+using namespace Testing;
 using QV::Instrumentation;
 using QV::NodeLexicon::IpInterfaceNode;
 using QV::NodeLexicon::Properties;
 
 // agent.ini is read once in a process, so one BMC serves all tests here.
-class IpmiAgent : public testing::Test {
+class IpmiAgentTest : public testing::Test {
  protected:
   static void SetUpTestSuite() {
-    directory = std::make_unique<Testing::TemporaryDirectory>();
+    directory = std::make_unique<TemporaryDirectory>();
     bmc = std::make_unique<SimulatedBmc>();
     std::string ini = "[log]\ndestination = file\nfile = " + log() + "\n[trace]\ndestination = file\nfile = " + log() +
                       "\n[processor]\nbackend = ipmi\n[ipmi]\n";
     for (const auto& [key, value] : bmc->settings()) {
       ini += key + " = " + value + '\n';
     }
-    Testing::writeFile(*directory / "agent.ini", ini);
+    writeFile(*directory / "agent.ini", ini);
     ::setenv("QV_AGENT_INI", (*directory / "agent.ini").c_str(), 1);
   }
   static void TearDownTestSuite() {
@@ -38,11 +39,11 @@ class IpmiAgent : public testing::Test {
     return instrumentation.getProperty(property, text) ? text : "(none)";
   }
 
-  static inline std::unique_ptr<Testing::TemporaryDirectory> directory;
+  static inline std::unique_ptr<TemporaryDirectory> directory;
   static inline std::unique_ptr<SimulatedBmc> bmc;
 };
 
-TEST_F(IpmiAgent, ShowsAndChangesTheBmcsInterface) {
+TEST_F(IpmiAgentTest, ShowsAndChangesTheBmcsInterface) {
   {
     Instrumentation instrumentation;
     instrumentation.selectNode(IpInterfaceNode);
@@ -59,20 +60,20 @@ TEST_F(IpmiAgent, ShowsAndChangesTheBmcsInterface) {
   EXPECT_EQ(bmc->witness("IP Address"), "192.0.2.77");
   EXPECT_EQ(bmc->witness("Subnet Mask"), "255.255.255.128");
   EXPECT_EQ(bmc->witness("IP Address Source"), "Static Address");
-  EXPECT_THAT(Testing::readFile(log()), testing::HasSubstr("Tarnwick.Ipmi"));
-  EXPECT_THAT(Testing::readFile(log()), testing::HasSubstr("round trips"));
+  EXPECT_THAT(readFile(log()), testing::HasSubstr("Tarnwick.Ipmi"));
+  EXPECT_THAT(readFile(log()), testing::HasSubstr("round trips"));
   Instrumentation again;
   again.selectNode(IpInterfaceNode);
   EXPECT_EQ(value(again, Properties::Ipv4Address), "192.0.2.77");
 }
 
-TEST(IpmiBackEndLibrary, ExportsItsFactoryAlone) {
-  const std::string symbols = IpmiFixture::outputOf({"nm", "-D", "--defined-only", IPMI_BACK_END});
+TEST(IpmiBackEndLibraryTest, ExportsItsFactoryAlone) {
+  const std::string symbols = run({"nm", "-D", "--defined-only", IPMI_BACK_END}).output;
   EXPECT_THAT(symbols, testing::MatchesRegex("[0-9a-f]+ T qvCreateBackEnd\n"));
 }
 
-TEST(IpmiBackEndLibrary, IsNotLinkedByTheInstrumentation) {
-  const std::string symbols = IpmiFixture::outputOf({"readelf", "-d", BINARY_DIR "/lib/libqvinstrumentation.so"});
+TEST(IpmiBackEndLibraryTest, IsNotLinkedByTheInstrumentation) {
+  const std::string symbols = run({"readelf", "-d", BINARY_DIR "/lib/libqvinstrumentation.so"}).output;
   EXPECT_THAT(symbols, testing::AllOf(testing::HasSubstr("NEEDED"), testing::Not(testing::HasSubstr("freeipmi"))));
 }
 

@@ -6,13 +6,13 @@
 #include <vector>
 
 #include "agent/backends/ipmi/IpmiBackEnd.h"
-#include "tests/agent/backends/ipmi/RecordedLog.h"
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/agent/RecordingLog.h"
+#include "tests/support/agent/SimulatedBmc.h"
 
 namespace {
 
-using IpmiFixture::SimulatedBmc;
+using namespace Testing;
 using QV::AddressChange;
 using QV::AddressOrigin;
 using QV::Ipmi::IpmiBackEnd;
@@ -25,9 +25,9 @@ auto refusal(const std::string& text) { return ThrowsMessage<std::runtime_error>
 
 const AddressChange bothValues{QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")};
 
-class IpmiChange : public testing::TestWithParam<SimulatedBmc::Personality> {};
+class IpmiChangeTest : public testing::TestWithParam<SimulatedBmc::Personality> {};
 
-TEST_P(IpmiChange, IsWhatAnotherClientSeesAndWhatTheNextReadShows) {
+TEST_P(IpmiChangeTest, IsWhatAnotherClientSeesAndWhatTheNextReadShows) {
   const SimulatedBmc bmc(GetParam());
   auto settings = parseSettings(bmc.settings());
   settings.cache = std::chrono::minutes(1);
@@ -46,7 +46,7 @@ TEST_P(IpmiChange, IsWhatAnotherClientSeesAndWhatTheNextReadShows) {
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Static);
 }
 
-TEST_P(IpmiChange, OfTheAddressLeavesTheMask) {
+TEST_P(IpmiChangeTest, OfTheAddressLeavesTheMask) {
   const SimulatedBmc bmc(GetParam());
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   backEnd.change("lan1", {QV::ipv4("192.0.2.76"), QV::mask("255.255.255.0")});
@@ -57,7 +57,7 @@ TEST_P(IpmiChange, OfTheAddressLeavesTheMask) {
   EXPECT_EQ(bmc.witness("Subnet Mask"), "255.255.255.0");
 }
 
-INSTANTIATE_TEST_SUITE_P(Personalities, IpmiChange,
+INSTANTIATE_TEST_SUITE_P(Personalities, IpmiChangeTest,
                          testing::Values(SimulatedBmc::Personality::AppliesOnCommit,
                                          SimulatedBmc::Personality::AppliesAtOnce),
                          [](const auto& personality) {
@@ -65,7 +65,7 @@ INSTANTIATE_TEST_SUITE_P(Personalities, IpmiChange,
                                                                                                   : "AtOnce";
                          });
 
-TEST(IpmiChangeAmongReaders, IsSeenAsAWholeOrNotAtAll) {
+TEST(IpmiChangeAmongReadersTest, IsSeenAsAWholeOrNotAtAll) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   std::vector<std::future<int>> readers;
@@ -93,7 +93,7 @@ TEST(IpmiChangeAmongReaders, IsSeenAsAWholeOrNotAtAll) {
   EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.77"));
 }
 
-TEST(IpmiChangeRefused, ForAnInterfaceThatIsNotThere) {
+TEST(IpmiChangeRefusedTest, ForAnInterfaceThatIsNotThere) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
 
@@ -104,7 +104,7 @@ TEST(IpmiChangeRefused, ForAnInterfaceThatIsNotThere) {
   EXPECT_EQ(bmc.stored("ip_addr"), "192.0.2.10");
 }
 
-TEST(IpmiChangeRefused, WhileAnotherClientsChangeIsInProgress) {
+TEST(IpmiChangeRefusedTest, WhileAnotherClientsChangeIsInProgress) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   bmc.ipmitool({"raw", "0x0c", "0x01", "1", "0", "1"});
@@ -118,38 +118,38 @@ TEST(IpmiChangeRefused, WhileAnotherClientsChangeIsInProgress) {
   EXPECT_EQ(bmc.stored("ip_addr"), "192.0.2.77");
 }
 
-TEST(IpmiChangeRefused, ByTheBmcChangesNothing) {
+TEST(IpmiChangeRefusedTest, ByTheBmcChangesNothing) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   bmc.hook("check", "exit 1");  // the simulator asks it about the address source
-  IpmiFixture::takeLog();
+  takeLog();
 
   EXPECT_THAT([&] { backEnd.change("lan1", bothValues); },
               ThrowsMessage<std::runtime_error>(AllOf(HasSubstr("refuses the IP address source static"),
                                                       HasSubstr("0xCC"), HasSubstr("nothing was changed"))));
 
-  EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 6000, "refuses the IP address source static"));
+  EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 6000, "refuses the IP address source static"));
   EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
   EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.10");
   EXPECT_EQ(bmc.stored("ip_addr_src"), "dhcp");
 }
 
-TEST(IpmiChangeRefused, WhereTheBmcAcceptsAndDoesNotApply) {
+TEST(IpmiChangeRefusedTest, WhereTheBmcAcceptsAndDoesNotApply) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   bmc.hook("set", "exit 1");
-  IpmiFixture::takeLog();
+  takeLog();
 
   EXPECT_THAT([&] { backEnd.change("lan1", bothValues); },
               ThrowsMessage<std::runtime_error>(AllOf(HasSubstr("does not show it"),
                                                       HasSubstr("IP address is 192.0.2.10, not 192.0.2.77"),
                                                       HasSubstr("the earlier values hold"))));
 
-  EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 6000, "does not show it"));
+  EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 6000, "does not show it"));
   EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
 }
 
-TEST(IpmiChangeRefused, WhereTheBmcAppliesAPartPutsTheEarlierValuesBack) {
+TEST(IpmiChangeRefusedTest, WhereTheBmcAppliesAPartPutsTheEarlierValuesBack) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   backEnd.change("lan1", {QV::ipv4("192.0.2.20"), QV::mask("255.255.255.0")});

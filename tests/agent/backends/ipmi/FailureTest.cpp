@@ -5,16 +5,15 @@
 #include <chrono>
 
 #include "agent/backends/ipmi/IpmiBackEnd.h"
-#include "tests/agent/backends/ipmi/PrivateFile.h"
-#include "tests/agent/backends/ipmi/RecordedLog.h"
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/agent/backends/ipmi/UdpRelay.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/agent/RecordingLog.h"
+#include "tests/support/agent/SimulatedBmc.h"
+#include "tests/support/agent/UdpRelay.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
-using IpmiFixture::SimulatedBmc;
-using IpmiFixture::UdpRelay;
+using namespace Testing;
 using QV::AddressChange;
 using QV::BackEndSettings;
 using QV::Ipmi::IpmiBackEnd;
@@ -63,7 +62,7 @@ bool readsAgain(IpmiBackEnd& backEnd) {
   return false;
 }
 
-TEST(IpmiFailure, OfABmcThatStallsEndsInTimeAndPasses) {
+TEST(IpmiFailureTest, OfABmcThatStallsEndsInTimeAndPasses) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
   backEnd.read();
@@ -78,7 +77,7 @@ TEST(IpmiFailure, OfABmcThatStallsEndsInTimeAndPasses) {
   EXPECT_EQ(bmc.stored("ip_addr"), "192.0.2.10");
 }
 
-TEST(IpmiFailure, OfABmcThatIsRestartedPasses) {
+TEST(IpmiFailureTest, OfABmcThatIsRestartedPasses) {
   SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
   backEnd.read();
@@ -90,7 +89,7 @@ TEST(IpmiFailure, OfABmcThatIsRestartedPasses) {
   EXPECT_TRUE(readsAgain(backEnd));
 }
 
-TEST(IpmiFailure, OfASessionThatTheBmcForgotIsNotSeen) {
+TEST(IpmiFailureTest, OfASessionThatTheBmcForgotIsNotSeen) {
   SimulatedBmc bmc;
   auto settings = bmc.settings();
   settings["session_timeout"] = "1";
@@ -103,14 +102,14 @@ TEST(IpmiFailure, OfASessionThatTheBmcForgotIsNotSeen) {
   EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
 }
 
-TEST(IpmiFailure, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
+TEST(IpmiFailureTest, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
   bmc.hook("set", "kill -STOP $SIMULATOR");
-  IpmiFixture::takeLog();
+  takeLog();
 
   EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
-  EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 6000, "the outcome is unknown"));
+  EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 6000, "the outcome is unknown"));
   bmc.removeHook("set");
   bmc.resume();
 
@@ -120,7 +119,7 @@ TEST(IpmiFailure, OfABmcThatStallsInMidChangeLeavesTheOutcomeOpenAndNoLockBehind
   EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
 }
 
-TEST(IpmiFailure, OfABmcThatDiesInMidChangeLeavesTheOutcomeOpen) {
+TEST(IpmiFailureTest, OfABmcThatDiesInMidChangeLeavesTheOutcomeOpen) {
   SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
   bmc.hook("set", "kill -KILL $SIMULATOR");
@@ -134,7 +133,7 @@ TEST(IpmiFailure, OfABmcThatDiesInMidChangeLeavesTheOutcomeOpen) {
   EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
 }
 
-TEST(IpmiFailure, OfTheNetworkInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
+TEST(IpmiFailureTest, OfTheNetworkInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings(wire.port()))));
@@ -150,7 +149,7 @@ TEST(IpmiFailure, OfTheNetworkInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
   EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
 }
 
-TEST(IpmiFailure, OfTheNetworkForAMomentEndsInAConfirmedChange) {
+TEST(IpmiFailureTest, OfTheNetworkForAMomentEndsInAConfirmedChange) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   auto settings = bmc.settings(wire.port());
@@ -183,9 +182,9 @@ struct Refusal {
   const char* message;
 };
 
-class IpmiSessionRefused : public testing::TestWithParam<Refusal> {};
+class IpmiSessionRefusedTest : public testing::TestWithParam<Refusal> {};
 
-TEST_P(IpmiSessionRefused, TellsWhatToDo) {
+TEST_P(IpmiSessionRefusedTest, TellsWhatToDo) {
   const SimulatedBmc bmc;
   auto settings = impatient(bmc.settings());
   settings[GetParam().key] = GetParam().value;
@@ -198,29 +197,29 @@ TEST_P(IpmiSessionRefused, TellsWhatToDo) {
   EXPECT_NO_THROW(right.read());
 }
 
-INSTANTIATE_TEST_SUITE_P(Reasons, IpmiSessionRefused,
+INSTANTIATE_TEST_SUITE_P(Reasons, IpmiSessionRefusedTest,
                          testing::Values(Refusal{"CipherSuite", "cipher_suite", "17", "try cipher_suite = 3"},
                                          Refusal{"User", "user", "nobody", "the user 'nobody'"},
                                          Refusal{"Host", "host", "no-such-host.invalid", "host"},
                                          Refusal{"Port", "port", "9", "no answer; check host and port"}),
                          [](const auto& refusal) { return refusal.param.name; });
 
-TEST(IpmiSessionRefused, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrected) {
+TEST(IpmiSessionRefusedTest, ForAWrongPasswordNamesItsFileAndSucceedsOnceItIsCorrected) {
   const SimulatedBmc bmc;
-  const Testing::TemporaryDirectory directory;
+  const TemporaryDirectory directory;
   const std::string file = directory / "password";
-  IpmiFixture::writePrivateFile(file, "wrong\n");
+  writePrivateFile(file, "wrong\n");
   auto settings = bmc.settings();
   settings["password_file"] = file;
   IpmiBackEnd backEnd(parseSettings(settings));
   EXPECT_THAT([&] { backEnd.read(); }, refusal("refused the password in " + file));
 
-  IpmiFixture::writePrivateFile(file, "test\n");
+  writePrivateFile(file, "test\n");
 
   EXPECT_NO_THROW(backEnd.read());
 }
 
-TEST(IpmiSessionRefused, InBandWhereThereIsNoDriverNamesTheModules) {
+TEST(IpmiSessionRefusedTest, InBandWhereThereIsNoDriverNamesTheModules) {
   IpmiBackEnd backEnd(parseSettings({{"device", "/dev/no-such-ipmi"}, {"cache", "0"}}));
 
   EXPECT_THAT([&] { backEnd.read(); },

@@ -2,17 +2,15 @@
 // that reads, and each keeps its own look at the BMC.
 #include <gmock/gmock.h>
 
-#include "tests/agent/backends/ipmi/Process.h"
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/agent/backends/ipmi/UdpRelay.h"
+#include "tests/support/agent/SimulatedBmc.h"
+#include "tests/support/agent/UdpRelay.h"
+#include "tests/support/system/Process.h"
 
 namespace {
 
-using IpmiFixture::Process;
-using IpmiFixture::SimulatedBmc;
-using IpmiFixture::UdpRelay;
+using namespace Testing;
 
-class IpmiProcesses : public testing::Test {
+class IpmiProcessesTest : public testing::Test {
  protected:
   // The command of a process with the agent in it, which reaches the BMC through that port and keeps a look at it for
   // as long as it may.
@@ -23,7 +21,7 @@ class IpmiProcesses : public testing::Test {
     for (const auto& [key, value] : settings) {
       text += key + " = " + value + '\n';
     }
-    Testing::writeFile(directory / ini, text);
+    writeFile(directory / ini, text);
     return {"env", "QV_AGENT_INI=" + (directory / ini), AGENT_CLIENT};
   }
 
@@ -32,14 +30,14 @@ class IpmiProcesses : public testing::Test {
     return process.readLine();
   }
 
-  const Testing::TemporaryDirectory directory;
+  const TemporaryDirectory directory;
   const SimulatedBmc bmc;
   UdpRelay wire{bmc.port()};
   Process reader{agentBehind(wire.port(), "reader.ini")};
   Process writer{agentBehind(bmc.port(), "writer.ini")};
 };
 
-TEST_F(IpmiProcesses, SeeEachOthersChangesWithTheNextRead) {
+TEST_F(IpmiProcessesTest, SeeEachOthersChangesWithTheNextRead) {
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
   EXPECT_EQ(wire.requests(), 12u);
 
@@ -52,7 +50,7 @@ TEST_F(IpmiProcesses, SeeEachOthersChangesWithTheNextRead) {
   EXPECT_EQ(ask(writer, "read"), "lan1 192.0.2.78/255.255.255.0");
 }
 
-TEST_F(IpmiProcesses, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
+TEST_F(IpmiProcessesTest, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
   EXPECT_EQ(ask(writer, "read"), ask(reader, "read"));
 
   wire.reset();
@@ -63,7 +61,7 @@ TEST_F(IpmiProcesses, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
   EXPECT_EQ(wire.requests(), 0u);
 }
 
-TEST_F(IpmiProcesses, SeeAChangeWhoseProcessEndedAtOnceAfterIt) {
+TEST_F(IpmiProcessesTest, SeeAChangeWhoseProcessEndedAtOnceAfterIt) {
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
   {
     Process passing(agentBehind(bmc.port(), "passing.ini"));

@@ -2,17 +2,17 @@
 #include <gmock/gmock.h>
 
 #include "agent/backends/ipmi/IpmiBackEnd.h"
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/agent/SimulatedBmc.h"
 
 namespace {
 
-using IpmiFixture::SimulatedBmc;
+using namespace Testing;
 using QV::AddressOrigin;
 using QV::Ipmi::IpmiBackEnd;
 using QV::Ipmi::parseSettings;
 
-TEST(IpmiRead, ShowsWhatTheBmcHas) {
+TEST(IpmiReadTest, ShowsWhatTheBmcHas) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
 
@@ -31,7 +31,7 @@ TEST(IpmiRead, ShowsWhatTheBmcHas) {
   EXPECT_TRUE(processor.dnsServers.empty());
 }
 
-TEST(IpmiRead, ShowsNoAddressWhereItIsZero) {
+TEST(IpmiReadTest, ShowsNoAddressWhereItIsZero) {
   const SimulatedBmc bmc(SimulatedBmc::Personality::AppliesAtOnce);
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
 
@@ -42,7 +42,7 @@ TEST(IpmiRead, ShowsNoAddressWhereItIsZero) {
   EXPECT_EQ(interface.ipv4Gateway, std::nullopt);
 }
 
-TEST(IpmiRead, ShowsWhatAnotherClientChanged) {
+TEST(IpmiReadTest, ShowsWhatAnotherClientChanged) {
   const SimulatedBmc bmc;
   IpmiBackEnd backEnd(parseSettings(bmc.settings()));
   ASSERT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
@@ -55,7 +55,7 @@ TEST(IpmiRead, ShowsWhatAnotherClientChanged) {
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Static);
 }
 
-TEST(IpmiRead, KeepsASnapshotForTheCacheTime) {
+TEST(IpmiReadTest, KeepsASnapshotForTheCacheTime) {
   const SimulatedBmc bmc;
   auto settings = parseSettings(bmc.settings());
   settings.cache = std::chrono::minutes(1);
@@ -67,7 +67,7 @@ TEST(IpmiRead, KeepsASnapshotForTheCacheTime) {
   EXPECT_EQ(backEnd.read().interfaces.at(0).ipv4Address, QV::ipv4("192.0.2.10"));
 }
 
-TEST(IpmiRead, FindsTheSameChannelHoweverItLooks) {
+TEST(IpmiReadTest, FindsTheSameChannelHoweverItLooks) {
   const SimulatedBmc bmc;
   for (const char* channels : {"auto", "all", "1"}) {
     auto settings = bmc.settings();
@@ -81,7 +81,7 @@ TEST(IpmiRead, FindsTheSameChannelHoweverItLooks) {
   }
 }
 
-TEST(IpmiRead, SaysThatAListedChannelIsNoLanChannel) {
+TEST(IpmiReadTest, SaysThatAListedChannelIsNoLanChannel) {
   const SimulatedBmc bmc;
   auto settings = bmc.settings();
   settings["channels"] = "1, 7";

@@ -7,28 +7,28 @@
 #include <thread>
 
 #include "agent/backends/ipmi/IpmiBackEnd.h"
-#include "tests/agent/backends/ipmi/RecordedLog.h"
-#include "tests/agent/backends/ipmi/SimulatedBmc.h"
-#include "tests/agent/backends/ipmi/UdpRelay.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/agent/RecordingLog.h"
+#include "tests/support/agent/SimulatedBmc.h"
+#include "tests/support/agent/UdpRelay.h"
 
 namespace {
 
-using IpmiFixture::SimulatedBmc;
-using IpmiFixture::UdpRelay;
+using namespace Testing;
 using QV::Ipmi::IpmiBackEnd;
 using QV::Ipmi::parseSettings;
 
 bool traced(const std::string& text) {
-  const auto log = IpmiFixture::takeLog();
-  return std::any_of(log.begin(), log.end(), [&](const auto& line) { return line.trace && line.text == text; });
+  const auto log = takeLog();
+  return std::any_of(log.begin(), log.end(),
+                     [&](const auto& line) { return line.channel == Channel::Trace && line.message == text; });
 }
 
-TEST(IpmiRoundTrips, OfAReadAreTwelveFromColdAndSixInAHeldSession) {
+TEST(IpmiRoundTripsTest, OfAReadAreTwelveFromColdAndSixInAHeldSession) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
-  IpmiFixture::takeLog();
+  takeLog();
 
   backEnd.read();
   EXPECT_EQ(wire.requests(), 12u);
@@ -40,7 +40,7 @@ TEST(IpmiRoundTrips, OfAReadAreTwelveFromColdAndSixInAHeldSession) {
   EXPECT_TRUE(traced("read 1 interfaces in 6 round trips"));
 }
 
-TEST(IpmiRoundTrips, AreNoneWithinTheCacheTime) {
+TEST(IpmiRoundTripsTest, AreNoneWithinTheCacheTime) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   auto settings = parseSettings(bmc.settings(wire.port()));
@@ -55,7 +55,7 @@ TEST(IpmiRoundTrips, AreNoneWithinTheCacheTime) {
 }
 
 // Two back ends are what two processes have: each its own look, and the file in common.
-class IpmiRoundTripsWithAnother : public testing::Test {
+class IpmiRoundTripsWithAnotherTest : public testing::Test {
  protected:
   QV::Ipmi::IpmiSettings cached(std::uint16_t port) const {
     auto settings = parseSettings(bmc.settings(port));
@@ -76,7 +76,7 @@ class IpmiRoundTripsWithAnother : public testing::Test {
   IpmiBackEnd writer{cached(bmc.port())};
 };
 
-TEST_F(IpmiRoundTripsWithAnother, AreSixAfterItsChangeAndThenNone) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreSixAfterItsChangeAndThenNone) {
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
 
@@ -86,7 +86,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixAfterItsChangeAndThenNone) {
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
 }
 
-TEST_F(IpmiRoundTripsWithAnother, AreNoneWhereItHadNothingToWrite) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreNoneWhereItHadNothingToWrite) {
   writer.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 12u);
 
@@ -96,7 +96,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreNoneWhereItHadNothingToWrite) {
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 0u);
 }
 
-TEST_F(IpmiRoundTripsWithAnother, AreSixAfterAChangeThatTheBmcRefused) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreSixAfterAChangeThatTheBmcRefused) {
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
 
   bmc.hook("check", "exit 1");
@@ -105,7 +105,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixAfterAChangeThatTheBmcRefused) {
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
 }
 
-TEST_F(IpmiRoundTripsWithAnother, AreSixOnceWhileItsChangeIsUnderWayAndOnceWhenItIsOver) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreSixOnceWhileItsChangeIsUnderWayAndOnceWhenItIsOver) {
   // Given a change that waits for the answer to its first write: three requests to look, one for the lock's state, one
   // for the lock
   constexpr unsigned firstWrite = 6;
@@ -135,7 +135,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixOnceWhileItsChangeIsUnderWayAndOnceWhenI
   EXPECT_EQ(wire.requests(), 6u);
 }
 
-// The text of what the operation throws; empty where it succeeds.
+// The text of what the operation throws; empty if it succeeds.
 template <typename Operation>
 std::string failureOf(const Operation& operation) {
   try {
@@ -148,7 +148,7 @@ std::string failureOf(const Operation& operation) {
 
 // What was written under a lock may be applied or dropped when the lock is given back, whenever that is. The simulator
 // shows it until then, and drops it.
-TEST_F(IpmiRoundTripsWithAnother, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
   // Given a change that is over and left its lock behind, and a look that was begun since
   UdpRelay brokenWire(bmc.port());
   auto settings = bmc.settings(brokenWire.port());
@@ -178,20 +178,21 @@ TEST_F(IpmiRoundTripsWithAnother, AreNotNoneOnceItHasGivenBackALockThatItLeft) {
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
 }
 
-TEST_F(IpmiRoundTripsWithAnother, AreSixEachTimeWhereChangesCannotBeLearnedOfAndTheLogSaysSoOnce) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreSixEachTimeWhereChangesCannotBeLearnedOfAndTheLogSaysSoOnce) {
   std::filesystem::create_symlink("/dev/null", bmc.generationFile());
-  IpmiFixture::takeLog();
+  takeLog();
 
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 6u);
 
-  const auto log = IpmiFixture::takeLog();
+  const auto log = takeLog();
   const auto tells = [&](const auto& line) {
-    return !line.trace && line.level == 6000 && line.text.starts_with(bmc.generationFile() + ": is a symbolic link");
+    return line.channel == Channel::Log && line.level == 6000 &&
+           line.message.starts_with(bmc.generationFile() + ": is a symbolic link");
   };
   EXPECT_EQ(std::count_if(log.begin(), log.end(), tells), 1);
-  EXPECT_TRUE(IpmiFixture::contains(log, 6000, "generation_file"));
+  EXPECT_TRUE(contains(log, "Tarnwick.Ipmi", 6000, "generation_file"));
 
   // And once the file can be used, looks are kept again
   std::filesystem::remove(bmc.generationFile());
@@ -199,7 +200,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixEachTimeWhereChangesCannotBeLearnedOfAnd
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 0u);
 }
 
-TEST_F(IpmiRoundTripsWithAnother, AreSixAfterTheChangeOfOneThatCachesNothingItself) {
+TEST_F(IpmiRoundTripsWithAnotherTest, AreSixAfterTheChangeOfOneThatCachesNothingItself) {
   IpmiBackEnd uncached(parseSettings(bmc.settings()));
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 12u);
 
@@ -208,7 +209,7 @@ TEST_F(IpmiRoundTripsWithAnother, AreSixAfterTheChangeOfOneThatCachesNothingItse
   EXPECT_EQ(requestsOfRead("192.0.2.77"), 6u);
 }
 
-TEST(IpmiRoundTrips, OfAChangeInAHeldSessionAreThirteen) {
+TEST(IpmiRoundTripsTest, OfAChangeInAHeldSessionAreThirteen) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
@@ -221,7 +222,7 @@ TEST(IpmiRoundTrips, OfAChangeInAHeldSessionAreThirteen) {
   EXPECT_EQ(wire.requests(), 13u);
 }
 
-TEST(IpmiRoundTrips, OfAChangeToWhatIsSoAlreadyAreThoseOfLooking) {
+TEST(IpmiRoundTripsTest, OfAChangeToWhatIsSoAlreadyAreThoseOfLooking) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
@@ -233,7 +234,7 @@ TEST(IpmiRoundTrips, OfAChangeToWhatIsSoAlreadyAreThoseOfLooking) {
   EXPECT_EQ(wire.requests(), 3u);
 }
 
-TEST(IpmiRoundTrips, IncludeTheOneThatGivesTheSessionBack) {
+TEST(IpmiRoundTripsTest, IncludeTheOneThatGivesTheSessionBack) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   {
@@ -245,7 +246,7 @@ TEST(IpmiRoundTrips, IncludeTheOneThatGivesTheSessionBack) {
 }
 
 // A BMC has few sessions; one that is merely left takes a place of them for a minute.
-TEST(IpmiRoundTrips, IncludeTheOneThatGivesAnIdleSessionBack) {
+TEST(IpmiRoundTripsTest, IncludeTheOneThatGivesAnIdleSessionBack) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   auto settings = bmc.settings(wire.port());

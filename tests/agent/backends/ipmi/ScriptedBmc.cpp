@@ -2,7 +2,7 @@
 
 #include "agent/backends/ipmi/lan/LanParameters.h"
 
-namespace IpmiFixture {
+namespace Testing {
 namespace {
 
 namespace Code = QV::Ipmi::CompletionCode;
@@ -138,4 +138,4 @@ void ScriptedBmc::apply() {
   staged_.clear();
 }
 
-}  // namespace IpmiFixture
+}  // namespace Testing

@@ -10,7 +10,7 @@
 
 #include "agent/backends/ipmi/lan/LanParameters.h"
 
-namespace IpmiFixture {
+namespace Testing {
 
 using QV::Ipmi::IpmiRequest;
 using QV::Ipmi::IpmiResponse;
@@ -63,4 +63,4 @@ class ScriptedBmc : public QV::Ipmi::IpmiTransport {
   std::optional<std::map<LanParameter, ParameterData>> earlier_;
 };
 
-}  // namespace IpmiFixture
+}  // namespace Testing

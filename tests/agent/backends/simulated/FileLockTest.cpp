@@ -5,29 +5,30 @@
 #include <thread>
 
 #include "agent/backends/simulated/FileLock.h"
-#include "tests/agent/support/Throws.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using namespace std::chrono_literals;
 
-TEST(FileLock, isTakenAgainOnceItIsLetGo) {
-  const Testing::TemporaryDirectory directory;
+TEST(FileLockTest, IsTakenAgainOnceItIsLetGo) {
+  const TemporaryDirectory directory;
   { const FileLock lock(directory / "lock", 0ms); }
   EXPECT_NO_THROW(FileLock(directory / "lock", 0ms));
 }
 
-TEST(FileLock, givesUpOnAHolderThatDoesNotLetGo) {
-  const Testing::TemporaryDirectory directory;
+TEST(FileLockTest, GivesUpOnAHolderThatDoesNotLetGo) {
+  const TemporaryDirectory directory;
   const FileLock holder(directory / "lock", 0ms);
   EXPECT_EQ(thrownBy([&] { FileLock(directory / "lock", 20ms); }),
             "the lock " + (directory / "lock") + " is still held by another process after 20 ms");
 }
 
-TEST(FileLock, waitsForAHolderThatLetsGo) {
-  const Testing::TemporaryDirectory directory;
+TEST(FileLockTest, WaitsForAHolderThatLetsGo) {
+  const TemporaryDirectory directory;
   auto holder = std::make_unique<FileLock>(directory / "lock", 0ms);
   bool waited = false;
   std::thread waiter([&] {
@@ -39,18 +40,17 @@ TEST(FileLock, waitsForAHolderThatLetsGo) {
   EXPECT_TRUE(waited);
 }
 
-TEST(FileLock, tellsWhyItCannotBeOpened) {
-  const Testing::TemporaryDirectory directory;
+TEST(FileLockTest, TellsWhyItCannotBeOpened) {
+  const TemporaryDirectory directory;
   EXPECT_EQ(thrownBy([&] { FileLock(directory / "none/lock", 0ms); }),
             "the lock " + (directory / "none/lock") + " cannot be opened: No such file or directory");
 }
 
-TEST(FileLock, followsNoSymbolicLink) {
-  const Testing::TemporaryDirectory directory;
+TEST(FileLockTest, FollowsNoSymbolicLink) {
+  const TemporaryDirectory directory;
   std::filesystem::create_symlink(directory / "victim", directory / "lock");
   EXPECT_THAT(thrownBy([&] { FileLock(directory / "lock", 0ms); }), testing::HasSubstr("symbolic links"));
   EXPECT_FALSE(std::filesystem::exists(directory / "victim"));
 }
 
 }  // namespace
-}  // namespace QV

@@ -9,34 +9,36 @@
 
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/backends/simulated/StateText.h"
-#include "tests/agent/support/Addresses.h"
-#include "tests/agent/support/Throws.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/system/TemporaryDirectory.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
-class ASimulatedProcessor : public testing::Test {
+using namespace QV;
+using namespace Testing;
+
+class SimulatedBackEndTest : public testing::Test {
  protected:
-  const Testing::TemporaryDirectory directory_;
+  const TemporaryDirectory directory_;
   const std::string state_ = directory_ / "processor/state.json";
   SimulatedBackEnd processor_{state_};
 };
 
-TEST_F(ASimulatedProcessor, MakesNothingButItsDirectoryBeforeItIsUsed) {
+TEST_F(SimulatedBackEndTest, MakesNothingButItsDirectoryBeforeItIsUsed) {
   EXPECT_TRUE(std::filesystem::is_empty(std::filesystem::path(state_).parent_path()));
 }
 
-TEST_F(ASimulatedProcessor, IsDescribedAsSimulatedWhateverItsStateSays) {
+TEST_F(SimulatedBackEndTest, IsDescribedAsSimulatedWhateverItsStateSays) {
   ManagementProcessor renamed = factoryConfiguration();
   renamed.description = "The BMC of rack 7";
-  Testing::writeFile(state_, writeState(renamed));
+  writeFile(state_, writeState(renamed));
   EXPECT_EQ(processor_.read().description, "The BMC of rack 7 (simulated)");
   processor_.change("eth0", {ipv4("192.0.2.77"), {}});
-  EXPECT_THAT(Testing::readFile(state_), testing::HasSubstr("\"The BMC of rack 7\""));
+  EXPECT_THAT(readFile(state_), testing::HasSubstr("\"The BMC of rack 7\""));
 }
 
-TEST_F(ASimulatedProcessor, IsRefusedWhereItsStateCouldNotBeChanged) {
+TEST_F(SimulatedBackEndTest, IsRefusedWhereItsStateCouldNotBeChanged) {
   const std::filesystem::path directory = std::filesystem::path(state_).parent_path();
   std::filesystem::permissions(directory_.path(), std::filesystem::perms::all);
   constexpr auto entered =
@@ -56,12 +58,12 @@ TEST_F(ASimulatedProcessor, IsRefusedWhereItsStateCouldNotBeChanged) {
   std::filesystem::permissions(directory, std::filesystem::perms::owner_all);
 }
 
-TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationOnTheFirstRead) {
+TEST_F(SimulatedBackEndTest, WritesItsFactoryConfigurationOnTheFirstRead) {
   EXPECT_EQ(processor_.read(), factoryConfiguration());
-  EXPECT_EQ(Testing::readFile(state_), writeState(factoryConfiguration()));
+  EXPECT_EQ(readFile(state_), writeState(factoryConfiguration()));
 }
 
-TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationWithTheFirstChange) {
+TEST_F(SimulatedBackEndTest, WritesItsFactoryConfigurationWithTheFirstChange) {
   processor_.change("eth1", {ipv4("198.51.100.99"), mask("255.255.0.0")});
   ManagementProcessor expected = factoryConfiguration();
   expected.interfaces[1].ipv4Address = ipv4("198.51.100.99");
@@ -70,40 +72,40 @@ TEST_F(ASimulatedProcessor, writesItsFactoryConfigurationWithTheFirstChange) {
   EXPECT_EQ(processor_.read(), expected);
 }
 
-TEST_F(ASimulatedProcessor, changesNoMoreThanItIsTold) {
+TEST_F(SimulatedBackEndTest, ChangesNoMoreThanItIsTold) {
   processor_.change("eth0", {{}, mask("255.255.0.0")});
   ManagementProcessor expected = factoryConfiguration();
   expected.interfaces[0].ipv4SubnetMask = mask("255.255.0.0");
   EXPECT_EQ(processor_.read(), expected);
 }
 
-TEST_F(ASimulatedProcessor, showsWhatAnotherProcessWrote) {
+TEST_F(SimulatedBackEndTest, ShowsWhatAnotherProcessWrote) {
   processor_.read();
   SimulatedBackEnd(state_).change("eth0", {ipv4("192.0.2.77"), {}});
   EXPECT_EQ(processor_.read().interfaces[0].ipv4Address, ipv4("192.0.2.77"));
 }
 
-TEST_F(ASimulatedProcessor, refusesToChangeAnInterfaceThatItDoesNotHave) {
+TEST_F(SimulatedBackEndTest, RefusesToChangeAnInterfaceThatItDoesNotHave) {
   EXPECT_EQ(thrownBy([&] {
               processor_.change("eth9", {ipv4("192.0.2.77"), {}});
             }),
             state_ + ": there is no interface 'eth9'");
 }
 
-TEST_F(ASimulatedProcessor, withADamagedStateTellsTheFileAndTheFieldAndLeavesTheFile) {
+TEST_F(SimulatedBackEndTest, WithADamagedStateTellsTheFileAndTheFieldAndLeavesTheFile) {
   processor_.read();
   for (const std::string damage : {"", "{", "{\"name\": 7}", "\0\0"}) {
-    Testing::writeFile(state_, damage);
+    writeFile(state_, damage);
     EXPECT_THAT(thrownBy([&] { processor_.read(); }), testing::StartsWith(state_ + ": "));
     EXPECT_THAT(thrownBy([&] {
                   processor_.change("eth0", {ipv4("192.0.2.77"), {}});
                 }),
                 testing::StartsWith(state_ + ": "));
-    EXPECT_EQ(Testing::readFile(state_), damage);
+    EXPECT_EQ(readFile(state_), damage);
   }
 }
 
-TEST_F(ASimulatedProcessor, losesNoChangeOfSeveralThreads) {
+TEST_F(SimulatedBackEndTest, LosesNoChangeOfSeveralThreads) {
   // When two threads change an interface each, over and over
   constexpr int changes = 50;
   const auto change = [&](const std::string& interface, const std::string& network) {
@@ -121,7 +123,7 @@ TEST_F(ASimulatedProcessor, losesNoChangeOfSeveralThreads) {
   EXPECT_EQ(processor_.read().interfaces[1].ipv4Address, ipv4("198.51.100.50"));
 }
 
-TEST_F(ASimulatedProcessor, ofAFreshMachineIsTheSameForAllThatAskAtOnce) {
+TEST_F(SimulatedBackEndTest, OfAFreshMachineIsTheSameForAllThatAskAtOnce) {
   std::vector<ManagementProcessor> seen(4);
   {
     std::vector<std::jthread> threads;
@@ -133,4 +135,3 @@ TEST_F(ASimulatedProcessor, ofAFreshMachineIsTheSameForAllThatAskAtOnce) {
 }
 
 }  // namespace
-}  // namespace QV

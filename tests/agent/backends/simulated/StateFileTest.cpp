@@ -9,12 +9,13 @@
 #include <set>
 
 #include "agent/backends/simulated/StateFile.h"
-#include "tests/agent/support/Throws.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/support/system/TemporaryDirectory.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using testing::HasSubstr;
 
 void replace(const std::string& path, const std::string& text) {
@@ -27,7 +28,7 @@ mode_t modeOf(const std::string& path) {
   return status.st_mode & 07777;
 }
 
-std::set<std::string> namesIn(const Testing::TemporaryDirectory& directory) {
+std::set<std::string> namesIn(const TemporaryDirectory& directory) {
   std::set<std::string> names;
   for (const auto& entry : std::filesystem::directory_iterator(directory.path())) {
     names.insert(entry.path().filename());
@@ -35,80 +36,80 @@ std::set<std::string> namesIn(const Testing::TemporaryDirectory& directory) {
   return names;
 }
 
-TEST(StateFile, hasNoTextBeforeItIsWritten) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, HasNoTextBeforeItIsWritten) {
+  const TemporaryDirectory directory;
   EXPECT_EQ(StateFile(directory / "state").read(), std::nullopt);
 }
 
-TEST(StateFile, isReplacedByWhatTheEditMakesOfIt) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, IsReplacedByWhatTheEditMakesOfIt) {
+  const TemporaryDirectory directory;
   const StateFile file(directory / "state");
   file.update([](const auto& current) { return current ? "no" : "one"; });
   file.update([](const auto& current) { return *current + " two"; });
   EXPECT_EQ(file.read(), "one two");
 }
 
-TEST(StateFile, leavesNothingBehindButItsLock) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, LeavesNothingBehindButItsLock) {
+  const TemporaryDirectory directory;
   replace(directory / "state", "x");
   EXPECT_EQ(namesIn(directory), (std::set<std::string>{"state", "state.lock"}));
 }
 
-TEST(StateFile, makesItsDirectory) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, MakesItsDirectory) {
+  const TemporaryDirectory directory;
   replace(directory / "a/b/state", "x");
-  EXPECT_EQ(Testing::readFile(directory / "a/b/state"), "x");
+  EXPECT_EQ(readFile(directory / "a/b/state"), "x");
 }
 
-TEST(StateFile, staysAsItIsWhereTheEditThrows) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, StaysAsItIsWhereTheEditThrows) {
+  const TemporaryDirectory directory;
   replace(directory / "state", "old");
   EXPECT_EQ(thrownBy([&] {
               StateFile(directory / "state").update([](const auto&) -> std::string { throw std::runtime_error("no"); });
             }),
             "no");
-  EXPECT_EQ(Testing::readFile(directory / "state"), "old");
+  EXPECT_EQ(readFile(directory / "state"), "old");
 }
 
-TEST(StateFile, sweepsAwayWhatAKilledWriterLeft) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "state", "old");
-  Testing::writeFile(directory / "state.new", "ha");
+TEST(StateFileTest, SweepsAwayWhatAKilledWriterLeft) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "state", "old");
+  writeFile(directory / "state.new", "ha");
   EXPECT_EQ(StateFile(directory / "state").read(), "old");
   replace(directory / "state", "new");
-  EXPECT_EQ(Testing::readFile(directory / "state"), "new");
+  EXPECT_EQ(readFile(directory / "state"), "new");
   EXPECT_EQ(namesIn(directory), (std::set<std::string>{"state", "state.lock"}));
 }
 
-TEST(StateFile, doesNotWriteThroughALinkPlantedUnderItsTemporaryName) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "victim", "mine");
+TEST(StateFileTest, DoesNotWriteThroughALinkPlantedUnderItsTemporaryName) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "victim", "mine");
   std::filesystem::create_symlink(directory / "victim", directory / "state.new");
   replace(directory / "state", "new");
-  EXPECT_EQ(Testing::readFile(directory / "victim"), "mine");
-  EXPECT_EQ(Testing::readFile(directory / "state"), "new");
+  EXPECT_EQ(readFile(directory / "victim"), "mine");
+  EXPECT_EQ(readFile(directory / "state"), "new");
 }
 
-TEST(StateFile, isMadeForItsOwnerAndGroup) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, IsMadeForItsOwnerAndGroup) {
+  const TemporaryDirectory directory;
   replace(directory / "state", "x");
   EXPECT_EQ(modeOf(directory / "state") & 0137, 0U);
 }
 
-TEST(StateFile, keepsItsMode) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "state", "old");
+TEST(StateFileTest, KeepsItsMode) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "state", "old");
   ASSERT_EQ(::chmod((directory / "state").c_str(), 0604), 0);
   replace(directory / "state", "new");
   EXPECT_EQ(modeOf(directory / "state"), 0604U);
 }
 
-TEST(StateFile, keepsItsOwner) {
+TEST(StateFileTest, KeepsItsOwner) {
   if (::geteuid() != 0) {
     GTEST_SKIP() << "only root can give files away";
   }
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "state", "old");
+  const TemporaryDirectory directory;
+  writeFile(directory / "state", "old");
   ASSERT_EQ(::chown((directory / "state").c_str(), 1234, 4321), 0);
   replace(directory / "state", "new");
   struct stat status {};
@@ -117,13 +118,13 @@ TEST(StateFile, keepsItsOwner) {
   EXPECT_EQ(status.st_gid, 4321U);
 }
 
-TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
+TEST(StateFileTest, IsReplacedByAWriterWhoCannotGiveFilesAway) {
   if (::geteuid() != 0) {
     GTEST_SKIP() << "only root can become another user";
   }
   // Given a file of one user, in a directory in which another may write
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "state", "old");
+  const TemporaryDirectory directory;
+  writeFile(directory / "state", "old");
   ASSERT_EQ(::chmod((directory / "state").c_str(), 0664), 0);
   ASSERT_EQ(::chmod(directory.path().c_str(), 0777), 0);
 
@@ -143,49 +144,48 @@ TEST(StateFile, isReplacedByAWriterWhoCannotGiveFilesAway) {
   EXPECT_EXIT(change(), testing::ExitedWithCode(0), "");
 
   // Then the new text counts more than the old owner
-  EXPECT_EQ(Testing::readFile(directory / "state"), "new");
+  EXPECT_EQ(readFile(directory / "state"), "new");
   EXPECT_EQ(modeOf(directory / "state"), 0664U);
 }
 
-TEST(StateFile, behindALinkIsReplacedAndTheLinkStays) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, BehindALinkIsReplacedAndTheLinkStays) {
+  const TemporaryDirectory directory;
   std::filesystem::create_directory(directory / "real");
-  Testing::writeFile(directory / "real/state", "old");
+  writeFile(directory / "real/state", "old");
   std::filesystem::create_symlink("real/state", directory / "hop");
   std::filesystem::create_symlink(directory / "hop", directory / "link");
   replace(directory / "link", "new");
   EXPECT_TRUE(std::filesystem::is_symlink(directory / "link"));
   EXPECT_TRUE(std::filesystem::is_symlink(directory / "hop"));
-  EXPECT_EQ(Testing::readFile(directory / "real/state"), "new");
+  EXPECT_EQ(readFile(directory / "real/state"), "new");
   EXPECT_EQ(StateFile(directory / "link").read(), "new");
 }
 
-TEST(StateFile, behindALinkToNothingIsMadeThere) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, BehindALinkToNothingIsMadeThere) {
+  const TemporaryDirectory directory;
   std::filesystem::create_symlink("later/state", directory / "link");
   EXPECT_EQ(StateFile(directory / "link").read(), std::nullopt);
   replace(directory / "link", "new");
-  EXPECT_EQ(Testing::readFile(directory / "later/state"), "new");
+  EXPECT_EQ(readFile(directory / "later/state"), "new");
 }
 
-TEST(StateFile, behindACircleOfLinksIsAnError) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, BehindACircleOfLinksIsAnError) {
+  const TemporaryDirectory directory;
   std::filesystem::create_symlink("b", directory / "a");
   std::filesystem::create_symlink("a", directory / "b");
   EXPECT_THAT(thrownBy([&] { StateFile(directory / "a").read(); }), HasSubstr("symbolic links"));
 }
 
-TEST(StateFile, thatIsADirectoryIsAnError) {
-  const Testing::TemporaryDirectory directory;
+TEST(StateFileTest, ThatIsADirectoryIsAnError) {
+  const TemporaryDirectory directory;
   std::filesystem::create_directory(directory / "state");
   EXPECT_THAT(thrownBy([&] { StateFile(directory / "state").read(); }), HasSubstr("state: cannot be read"));
 }
 
-TEST(StateFile, whoseDirectoryCannotBeMadeIsAnError) {
-  const Testing::TemporaryDirectory directory;
-  Testing::writeFile(directory / "file", "x");
+TEST(StateFileTest, WhoseDirectoryCannotBeMadeIsAnError) {
+  const TemporaryDirectory directory;
+  writeFile(directory / "file", "x");
   EXPECT_THAT(thrownBy([&] { replace(directory / "file/state", "x"); }), HasSubstr("file: cannot be created"));
 }
 
 }  // namespace
-}  // namespace QV

@@ -5,11 +5,12 @@
 
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/backends/simulated/StateText.h"
-#include "tests/agent/support/Throws.h"
+#include "tests/support/system/Throws.h"
 
-namespace QV {
 namespace {
 
+using namespace QV;
+using namespace Testing;
 using nlohmann::json;
 using Pointer = json::json_pointer;
 
@@ -32,35 +33,35 @@ std::string complaintWithout(const std::string& parent, const std::string& field
   return complaintAbout(state);
 }
 
-TEST(StateText, readsAsItWasWritten) {
+TEST(StateTextTest, ReadsAsItWasWritten) {
   EXPECT_EQ(parseState(writeState(factoryConfiguration())), factoryConfiguration());
 }
 
-TEST(StateText, readsAsItWasWrittenWhereValuesAreAbsent) {
+TEST(StateTextTest, ReadsAsItWasWrittenWhereValuesAreAbsent) {
   const ManagementProcessor bare{"", "", {}, {NetworkInterface{}}};
   EXPECT_EQ(parseState(writeState(bare)), bare);
   const ManagementProcessor none{"n", "d", {}, {}};
   EXPECT_EQ(parseState(writeState(none)), none);
 }
 
-TEST(StateText, isIndentedForItsReader) {
+TEST(StateTextTest, IsIndentedForItsReader) {
   EXPECT_THAT(writeState(factoryConfiguration()),
               testing::StartsWith("{\n  \"name\": \"BMC\",\n  \"description\": \"Simulated management processor\",\n"));
   EXPECT_THAT(writeState(factoryConfiguration()), testing::EndsWith("}\n"));
 }
 
-TEST(StateText, thatIsNoJsonIsRefused) {
+TEST(StateTextTest, ThatIsNoJsonIsRefused) {
   for (const char* text : {"", "{", "hello", "{\"name\": \"BMC\"", "{} {}", "\xff"}) {
     EXPECT_THAT(thrownBy([&] { parseState(text); }), testing::HasSubstr("parse error")) << text;
   }
 }
 
-TEST(StateText, thatIsNoObjectIsRefused) {
+TEST(StateTextTest, ThatIsNoObjectIsRefused) {
   EXPECT_EQ(complaintAbout(json::array()), "the state is not an object");
   EXPECT_EQ(complaintAbout(nullptr), "the state is not an object");
 }
 
-TEST(StateText, withoutARequiredFieldIsRefused) {
+TEST(StateTextTest, WithoutARequiredFieldIsRefused) {
   EXPECT_EQ(complaintWithout("", "name"), "the field name is missing");
   EXPECT_EQ(complaintWithout("", "description"), "the field description is missing");
   EXPECT_EQ(complaintWithout("", "dnsServers"), "the field dnsServers is missing");
@@ -72,7 +73,7 @@ TEST(StateText, withoutARequiredFieldIsRefused) {
   EXPECT_EQ(complaintWithout("/interfaces/0/ipv6", "origin"), "the field interfaces[0].ipv6.origin is missing");
 }
 
-TEST(StateText, withAFieldOfTheWrongTypeIsRefused) {
+TEST(StateTextTest, WithAFieldOfTheWrongTypeIsRefused) {
   EXPECT_EQ(complaintWith("/name", 1), "the field name is not a text");
   EXPECT_EQ(complaintWith("/description", nullptr), "the field description is not a text");
   EXPECT_EQ(complaintWith("/dnsServers", "192.0.2.53"), "the field dnsServers is not an array");
@@ -85,7 +86,7 @@ TEST(StateText, withAFieldOfTheWrongTypeIsRefused) {
   EXPECT_EQ(complaintWith("/interfaces/0/ipv4/address", 7), "the field interfaces[0].ipv4.address is not a text");
 }
 
-TEST(StateText, withAValueThatMeansNothingIsRefused) {
+TEST(StateTextTest, WithAValueThatMeansNothingIsRefused) {
   EXPECT_EQ(complaintWith("/dnsServers/0", "dns.example"), "the field dnsServers[0] is not an IP address");
   EXPECT_EQ(complaintWith("/interfaces/0/name", ""), "the field interfaces[0].name is empty or holds a colon: ''");
   EXPECT_EQ(complaintWith("/interfaces/0/name", "a:b"),
@@ -104,11 +105,10 @@ TEST(StateText, withAValueThatMeansNothingIsRefused) {
   }
 }
 
-TEST(StateText, withAFieldThatAChangeWouldLoseIsRefused) {
+TEST(StateTextTest, WithAFieldThatAChangeWouldLoseIsRefused) {
   EXPECT_EQ(complaintWith("/note", "mine"), "the field note is not known");
   EXPECT_EQ(complaintWith("/interfaces/1/vlan", 7), "the field interfaces[1].vlan is not known");
   EXPECT_EQ(complaintWith("/interfaces/1/ipv4/ttl", 7), "the field interfaces[1].ipv4.ttl is not known");
 }
 
 }  // namespace
-}  // namespace QV

@@ -1,8 +1,6 @@
 // state_writer STATE INTERFACE NETWORK CHANGES: changes the interface's address and mask that many times, 0 for ever,
-// between NETWORK.1 with 255.255.255.0 and NETWORK.2 with 255.255.0.0 and so on. A dot goes to standard output before
-// the first change. Fails where a change that was confirmed is not there when it is read back.
-#include <unistd.h>
-
+// between NETWORK.1 with 255.255.255.0 and NETWORK.2 with 255.255.0.0 and so on. A line goes to standard output before
+// the first change. Fails if a change that was confirmed is not there when it is read back.
 #include <algorithm>
 #include <exception>
 #include <iostream>
@@ -16,9 +14,7 @@ int main(int, char** arguments) {
   const int changes = std::stoi(arguments[4]);
   try {
     QV::SimulatedBackEnd processor(arguments[1]);
-    if (::write(STDOUT_FILENO, ".", 1) != 1) {
-      return 1;
-    }
+    std::cout << "ready" << std::endl;
     for (int count = 1; changes == 0 || count <= changes; ++count) {
       const bool odd = count % 2 != 0;
       const auto address = QV::Ipv4Address::parse(network + (odd ? ".1" : ".2"));

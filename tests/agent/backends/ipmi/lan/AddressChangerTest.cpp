@@ -2,13 +2,13 @@
 #include <gmock/gmock.h>
 
 #include "agent/backends/ipmi/lan/AddressChanger.h"
-#include "tests/agent/backends/ipmi/RecordedLog.h"
 #include "tests/agent/backends/ipmi/ScriptedBmc.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
+#include "tests/support/agent/RecordingLog.h"
 
 namespace {
 
-using IpmiFixture::ScriptedBmc;
+using namespace Testing;
 using QV::AddressChange;
 using QV::Ipmi::ConnectionLost;
 using QV::Ipmi::HeldLocks;
@@ -75,12 +75,12 @@ TEST_F(AddressChangerTest, HoldsHoweverTheBmcApplies) {
 
 TEST_F(AddressChangerTest, DoesWithoutALockWhereThereIsNone) {
   bmc.hasLock = false;
-  IpmiFixture::takeLog();
+  takeLog();
 
   change(bothValues);
 
   expectNewValues();
-  EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 4000, "has no set-in-progress lock"));
+  EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 4000, "has no set-in-progress lock"));
 }
 
 TEST_F(AddressChangerTest, TakesTheLockWhereItsStateIsNotTold) {
@@ -317,13 +317,13 @@ TEST_F(AddressChangerTest, HasAnUnknownOutcomeWhereTheBmcIsGoneAndRemembersTheLo
       throw NotSent("no session");
     }
   };
-  IpmiFixture::takeLog();
+  takeLog();
 
   EXPECT_THAT([&] { change(bothValues); }, refusal("outcome of the change of lan1 is unknown", "set host to the new"));
 
   EXPECT_EQ(begun, 1);
   EXPECT_THAT(held, ElementsAre(1));
-  EXPECT_TRUE(IpmiFixture::contains(IpmiFixture::takeLog(), 6000, "lock of LAN channel 1 may stay set"));
+  EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 6000, "lock of LAN channel 1 may stay set"));
 }
 
 TEST_F(AddressChangerTest, ChangesNothingWhereTheConnectionBreaksWithTheLock) {

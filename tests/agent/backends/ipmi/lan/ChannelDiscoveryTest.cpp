@@ -5,7 +5,7 @@
 
 namespace {
 
-using IpmiFixture::ScriptedBmc;
+using namespace Testing;
 using QV::Ipmi::ChannelChoice;
 using QV::Ipmi::discoverChannels;
 using QV::Ipmi::IpmiError;
@@ -15,7 +15,7 @@ using testing::ThrowsMessage;
 
 constexpr std::uint8_t systemInterface = 0x0F;
 
-TEST(IpmiChannels, InUseOverLanIsTheSessionsOwnAtOneRoundTrip) {
+TEST(IpmiChannelsTest, InUseOverLanIsTheSessionsOwnAtOneRoundTrip) {
   ScriptedBmc bmc;
   bmc.lanChannels = {1, 8};
   bmc.presentChannel = 8;
@@ -24,7 +24,7 @@ TEST(IpmiChannels, InUseOverLanIsTheSessionsOwnAtOneRoundTrip) {
   EXPECT_EQ(bmc.requests, 1u);
 }
 
-TEST(IpmiChannels, InUseInBandIsTheFirstLanChannel) {
+TEST(IpmiChannelsTest, InUseInBandIsTheFirstLanChannel) {
   ScriptedBmc bmc;
   bmc.lanChannels = {2, 8};
   bmc.presentChannel = systemInterface;
@@ -33,7 +33,7 @@ TEST(IpmiChannels, InUseInBandIsTheFirstLanChannel) {
   EXPECT_EQ(bmc.requests, 3u);
 }
 
-TEST(IpmiChannels, AllAreFoundAtElevenRoundTrips) {
+TEST(IpmiChannelsTest, AllAreFoundAtElevenRoundTrips) {
   ScriptedBmc bmc;
   bmc.lanChannels = {1, 3, 11};
 
@@ -41,13 +41,13 @@ TEST(IpmiChannels, AllAreFoundAtElevenRoundTrips) {
   EXPECT_EQ(bmc.requests, 11u);
 }
 
-TEST(IpmiChannels, ListedAreTakenAsTheyAre) {
+TEST(IpmiChannelsTest, ListedAreTakenAsTheyAre) {
   ScriptedBmc bmc;
   EXPECT_THAT(discoverChannels(bmc, {ChannelChoice::Mode::Listed, {2, 5}}), ElementsAre(2, 5));
   EXPECT_EQ(bmc.requests, 0u);
 }
 
-TEST(IpmiChannels, AreToBeNamedWhereTheBmcShowsNone) {
+TEST(IpmiChannelsTest, AreToBeNamedWhereTheBmcShowsNone) {
   ScriptedBmc bmc;
   bmc.lanChannels = {};
   bmc.presentChannel = systemInterface;

@@ -3,11 +3,11 @@
 
 #include "agent/backends/ipmi/lan/InterfaceReader.h"
 #include "tests/agent/backends/ipmi/ScriptedBmc.h"
-#include "tests/agent/support/Addresses.h"
+#include "tests/support/agent/Addresses.h"
 
 namespace {
 
-using IpmiFixture::ScriptedBmc;
+using namespace Testing;
 using QV::AddressOrigin;
 using QV::Ipmi::channelOf;
 using QV::Ipmi::IpmiError;
@@ -28,13 +28,13 @@ ParameterData ipv6(std::uint8_t source, bool zero = false) {
   return data;
 }
 
-TEST(IpmiInterface, CostsAtMostSixRoundTrips) {
+TEST(IpmiInterfaceTest, CostsAtMostSixRoundTrips) {
   ScriptedBmc bmc;
   readInterface(bmc, 1, Ipv6Choice::Static);
   EXPECT_EQ(bmc.requests, 6u);
 }
 
-TEST(IpmiInterface, LacksWhatTheBmcDoesNotSupport) {
+TEST(IpmiInterfaceTest, LacksWhatTheBmcDoesNotSupport) {
   for (const std::uint8_t code : {0x80, 0xC9, 0xCC}) {
     ScriptedBmc bmc;
     bmc.readRefused = {{LanParameter::MacAddress, code}, {LanParameter::DefaultGateway, code}};
@@ -48,7 +48,7 @@ TEST(IpmiInterface, LacksWhatTheBmcDoesNotSupport) {
   }
 }
 
-TEST(IpmiInterface, LacksWhatTheBmcTellsTooShort) {
+TEST(IpmiInterfaceTest, LacksWhatTheBmcTellsTooShort) {
   ScriptedBmc bmc;
   bmc.values = {{LanParameter::AddressSource, {}},
                 {LanParameter::IpAddress, {192, 0, 2}},
@@ -65,19 +65,19 @@ TEST(IpmiInterface, LacksWhatTheBmcTellsTooShort) {
   EXPECT_EQ(interface.ipv6Address, std::nullopt);
 }
 
-TEST(IpmiInterface, SaysWhyTheBmcRefuses) {
+TEST(IpmiInterfaceTest, SaysWhyTheBmcRefuses) {
   ScriptedBmc bmc;
   bmc.readRefused = {{LanParameter::IpAddress, 0xD4}};
   EXPECT_THAT([&] { readInterface(bmc, 1, Ipv6Choice::Off); },
               ThrowsMessage<IpmiError>(HasSubstr("IP address of LAN channel 1: privilege too low")));
 }
 
-TEST(IpmiInterface, OfAChannelThatTellsNothingIsNone) {
+TEST(IpmiInterfaceTest, OfAChannelThatTellsNothingIsNone) {
   ScriptedBmc bmc;
   EXPECT_THAT([&] { readInterface(bmc, 7, Ipv6Choice::Off); }, ThrowsMessage<IpmiError>(HasSubstr("no LAN channel 7")));
 }
 
-TEST(IpmiInterface, TellsWhereItsAddressComesFrom) {
+TEST(IpmiInterfaceTest, TellsWhereItsAddressComesFrom) {
   const std::pair<std::uint8_t, AddressOrigin> origins[] = {{0, AddressOrigin::Unknown}, {1, AddressOrigin::Static},
                                                             {2, AddressOrigin::Dhcp},    {0xF2, AddressOrigin::Dhcp},
                                                             {3, AddressOrigin::Unknown}, {4, AddressOrigin::Unknown}};
@@ -88,7 +88,7 @@ TEST(IpmiInterface, TellsWhereItsAddressComesFrom) {
   }
 }
 
-TEST(IpmiInterface, HasTheKindOfIpv6AddressThatIsChosen) {
+TEST(IpmiInterfaceTest, HasTheKindOfIpv6AddressThatIsChosen) {
   struct Case {
     Ipv6Choice choice;
     LanParameter parameter;
@@ -116,13 +116,13 @@ TEST(IpmiInterface, HasTheKindOfIpv6AddressThatIsChosen) {
   }
 }
 
-TEST(IpmiInterface, HasNoIpv6AddressOfZeros) {
+TEST(IpmiInterfaceTest, HasNoIpv6AddressOfZeros) {
   ScriptedBmc bmc;
   bmc.values[LanParameter::Ipv6StaticAddress] = ipv6(0x80, true);
   EXPECT_EQ(readInterface(bmc, 1, Ipv6Choice::Static).ipv6Address, std::nullopt);
 }
 
-TEST(IpmiInterfaceName, LeadsToItsChannel) {
+TEST(IpmiInterfaceNameTest, LeadsToItsChannel) {
   EXPECT_EQ(channelOf("lan1"), 1);
   EXPECT_EQ(channelOf("lan11"), 11);
   for (const char* name : {"", "lan", "lan01", "lan1 ", "LAN1", "eth1", "lan256", "lan-1", "lan+1"}) {

@@ -16,14 +16,14 @@ using namespace std::chrono_literals;
 const auto never = 1h;
 const auto nothing = [] {};
 
-TEST(OperationThread, GivesWhatTheOperationGivesAndThrowsWhatItThrows) {
+TEST(OperationThreadTest, GivesWhatTheOperationGivesAndThrowsWhatItThrows) {
   OperationThread thread(never, nothing);
   EXPECT_EQ(thread.run(Deadline(10s), [] { return 42; }), 42);
   EXPECT_THAT([&] { thread.run(Deadline(10s), []() -> int { throw std::out_of_range("too far"); }); },
               testing::ThrowsMessage<std::runtime_error>("too far"));
 }
 
-TEST(OperationThread, LetsTheCallerGoAtTheDeadlineAndFinishesTheOperation) {
+TEST(OperationThreadTest, LetsTheCallerGoAtTheDeadlineAndFinishesTheOperation) {
   const auto release = std::make_shared<std::promise<void>>();
   const auto ended = std::make_shared<std::promise<void>>();
   OperationThread thread(never, nothing);
@@ -42,7 +42,7 @@ TEST(OperationThread, LetsTheCallerGoAtTheDeadlineAndFinishesTheOperation) {
   EXPECT_EQ(ended->get_future().wait_for(10s), std::future_status::ready);
 }
 
-TEST(OperationThread, NeverBeginsAnOperationWhoseCallerHasLeft) {
+TEST(OperationThreadTest, NeverBeginsAnOperationWhoseCallerHasLeft) {
   const auto release = std::make_shared<std::promise<void>>();
   const auto begun = std::make_shared<std::atomic<bool>>(false);
   OperationThread thread(never, nothing);
@@ -60,7 +60,7 @@ TEST(OperationThread, NeverBeginsAnOperationWhoseCallerHasLeft) {
   EXPECT_FALSE(*begun);
 }
 
-TEST(OperationThread, RunsOneOperationAtATime) {
+TEST(OperationThreadTest, RunsOneOperationAtATime) {
   OperationThread thread(never, nothing);
   const auto running = std::make_shared<std::atomic<int>>(0);
   const auto together = std::make_shared<std::atomic<int>>(0);
@@ -83,7 +83,7 @@ TEST(OperationThread, RunsOneOperationAtATime) {
   EXPECT_EQ(*together, 0);
 }
 
-TEST(OperationThread, ActsOnceWhenIdleAndOnceWhenItEnds) {
+TEST(OperationThreadTest, ActsOnceWhenIdleAndOnceWhenItEnds) {
   const auto idle = std::make_shared<std::atomic<int>>(0);
   {
     OperationThread thread(10ms, [idle] {
@@ -96,7 +96,7 @@ TEST(OperationThread, ActsOnceWhenIdleAndOnceWhenItEnds) {
   EXPECT_EQ(*idle, 2);
 }
 
-TEST(OperationThread, ThatIsBlockedDoesNotHoldItsOwner) {
+TEST(OperationThreadTest, ThatIsBlockedDoesNotHoldItsOwner) {
   const auto release = std::make_shared<std::promise<void>>();
   const auto idle = std::make_shared<std::promise<void>>();
   const auto start = std::chrono::steady_clock::now();

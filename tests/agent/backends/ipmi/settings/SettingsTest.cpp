@@ -3,13 +3,13 @@
 
 #include "agent/backends/ipmi/settings/IpmiSettings.h"
 #include "agent/backends/ipmi/settings/SecretFile.h"
-#include "tests/agent/backends/ipmi/PrivateFile.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
+using namespace Testing;
+
 namespace fs = std::filesystem;
-using IpmiFixture::ownerOnly;
-using IpmiFixture::writePrivateFile;
 using QV::BackEndSettings;
 using QV::Ipmi::ChannelChoice;
 using QV::Ipmi::IpmiSettings;
@@ -37,7 +37,7 @@ class IpmiSettingsTest : public testing::Test {
     return section;
   }
 
-  const Testing::TemporaryDirectory directory;
+  const TemporaryDirectory directory;
   const std::string password = directory / "password";
 };
 

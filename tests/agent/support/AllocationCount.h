@@ -1,4 +1,0 @@
-// How often the program has allocated with operator new, for tests of code that must not.
-#pragma once
-
-long allocationCount();

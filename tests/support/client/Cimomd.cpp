@@ -1,0 +1,57 @@
+#include "tests/support/client/Cimomd.h"
+
+#include <signal.h>
+
+#include <stdexcept>
+
+#include "Paths.h"
+#include "tests/support/system/Poll.h"
+
+namespace Testing {
+namespace {
+
+constexpr const char* program = BINARY_DIR "/bin/cimomd";
+
+std::vector<std::string> joined(std::vector<std::string> first, const std::vector<std::string>& second) {
+  first.insert(first.end(), second.begin(), second.end());
+  return first;
+}
+
+}  // namespace
+
+Cimomd::Cimomd(const std::vector<std::string>& options, const Environment& environment)
+    : process_(joined({program, "--port", "0"}, options), environment) {
+  std::string output;
+  poll([&] {
+    output = process_.output();
+    return output.ends_with('\n') || !process_.isRunning();
+  });
+  const auto colon = output.rfind(':');
+  if (!output.starts_with("listening on ") || colon == std::string::npos)
+    throw std::runtime_error("cimomd does not listen: " + process_.errors());
+  port_ = static_cast<std::uint16_t>(std::stoul(output.substr(colon + 1)));
+}
+
+std::vector<std::string> Cimomd::probeOptions() {
+  return {"--schema",       SOURCE_DIR "/tests/support/probe/Probe.mof",
+          "--registration", SOURCE_DIR "/tests/support/probe/Probe.reg",
+          "--provider-dir", BINARY_DIR "/lib"};
+}
+
+std::string Cimomd::url(const std::string& object, const std::string& nameSpace) const {
+  return "http://127.0.0.1:" + std::to_string(port_) + "/" + nameSpace + ":" + object;
+}
+
+Completed Cimomd::wbemcli(std::vector<std::string> operation, const std::string& object,
+                          const std::vector<std::string>& more) const {
+  operation.insert(operation.begin(), "wbemcli");
+  operation.push_back(url(object));
+  return run(joined(std::move(operation), more));
+}
+
+int Cimomd::stop() {
+  process_.signal(SIGTERM);
+  return process_.wait();
+}
+
+}  // namespace Testing

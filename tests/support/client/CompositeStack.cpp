@@ -1,0 +1,35 @@
+#include "tests/support/client/CompositeStack.h"
+
+#include <fstream>
+#include <iterator>
+
+#include "Paths.h"
+
+namespace Testing {
+std::string contentOf(const std::filesystem::path& file) {
+  std::ifstream stream(file, std::ios::binary);
+  return {std::istreambuf_iterator<char>(stream), {}};
+}
+
+CompositeStack::CompositeStack(const std::string& processor, int logThreshold) {
+  const std::string ini = "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " +
+                          (directory_.path() / "agent.log").string() + "\nthreshold = " + std::to_string(logThreshold) +
+                          "\nthreshold.Tarnwick.SimulatedProcessor = 7000\n[host]\npublish = yes\n" + processor;
+  cimomd_ =
+      std::make_unique<Cimomd>(options(), Environment{{"QV_AGENT_INI", directory_.write("agent.ini", ini).string()}});
+}
+
+std::vector<std::string> CompositeStack::options() {
+  return {"--schema",       BINARY_DIR "/share/cimomd",
+          "--registration", BINARY_DIR "/share/cimomd/CompositeIPConfig.reg",
+          "--registration", BINARY_DIR "/share/cimomd/UnderlyingIPConfig.reg",
+          "--provider-dir", BINARY_DIR "/lib"};
+}
+
+std::string CompositeStack::log() const { return contentOf(directory_.path() / "agent.log"); }
+
+std::string simulatedProcessor(const std::filesystem::path& state) {
+  return "[processor]\nbackend = simulated\n[simulated]\nstate = " + state.string() + "\n";
+}
+
+}  // namespace Testing

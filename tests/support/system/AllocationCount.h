@@ -1,0 +1,8 @@
+// How often the program has allocated with operator new, for tests of code that must not.
+#pragma once
+
+namespace Testing {
+
+long allocationCount();
+
+}  // namespace Testing
