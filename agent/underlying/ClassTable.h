@@ -17,7 +17,7 @@ struct UnderlyingClass {
 // The class of that name, letters without regard to case; null if there is none.
 const UnderlyingClass* findUnderlyingClass(const char* name);
 
-// All instances of a class: those of the management processor, then those of the host where the class has them and
+// All instances of a class: those of the management processor, then those of the host if the class has them and
 // agent.ini asks for them. Throws what reading the processor throws.
 Instances readInstances(const UnderlyingClass& underlyingClass);
 

@@ -10,8 +10,8 @@ namespace QV {
 
 class SimulatedBackEnd : public BackEnd {
  public:
-  // Makes the file's directory where it is missing; the first read or change writes the factory configuration where
-  // there is no file. Throws std::runtime_error with what to do where the file could not be changed later.
+  // Makes the file's directory if it is missing; the first read or change writes the factory configuration if
+  // there is no file. Throws std::runtime_error with what to do if the file could not be changed later.
   explicit SimulatedBackEnd(const std::string& stateFile);
 
   // The file is read anew each time, since other processes change it. A damaged file is an error that names the field,

@@ -197,7 +197,7 @@ TEST(AgentConfigurationTest, AFileThatTheVariableNamesAndThatIsMissingIsAnError)
 }
 
 TEST(AgentConfigurationTest, AFileThatThisUserMayNotReadIsAnError) {
-  const Testing::TemporaryDirectory directory;
+  const TemporaryDirectory directory;
   writeFile(directory / "a.ini", "");
   std::filesystem::permissions(directory / "a.ini", std::filesystem::perms::none);
   const AgentIniVariable variable(directory / "a.ini");
