@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the wire costs: the same enumeration as a bare up-call, with CIM-XML around it, and over a kept-alive
 // connection. The first is the baseline of the other two.
 #include <benchmark/benchmark.h>
@@ -29,7 +30,9 @@ struct Manager {
     manager.loadSchemaText(std::string{std::istreambuf_iterator<char>(mof), {}}, "root/test", "Probe.mof");
     for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/support/probe/Probe.reg")) {
       registration.association = false;
-      if (registration.instance) manager.addProvider(registration, &ProbeProvider_Create_InstanceMI, nullptr);
+      if (registration.instance) {
+        manager.addProvider(registration, &ProbeProvider_Create_InstanceMI, nullptr);
+      }
     }
   }
 
@@ -51,7 +54,9 @@ void upCall(benchmark::State& state) {
     RequestScope scope(broker);
     const CMPIObjectPath* path = CMNewObjectPath(broker, "root/test", "TEST_Thing", nullptr);
     CMPIEnumeration* result = CBEnumInstances(broker, scope.context(), path, nullptr, nullptr);
-    while (CMHasNext(result, nullptr)) benchmark::DoNotOptimize(CMGetNext(result, nullptr));
+    while (CMHasNext(result, nullptr)) {
+      benchmark::DoNotOptimize(CMGetNext(result, nullptr));
+    }
   }
 }
 BENCHMARK(upCall)->Unit(benchmark::kMicrosecond);
@@ -61,15 +66,20 @@ void withCimXml(benchmark::State& state) {
   request.headers.add("CIMOperation", "MethodCall");
   request.headers.add("CIMMethod", "EnumerateInstances");
   request.headers.add("CIMObject", "root%2Ftest");
-  for (auto _ : state) benchmark::DoNotOptimize(instance().endpoint.handle(request));
+  for (auto _ : state) {
+    benchmark::DoNotOptimize(instance().endpoint.handle(request));
+  }
 }
 BENCHMARK(withCimXml)->Unit(benchmark::kMicrosecond);
 
 void overHttp(benchmark::State& state) {
   Http::Server server({}, [](const Http::Request& request) { return instance().endpoint.handle(request); });
   Testing::HttpClient client(server.port());
-  for (auto _ : state)
-    if (client.post("/cimom", body, headers).status != 200) state.SkipWithError("the request failed");
+  for (auto _ : state) {
+    if (client.post("/cimom", body, headers).status != 200) {
+      state.SkipWithError("the request failed");
+    }
+  }
 }
 BENCHMARK(overHttp)->Unit(benchmark::kMicrosecond)->UseRealTime();
 

@@ -1,3 +1,4 @@
+/* SPDX-License-Identifier: Apache-2.0 */
 /*
  * CMPI 2.0 data types: scalars, the value union, types, value states, return codes and constants.
  *

@@ -1,3 +1,4 @@
+/* SPDX-License-Identifier: Apache-2.0 */
 /*
  * CMPI 2.0 function tables: the binary interface between a CIM object manager and its providers.
  *

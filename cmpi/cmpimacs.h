@@ -1,3 +1,4 @@
+/* SPDX-License-Identifier: Apache-2.0 */
 /*
  * CMPI 2.0 convenience macros: each calls one slot on its first argument. Provider code goes through these and the MI
  * stubs, never through positional knowledge of a table.

@@ -1,3 +1,4 @@
+/* SPDX-License-Identifier: Apache-2.0 */
 /* CMPI 2.0: operating-system services, reached through the broker's extension table (CMPIBrokerExtFT). */
 #ifndef CMPIOS_H_
 #define CMPIOS_H_

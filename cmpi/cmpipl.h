@@ -1,3 +1,4 @@
+/* SPDX-License-Identifier: Apache-2.0 */
 /* CMPI 2.0: what depends on the platform. A build defines CMPI_PLATFORM_LINUX_GENERIC_GNU. */
 #ifndef CMPIPL_H_
 #define CMPIPL_H_

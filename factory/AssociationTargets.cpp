@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Which class lies at the far end of an association, seen from either end.
 #include <QV/ProviderHelper.h>
 

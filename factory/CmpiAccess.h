@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The thin layer over CMPI objects that the library shares. Object managers do hand out null strings, null paths and
 // wrongly typed values; what would have to follow a null pointer is skipped here, once for all.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // How composite instances are read and made, for every row of the model.
 #pragma once
 

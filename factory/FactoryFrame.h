@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The trace frame of the factory's members.
 #pragma once
 

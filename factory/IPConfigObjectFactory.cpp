@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The factory's members by name: each read pair stands for its row of the model.
 #include "factory/IPConfigObjectFactory.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Builds the composite instances, writes configuration changes, and resolves the far ends of associations.
 #pragma once
 

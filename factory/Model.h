@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The model that clients see, stated once: six composite classes and the six associations between them, a row each.
 // What is done with a row stands elsewhere, once for all rows: CompositeInstances.cpp reads and makes instances,
 // AssociationTargets.cpp finds far ends, providers/operations/ walks the associations.

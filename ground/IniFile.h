@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Reads INI text: agent.ini and cimomd's configuration file. It knows nothing of what the keys mean.
 #pragma once
 

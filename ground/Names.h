@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // CIM names, which DSP0004 takes as equal without regard to case.
 #pragma once
 

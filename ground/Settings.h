@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The keys and values of one section of a configuration file, each value taken with its form and range checked.
 #pragma once
 

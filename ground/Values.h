@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The values of settings, from their texts. Each refusal is a std::invalid_argument with the reason alone, such as
 // "must be a number from 1 to 11": who asks knows where the text stands.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Serves the DHCP assignment settings.
 #include "providers/operations/InstanceOperations.h"
 #include "providers/operations/ProviderUnit.h"

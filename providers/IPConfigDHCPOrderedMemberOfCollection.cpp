@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Serves the association by which DHCP settings are members of assignment setting sequences.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Serves the association by which assignment setting sequences apply to IP protocol endpoints.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Serves the association by which the computer system hosts remote service access points.
 #include "providers/operations/AssociationOperations.h"
 #include "providers/operations/ProviderUnit.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The trace and log frame: every operation of every provider and every member of the factory reports through it, so
 // that an administrator can follow a request line by line in the agent's log and trace.
 //

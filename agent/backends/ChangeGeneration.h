@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A number in a small file, by which processes tell each other that something they all look at was changed: a look is
 // still true where the number is what it was before the look was begun.
 #pragma once

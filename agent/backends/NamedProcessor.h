@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A management processor under the name and description that the administrator gave it.
 #pragma once
 

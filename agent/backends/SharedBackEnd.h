@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The management processor of this process: one back end, shared by the instrumentation's cursors and by the underlying
 // provider, so that what a client writes is what the next read shows.
 #pragma once

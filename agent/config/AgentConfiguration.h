@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The agent's configuration, agent.ini: what every library of the agent reads on its first use.
 #pragma once
 

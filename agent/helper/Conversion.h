@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // CMPI data as ordinary values. A datum that is null, bad or not found, or whose pointer is null, has no value of any
 // kind: object managers hand out all of these.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What QV::Instrumentation does: a cursor over the interfaces of a management processor as they were when it was set,
 // which gathers the address and the mask of one change into one exchange with the processor.
 #pragma once

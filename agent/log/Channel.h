@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // One of the two channels of messages, the log or the trace: its thresholds and where its messages go.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // How a message becomes one line of text.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A log file that several processes may share and that may be rotated away at any time.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // How the agent's own code reports: one line to the log and the same to the trace, with the place that it comes from.
 #pragma once
 

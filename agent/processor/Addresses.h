@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The addresses of an interface as values: parsed once where they come in (a client's text, a state file, the octets of
 // the wire), printed once where they go out. A value may be one that no host can have, since processors show such
 // values too; what a client asks for passes through requireHost and requireUsable, or the processor would take itself

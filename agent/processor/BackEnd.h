@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The seam between the agent and a management processor. An implementation reaches one processor; the instrumentation
 // and the underlying provider share it within a process.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What a management processor's IP configuration is to the agent: plain values, whatever hardware they come from.
 #pragma once
 

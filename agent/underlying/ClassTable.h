@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The underlying classes: what each is called, what names an instance, what makes its instances.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The IP configuration of the host that we run on, described as that of the management processor is.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the instances of the underlying classes hold, made from a system's configuration: plain values, before any
 // object manager is involved. Property names and value maps are those of the DMTF classes that the classes stand for.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A computer system whose IP configuration the underlying classes show.
 #pragma once
 

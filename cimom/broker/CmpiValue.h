@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Values as they pass the binary interface.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Threads, mutexes and conditions, as providers reach them: POSIX threads, whose semantics the interface's are.
 #include <pthread.h>
 #include <string.h>

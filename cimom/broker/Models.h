@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What stands behind those CMPI objects that are no CIM values themselves.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What comes in through the up-call table, and who carries it out.
 #pragma once
 

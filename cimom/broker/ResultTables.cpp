@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The function tables of what a provider answers with.
 #include "cimom/broker/Guard.h"
 #include "cimom/model/Types.h"

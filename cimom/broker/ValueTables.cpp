@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The function tables of the objects that are no more than their contents.
 #include "cimom/broker/Guard.h"
 #include "cimom/model/Types.h"

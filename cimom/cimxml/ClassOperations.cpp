@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "cimom/cimxml/Call.h"
 #include "cimom/cimxml/ClassWriter.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // An XML document in memory, and its elements as the request reader walks them.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The two kinds of failure of a CIM-XML request.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Writes CMPI objects as CIM-XML (DSP0201).
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A CIM-XML request as the client wrote it: texts and type names, before any class gives them a meaning.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // CIM values as text in CIM-XML (DSP0201, 5.2.3: VALUE).
 #pragma once
 

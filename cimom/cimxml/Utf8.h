@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // UTF-8, held to what an XML 1.0 document can carry.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The HTTP request and response as the handler of a server sees them.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // An HTTP/1.1 server: any method, chunked bodies, 100-continue, keep-alive, optionally TLS and basic authentication.
 // Every connection has a thread of its own, so that a request which waits for slow hardware holds up no other.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // CIM's data types (DSP0004): the one table that values, MOF and CIM-XML read them from.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // CIM values: single, in arrays, and by name.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The function tables, whichever set of CMPI headers a build takes: this one stands before theirs on the include path.
 // The sets in circulation agree on the binary interface and differ in how they word it; what the tree must not see of
 // that is levelled here and in cmpimacs.h. tests/cmpi/stand-in lists the differences.

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The convenience macros, whichever set of CMPI headers a build takes (see cmpift.h beside this file): some are
 // functions that take a value as const CMPIValue* only, some are left out unless a version is asked for.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The builders of association instances: each pairs the composite instances of an association's two ends.
 #include <cstring>
 #include <optional>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The instance side of an association class: what the unit's builder makes.
 #include <QV/ProviderHelper.h>
 

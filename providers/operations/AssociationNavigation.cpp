@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The association side: from a source object to what lies at the far end.
 #include <optional>
 

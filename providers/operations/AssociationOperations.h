@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The operations of the six association providers, stated once; a unit is a row, in which every deliberate difference
 // stands, to the last blank of a message (compatibility 2).
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The source lines in the trace are fixed (compatibility 3).
 #include "providers/operations/InstanceOperations.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The operations of the six providers that serve a composite class, stated once; a unit is a row.
 #pragma once
 

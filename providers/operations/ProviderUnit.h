@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The named operations that every unit gives its function tables: stubs, and one-line calls of the operations told
 // once. Each unit states before them its `broker` and its row, `unit`.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What each library of the agent exports: its contract and nothing else, since object managers load providers into one
 // name space.
 #include <gmock/gmock.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the options of the build leave out, and what they refuse: each case configures the project anew and asks Ninja
 // for the commands that a build would run, without running them.
 #include <gmock/gmock.h>

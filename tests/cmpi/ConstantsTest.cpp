@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The numbers that travel between separately built object managers and providers.
 #include <cmpimacs.h>
 #include <gtest/gtest.h>

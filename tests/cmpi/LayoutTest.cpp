@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Holds every struct of the CMPI headers to the sizes and offsets of the standard's binary interface.
 #include <cmpift.h>
 #include <gtest/gtest.h>

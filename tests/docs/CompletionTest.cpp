@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What bash offers after the names of the installed programs.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The manual pages are clean, and name every option of the programs and every key of the samples.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The demonstration against a simulated BMC that answers real IPMI.
 #include <gmock/gmock.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The whole product on a BMC that answers real IPMI over RMCP+; ipmitool is the witness of what the BMC itself holds.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -27,7 +28,9 @@ constexpr auto margin = 3s;
 
 std::string sectionFor(const QV::BackEndSettings& settings) {
   std::string text = "[processor]\nbackend = ipmi\n[ipmi]\n";
-  for (const auto& [key, value] : settings) text += key + " = " + value + '\n';
+  for (const auto& [key, value] : settings) {
+    text += key + " = " + value + '\n';
+  }
   return text;
 }
 
@@ -128,10 +131,11 @@ TEST_F(BmcStackTest, IsChangedByTwoObjectManagersOneAfterTheOther) {
   const bool otherDone = other.log().empty();
   EXPECT_TRUE(firstDone || otherDone) << stack_->log() << other.log();
   const std::string address = bmc_->witness("IP Address");
-  if (firstDone != otherDone)
+  if (firstDone != otherDone) {
     EXPECT_EQ(address, firstDone ? "192.0.2.77" : "192.0.2.78");
-  else
+  } else {
     EXPECT_THAT(address, testing::AnyOf("192.0.2.77", "192.0.2.78"));
+  }
   stack_->modify(staticSetting("lan1"), "IPv4Address=192.0.2.79");
   EXPECT_EQ(witnessedAddress(*bmc_), "192.0.2.79/255.255.255.0 Static Address");
 }

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // cimomd's command line and configuration file: what it takes, and what it says of what it does not take.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -45,8 +46,9 @@ TEST_F(CommandLineTest, ShowsHelpWithEveryOption) {
   EXPECT_EQ(completed.status, 0);
   for (const char* option : {"--config", "--address", "--port", "--schema", "--registration", "--provider-dir",
                              "--max-request-size", "--max-connections", "--idle-timeout", "--shutdown-timeout",
-                             "--tls-certificate", "--tls-key", "--password-file", "--version"})
+                             "--tls-certificate", "--tls-key", "--password-file", "--version"}) {
     EXPECT_THAT(completed.output, HasSubstr(option));
+  }
 }
 
 TEST_F(CommandLineTest, ShowsTheVersion) { EXPECT_THAT(cimomd({"--version"}).output, StartsWith("cimomd ")); }

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The six association classes of a simulated management processor in its factory state, walked with wbemcli from each
 // end of each.
 #include <gmock/gmock.h>
@@ -38,8 +39,11 @@ class CompositeAssociationTest : public testing::Test {
   // From the values of an instance: those that hold a path.
   static Ends endsOf(const Printed& instance) {
     Ends ends;
-    for (const auto& [name, value] : instance.values)
-      if (value.find("root/cimv2") != std::string::npos) ends[name] = referenceOf(value);
+    for (const auto& [name, value] : instance.values) {
+      if (value.find("root/cimv2") != std::string::npos) {
+        ends[name] = referenceOf(value);
+      }
+    }
     return ends;
   }
 
@@ -47,8 +51,9 @@ class CompositeAssociationTest : public testing::Test {
   // does not take the references in the form in which it prints them.
   static std::string asArgument(const std::string& printed) {
     std::string argument = printed;
-    for (std::size_t at; (at = argument.find("managed.example/root/cimv2")) != std::string::npos;)
+    for (std::size_t at; (at = argument.find("managed.example/root/cimv2")) != std::string::npos;) {
       argument.erase(at, std::string("managed.example/root/cimv2").size());
+    }
     return argument;
   }
 
@@ -65,23 +70,27 @@ TEST_F(CompositeAssociationTest, AnswersTheFarEndsOfEachEnd) {
     SCOPED_TRACE(std::string(view.association) + " from " + view.source);
     EXPECT_EQ(stack_.names(scoped("ain", "-ac", view.association), view.source), view.far);
     Objects found;
-    for (const Printed& instance : stack_.instances(scoped("ai", "-ac", view.association), view.source))
+    for (const Printed& instance : stack_.instances(scoped("ai", "-ac", view.association), view.source)) {
       found.push_back(objectOf(instance.path));
+    }
     EXPECT_EQ(found, view.far);
   }
 }
 
 TEST_F(CompositeAssociationTest, NamesTheManagedSystemAsTheHostOfWhatItAnswers) {
-  for (const View& view : views())
+  for (const View& view : views()) {
     EXPECT_THAT(stack_.paths(scoped("ain", "-ac", view.association), view.source),
                 AllOf(Not(IsEmpty()), Each(StartsWith("managed.example/root/cimv2:"))));
+  }
 }
 
 TEST_F(CompositeAssociationTest, AnswersWholeInstances) {
-  for (const Printed& found : stack_.instances("ai", computerSystem()))
+  for (const Printed& found : stack_.instances("ai", computerSystem())) {
     EXPECT_EQ(found.values, stack_.get(objectOf(found.path)));
-  for (const Printed& found : stack_.instances("ai", sequence("eth1:dhcp")))
+  }
+  for (const Printed& found : stack_.instances("ai", sequence("eth1:dhcp"))) {
     EXPECT_EQ(found.values, stack_.get(objectOf(found.path)));
+  }
 }
 
 TEST_F(CompositeAssociationTest, AnswersThroughEveryAssociationWhereNoneIsNamed) {
@@ -142,7 +151,9 @@ TEST_F(CompositeAssociationTest, NamesItsReferencesByBothEnds) {
     for (std::size_t i = 0; i < names.size(); ++i) {
       EXPECT_THAT(names[i], StartsWith(std::string(view.association) + '.'));
       // The keys of this one are references that its References does not set, so its names have none.
-      if (view.association == std::string(Classes::elementSettingData)) continue;
+      if (view.association == std::string(Classes::elementSettingData)) {
+        continue;
+      }
       EXPECT_THAT(names[i], AllOf(HasSubstr(view.source), HasSubstr(view.referenceNames[i])));
     }
   }
@@ -173,7 +184,9 @@ TEST_P(CompositeAssociationClassTest, EnumeratesItsPairs) {
 
 TEST_P(CompositeAssociationClassTest, EnumeratesItsNames) {
   Objects expected;
-  for (const auto& pair : GetParam().pairs) expected.push_back(pathOf(pair));
+  for (const auto& pair : GetParam().pairs) {
+    expected.push_back(pathOf(pair));
+  }
   EXPECT_EQ(stack_.names("ein", GetParam().association), expected);
 }
 
@@ -202,8 +215,10 @@ TEST_F(CompositeAssociationTest, OfSequencesToEndpointsSaysHowTheyRelate) {
     EXPECT_EQ(instance.values.at("IsCurrent"), "2");
     EXPECT_EQ(instance.values.at("IsNext"), "3");
   }
-  for (const Printed& instance : stack_.instances(scoped("ri", "-arc", Classes::elementSettingData), endpoint("eth0")))
+  for (const Printed& instance :
+       stack_.instances(scoped("ri", "-arc", Classes::elementSettingData), endpoint("eth0"))) {
     EXPECT_THAT(instance.values, Not(Contains(Key("IsNext"))));
+  }
 }
 
 TEST_F(CompositeAssociationTest, AnswersForItsSuperclass) {

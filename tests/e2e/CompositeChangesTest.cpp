@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Changes that a client makes with wbemcli, followed down to the simulated management processor's state file.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -112,8 +113,9 @@ TEST_F(CompositeChangeTest, OfAnUndeclaredPropertyIsRefused) {
 
 TEST_F(CompositeChangeTest, OfClassesThatCannotChangeIsNotSupported) {
   const std::string before = factoryState();
-  for (const std::string& object : {computerSystem(), sequence("eth0:static"), dhcpSetting("eth0")})
+  for (const std::string& object : {computerSystem(), sequence("eth0:static"), dhcpSetting("eth0")}) {
     EXPECT_THAT(stack_.failure("mi", object, {"ElementName=other"}), HasSubstr("(7) CIM_ERR_NOT_SUPPORTED"));
+  }
   EXPECT_EQ(contentOf(state_), before);
 }
 
@@ -126,10 +128,13 @@ TEST_F(CompositeChangeTest, BySeveralClientsAtOnceLosesNone) {
       stack_.modify(staticSetting(interface), values);
     }));
   }
-  for (int i = 0; i < 4; ++i)
+  for (int i = 0; i < 4; ++i) {
     clients.push_back(std::async(
         std::launch::async, [this] { EXPECT_THAT(stack_.names("ein", Classes::clientAccess), testing::SizeIs(6)); }));
-  for (auto& client : clients) client.get();
+  }
+  for (auto& client : clients) {
+    client.get();
+  }
   expectAddress("eth0", "192.0.2.77", "255.255.0.0");
   expectAddress("eth1", "198.51.100.99", "255.255.0.0");
 }
@@ -137,7 +142,9 @@ TEST_F(CompositeChangeTest, BySeveralClientsAtOnceLosesNone) {
 TEST_F(CompositeChangeTest, ByTwoObjectManagersOnOneProcessorLosesNone) {
   const CompositeStack other(simulatedProcessor(state_));
   const auto change = [](const CompositeStack& stack, const std::string& interface, const std::string& prefix) {
-    for (int i = 1; i <= 8; ++i) stack.modify(staticSetting(interface), "IPv4Address=" + prefix + std::to_string(i));
+    for (int i = 1; i <= 8; ++i) {
+      stack.modify(staticSetting(interface), "IPv4Address=" + prefix + std::to_string(i));
+    }
   };
   auto first = std::async(std::launch::async, [&] { change(stack_, "eth0", "192.0.2.10"); });
   auto second = std::async(std::launch::async, [&] { change(other, "eth1", "198.51.100.10"); });
@@ -160,8 +167,9 @@ TEST_F(CompositeChangeTest, OfADamagedStateIsRefusedAndTheFileKeptUntilItIsRepai
                                      std::string("\0\xFF\xFE", 3), std::string("[]")}) {
     directory_.write("processor.json", damaged);
     for (const char* className :
-         {Classes::computerSystem, Classes::endpoint, Classes::staticSetting, Classes::remoteAccessPoint})
+         {Classes::computerSystem, Classes::endpoint, Classes::staticSetting, Classes::remoteAccessPoint}) {
       EXPECT_THAT(stack_.failure("ei", className), AllOf(HasSubstr("(1) CIM_ERR_FAILED"), HasSubstr(state_.string())));
+    }
     EXPECT_THAT(stack_.failure("gi", endpoint("eth0")), HasSubstr(state_.string()));
     EXPECT_THAT(stack_.failure("mi", endpoint("eth0"), {"IPv4Address=192.0.2.77"}), HasSubstr(state_.string()));
     EXPECT_EQ(contentOf(state_), damaged);

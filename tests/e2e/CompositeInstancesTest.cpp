@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The six composite classes of a simulated management processor in its factory state, read with wbemcli.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -39,21 +40,29 @@ TEST_P(CompositeClassTest, EnumeratesItsInstancesWithEveryValue) {
 
 TEST_P(CompositeClassTest, EnumeratesItsNamesInTheRequestsNamespace) {
   std::vector<std::string> expected;
-  for (const std::string& object : GetParam().objects) expected.push_back("root/cimv2:" + object);
+  for (const std::string& object : GetParam().objects) {
+    expected.push_back("root/cimv2:" + object);
+  }
   std::vector<std::string> found = stack_.paths("ein", GetParam().className);
-  for (std::string& path : found) path = withoutHost(path);
+  for (std::string& path : found) {
+    path = withoutHost(path);
+  }
   EXPECT_EQ(found, expected);
 }
 
 TEST_P(CompositeClassTest, GetsEachInstanceByTheNameThatItEnumerated) {
   const std::vector<std::string> names = stack_.names("ein", GetParam().className);
   ASSERT_THAT(names, SizeIs(GetParam().values.size()));
-  for (std::size_t i = 0; i < names.size(); ++i) EXPECT_EQ(stack_.get(names[i]), GetParam().values[i]);
+  for (std::size_t i = 0; i < names.size(); ++i) {
+    EXPECT_EQ(stack_.get(names[i]), GetParam().values[i]);
+  }
 }
 
 TEST_P(CompositeClassTest, IsFoundInAnyLetterCase) {
   std::string shouted = GetParam().className;
-  for (char& letter : shouted) letter = static_cast<char>(std::toupper(static_cast<unsigned char>(letter)));
+  for (char& letter : shouted) {
+    letter = static_cast<char>(std::toupper(static_cast<unsigned char>(letter)));
+  }
   EXPECT_EQ(stack_.names("ein", shouted), GetParam().objects);
   EXPECT_THAT(stack_.instances("ei", shouted), SizeIs(GetParam().objects.size()));
 }
@@ -93,15 +102,18 @@ TEST_F(CompositeInstancesTest, LeaveOutWhatBelongsToTheHost) {
   EXPECT_THAT(namesUnder("YRNQV_IPProtocolEndpoint"),
               AllOf(HasSubstr(R"(SystemCreationClassName="YRNQV_ComputerSystem",SystemName="managed.example")"),
                     HasSubstr(R"(Name="lo")")));
-  for (const char* settingClass : {"YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData"})
+  for (const char* settingClass : {"YRNQV_StaticIPAssignmentSettingData", "YRNQV_DHCPSettingData"}) {
     EXPECT_THAT(namesUnder(settingClass), AllOf(HasSubstr(R"("Host:lo")"), HasSubstr(R"("BMC:eth0")")));
+  }
   EXPECT_THAT(namesUnder("YRNQV_IPAssignmentSettingData"), HasSubstr(R"("Host:lo:static")"));
   EXPECT_THAT(namesUnder("YRNQV_IPRemoteServiceAccessPoint"),
               HasSubstr(R"(SystemCreationClassName="YRNQV_ComputerSystem",SystemName="managed.example")"));
 
-  for (const ClassCase& row : classCases())
-    for (const std::string& name : stack_.names("ein", row.className))
+  for (const ClassCase& row : classCases()) {
+    for (const std::string& name : stack_.names("ein", row.className)) {
       EXPECT_THAT(name, AllOf(Not(HasSubstr("\"lo\"")), Not(HasSubstr("Host:")), Not(HasSubstr("managed.example"))));
+    }
+  }
 }
 
 TEST_F(CompositeInstancesTest, ShowWithSeveralPropertiesWhatWasAskedInAnyLetterCase) {

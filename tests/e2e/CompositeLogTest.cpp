@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What a request leaves in the management agent's log.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -18,8 +19,11 @@ class CompositeLogTest : public testing::Test {
  protected:
   static std::vector<std::string> having(const std::string& log, const std::string& part) {
     std::vector<std::string> lines;
-    for (const std::string& line : linesOf(log))
-      if (line.find(part) != std::string::npos) lines.push_back(line);
+    for (const std::string& line : linesOf(log)) {
+      if (line.find(part) != std::string::npos) {
+        lines.push_back(line);
+      }
+    }
     return lines;
   }
 
@@ -52,8 +56,9 @@ TEST_F(CompositeLogTest, TellsOfAChangeDownToTheInterface) {
   for (const char* line :
        {"VARIABLE: 'IpName' has Value 'eth0' at line 469", "VARIABLE: 'Ipv4Address' has Value '192.0.2.77' at line 476",
         "VARIABLE: 'Ipv4SubnetMask' has Value '255.255.255.0' at line 483",
-        "EXITING: executeModifyInstance() in IPConfigObjectFactory [Line: 536]"})
+        "EXITING: executeModifyInstance() in IPConfigObjectFactory [Line: 536]"}) {
     EXPECT_THAT(stack.log(), HasSubstr(line));
+  }
 }
 
 TEST_F(CompositeLogTest, HoldsNothingOfARequestThatSucceedsAtLevel6000) {
@@ -75,8 +80,9 @@ TEST_F(CompositeLogTest, ShowsLineFeedsOfAClientAsEscapes) {
   const CompositeStack stack(processor(), 6000);
   stack.modify(endpoint("eth0"), "IPv4Address=1\n2026 6000 Forged forged (forged:1): line");
   EXPECT_THAT(having(stack.log(), "Forged"), Contains(HasSubstr("'1\\n2026 6000 Forged")));
-  for (const std::string& line : linesOf(stack.log()))
+  for (const std::string& line : linesOf(stack.log())) {
     EXPECT_THAT(line, testing::ContainsRegex("^20[0-9-]+T[0-9:.]+Z "));
+  }
 }
 
 }  // namespace

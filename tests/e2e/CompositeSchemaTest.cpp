@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The classes as a client of cimomd sees them, and what they say of the instances.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // cimomd with the composite where something is missing, and what only a hand-made request can ask.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -75,10 +76,11 @@ class RawRequestTest : public CompositeServerTest {
 TEST_F(RawRequestTest, ToGetAnInstanceWithoutKeysFailsAsTheProviderSays) {
   for (const char* className : {"YRNx_MgmtHwComputerSystem", "YRNx_MgmtHwIPProtocolEndPoint",
                                 "YRNx_MgmtHwIPAssignmentSettingSequence", "YRNx_MgmtHwStaticIPAssignmentSettingData",
-                                "YRNx_MgmtHwDHCPAssignmentSettingData", "YRNx_MgmtHwRemoteServiceAccessPoint"})
+                                "YRNx_MgmtHwDHCPAssignmentSettingData", "YRNx_MgmtHwRemoteServiceAccessPoint"}) {
     EXPECT_THAT(call("GetInstance", parameter("InstanceName", instanceName(className, ""))),
                 AllOf(HasSubstr("<ERROR CODE=\"1\""), HasSubstr("At least one key should be passed")))
         << className;
+  }
   // An association's provider finds nothing, and says why in the log.
   EXPECT_THAT(call("GetInstance", parameter("InstanceName", instanceName("YRNx_MgmtHwClientAccess", ""))),
               HasSubstr("<ERROR CODE=\"6\""));
@@ -131,9 +133,11 @@ TEST_F(RawRequestTest, WithoutAUsableValueChangesNothing) {
 TEST_F(CompositeServerTest, DoesNotStartWithoutTheLibraryOfAProvider) {
   for (const char* missing : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
     const TemporaryDirectory providers;
-    for (const char* present : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"})
-      if (std::string(present) != missing)
+    for (const char* present : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
+      if (std::string(present) != missing) {
         std::filesystem::create_symlink(std::string(BINARY_DIR "/lib/") + present, providers.path() / present);
+      }
+    }
     std::vector<std::string> options = CompositeStack::options();
     options.back() = providers.path().string();
     options.insert(options.begin(), {BINARY_DIR "/bin/cimomd", "--config", "/dev/null"});
@@ -226,9 +230,12 @@ TEST_F(CompositeServerTest, AnswersManyClientsAtOnceAlike) {
   const std::vector<std::string> expected = stack.paths("ein", "YRNx_MgmtHwClientAccess");
   ASSERT_THAT(expected, SizeIs(6));
   std::vector<std::future<std::vector<std::string>>> clients;
-  for (int i = 0; i < 16; ++i)
+  for (int i = 0; i < 16; ++i) {
     clients.push_back(std::async(std::launch::async, [&] { return stack.paths("ein", "YRNx_MgmtHwClientAccess"); }));
-  for (auto& client : clients) EXPECT_EQ(client.get(), expected);
+  }
+  for (auto& client : clients) {
+    EXPECT_EQ(client.get(), expected);
+  }
 }
 
 TEST_F(CompositeServerTest, EndsCleanlyAfterRequests) {

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "tests/e2e/DemonstrationFixture.h"
 
 #include "Paths.h"
@@ -14,9 +15,12 @@ namespace fs = std::filesystem;
 std::vector<std::string> processesOf(const fs::path& directory) {
   std::vector<std::string> found;
   for (const auto& entry : fs::directory_iterator("/proc")) {
-    if (entry.path().filename().string().find_first_not_of("0123456789") != std::string::npos) continue;
-    if (contentOf(entry.path() / "environ").find(directory.string()) != std::string::npos)
+    if (entry.path().filename().string().find_first_not_of("0123456789") != std::string::npos) {
+      continue;
+    }
+    if (contentOf(entry.path() / "environ").find(directory.string()) != std::string::npos) {
       found.push_back(contentOf(entry.path() / "cmdline"));
+    }
   }
   return found;
 }
@@ -24,8 +28,9 @@ std::vector<std::string> processesOf(const fs::path& directory) {
 }  // namespace
 
 DemonstrationTest::DemonstrationTest() {
-  for (const char* part : {"bin", "lib", "share"})
+  for (const char* part : {"bin", "lib", "share"}) {
     fs::create_directory_symlink(fs::path(BINARY_DIR) / part, build() / part);
+  }
   fs::create_directory(temporary());
 }
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The demonstration that newcomers see first, and the picture that it draws.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -60,7 +61,9 @@ TEST_F(DemonstrationTest, RefusesWhatItDoesNotKnow) {
 
 TEST_F(DemonstrationTest, IsColouredOnATerminalThatWantsIt) {
   std::string words;
-  for (const std::string& word : command({})) words += "'" + word + "' ";
+  for (const std::string& word : command({})) {
+    words += "'" + word + "' ";
+  }
   Environment terminal = environment();
   terminal["TERM"] = "xterm";
   terminal["NO_COLOR"] = "";
@@ -129,7 +132,9 @@ TEST_F(ModelGraphTest, HasEveryInstanceAsANodeAndEveryAssociationAsAnEdge) {
   std::vector<std::string> nodes;
   std::vector<std::string> edges;
   for (const std::string& line : linesOf(graph.output)) {
-    if (line.find("root/cimv2:") == std::string::npos || line.find("style = invis") != std::string::npos) continue;
+    if (line.find("root/cimv2:") == std::string::npos || line.find("style = invis") != std::string::npos) {
+      continue;
+    }
     (line.find(" -> ") == std::string::npos ? nodes : edges).push_back(line);
   }
   // A system, 2 endpoints, 3 access points, 4 sequences, 2 static and 2 DHCP settings; 2 and 3 hosted, 6 by client
@@ -139,7 +144,9 @@ TEST_F(ModelGraphTest, HasEveryInstanceAsANodeAndEveryAssociationAsAnEdge) {
 }
 
 TEST_F(ModelGraphTest, IsAGraphThatGraphvizTakes) {
-  if (run({"sh", "-c", "command -v dot"}).status != 0) GTEST_SKIP() << "dot (graphviz) is not there";
+  if (run({"sh", "-c", "command -v dot"}).status != 0) {
+    GTEST_SKIP() << "dot (graphviz) is not there";
+  }
   const auto file = directory_.write("model.dot", draw("dot").output);
   const Completed drawn = run({"dot", "-Tplain", file.string()});
   ASSERT_EQ(drawn.status, 0) << drawn.errors;
@@ -151,7 +158,9 @@ TEST_F(ModelGraphTest, IsAGraphThatGraphvizTakes) {
   for (const std::string& line : linesOf(std::regex_replace(drawn.output, std::regex("\\\\\n"), ""))) {
     nodes += line.starts_with("node ") ? 1 : 0;
     edges += line.starts_with("edge ") && line.find(" invis ") == std::string::npos ? 1 : 0;
-    if (std::smatch found; std::regex_match(line, found, endpoint)) endpoints[std::stod(found[1])] = found[2];
+    if (std::smatch found; std::regex_match(line, found, endpoint)) {
+      endpoints[std::stod(found[1])] = found[2];
+    }
   }
   EXPECT_EQ(nodes, 14U);
   EXPECT_EQ(edges, 23U);

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The tree that `cmake --install` writes: it serves wherever it is moved to, and is taken away without a rest.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

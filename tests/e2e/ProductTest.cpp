@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The product as it leaves the build: what the library exports and needs, the tools, and the demonstration.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -30,13 +31,17 @@ TEST(CompositeLibraryTest, ExportsExactlyItsEighteenFactories) {
   std::set<std::string> expected;
   for (const char* provider : {"CompositeIPConfigProvider", "IPProtocolendptProvider",
                                "IPConfigAssignmentSettingProvider", "IPConfigStaticAssnSettingDataProvider",
-                               "IPConfigDHCPAssnSettingDataProvider", "IPRemoteServiceAccessPointProvider"})
+                               "IPConfigDHCPAssnSettingDataProvider", "IPRemoteServiceAccessPointProvider"}) {
     expected.insert(std::string(provider) + "_Create_InstanceMI");
-  for (const char* provider : {"IPProtocolHostedAccessPointProvider", "IPRemoteHostedAccessPointProvider",
-                               "IPConfigClientAccessProvider", "IPConfigElementSettingDataProvider",
-                               "IPConfigStaticOrderedMembetOfCollProvider", "IPConfigDHCPOrderedMembetOfCollProvider"})
-    for (const char* kind : {"Instance", "Association"})
+  }
+  for (const char* provider :
+       {"IPProtocolHostedAccessPointProvider", "IPRemoteHostedAccessPointProvider", "IPConfigClientAccessProvider",
+        "IPConfigElementSettingDataProvider", "IPConfigStaticOrderedMembetOfCollProvider",
+        "IPConfigDHCPOrderedMembetOfCollProvider"}) {
+    for (const char* kind : {"Instance", "Association"}) {
       expected.insert(std::string(provider) + "_Create_" + kind + "MI");
+    }
+  }
   EXPECT_EQ(found, expected);
   EXPECT_THAT(expected, SizeIs(18));
 }
@@ -64,7 +69,9 @@ class RegistrationToolTest : public testing::Test {
 
   static std::size_t count(const std::string& text, const std::string& part) {
     std::size_t found = 0;
-    for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) ++found;
+    for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) {
+      ++found;
+    }
     return found;
   }
 
@@ -112,13 +119,17 @@ TEST_F(RegistrationToolTest, NamesEveryFactoryOfTheLibraryAndNoOther) {
   for (std::string line; std::getline(lines, line);) {
     std::istringstream words(line.substr(0, line.find('#')));
     std::string className, nameSpace, provider, location;
-    if (!(words >> className >> nameSpace >> provider >> location)) continue;
-    for (std::string kind; words >> kind;)
+    if (!(words >> className >> nameSpace >> provider >> location)) {
+      continue;
+    }
+    for (std::string kind; words >> kind;) {
       registered.insert(provider + (kind == "instance" ? "_Create_InstanceMI" : "_Create_AssociationMI"));
+    }
   }
   std::set<std::string> exported;
-  for (const std::string& line : linesOf(run({"nm", "-D", "--defined-only", library}).output))
+  for (const std::string& line : linesOf(run({"nm", "-D", "--defined-only", library}).output)) {
     exported.insert(line.substr(line.rfind(' ') + 1));
+  }
   EXPECT_EQ(registered, exported);
 }
 

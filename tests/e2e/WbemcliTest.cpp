@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // cimomd with the probe provider, asked by wbemcli.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
@@ -58,8 +59,9 @@ TEST_F(WbemcliTest, EnumeratesInstancesWithEveryTypeOfProperty) {
                            "-Texts=\"one\",\"two\",\"\"",
                            "-Unset=",
                            "-WithDefault=5",
-                           "-Numbers=14,15"})
+                           "-Numbers=14,15"}) {
     EXPECT_THAT(output, HasSubstr(line));
+  }
 }
 
 TEST_F(WbemcliTest, EnumeratesSubclassesToo) {
@@ -122,10 +124,13 @@ TEST_F(WbemcliTest, GetsAnEmptyAnswerFromAClassWithoutAProvider) { EXPECT_EQ(ask
 
 TEST_F(WbemcliTest, IsServedBesideOthers) {
   std::vector<std::future<Completed>> clients;
-  for (int i = 0; i < 16; ++i)
+  for (int i = 0; i < 16; ++i) {
     clients.push_back(std::async(std::launch::async, [this] { return cimomd_.wbemcli({"ein"}, "TEST_Thing"); }));
+  }
   const std::string expected = ask({"ein"}, "TEST_Thing");
-  for (auto& client : clients) EXPECT_EQ(client.get().output, expected);
+  for (auto& client : clients) {
+    EXPECT_EQ(client.get().output, expected);
+  }
 }
 
 TEST(WbemcliWithPasswordTest, IsServedWhenItIsRight) {

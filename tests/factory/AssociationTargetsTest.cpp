@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The class at the far end of an association: the table, the traces, and the path that is made of it.
 #include "factory/IPConfigObjectFactory.h"
 #include "tests/support/composite/AssociationModel.h"

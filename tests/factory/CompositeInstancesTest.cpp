@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The factory's read pairs, for all six composite classes.
 #include <ostream>
 

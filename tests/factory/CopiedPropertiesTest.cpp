@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What a composite instance of each class carries, property by property.
 #include "tests/support/composite/Samples.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The write to the instrumentation, with a stand-in that records every call and throws where a test wants it.
 #include <gtest/gtest.h>
 

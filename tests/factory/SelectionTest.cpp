@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Which underlying instances belong to the management processor.
 #include <ostream>
 

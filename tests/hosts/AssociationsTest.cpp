@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The six associations, walked from either end.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

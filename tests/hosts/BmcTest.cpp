@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The product on a BMC that answers real IPMI over the network; ipmitool tells what the BMC itself holds.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

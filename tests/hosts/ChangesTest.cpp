@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Changes of address and mask, followed down to what the management processor itself holds.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Many requests over connections that are kept, each answered as the first of its kind was, in memory that stays.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The document's own look at the first endpoint, and its first change, as they stand there.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

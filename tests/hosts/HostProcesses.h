@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The processes of this machine that a test looks at, by /proc.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The six classes of instances, read as a client reads them, compared with what the management processor holds.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What happens to a provider process in its life: it is left idle or disabled, killed, restarted, upgraded, removed.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the first request is answered where a step of the installation was forgotten or something is not as it must be:
 // the document explains every message that comes up here.
 #include <gmock/gmock.h>

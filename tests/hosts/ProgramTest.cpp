@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // hosts_test and private-machine themselves, without an object manager.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

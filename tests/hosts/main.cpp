@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // hosts_test OBJECT_MANAGER [separately]: holds the product in a running object manager. Enters a machine of its own
 // before anything is changed, so that what is installed on this one stays as it is.
 #include <gmock/gmock.h>

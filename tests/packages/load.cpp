@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // load LIBRARY FUNCTION...: loads a provider library as an object manager does and looks up its factories.
 #include <dlfcn.h>
 

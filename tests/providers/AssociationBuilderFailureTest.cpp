@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the six builders do when an end cannot be read or the broker cannot make what they ask for.
 #include <algorithm>
 #include <tuple>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What single builders do beside the pairing: the systems that cannot be had, the flags of element setting data, the
 // markers of ordered members.
 #include "tests/providers/AssociationTest.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the six builders make when nothing goes wrong: pairs, order, properties, paths, up-calls and the frame.
 #include "tests/providers/AssociationTest.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The fixture of the association operations: an association seen from one of its ends, with three instances at the far
 // end that belong to the source.
 #pragma once

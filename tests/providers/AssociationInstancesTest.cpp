@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // GetInstance, EnumInstances and EnumInstanceNames of the six association classes.
 #include <algorithm>
 

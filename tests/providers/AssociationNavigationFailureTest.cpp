@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The four association operations where the model has no far end, the far end cannot be read, or the broker cannot make
 // what they ask for.
 #include <algorithm>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Associators, AssociatorNames, References and ReferenceNames of the six providers, from either end, where the far end
 // can be read.
 #include "tests/providers/AssociationDirection.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The fixture of the association tests: an attached association provider, underlying instances by the names of the
 // composites that they yield, and what an operation delivered, in texts that a test compares.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What object managers do to providers, asked of every unit: the calls of their lives, texts without characters,
 // classes that they do not know, keys that nobody set, values of other types.
 #include <algorithm>

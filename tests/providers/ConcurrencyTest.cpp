@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The whole product in one process, asked from several threads at once: what object managers do. Meant for the thread
 // sanitizer, under which only the frame's two trace buffers may be shared without a lock (tests/tsan.supp).
 #include <cmpimacs.h>

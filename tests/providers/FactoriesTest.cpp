@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The eighteen factories, their function tables, and the operations that no provider of the library carries out.
 #include "tests/support/composite/CompositeTest.h"
 #include "tests/support/composite/Units.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // GetInstance, EnumInstances and EnumInstanceNames of the six composite classes: what reaches the result object, the
 // agent's log and trace, and the broker's trace.
 #include <stdexcept>

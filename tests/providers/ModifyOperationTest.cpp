@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // ModifyInstance of the endpoint, the static settings and the remote access point, down to the instrumentation.
 #include "cimom/broker/Handle.h"
 #include "tests/support/composite/Samples.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // How the association operations of the two ordered members decide by "InstanceID" what belongs together.
 #include "tests/providers/AssociationTest.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The library itself, loaded, used, left and loaded again in one process, as object managers do that unload idle
 // providers.
 #include <dlfcn.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The interface counts in 16 bits: of 65537 instances a walk visits one. Once for every loop of the library that walks
 // over instances. What an object manager is like plays no part, so that these run under the standard personality alone.
 #include <algorithm>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The classes as object managers are given them: what the build wrote below share/.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

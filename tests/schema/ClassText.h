@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What a class declares, as text that two declarations can be compared by.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Holds the subset of the DMTF's schema to the DMTF's own files, where there are some.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // compositeipconfig-register in a tree of its own: what it refuses, and cimomd. tests/hosts has it register in sfcb and
 // OpenPegasus.
 #include <gmock/gmock.h>

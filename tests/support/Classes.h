@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The classes that the library serves, by the names that clients know.
 #pragma once
 

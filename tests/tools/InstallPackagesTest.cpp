@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // tools/install-packages with Debian's own package manager, on a root directory of its own.
 #include <fcntl.h>
 #include <gmock/gmock.h>

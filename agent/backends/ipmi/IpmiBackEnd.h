@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The back end that reaches a management processor through IPMI, in-band or over LAN.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The management processor as one thread sees it: what it is asked, what is kept of its answers, and for how long.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "agent/backends/simulated/FileLock.h"
 
 #include <sys/file.h>

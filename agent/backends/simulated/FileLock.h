@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // An exclusive lock between processes, held while the object lives. A process that dies lets go of it.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The management processor of a machine that has none: a state file that several processes may share.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A file that is always one whole text, the old or the new one, whatever happens to its writers.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The simulated management processor's state as text: JSON that an administrator may read and edit.
 //
 //   { "name": "...", "description": "...", "dnsServers": ["..."],

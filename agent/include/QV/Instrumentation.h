@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The management agent's instrumentation (libqvinstrumentation): a cursor over the management processor's nodes.
 //
 // These declarations are a contract between separately built libraries: another set of libraries with the same symbols

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The management agent's provider helpers (libqvhelper): what the composite providers ask of it.
 //
 // These declarations are a contract between separately built libraries: another set of libraries with the same symbols

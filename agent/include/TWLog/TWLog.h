@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The management agent's logging library (libtwlog): a log and a trace, filtered by component and level.
 //
 // These declarations are a contract between separately built libraries: another set of libraries with the same symbols

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Which back end agent.ini chooses, and what is said if it cannot be had. A process has one back end, so each case
 // runs in a child, on a copy of the instrumentation library beside which the case puts what it needs.
 #include <dlfcn.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A back end in a shared object of its own: a processor whose name is what the setting "name" says.
 #include "agent/processor/BackEnd.h"
 #include "ground/Settings.h"

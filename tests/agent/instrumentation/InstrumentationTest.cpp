@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The instrumentation as its callers have it: the shared library behind its contract, on the simulated processor.
 #include <QV/Instrumentation.h>
 #include <gmock/gmock.h>

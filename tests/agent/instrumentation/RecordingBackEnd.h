@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The simulated processor with a record of what reaches it, and a switch that makes it unreachable.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the agent's own code reports reaches both channels alike. agent.ini is read once in a process, so each case runs
 // in a child.
 #include <gmock/gmock.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The logging library as its callers have it: the shared library behind its contract. agent.ini is read once in a
 // process, so each case that needs one of its own runs in a child.
 #include <TWLog/TWLog.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The underlying provider in an object manager that hands out what it should not: null objects with a good status, good
 // objects with a bad one, nulls for paths, names and results. Every request ends with a status, and nothing is followed
 // that is not there.

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The underlying provider as an object manager has it: the shared library behind its factory, loaded into a real
 // broker, on the simulated processor.
 #include <QV/Instrumentation.h>

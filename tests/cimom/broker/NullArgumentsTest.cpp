@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Every slot of every table, with a null in the place of an object, a name or a status: a code, never a crash.
 #include <functional>
 

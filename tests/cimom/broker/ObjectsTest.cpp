@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "cimom/broker/Handle.h"
 #include "tests/support/broker/ManagedElements.h"
 #include "tests/support/broker/RecordingProvider.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The schema as clients read it.
 #include "tests/cimom/cimxml/EndpointTest.h"
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "tests/cimom/cimxml/EndpointTest.h"
 
 #include <cmpimacs.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The intrinsic methods, against the probe provider.
 #include <cmpidt.h>
 

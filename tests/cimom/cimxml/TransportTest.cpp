@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What makes a request a CIM operation over HTTP, and what is said of one that is none.
 #include "tests/cimom/cimxml/EndpointTest.h"
 

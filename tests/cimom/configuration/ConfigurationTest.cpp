@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What cimomd works with: its command line, the configuration file, and what is installed beside it.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A request's body, as any client on the network can send it: what the reader takes goes on to the object manager with
 // the probe's classes; what it does not take is refused with a TransportError and nothing else.
 #include <cstddef>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Feeds the MOF reader any bytes: it returns classes or throws a ConfigurationError that names the text, and nothing
 // else.
 #include <cstddef>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Addresses as tests write them, and as a failed expectation shows them.
 #pragma once
 

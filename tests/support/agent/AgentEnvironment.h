@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // An agent of its own for a test program: an agent.ini whose simulated processor, log and trace lie in a temporary
 // directory, which shows the host, too, and whose log does not say once in a process that the processor is simulated.
 // The agent's libraries read agent.ini once in a process, so it is put in place before the first test.

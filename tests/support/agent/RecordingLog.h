@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Stands in for the agent's logging library: keeps every line that reaches either channel, in order.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A BMC for tests: OpenIPMI's simulator, which speaks RMCP+ over UDP like a real one, run by tools/ipmi-sim-bmc.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A wire between a client and a BMC that counts what goes over it and can be cut.
 #pragma once
 

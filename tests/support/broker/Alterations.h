@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Objects of the broker that answer otherwise than the broker made them: each keeps its own table, replaced in part.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A broker whose up-calls a test scripts and whose makers a test can make fail. Everything else is the real broker's,
 // with the running personality.
 #pragma once

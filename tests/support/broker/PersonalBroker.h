@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The embedded object manager's broker with the running personality: what it and every object that it hands out answer
 // where object managers differ. All else is the real broker's.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The objects of the embedded object manager with the function tables of the running personality.
 #pragma once
 

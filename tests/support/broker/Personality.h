@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // How the object managers differ in what a provider can see of them. Nothing here is the library's doing: where a
 // test's expectation depends on the object manager, it asks the row of the running one.
 #pragma once

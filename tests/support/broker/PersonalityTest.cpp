@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // That the broker of the tests is like the object manager whose name it bears: what a provider sees of it, row by row.
 #include <stdexcept>
 

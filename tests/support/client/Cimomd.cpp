@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "tests/support/client/Cimomd.h"
 
 #include <signal.h>
@@ -34,8 +35,9 @@ Cimomd::Cimomd(const std::vector<std::string>& options, const Environment& envir
     return output.ends_with('\n') || !process_.isRunning();
   });
   const auto colon = output.rfind(':');
-  if (!output.starts_with("listening on ") || colon == std::string::npos)
+  if (!output.starts_with("listening on ") || colon == std::string::npos) {
     throw std::runtime_error("cimomd does not listen: " + process_.errors());
+  }
   port_ = static_cast<std::uint16_t>(std::stoul(output.substr(colon + 1)));
 }
 

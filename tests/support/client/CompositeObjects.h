@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The composite's objects as wbemcli prints and takes them, without host and namespace: keys in the schema's order.
 #pragma once
 

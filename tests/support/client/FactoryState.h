@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What the composite shows of a simulated management processor in its factory state, as wbemcli prints it: the
 // instances of each class with their values, and how the associations relate them.
 #pragma once

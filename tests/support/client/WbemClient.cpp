@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "tests/support/client/WbemClient.h"
 
 #include <gtest/gtest.h>
@@ -9,8 +10,11 @@ namespace Testing {
 std::vector<std::string> linesOf(const std::string& output) {
   std::vector<std::string> lines;
   std::istringstream stream(output);
-  for (std::string line; std::getline(stream, line);)
-    if (!line.empty()) lines.push_back(line);
+  for (std::string line; std::getline(stream, line);) {
+    if (!line.empty()) {
+      lines.push_back(line);
+    }
+  }
   return lines;
 }
 
@@ -24,7 +28,9 @@ std::vector<Printed> instancesOf(const std::string& output) {
     const auto equals = line.find('=');
     const std::string name = line.substr(1, equals - 1);
     instances.back().names.push_back(name);
-    if (equals + 1 < line.size()) instances.back().values[name] = line.substr(equals + 1);
+    if (equals + 1 < line.size()) {
+      instances.back().values[name] = line.substr(equals + 1);
+    }
   }
   return instances;
 }

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What each of the six associations must do: the tests' own statement, which shares nothing with the product's.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The ground that the library's tests stand on: its own objects in front of the embedded object manager's real broker,
 // with the product's schema and the running personality, scripted underlying instances, and every line, call and result
 // recorded.

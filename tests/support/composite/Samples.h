@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Underlying instances that the composite takes, for each of its six classes.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Stands in for the agent's instrumentation: nodes as a test scripts them, every call recorded in order, an exception
 // at any of them on demand.
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The twelve provider units as the tests drive them: their factories, names and classes.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A library that loads, with one factory of the two that a provider may have.
 #include <cmpift.h>
 

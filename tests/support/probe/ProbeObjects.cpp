@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "tests/support/probe/ProbeObjects.h"
 
 #include <cmpimacs.h>
@@ -30,7 +31,9 @@ void setTexts(const CMPIBroker* broker, CMPIInstance* instance, bool withNull) {
   CMPIValue texts{};
   texts.array = CMNewArray(broker, 3, CMPI_string, nullptr);
   CMSetArrayElementAt(texts.array, 0, "one", CMPI_chars);
-  if (!withNull) CMSetArrayElementAt(texts.array, 1, "two", CMPI_chars);
+  if (!withNull) {
+    CMSetArrayElementAt(texts.array, 1, "two", CMPI_chars);
+  }
   CMSetArrayElementAt(texts.array, 2, "", CMPI_chars);
   CMSetProperty(instance, "Texts", &texts, CMPI_stringA);
 }
@@ -88,7 +91,9 @@ CMPIInstance* numbered(const CMPIBroker* broker, const char* nameSpace) {
 }
 
 bool sameValue(const CMPIData& one, const CMPIData& other) {
-  if (one.type != other.type) return false;
+  if (one.type != other.type) {
+    return false;
+  }
   switch (one.type) {
     case CMPI_ref:
       return same(one.value.ref, other.value.ref);
@@ -128,22 +133,33 @@ std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjec
   const std::string nameSpace = chars(CMGetNameSpace(path, nullptr));
   const std::string className = chars(CMGetClassName(path, nullptr));
   const auto is = [&className](const char* name) { return strcasecmp(className.c_str(), name) == 0; };
-  if (is("TEST_Thing"))
+  if (is("TEST_Thing")) {
     return {thing(broker, nameSpace.c_str(), "TEST_Thing", 1), thing(broker, nameSpace.c_str(), "TEST_Thing", 2)};
-  if (is("TEST_Part")) return {thing(broker, nameSpace.c_str(), "TEST_Part", 3)};
-  if (is("TEST_Link")) return {link(broker, nameSpace.c_str())};
-  if (is("TEST_Numbered")) return {numbered(broker, nameSpace.c_str())};
+  }
+  if (is("TEST_Part")) {
+    return {thing(broker, nameSpace.c_str(), "TEST_Part", 3)};
+  }
+  if (is("TEST_Link")) {
+    return {link(broker, nameSpace.c_str())};
+  }
+  if (is("TEST_Numbered")) {
+    return {numbered(broker, nameSpace.c_str())};
+  }
   return {};
 }
 
 bool same(const CMPIObjectPath* one, const CMPIObjectPath* other) {
   const std::string className = chars(CMGetClassName(one, nullptr));
   const CMPICount count = CMGetKeyCount(one, nullptr);
-  if (strcasecmp(className.c_str(), chars(CMGetClassName(other, nullptr)).c_str()) != 0) return false;
+  if (strcasecmp(className.c_str(), chars(CMGetClassName(other, nullptr)).c_str()) != 0) {
+    return false;
+  }
   for (CMPICount i = 0; i < count; ++i) {
     CMPIString* name = nullptr;
     const CMPIData key = CMGetKeyAt(one, i, &name, nullptr);
-    if (!sameValue(key, CMGetKey(other, chars(name).c_str(), nullptr))) return false;
+    if (!sameValue(key, CMGetKey(other, chars(name).c_str(), nullptr))) {
+      return false;
+    }
   }
   return count == CMGetKeyCount(other, nullptr);
 }

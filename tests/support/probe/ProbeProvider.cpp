@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A CMPI provider for the tests of cimomd. Where the environment variable PROBE_DIRECTORY names a directory, the
 // provider tells there by files what it does: "reached" once a request for TEST_Slow waits, which it does until there
 // is a file "go", and "cleaned" once it has been cleaned up.
@@ -24,14 +25,17 @@ std::filesystem::path file(const char* name) {
 }
 
 void tell(const char* name) {
-  if (const auto path = file(name); !path.empty()) std::ofstream(path) << name;
+  if (const auto path = file(name); !path.empty()) {
+    std::ofstream(path) << name;
+  }
 }
 
 void waitForGo() {
   tell("reached");
   const auto deadline = std::chrono::steady_clock::now() + 60s;
-  while (!std::filesystem::exists(file("go")) && std::chrono::steady_clock::now() < deadline)
+  while (!std::filesystem::exists(file("go")) && std::chrono::steady_clock::now() < deadline) {
     std::this_thread::sleep_for(5ms);
+  }
 }
 
 bool isClass(const CMPIObjectPath* path, const char* name) {
@@ -40,8 +44,12 @@ bool isClass(const CMPIObjectPath* path, const char* name) {
 
 // What the classes that behave badly do.
 CMPIStatus behave(const CMPIObjectPath* path) {
-  if (isClass(path, "TEST_Slow")) waitForGo();
-  if (isClass(path, "TEST_Failing")) CMReturnWithChars(broker, CMPI_RC_ERR_ACCESS_DENIED, "out of <order>");
+  if (isClass(path, "TEST_Slow")) {
+    waitForGo();
+  }
+  if (isClass(path, "TEST_Failing")) {
+    CMReturnWithChars(broker, CMPI_RC_ERR_ACCESS_DENIED, "out of <order>");
+  }
   CMReturn(CMPI_RC_OK);
 }
 
@@ -53,24 +61,34 @@ CMPIStatus ProbeCleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) {
 CMPIStatus ProbeEnumInstances(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* path,
                               const char**) {
   const CMPIStatus status = behave(path);
-  if (status.rc != CMPI_RC_OK) return status;
-  for (const CMPIInstance* instance : Probe::instancesOf(broker, path)) CMReturnInstance(result, instance);
+  if (status.rc != CMPI_RC_OK) {
+    return status;
+  }
+  for (const CMPIInstance* instance : Probe::instancesOf(broker, path)) {
+    CMReturnInstance(result, instance);
+  }
   return CMReturnDone(result);
 }
 
 CMPIStatus ProbeEnumInstanceNames(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result,
                                   const CMPIObjectPath* path) {
   const CMPIStatus status = behave(path);
-  if (status.rc != CMPI_RC_OK) return status;
-  for (const CMPIInstance* instance : Probe::instancesOf(broker, path))
+  if (status.rc != CMPI_RC_OK) {
+    return status;
+  }
+  for (const CMPIInstance* instance : Probe::instancesOf(broker, path)) {
     CMReturnObjectPath(result, CMGetObjectPath(instance, nullptr));
+  }
   return CMReturnDone(result);
 }
 
 CMPIStatus ProbeGetInstance(CMPIInstanceMI*, const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* path,
                             const char**) {
-  for (const CMPIInstance* instance : Probe::instancesOf(broker, path))
-    if (Probe::same(path, CMGetObjectPath(instance, nullptr))) CMReturnInstance(result, instance);
+  for (const CMPIInstance* instance : Probe::instancesOf(broker, path)) {
+    if (Probe::same(path, CMGetObjectPath(instance, nullptr))) {
+      CMReturnInstance(result, instance);
+    }
+  }
   return CMReturnDone(result);
 }
 
@@ -108,7 +126,9 @@ CMPIObjectPath* farEnd(const CMPIObjectPath* source) {
   const CMPIInstance* link = theLink(source);
   CMPIObjectPath* whole = CMGetProperty(link, "Whole", nullptr).value.ref;
   CMPIObjectPath* part = CMGetProperty(link, "Part", nullptr).value.ref;
-  if (Probe::same(source, whole)) return part;
+  if (Probe::same(source, whole)) {
+    return part;
+  }
   return Probe::same(source, part) ? whole : nullptr;
 }
 
@@ -116,27 +136,37 @@ CMPIStatus ProbeAssociators(CMPIAssociationMI*, const CMPIContext*, const CMPIRe
                             const CMPIObjectPath* source, const char*, const char*, const char*, const char*,
                             const char**) {
   const CMPIObjectPath* end = farEnd(source);
-  if (end)
-    for (const CMPIInstance* instance : Probe::instancesOf(broker, end))
-      if (Probe::same(end, CMGetObjectPath(instance, nullptr))) CMReturnInstance(result, instance);
+  if (end) {
+    for (const CMPIInstance* instance : Probe::instancesOf(broker, end)) {
+      if (Probe::same(end, CMGetObjectPath(instance, nullptr))) {
+        CMReturnInstance(result, instance);
+      }
+    }
+  }
   return CMReturnDone(result);
 }
 
 CMPIStatus ProbeAssociatorNames(CMPIAssociationMI*, const CMPIContext*, const CMPIResult* result,
                                 const CMPIObjectPath* source, const char*, const char*, const char*, const char*) {
-  if (const CMPIObjectPath* end = farEnd(source)) CMReturnObjectPath(result, end);
+  if (const CMPIObjectPath* end = farEnd(source)) {
+    CMReturnObjectPath(result, end);
+  }
   return CMReturnDone(result);
 }
 
 CMPIStatus ProbeReferences(CMPIAssociationMI*, const CMPIContext*, const CMPIResult* result,
                            const CMPIObjectPath* source, const char*, const char*, const char**) {
-  if (farEnd(source)) CMReturnInstance(result, theLink(source));
+  if (farEnd(source)) {
+    CMReturnInstance(result, theLink(source));
+  }
   return CMReturnDone(result);
 }
 
 CMPIStatus ProbeReferenceNames(CMPIAssociationMI*, const CMPIContext*, const CMPIResult* result,
                                const CMPIObjectPath* source, const char*, const char*) {
-  if (farEnd(source)) CMReturnObjectPath(result, CMGetObjectPath(theLink(source), nullptr));
+  if (farEnd(source)) {
+    CMReturnObjectPath(result, CMGetObjectPath(theLink(source), nullptr));
+  }
   return CMReturnDone(result);
 }
 

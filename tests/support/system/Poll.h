@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #pragma once
 
 #include <chrono>
@@ -10,7 +11,9 @@ template <typename Condition>
 bool poll(Condition condition, std::chrono::milliseconds patience = std::chrono::seconds(30)) {
   const auto deadline = std::chrono::steady_clock::now() + patience;
   while (!condition()) {
-    if (std::chrono::steady_clock::now() > deadline) return false;
+    if (std::chrono::steady_clock::now() > deadline) {
+      return false;
+    }
     std::this_thread::sleep_for(std::chrono::milliseconds(2));
   }
   return true;

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A fresh directory for one test, removed with all that is in it, and files in it.
 #pragma once
 
@@ -16,7 +17,9 @@ class TemporaryDirectory {
  public:
   TemporaryDirectory() {
     std::string name = (std::filesystem::temp_directory_path() / "ipconfig-test-XXXXXX").string();
-    if (!::mkdtemp(name.data())) throw std::system_error(errno, std::generic_category(), "mkdtemp " + name);
+    if (!::mkdtemp(name.data())) {
+      throw std::system_error(errno, std::generic_category(), "mkdtemp " + name);
+    }
     path_ = name;
   }
   ~TemporaryDirectory() {

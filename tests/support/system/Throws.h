@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The text of what an operation throws; a failed expectation where it throws nothing.
 #pragma once
 

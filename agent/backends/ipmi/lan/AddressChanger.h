@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A change of an interface's address from the first look to the confirmation that it holds.
 #pragma once
 

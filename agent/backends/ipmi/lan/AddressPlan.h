@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // From the address settings that a channel has and the change that is asked for to the parameters that must be written.
 #pragma once
 

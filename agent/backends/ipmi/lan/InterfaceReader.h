@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // One LAN channel of the processor as an interface of the agent's model.
 #pragma once
 

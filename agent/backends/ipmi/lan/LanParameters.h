@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The LAN configuration parameters of a channel (IPMI 2.0, 23.1 and 23.2, table 23-4), as raw requests.
 #pragma once
 

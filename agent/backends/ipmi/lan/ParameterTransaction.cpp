@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "agent/backends/ipmi/lan/ParameterTransaction.h"
 
 #include "agent/backends/ipmi/lan/LanParameters.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Several LAN parameters of one channel written under the processor's set-in-progress lock (IPMI 2.0, table 23-4,
 // parameter 0).
 #pragma once

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The moment by which an operation of the processor has ended, whatever the hardware does.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The way to the processor over many operations: holds one session, opens another where it broke, counts what goes over
 // the wire and keeps every operation to its time.
 #pragma once

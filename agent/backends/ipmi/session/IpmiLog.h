@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The back end's lines in the agent's log and trace, under the component "Tarnwick.Ipmi".
 #pragma once
 

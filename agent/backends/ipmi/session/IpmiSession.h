@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // One open session with the management processor: the thin layer over libfreeipmi.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // How requests reach the management processor and answers come back: one at a time, in the manner of IPMI.
 #pragma once
 

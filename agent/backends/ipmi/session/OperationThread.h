@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The thread on which the processor is asked. libfreeipmi and the operating system's driver block for longer than a
 // caller may wait; here it is the thread that stays behind, while the caller leaves at its deadline.
 #pragma once

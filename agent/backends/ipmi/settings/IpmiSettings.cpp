@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "agent/backends/ipmi/settings/IpmiSettings.h"
 
 #include <freeipmi/freeipmi.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The [ipmi] section of agent.ini: how the management processor is reached and how long it may take.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "agent/backends/ipmi/settings/SecretFile.h"
 
 #include <fcntl.h>

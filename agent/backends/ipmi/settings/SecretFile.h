@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Passwords and keys lie in files of their own, so that the configuration may be read by everybody.
 #pragma once
 

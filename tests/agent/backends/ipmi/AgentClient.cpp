@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // agent_client: does what standard input says with the agent's instrumentation and answers each line with one.
 //   read                  "lan1 192.0.2.10/255.255.255.0", interface by interface
 //   change ADDRESS MASK   changes the first interface; "done"

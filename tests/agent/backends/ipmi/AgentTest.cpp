@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The agent as it is installed: agent.ini says ipmi, and the instrumentation loads the back end and shows the real BMC.
 #include <QV/Instrumentation.h>
 #include <gmock/gmock.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Changing the address of a real RMCP+ server, with ipmitool as the witness.
 #include <gmock/gmock.h>
 

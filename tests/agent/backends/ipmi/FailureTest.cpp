@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What goes wrong between the agent and its BMC: every operation ends in its time, and the next one after the recovery
 // works.
 #include <gmock/gmock.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Object managers run provider libraries in processes of their own: here the agent is in two, one that changes and one
 // that reads, and each keeps its own look at the BMC.
 #include <gmock/gmock.h>

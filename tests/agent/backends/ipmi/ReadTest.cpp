@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Reading a real RMCP+ server.
 #include <gmock/gmock.h>
 

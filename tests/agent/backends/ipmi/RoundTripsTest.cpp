@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What a read costs, counted on the wire: over a real network the round trips are the cost.
 #include <gmock/gmock.h>
 

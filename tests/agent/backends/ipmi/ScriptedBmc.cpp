@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 #include "tests/agent/backends/ipmi/ScriptedBmc.h"
 
 #include "agent/backends/ipmi/lan/LanParameters.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A BMC of any temper, for those that the simulator does not have: it answers requests directly.
 #pragma once
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // state_writer STATE INTERFACE NETWORK CHANGES: changes the interface's address and mask that many times, 0 for ever,
 // between NETWORK.1 with 255.255.255.0 and NETWORK.2 with 255.255.0.0 and so on. A line goes to standard output before
 // the first change. Fails if a change that was confirmed is not there when it is read back.

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // Processes that share a state file: killed in the middle of their work, and side by side.
 #include <gtest/gtest.h>
 #include <signal.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // A change on BMCs of every temper.
 #include <gmock/gmock.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // What a channel's parameters make of an interface.
 #include <gmock/gmock.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: Apache-2.0
 // The [ipmi] section: defaults, forms, and refusals that name key, value and reason.
 #include <gmock/gmock.h>
 
