@@ -34,8 +34,8 @@ void ObjectManager::loadSchemaText(std::string_view mof, std::string_view nameSp
   parts_->core.classes.addNamespace(nameSpace);
 }
 
-void ObjectManager::loadRegistration(const std::filesystem::path& file) {
-  for (const ProviderRegistration& registration : readRegistration(file)) {
+void ObjectManager::loadRegistration(const std::filesystem::path& fileOrDirectory) {
+  for (const ProviderRegistration& registration : readRegistration(fileOrDirectory)) {
     parts_->router.providers().add(registration);
     parts_->addNamespaces(registration);
   }

@@ -28,9 +28,9 @@ class ObjectManager {
   // Reads MOF from a text and makes the namespace known.
   void loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin = "text");
 
-  // Reads a registration file (ProviderRegistration.h) and makes its namespaces known.
+  // Reads a registration file, or every *.reg of a directory (ProviderRegistration.h), and makes the namespaces known.
   // Throws ConfigurationError "FILE:LINE: what is wrong".
-  void loadRegistration(const std::filesystem::path& file);
+  void loadRegistration(const std::filesystem::path& fileOrDirectory);
   // Where libraries are looked for, after the directories added before.
   void addProviderDirectory(const std::filesystem::path& directory);
   // Registers a provider that is linked into this program; a factory of a type that the registration does not name

@@ -110,7 +110,7 @@ void serve(const Configuration& configuration, const EndSignals& endSignals) {
 
 int main(int argc, char** argv) {
   try {
-    const auto configuration = readCommandLine(argc, argv);
+    const auto configuration = readCommandLine(argc, argv, thisInstallation());
     if (!configuration) {
       return 0;
     }

@@ -17,14 +17,17 @@
 namespace QV {
 namespace {
 
-// A back end's library lies beside this one; the plain name lets the loader's own search find it elsewhere.
+// Back ends are installed in a directory of their own beside this library, and built into the same one; the plain name
+// lets the loader's own search find it elsewhere.
 std::string pathOf(const std::string& libraryName) {
   Dl_info self{};
   if (::dladdr(reinterpret_cast<const void*>(&sharedBackEnd), &self) != 0 && self.dli_fname) {
-    const auto neighbour = std::filesystem::absolute(self.dli_fname).parent_path() / libraryName;
-    std::error_code unreadable;
-    if (std::filesystem::exists(neighbour, unreadable)) {
-      return neighbour;
+    const auto here = std::filesystem::absolute(self.dli_fname).parent_path();
+    for (const auto& directory : {here / "compositeipconfig", here}) {
+      std::error_code unreadable;
+      if (std::filesystem::exists(directory / libraryName, unreadable)) {
+        return directory / libraryName;
+      }
     }
   }
   return libraryName;

@@ -9,6 +9,7 @@
 #include <limits>
 #include <map>
 #include <string_view>
+#include <system_error>
 #include <utility>
 
 #include "ground/IniFile.h"
@@ -79,7 +80,8 @@ const std::vector<Setting>& settings() {
       {"port", "N", "port to listen on; 0: any free port (5988)", false, number(&Configuration::port, 0, 65535)},
       {"schema", "PATH", "MOF file, or directory of *.mof files, with the classes", true,
        paths(&Configuration::schemas)},
-      {"registration", "FILE", "which provider serves which class", true, paths(&Configuration::registrations)},
+      {"registration", "PATH", "file, or directory of *.reg files: which provider serves which class", true,
+       paths(&Configuration::registrations)},
       {"provider-dir", "DIR", "directory with the providers' libraries", true,
        paths(&Configuration::providerDirectories)},
       {"max-request-size", "BYTES", "largest body of a request (4194304)", false,
@@ -126,7 +128,20 @@ GivenValues readConfigurationFile(const std::filesystem::path& file) {
   return values;
 }
 
-Configuration toConfiguration(const GivenValues& given) {
+void useInstalled(std::vector<std::filesystem::path>& paths, const char* setting,
+                  const std::filesystem::path& installed) {
+  if (!paths.empty()) {
+    return;
+  }
+  std::error_code unreadable;
+  if (!std::filesystem::exists(installed, unreadable)) {
+    throw UsageError(std::string("--") + setting + ": must be given, because " + installed.string() +
+                     ", where it is installed, cannot be read or does not exist");
+  }
+  paths.push_back(installed);
+}
+
+Configuration toConfiguration(const GivenValues& given, const Installation& installation) {
   Configuration configuration;
   for (const Setting& setting : settings()) {
     const auto values = given.find(std::string_view(setting.name));
@@ -143,16 +158,23 @@ Configuration toConfiguration(const GivenValues& given) {
   if (configuration.tlsCertificate.empty() != configuration.tlsKey.empty()) {
     throw UsageError("tls-certificate and tls-key must be given together");
   }
+  useInstalled(configuration.schemas, "schema", installation.schema);
+  useInstalled(configuration.registrations, "registration", installation.registration);
+  useInstalled(configuration.providerDirectories, "provider-dir", installation.providerDirectory);
   return configuration;
 }
 
 }  // namespace
 
-std::optional<Configuration> readCommandLine(int argc, const char* const* argv) {
+std::optional<Configuration> readCommandLine(int argc, const char* const* argv, const Installation& installation) {
   CLI::App app("A CIM object manager for CMPI 2.0 providers: serves CIM-XML over HTTP.", "cimomd");
   app.set_version_flag("--version", "cimomd " CIMOMD_VERSION);
   std::string file;
-  app.add_option("--config", file, "configuration file: the options below as \"key = value\" lines")->type_name("FILE");
+  const std::string installedFile = installation.configurationFile.string();
+  const CLI::Option* fileOption =
+      app.add_option("--config", file,
+                     "configuration file: the options below as \"key = value\" lines (" + installedFile + ")")
+          ->type_name("FILE");
   std::map<std::string, std::vector<std::string>> texts;
   for (const Setting& setting : settings()) {
     app.add_option("--" + std::string(setting.name), texts[setting.name], setting.help)
@@ -168,8 +190,18 @@ std::optional<Configuration> readCommandLine(int argc, const char* const* argv) 
     throw UsageError(error.what());
   }
   GivenValues values;
-  if (!file.empty()) {
+  std::error_code unreadable;
+  if (!fileOption->empty()) {
+    if (file.empty()) {
+      throw UsageError("--config: must not be empty");
+    }
     values = readConfigurationFile(file);
+  } else if (std::filesystem::status(installation.configurationFile, unreadable).type() !=
+             std::filesystem::file_type::not_found) {
+    values = readConfigurationFile(installation.configurationFile);
+  } else if (argc < 2) {
+    throw UsageError("nothing to serve: write " + installedFile +
+                     " (cimomd.ini.sample shows every key), name another file with --config, or give options (--help)");
   }
   for (const auto& [name, given] : texts) {
     if (given.empty()) {
@@ -181,7 +213,7 @@ std::optional<Configuration> readCommandLine(int argc, const char* const* argv) 
       taken.push_back({text, "--" + name, {}});
     }
   }
-  return toConfiguration(values);
+  return toConfiguration(values, installation);
 }
 
 }  // namespace Cimom

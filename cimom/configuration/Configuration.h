@@ -9,6 +9,8 @@
 #include <string>
 #include <vector>
 
+#include "cimom/configuration/Installation.h"
+
 namespace Cimom {
 
 // What cimomd works with, from its command line and its configuration file.
@@ -33,10 +35,11 @@ class UsageError : public std::runtime_error {
   using std::runtime_error::runtime_error;
 };
 
-// Reads cimomd's command line and the configuration file that it names: `key = value` lines, the keys named as the
-// options are; what the command line says replaces what the file says, and a relative path in the file is relative to
-// the file's directory. Returns nothing when help or the version was asked for, and has been printed.
-// Throws UsageError.
-std::optional<Configuration> readCommandLine(int argc, const char* const* argv);
+// Reads cimomd's command line and the configuration file that it names, or the installed one where it names none:
+// `key = value` lines, the keys named as the options are; what the command line says replaces what the file says, and a
+// relative path in the file is relative to the file's directory. Schema, registration and provider directory are the
+// installed ones where neither says otherwise; with no option and no file there is nothing to serve, which is an error.
+// Returns nothing when help or the version was asked for, and has been printed. Throws UsageError.
+std::optional<Configuration> readCommandLine(int argc, const char* const* argv, const Installation& installation);
 
 }  // namespace Cimom

@@ -1,15 +1,20 @@
 #include "cimom/providers/ProviderRegistration.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <fstream>
+#include <iterator>
 #include <sstream>
 #include <string_view>
+#include <system_error>
 
 #include "cimom/model/Errors.h"
 
 namespace Cimom {
 namespace {
+
+namespace fs = std::filesystem;
 
 std::string_view trimmed(std::string_view text) {
   constexpr std::string_view blanks = " \t\r\v\f";
@@ -139,18 +144,49 @@ class StanzaReader {
   std::vector<ProviderRegistration> done_;
 };
 
-}  // namespace
-
-std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& file) {
+std::vector<ProviderRegistration> readFile(const fs::path& file) {
   std::ifstream stream(file);
   StanzaReader reader(file.string());
-  if (!stream || std::filesystem::is_directory(file)) {
+  if (!stream || fs::is_directory(file)) {
     throw ConfigurationError(file.string() + ": " + (stream ? "is a directory" : std::strerror(errno)));
   }
   for (std::string line; std::getline(stream, line);) {
     reader.line(line);
   }
   return reader.finish();
+}
+
+std::vector<fs::path> registrationsIn(const fs::path& directory) {
+  std::vector<fs::path> files;
+  std::error_code unreadable;
+  for (fs::directory_iterator entry(directory, unreadable), end; !unreadable && entry != end;
+       entry.increment(unreadable)) {
+    if (entry->path().extension() == ".reg") {
+      files.push_back(entry->path());
+    }
+  }
+  if (unreadable) {
+    throw ConfigurationError(directory.string() + ": cannot be read: " + unreadable.message());
+  }
+  if (files.empty()) {
+    throw ConfigurationError(directory.string() + ": contains no *.reg file");
+  }
+  std::ranges::sort(files);
+  return files;
+}
+
+}  // namespace
+
+std::vector<ProviderRegistration> readRegistration(const fs::path& fileOrDirectory) {
+  std::error_code unreadable;
+  if (!fs::is_directory(fileOrDirectory, unreadable)) {
+    return readFile(fileOrDirectory);
+  }
+  std::vector<ProviderRegistration> all;
+  for (const fs::path& file : registrationsIn(fileOrDirectory)) {
+    std::ranges::move(readFile(file), std::back_inserter(all));
+  }
+  return all;
 }
 
 }  // namespace Cimom

@@ -24,7 +24,7 @@ struct ProviderRegistration {
 using InstanceFactory = std::function<CMPIInstanceMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
 using AssociationFactory = std::function<CMPIAssociationMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
 
-// Reads a registration file: one stanza per class,
+// Reads a registration file, or every *.reg of a directory: one stanza per class,
 //
 //     [ClassName]
 //        provider: ProviderName
@@ -35,6 +35,6 @@ using AssociationFactory = std::function<CMPIAssociationMI*(const CMPIBroker*, c
 //
 // `#` starts a comment; `group`, which other object managers take for their processes, is accepted and means nothing.
 // Throws ConfigurationError "FILE:LINE: what is wrong".
-std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& file);
+std::vector<ProviderRegistration> readRegistration(const std::filesystem::path& fileOrDirectory);
 
 }  // namespace Cimom

@@ -20,6 +20,14 @@ class CommandLineTest : public testing::Test {
     return run(arguments);
   }
 
+  // With all that it takes to serve, so that what follows is refused for what it is.
+  static void expectFailure(const std::vector<std::string>& options, const std::string& mentioned) {
+    std::vector<std::string> arguments = Cimomd::probeOptions();
+    arguments.insert(arguments.end(), {"--config", "/dev/null", "--port", "0"});
+    arguments.insert(arguments.end(), options.begin(), options.end());
+    expectRefused(arguments, 1, mentioned);
+  }
+
   static void expectRefused(const std::vector<std::string>& arguments, int status, const std::string& mentioned) {
     const Completed completed = cimomd(arguments);
     EXPECT_EQ(completed.status, status) << completed.errors;
@@ -69,25 +77,36 @@ TEST_F(CommandLineTest, IsRefusedForWhatTheFileSays) {
 }
 
 TEST_F(CommandLineTest, FailsWithStatusOneForWhatItIsGiven) {
-  expectRefused({"--port", "0", "--schema", "/nowhere.mof"}, 1, "/nowhere.mof");
-  expectRefused({"--port", "0", "--schema", directory_.write("bad.mof", "class {").string()}, 1, "bad.mof:1");
-  expectRefused({"--port", "0", "--registration", "/nowhere.reg"}, 1, "/nowhere.reg");
-  expectRefused({"--port", "0", "--address", "localhost"}, 1, "localhost");
-  expectRefused({"--port", "0", "--address", "192.0.2.1"}, 1, "192.0.2.1");
-  expectRefused({"--port", "0", "--password-file", "/nowhere"}, 1, "/nowhere");
-  expectRefused({"--port", "0", "--tls-certificate", "/nowhere", "--tls-key", "/nowhere"}, 1, "/nowhere");
+  expectFailure({"--schema", "/nowhere.mof"}, "/nowhere.mof");
+  expectFailure({"--schema", directory_.write("bad.mof", "class {").string()}, "bad.mof:1");
+  expectFailure({"--registration", "/nowhere.reg"}, "/nowhere.reg");
+  expectFailure({"--registration", directory_.path().string()}, "contains no *.reg file");
+  expectFailure({"--address", "localhost"}, "localhost");
+  expectFailure({"--address", "192.0.2.1"}, "192.0.2.1");
+  expectFailure({"--password-file", "/nowhere"}, "/nowhere");
+  expectFailure({"--tls-certificate", "/nowhere", "--tls-key", "/nowhere"}, "/nowhere");
+}
+
+TEST_F(CommandLineTest, IsRefusedWhereNothingIsInstalledBesideTheProgram) {
+  // The build's program stands beside no classes and no providers.
+  expectRefused({"--config", "/dev/null", "--port", "0"}, 2, "--schema: must be given, because ");
+  expectRefused({"--config", "/dev/null", "--schema", SOURCE_DIR "/tests/support/probe/Probe.mof"}, 2,
+                "--registration: must be given, because ");
+  expectRefused({"--config", ""}, 2, "--config");
 }
 
 TEST_F(CommandLineTest, FailsForAProviderWithoutALibrary) {
   auto options = Cimomd::probeOptions();
   options.back() = directory_.path().string();
-  options.insert(options.end(), {"--port", "0"});
+  options.insert(options.end(), {"--config", "/dev/null", "--port", "0"});
   expectRefused(options, 1, "cimomprobe");
 }
 
 TEST_F(CommandLineTest, FailsForAPortThatIsTaken) {
-  const Cimomd first({});
-  expectRefused({"--port", std::to_string(first.port())}, 1, "Address already in use");
+  const Cimomd first(Cimomd::probeOptions());
+  std::vector<std::string> options = Cimomd::probeOptions();
+  options.insert(options.end(), {"--config", "/dev/null", "--port", std::to_string(first.port())});
+  expectRefused(options, 1, "Address already in use");
 }
 
 TEST_F(CommandLineTest, TakesItsOptionsFromTheFileRelativeToIt) {
@@ -98,6 +117,14 @@ TEST_F(CommandLineTest, TakesItsOptionsFromTheFileRelativeToIt) {
                         "provider-dir = " BINARY_DIR "/lib ; where the build puts it\n")});
   const std::string classes = cimomd.wbemcli({"ecn"}, "").output;
   EXPECT_THAT(classes, AllOf(HasSubstr("TEST_Local"), HasSubstr("TEST_Thing")));
+}
+
+TEST_F(CommandLineTest, TakesADirectoryOfRegistrations) {
+  directory_.write("all/first.reg", readFile(SOURCE_DIR "/tests/support/probe/Probe.reg"));
+  directory_.write("all/first.peg.mof", "what another object manager takes");
+  const Cimomd cimomd({"--config", file("schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\nregistration = all\n"
+                                        "provider-dir = " BINARY_DIR "/lib\n")});
+  EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
 }
 
 TEST_F(CommandLineTest, TakesIndentedKeysOfTheFile) {
@@ -112,7 +139,9 @@ TEST_F(CommandLineTest, TakesIndentedKeysOfTheFile) {
 
 TEST_F(CommandLineTest, WinsOverTheFile) {
   // The file's port could not be listened on.
-  EXPECT_NE(Cimomd({"--config", file("port = 1\naddress = 192.0.2.1\n"), "--address", "127.0.0.1"}).port(), 1);
+  std::vector<std::string> options = Cimomd::probeOptions();
+  options.insert(options.end(), {"--config", file("port = 1\naddress = 192.0.2.1\n"), "--address", "127.0.0.1"});
+  EXPECT_NE(Cimomd(options).port(), 1);
 }
 
 }  // namespace

@@ -136,7 +136,7 @@ TEST_F(CompositeServerTest, DoesNotStartWithoutTheLibraryOfAProvider) {
         std::filesystem::create_symlink(std::string(BINARY_DIR "/lib/") + present, providers.path() / present);
     std::vector<std::string> options = CompositeStack::options();
     options.back() = providers.path().string();
-    options.insert(options.begin(), BINARY_DIR "/bin/cimomd");
+    options.insert(options.begin(), {BINARY_DIR "/bin/cimomd", "--config", "/dev/null"});
     const Completed completed = run(options);
     EXPECT_NE(completed.status, 0);
     EXPECT_THAT(completed.errors, HasSubstr(missing));

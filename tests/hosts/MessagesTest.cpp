@@ -119,7 +119,8 @@ TEST_F(HostMessagesTest, OfAMissingProviderDirectoryAreExplained) {
 }
 
 TEST_F(HostMessagesTest, OfTheAgentsMissingLibrariesAreExplained) {
-  host().install(without({"ldconfig"}));
+  const std::string install = "cmake --install build/default\n";
+  host().install(with(install, install + "rm /usr/local/lib/libqvhelper.so.1\n"));
   expectExplained(firstRequest(), "libqvhelper.so.1: cannot open shared object file");
 }
 
@@ -170,14 +171,14 @@ TEST_F(HostMessagesTest, OfAMistakeInAgentIniAreExplained) {
   expectExplained(firstRequest(), "agent.ini:11: ");
 }
 
-TEST_F(HostMessages, OfAMissingAgentIniAreExplained) {
+TEST_F(HostMessagesTest, OfAMissingAgentIniAreExplained) {
   installOn("[processor]\nbackend = simulated\n");
   std::filesystem::remove(CONFIGURATION_DIR "/agent.ini");
   host().restart();
   expectExplained(firstRequest(), "cannot be opened: No such file or directory; create it");
 }
 
-TEST_F(HostMessages, OfAProcessorThatIsNotChosenAreExplained) {
+TEST_F(HostMessagesTest, OfAProcessorThatIsNotChosenAreExplained) {
   installOn("");
   expectExplained(firstRequest(), "[processor] has no key 'backend'");
 }
@@ -203,7 +204,7 @@ TEST_F(HostMessagesTest, OfAMachineWithoutABmcAreExplained) {
 
 TEST_F(HostMessagesTest, OfAMissingBackEndAreExplained) {
   installOn(ipmi("connection = inband\n"));
-  std::filesystem::remove(INSTALL_PREFIX "/lib/libqvbmc-ipmi.so");
+  std::filesystem::remove(INSTALL_PREFIX "/lib/compositeipconfig/libqvbmc-ipmi.so");
   host().restart();
   expectExplained(firstRequest(), "libqvbmc-ipmi.so");
 }

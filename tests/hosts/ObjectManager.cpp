@@ -145,29 +145,21 @@ void ObjectManager::install(const Edit& edit) {
     prepare();
   }
   prepared_ = true;
-  for (const std::string& step : installing()) {
-    carryOut(step, edit);
-    if (step == "install" && processes_ == 2) {
-      registerSeparately();
-    }
-    if (step.ends_with(" start")) {
-      awaitListening();
-    }
-  }
+  carryOutAll(installing(), edit);
 }
 
-void ObjectManager::remove(const Edit& edit) {
-  for (const std::string& step : removing()) {
-    carryOut(step, edit);
-    if (step.ends_with(" stop")) {
-      awaitEnd();
-    }
-  }
-}
+void ObjectManager::remove(const Edit& edit) { carryOutAll(removing(), edit); }
 
-void ObjectManager::upgrade() {
-  for (const std::string& step : upgrading()) {
-    carryOut(step);
+void ObjectManager::upgrade() { carryOutAll(upgrading(), {}); }
+
+void ObjectManager::registerByCommand(const Edit& edit) { carryOutAll(registeringByCommand(), edit); }
+
+void ObjectManager::takeOutByCommand() { carryOutAll(takingOutByCommand(), {}); }
+
+// Comes back when what a step starts listens, and what it stops has ended.
+void ObjectManager::carryOutAll(const std::vector<std::string>& steps, const Edit& edit) {
+  for (const std::string& step : steps) {
+    carryOut(step, edit);
     if (step == "install" && processes_ == 2) {
       registerSeparately();
     }

@@ -40,9 +40,15 @@ class ObjectManager : public WbemClient {
   // A new version over the one that is there.
   void upgrade();
 
+  // The registration alone, by the command that the document names for it: from stopped to serving, and from running to
+  // stopped.
+  void registerByCommand(const Edit& edit = {});
+  void takeOutByCommand();
+
   void start(const Edit& edit = {});
   void stop();
   void restart();
+  bool isListening() const;
   // Ends it without asking it to end.
   void kill();
 
@@ -96,12 +102,14 @@ class ObjectManager : public WbemClient {
   virtual std::vector<std::string> installing() const = 0;
   virtual std::vector<std::string> removing() const = 0;
   virtual std::vector<std::string> upgrading() const = 0;
+  virtual std::vector<std::string> registeringByCommand() const = 0;
+  virtual std::vector<std::string> takingOutByCommand() const = 0;
 
  private:
-  bool isListening() const;
   void awaitListening() const;
   void awaitEnd() const;
   void registerSeparately() const;
+  void carryOutAll(const std::vector<std::string>& steps, const Edit& edit);
 
   const std::string prefix_;
   const int processes_;

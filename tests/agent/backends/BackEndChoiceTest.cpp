@@ -99,7 +99,7 @@ TEST_F(BackEndChoiceTest, GivesTheProcessorItsConfiguredNames) {
   expect(describe, "^a: b$");
 }
 
-TEST_F(BackEndChoiceTest, SaysOfSimulatedBackEndTestWhatItIsUnderAnyDescription) {
+TEST_F(BackEndChoiceTest, SaysOfASimulatedProcessorWhatItIsUnderAnyDescription) {
   chooseSimulated("name = a\ndescription = b\n");
   expect(describe, "^a: b .simulated.$");
   chooseSimulated("description = SIMULATED on rack 7\n");

@@ -100,7 +100,7 @@ TEST(LoggerTest, ReportsAMissingAgentIniOnceWithWhatToDoAndGoesOn) {
   ::unsetenv("QV_AGENT_INI");
 }
 
-TEST(LoggerTest, takesMessagesFromSeveralThreads) {
+TEST(LoggerTest, TakesMessagesFromSeveralThreads) {
   const TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";
   writeFile(ini, "[log]\ndestination = file\nfile = " + (directory / "log") + "\n");

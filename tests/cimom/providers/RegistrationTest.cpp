@@ -11,6 +11,7 @@ using namespace Testing;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::SizeIs;
+using testing::ThrowsMessage;
 
 class RegistrationTest : public testing::Test {
  protected:
@@ -50,6 +51,23 @@ TEST_F(RegistrationTest, AStanzaNamesAClassAndItsProvider) {
   EXPECT_FALSE(all[1].instance);
   EXPECT_TRUE(all[1].association);
   EXPECT_THAT(all[1].namespaces, ElementsAre("root/cimv2", "root/third"));
+}
+
+TEST_F(RegistrationTest, ADirectoryRegistersWhatItsFilesDo) {
+  for (const char* name : {"b.reg", "a.reg", "c.peg.mof"}) {
+    directory.write(std::string("all/") + name,
+                    std::string("[") + name[0] + "]\nprovider: P\nlocation: l\ntype: instance\nnamespace: n\n");
+  }
+  const auto all = readRegistration(directory.path() / "all");
+  ASSERT_THAT(all, SizeIs(2));
+  EXPECT_EQ(all[0].className, "a");
+  EXPECT_EQ(all[1].className, "b");
+}
+
+TEST_F(RegistrationTest, ADirectoryWithoutRegistrationsIsRefused) {
+  directory.write("none/c.peg.mof", "");
+  EXPECT_THAT([this] { readRegistration(directory.path() / "none"); },
+              ThrowsMessage<ConfigurationError>(HasSubstr("none: contains no *.reg file")));
 }
 
 TEST_F(RegistrationTest, AnEmptyFileRegistersNothing) { EXPECT_THAT(read("# nothing\n\n"), SizeIs(0)); }

@@ -2,6 +2,7 @@
 
 #include <signal.h>
 
+#include <algorithm>
 #include <stdexcept>
 
 #include "Paths.h"
@@ -10,17 +11,23 @@
 namespace Testing {
 namespace {
 
-constexpr const char* program = BINARY_DIR "/bin/cimomd";
-
 std::vector<std::string> joined(std::vector<std::string> first, const std::vector<std::string>& second) {
   first.insert(first.end(), second.begin(), second.end());
   return first;
 }
 
+// The configuration file of this machine, where there is one, says nothing to a test.
+std::vector<std::string> withConfiguration(std::vector<std::string> options) {
+  if (std::find(options.begin(), options.end(), "--config") == options.end()) {
+    options.insert(options.end(), {"--config", "/dev/null"});
+  }
+  return options;
+}
+
 }  // namespace
 
-Cimomd::Cimomd(const std::vector<std::string>& options, const Environment& environment)
-    : process_(joined({program, "--port", "0"}, options), environment) {
+Cimomd::Cimomd(const std::vector<std::string>& options, const Environment& environment, const std::string& program)
+    : process_(joined({program, "--port", "0"}, withConfiguration(options)), environment) {
   std::string output;
   poll([&] {
     output = process_.output();

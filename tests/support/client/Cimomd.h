@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "Paths.h"
 #include "tests/support/system/Process.h"
 
 namespace Testing {
@@ -13,7 +14,8 @@ class Cimomd {
  public:
   // Waits until it listens. Throws std::runtime_error with what it wrote to the standard error where it ends instead.
   // @param options further options; --port is given already
-  explicit Cimomd(const std::vector<std::string>& options, const Environment& environment = {});
+  explicit Cimomd(const std::vector<std::string>& options, const Environment& environment = {},
+                  const std::string& program = BINARY_DIR "/bin/cimomd");
 
   // Options with which it serves the probe provider and its classes, in root/test.
   static std::vector<std::string> probeOptions();
