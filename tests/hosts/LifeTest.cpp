@@ -164,13 +164,13 @@ TEST_F(HostLifeTest, IsTakenOutAndRegisteredByTheCommandAsWell) {
 TEST_F(HostLifeTest, IsRegisteredInAnotherNamespaceByTheCommand) {
   host().takeOutByCommand();
   host().registerByCommand(inNamespace("root/other"));
-  EXPECT_THAT(host().names("ein", clientAccess, "root/other"), SizeIs(6));
-  EXPECT_THAT(host().failure("ei", clientAccess), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
+  EXPECT_THAT(host().names("ein", Classes::clientAccess, "root/other"), SizeIs(6));
+  EXPECT_THAT(host().failure("ei", Classes::clientAccess), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
 
   // It stays there until it is taken out.
   host().stop();
   host().registerByCommand();
-  EXPECT_THAT(host().names("ein", clientAccess, "root/other"), SizeIs(6));
+  EXPECT_THAT(host().names("ein", Classes::clientAccess, "root/other"), SizeIs(6));
   host().stop();
   EXPECT_THROW(host().registerByCommand(inNamespace("root/cimv2")), std::runtime_error);
   if (!host().isListening()) {
@@ -179,7 +179,8 @@ TEST_F(HostLifeTest, IsRegisteredInAnotherNamespaceByTheCommand) {
   host().takeOutByCommand();
   host().registerByCommand();
   expectServing();
-  EXPECT_THAT(host().failure("ei", clientAccess, {}, "root/other"), HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
+  EXPECT_THAT(host().failure("ei", Classes::clientAccess, {}, "root/other"),
+              HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
 }
 
 TEST_F(HostLifeTest, IsAsItWasWhereTheCommandFails) {
