@@ -6,14 +6,19 @@ if(NOT CMPI_INCLUDE_DIR)
   else()
     set(CMPI_HEADERS "${PROJECT_SOURCE_DIR}/cmpi")
   endif()
-elseif(EXISTS "${CMPI_INCLUDE_DIR}/cmpidt.h")
-  set(CMPI_HEADERS "${CMPI_INCLUDE_DIR}")
 else()
-  message(FATAL_ERROR "CMPI_INCLUDE_DIR is ${CMPI_INCLUDE_DIR}, but there is no cmpidt.h in it")
+  set(CMPI_HEADERS "${CMPI_INCLUDE_DIR}")
 endif()
+foreach(header cmpidt.h cmpift.h cmpimacs.h)
+  if(NOT EXISTS "${CMPI_HEADERS}/${header}")
+    message(FATAL_ERROR "${CMPI_HEADERS} has no ${header}: name the directory of all CMPI headers with "
+                        "-DCMPI_INCLUDE_DIR=, for example ${PROJECT_SOURCE_DIR}/cmpi")
+  endif()
+endforeach()
 message(STATUS "CMPI headers: ${CMPI_HEADERS}")
 
-# SYSTEM: the convenience macros cast in C's manner.
+# What differs between the sets is levelled in compatible/, which includes them in turn. SYSTEM: the convenience macros
+# cast in C's manner.
 add_library(cmpi INTERFACE)
-target_include_directories(cmpi SYSTEM INTERFACE "${CMPI_HEADERS}")
+target_include_directories(cmpi SYSTEM INTERFACE "${PROJECT_SOURCE_DIR}/cmpi/compatible" "${CMPI_HEADERS}")
 target_compile_definitions(cmpi INTERFACE CMPI_PLATFORM_LINUX_GENERIC_GNU)

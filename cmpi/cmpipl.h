@@ -20,6 +20,7 @@
 #define CMPI_THREAD_TYPE void*
 #define CMPI_MUTEX_TYPE void*
 #define CMPI_COND_TYPE void*
-#define CMPI_THREAD_KEY_TYPE unsigned long
+/* The first headers have eight bytes here; an object manager writes four, as every later one does. */
+#define CMPI_THREAD_KEY_TYPE unsigned int
 
 #endif /* CMPIPL_H_ */

@@ -84,7 +84,7 @@ void rehome(CMPIObjectPath* path, const CMPIObjectPath* request, CMPIStatus* sta
 
 void traceToBroker(const CMPIBroker* broker, int level, const char* text) {
   if (broker) {
-    CMTraceMessage(broker, level, "CompositeIPConfigProvider", text, nullptr);
+    CMTraceMessage(broker, static_cast<Cmpi::TraceLevel>(level), "CompositeIPConfigProvider", text, nullptr);
   }
 }
 

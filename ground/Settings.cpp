@@ -45,7 +45,7 @@ void Settings::take(const std::string& key, const std::function<void(const std::
 }
 
 void Settings::refuse(const std::string& key, const std::string& value, const std::string& reason) const {
-  throw std::runtime_error(place_ + ": " + key + " = " + value + ": " + reason);
+  throw RefusedSetting(place_, key, value, reason);
 }
 
 }  // namespace Ground

@@ -1,11 +1,11 @@
-// The keys and values of one section of a configuration file, each value taken with its form and range checked. Every
-// refusal is a std::runtime_error "PLACE: KEY = VALUE: REASON".
+// The keys and values of one section of a configuration file, each value taken with its form and range checked.
 #pragma once
 
 #include <chrono>
 #include <cstdint>
 #include <functional>
 #include <map>
+#include <stdexcept>
 #include <string>
 #include <utility>
 #include <vector>
@@ -13,6 +13,25 @@
 #include "ground/Values.h"
 
 namespace Ground {
+
+// Every refusal, "PLACE: KEY = VALUE: REASON". Who knows the line on which the key stands can say it better.
+class RefusedSetting : public std::runtime_error {
+ public:
+  RefusedSetting(const std::string& place, std::string key, const std::string& value, const std::string& reason)
+      : RefusedSetting(place, std::move(key), std::string(" = ") + value + ": " + reason) {}
+
+  const std::string& key() const { return key_; }
+
+  // "KEY = VALUE: REASON"
+  std::string withoutPlace() const { return key_ + rest_; }
+
+ private:
+  RefusedSetting(const std::string& place, std::string key, std::string rest)
+      : std::runtime_error(place + ": " + key + rest), key_(std::move(key)), rest_(std::move(rest)) {}
+
+  std::string key_;
+  std::string rest_;
+};
 
 // A key that is not there leaves its target as it is.
 class Settings {

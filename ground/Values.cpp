@@ -56,6 +56,8 @@ std::vector<std::string> parseList(const std::string& text) {
   return words;
 }
 
+bool parseBoolean(const std::string& text) { return parseChoice<bool>(text, {{"yes", true}, {"no", false}}); }
+
 std::string parseText(const std::string& text) {
   if (text.empty()) {
     throw std::invalid_argument("must not be empty");

@@ -21,6 +21,8 @@ std::chrono::milliseconds parseSeconds(const std::string& text, std::chrono::mil
 // The words of a list that commas or blanks separate; at least one.
 std::vector<std::string> parseList(const std::string& text);
 
+bool parseBoolean(const std::string& text);  // yes or no
+
 std::string parseText(const std::string& text);  // any but the empty one
 
 std::string parseAbsolutePath(const std::string& text);

@@ -2,6 +2,7 @@
 
 #include <dlfcn.h>
 
+#include <exception>
 #include <filesystem>
 #include <mutex>
 #include <stdexcept>
@@ -10,6 +11,8 @@
 #include "agent/backends/NamedProcessor.h"
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/config/AgentConfiguration.h"
+#include "agent/log/Report.h"
+#include "ground/Settings.h"
 
 namespace QV {
 namespace {
@@ -43,17 +46,52 @@ std::shared_ptr<BackEnd> load(const std::string& name, const BackEndSettings& se
   if (!create) {
     throw std::runtime_error("the back end " + name + " cannot be used: " + ::dlerror());
   }
-  // The deleter holds the library, so its code outlives the object.
-  return {create(settings), [library](BackEnd* backEnd) { delete backEnd; }};
+  // The deleter holds the library, so its code outlives the object. What is thrown is made anew before the library
+  // goes, which holds the code of its exceptions, too.
+  try {
+    return {create(settings), [library](BackEnd* backEnd) { delete backEnd; }};
+  } catch (const Ground::RefusedSetting& refused) {
+    throw Ground::RefusedSetting(refused);
+  } catch (const std::exception& error) {
+    throw std::runtime_error(error.what());
+  }
+}
+
+// Reported as a failure, so that it is seen: whoever takes made-up values for a processor's must be able to learn it.
+std::shared_ptr<BackEnd> simulate(const BackEndSettings& settings) {
+  const std::string state = parseSimulatedSettings(settings);
+  auto backEnd = std::make_shared<SimulatedBackEnd>(state);
+  TWLog::report("Tarnwick.SimulatedProcessor", TWLog::failureLevel,
+                "the management processor is simulated (" + agentConfigurationFile() +
+                    ": backend = simulated): its values are made up, and changes reach no hardware but " + state);
+  return backEnd;
+}
+
+// A back end knows its keys, the agent the file and the line on which they stand.
+std::shared_ptr<BackEnd> openBackEnd(const AgentConfiguration& configuration) {
+  const std::string& choice = configuration.backEnd;
+  try {
+    return choice == "simulated" ? simulate(configuration.backEndSettings)
+                                 : load(choice, configuration.backEndSettings);
+  } catch (const Ground::RefusedSetting& refused) {
+    const auto line = configuration.backEndLines.find(refused.key());
+    throw std::runtime_error(agentConfigurationFile() +
+                             (line == configuration.backEndLines.end() ? "" : ":" + std::to_string(line->second)) +
+                             ": [" + choice + "] " + refused.withoutPlace());
+  }
 }
 
 std::shared_ptr<BackEnd> createBackEnd() {
   const AgentConfiguration configuration = readAgentConfiguration();
-  const BackEndSettings& settings = configuration.backEndSettings;
-  const std::shared_ptr<BackEnd> backEnd = configuration.backEnd == "simulated"
-                                               ? std::make_shared<SimulatedBackEnd>(parseSimulatedSettings(settings))
-                                               : load(configuration.backEnd, settings);
-  return std::make_shared<NamedProcessor>(backEnd, configuration.processorName, configuration.processorDescription);
+  const std::string& choice = configuration.backEnd;
+  if (choice.empty()) {
+    throw std::runtime_error(agentConfigurationFile() +
+                             ": [processor] has no key 'backend', so that there is no management processor; set "
+                             "backend = ipmi for a BMC, or backend = simulated for made-up values");
+  }
+  const std::string& description = configuration.processorDescription;
+  return std::make_shared<NamedProcessor>(openBackEnd(configuration), configuration.processorName,
+                                          choice == "simulated" ? describedAsSimulated(description) : description);
 }
 
 }  // namespace

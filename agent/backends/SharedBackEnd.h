@@ -8,8 +8,9 @@
 
 namespace QV {
 
-// The back end that agent.ini chooses, made on first use. Throws std::runtime_error in words an administrator can act
-// on where agent.ini is broken or the back end cannot be made; the next call tries again. Safe to call from several
+// The back end that agent.ini chooses, made on first use; that a processor is simulated is then reported, once. Throws
+// std::runtime_error in words an administrator can act on where agent.ini is missing, broken or chooses none, or where
+// the back end cannot be made; the next call tries again. Safe to call from several
 // threads at once.
 std::shared_ptr<BackEnd> sharedBackEnd();
 

@@ -71,11 +71,33 @@ const Key keys[] = {
      [](Configuration& c, Text& key, Text& value) {
        c.trace.componentThresholds[key.substr(std::strlen(componentThreshold))] = level(value);
      }},
+    {"host", "publish", [](Configuration& c, Text&, Text& value) { c.publishesHost = Ground::parseBoolean(value); }},
     {"processor", "backend", [](Configuration& c, Text&, Text& value) { c.backEnd = backEnd(value); }},
     {"processor", "name", [](Configuration& c, Text&, Text& value) { c.processorName = Ground::parseText(value); }},
     {"processor", "description",
      [](Configuration& c, Text&, Text& value) { c.processorDescription = Ground::parseText(value); }},
 };
+
+// What stands in the file's stead in the message that it is missing, or cannot be read.
+std::string remedyFor(int error) {
+  if (error == ENOENT || error == ENOTDIR) {
+    return "create it and choose the management processor there: [processor] with backend = ipmi for a BMC, or "
+           "backend = simulated for made-up values";
+  }
+  return "let the object manager's user read it";
+}
+
+// "file, threshold, threshold.COMPONENT": the keys of a section, for the message that one is none of them.
+std::string keysOf(const std::string& section) {
+  std::string names;
+  for (const Key& known : keys) {
+    if (section == known.section) {
+      const std::string name = known.name;
+      names += (names.empty() ? "" : ", ") + name + (name.ends_with('.') ? "COMPONENT" : "");
+    }
+  }
+  return names;
+}
 
 bool takes(const Key& known, const std::string& key) {
   const std::string name = known.name;
@@ -95,7 +117,17 @@ std::string chosenBackEnd(const std::vector<Ground::IniEntry>& entries) {
       return entry.value;
     }
   }
-  return AgentConfiguration().backEnd;
+  return {};
+}
+
+std::string knownSections() {
+  std::vector<std::string> names;
+  for (const Key& known : keys) {
+    names.emplace_back(known.section);
+  }
+  names.insert(names.end(), std::begin(backEnds), std::end(backEnds));
+  names.erase(std::unique(names.begin(), names.end()), names.end());
+  return Ground::mustBeOneOf(names);
 }
 
 void set(AgentConfiguration& configuration, const Ground::IniEntry& entry, const std::string& chosen) {
@@ -116,16 +148,17 @@ void set(AgentConfiguration& configuration, const Ground::IniEntry& entry, const
     }
   }
   if (sectionKnown) {
-    throw std::runtime_error("[" + section + "] has no key '" + key + "'");
+    throw std::runtime_error("[" + section + "] has no key '" + key + "': must be one of " + keysOf(section));
   }
   if (section.empty()) {
-    throw std::runtime_error("the key '" + key + "' stands before any section");
+    throw std::runtime_error("the key '" + key + "' stands before any section: move it below its [section]");
   }
   if (!isBackEndSection(section, chosen)) {
-    throw std::runtime_error("there is no section [" + section + "]");
+    throw std::runtime_error("there is no section [" + section + "]: " + knownSections());
   }
   if (section == chosen) {
     configuration.backEndSettings[key] = value;
+    configuration.backEndLines[key] = line;
   }
 }
 
@@ -168,16 +201,18 @@ AgentConfiguration parseAgentConfiguration(std::istream& input, const std::strin
   return configuration;
 }
 
-AgentConfiguration readAgentConfiguration() {
+std::string agentConfigurationFile() {
   const char* chosen = std::getenv("QV_AGENT_INI");
-  const std::string fileName = chosen ? chosen : DEFAULT_AGENT_INI;
+  return chosen ? chosen : CONFIGURATION_DIR "/agent.ini";
+}
+
+AgentConfiguration readAgentConfiguration() {
+  const std::string fileName = agentConfigurationFile();
   errno = 0;
   std::ifstream file(fileName);
   if (!file) {
-    if (!chosen && errno == ENOENT) {
-      return {};
-    }
-    throw std::runtime_error(fileName + ": cannot be opened: " + std::strerror(errno));
+    const int error = errno;
+    throw std::runtime_error(fileName + ": cannot be opened: " + std::strerror(error) + "; " + remedyFor(error));
   }
   return parseAgentConfiguration(file, fileName);
 }

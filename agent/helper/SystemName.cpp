@@ -8,7 +8,7 @@
 namespace QV {
 namespace {
 
-// A broken agent.ini counts as none here, since a path needs some host: the log reports the file.
+// A path needs some host, whatever is wrong with agent.ini or missing: the log reports that.
 std::string configuredName() {
   try {
     return readAgentConfiguration().systemName;

@@ -8,8 +8,8 @@
 namespace TWLog {
 namespace {
 
-// Both channels as agent.ini has them, read with the first message. A broken file is reported once, and the defaults
-// hold: a provider must not fail for its log's sake.
+// Both channels as agent.ini has them, read with the first message. A broken or missing file is reported once, and the
+// defaults hold: a provider must not fail for its log's sake, and what it fails for must reach the log.
 struct Channels {
   explicit Channels(const QV::AgentConfiguration& configuration) : log(configuration.log), trace(configuration.trace) {}
 

@@ -25,7 +25,7 @@ class BackEnd {
 };
 
 // The keys and values of the back end's own section of agent.ini. An unknown key or a malformed value is refused by the
-// back end's constructor with a std::runtime_error that names it.
+// back end's constructor with a Ground::RefusedSetting, to which the agent adds file and line.
 using BackEndSettings = std::map<std::string, std::string>;
 
 // What the back end NAME exports from its library, libqvbmc-NAME.so, with C linkage, under the name "qvCreateBackEnd".

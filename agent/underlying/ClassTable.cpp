@@ -5,6 +5,7 @@
 #include <iterator>
 
 #include "agent/backends/SharedBackEnd.h"
+#include "agent/config/AgentConfiguration.h"
 #include "agent/underlying/Host.h"
 
 namespace QV {
@@ -35,9 +36,19 @@ const UnderlyingClass* findUnderlyingClass(const char* name) {
   return nullptr;
 }
 
+namespace {
+
+// Who may ask for the processor need not learn the host's own network. Read once, as all of agent.ini.
+bool publishesHost() {
+  static const bool publishes = readAgentConfiguration().publishesHost;
+  return publishes;
+}
+
+}  // namespace
+
 Instances readInstances(const UnderlyingClass& underlyingClass) {
   Instances instances = underlyingClass.build({"YRNQV_SPComputerSystem", "BMC", sharedBackEnd()->read()});
-  if (underlyingClass.ofHostToo) {
+  if (underlyingClass.ofHostToo && publishesHost()) {
     Instances ofHost = underlyingClass.build({"YRNQV_ComputerSystem", "Host", readHost()});
     instances.insert(instances.end(), std::make_move_iterator(ofHost.begin()), std::make_move_iterator(ofHost.end()));
   }

@@ -8,6 +8,7 @@
 #include <functional>
 #include <stdexcept>
 
+#include "agent/backends/SharedBackEnd.h"
 #include "agent/helper/Conversion.h"
 #include "agent/log/Report.h"
 #include "agent/underlying/ClassTable.h"
@@ -15,6 +16,8 @@
 namespace {
 
 using namespace QV;
+
+constexpr const char* component = "Tarnwick.UnderlyingIPConfigProvider";
 
 const CMPIBroker* broker = nullptr;
 
@@ -147,7 +150,7 @@ class Request {
 
 CMPIStatus failed(CMPIrc code, const char* reason,
                   const TWLog::SourceLocation& where = TWLog::SourceLocation::current()) noexcept {
-  TWLog::report("Tarnwick.UnderlyingIPConfigProvider", TWLog::failureLevel, reason, where);
+  TWLog::report(component, TWLog::failureLevel, reason, where);
   CMPIStatus made{CMPI_RC_OK, nullptr};
   CMPIString* message = CMNewString(broker, reason, &made);
   return {code, made.rc == CMPI_RC_OK && !CMIsNullObject(message) ? message : nullptr};
@@ -233,6 +236,19 @@ CMPIStatus underlyingExecQuery(CMPIInstanceMI*, const CMPIContext*, const CMPIRe
   return notSupported;
 }
 
+// What every request would fail for is reported when the object manager loads the provider, before the first of them;
+// once, however often it asks for the MI.
+void openProcessor() {
+  [[maybe_unused]] static const bool opened = [] {
+    try {
+      return sharedBackEnd() != nullptr;
+    } catch (const std::exception& error) {
+      TWLog::report(component, TWLog::failureLevel, error.what());
+      return false;
+    }
+  }();
+}
+
 }  // namespace
 
-CMInstanceMIStub(underlying, UnderlyingIPConfigProvider, broker, CMNoHook)
+CMInstanceMIStub(underlying, UnderlyingIPConfigProvider, broker, openProcessor())

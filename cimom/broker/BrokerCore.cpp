@@ -11,7 +11,8 @@ namespace {
 
 void logToStandardError(int severity, std::string_view component, std::string_view text) {
   constexpr std::array<const char*, 5> names = {"message", "error", "info", "warning", "debug"};
-  const auto index = severity >= CMPI_SEV_ERROR && severity <= CMPI_DEV_DEBUG ? static_cast<std::size_t>(severity) : 0;
+  const auto number = static_cast<std::size_t>(severity);
+  const auto index = number < names.size() ? number : 0;
   std::string line = std::string(names[index]) + ": ";
   if (!component.empty()) {
     line.append(component).append(": ");

@@ -252,12 +252,12 @@ CMPIStatus send(const CMPIBroker* broker, MessageSink BrokerCore::*sink, int lev
   });
 }
 
-CMPIStatus logMessage(const CMPIBroker* broker, int severity, const char* id, const char* text,
+CMPIStatus logMessage(const CMPIBroker* broker, Cmpi::Severity severity, const char* id, const char* text,
                       const CMPIString* string) {
   return send(broker, &BrokerCore::log, severity, id, text, string);
 }
 
-CMPIStatus trace(const CMPIBroker* broker, int level, const char* component, const char* text,
+CMPIStatus trace(const CMPIBroker* broker, Cmpi::TraceLevel level, const char* component, const char* text,
                  const CMPIString* string) {
   return send(broker, &BrokerCore::trace, level, component, text, string);
 }

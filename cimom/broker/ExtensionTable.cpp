@@ -4,6 +4,7 @@
 
 #include <cerrno>
 #include <chrono>
+#include <cstring>
 #include <memory>
 #include <new>
 #include <string>
@@ -59,6 +60,9 @@ int threadSleep(CMPIUint32 milliseconds) {
 
 int threadOnce(int* once, void (*initialise)()) { return once && initialise ? pthread_once(once, initialise) : EINVAL; }
 
+// A provider may have been built with the headers whose key has four bytes, whatever the type has here.
+static_assert(sizeof(pthread_key_t) == 4 && sizeof(CMPI_THREAD_KEY_TYPE) >= 4, "no more than four bytes are written");
+
 int createThreadKey(CMPI_THREAD_KEY_TYPE* key, void (*cleanup)(void*)) {
   pthread_key_t made;
   if (!key) {
@@ -66,7 +70,7 @@ int createThreadKey(CMPI_THREAD_KEY_TYPE* key, void (*cleanup)(void*)) {
   }
   const int error = pthread_key_create(&made, cleanup);
   if (!error) {
-    *key = made;
+    std::memcpy(key, &made, sizeof made);
   }
   return error;
 }

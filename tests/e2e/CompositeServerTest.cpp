@@ -14,6 +14,7 @@ namespace {
 
 using namespace Testing;
 using testing::AllOf;
+using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::Not;
 using testing::SizeIs;
@@ -157,6 +158,67 @@ TEST_F(CompositeServerTest, SaysWhatIsWrongWithTheAgentsConfiguration) {
   const Completed completed = run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
   EXPECT_NE(completed.status, 0);
   EXPECT_THAT(completed.errors, HasSubstr("agent.ini:2"));
+}
+
+TEST_F(CompositeServerTest, InventsNoManagementProcessorWhereNoneIsChosen) {
+  // What the requests are answered, and what the administrator finds.
+  const auto answers = [](const Cimomd& cimomd, const std::string& sentence) {
+    for (const char* className : {"YRNx_MgmtHwComputerSystem", "YRNx_MgmtHwIPProtocolEndPoint",
+                                  "YRNx_MgmtHwIPAssignmentSettingSequence", "YRNx_MgmtHwRemoteServiceAccessPoint"}) {
+      const Completed completed = run({"wbemcli", "ei", cimomd.url(className, "root/cimv2")});
+      EXPECT_NE(completed.status, 0) << className;
+      EXPECT_EQ(completed.output, "") << className;
+      EXPECT_THAT(completed.errors, HasSubstr(sentence)) << className;
+    }
+  };
+  {
+    const std::string missing = directory_ / "none.ini";
+    Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", missing}});
+    const std::string sentence = missing + ": cannot be opened: No such file or directory; create it and choose";
+    answers(cimomd, sentence);
+    EXPECT_THAT(cimomd.process().errors(), HasSubstr(sentence)) << "it shows at the start already";
+  }
+  const std::string log = directory_ / "agent.log";
+  const auto ini = directory_.write("agent.ini", "[log]\ndestination = file\nfile = " + log + '\n');
+  const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
+  const std::string sentence = ini.string() + ": [processor] has no key 'backend'";
+  EXPECT_THAT(contentOf(log), HasSubstr(sentence)) << "it shows at the start already";
+  answers(cimomd, sentence);
+}
+
+TEST_F(CompositeServerTest, SaysAtItsStartThatTheStateCannotBeWritten) {
+  const std::string log = directory_ / "agent.log";
+  const auto ini = directory_.write(
+      "agent.ini", "[log]\ndestination = file\nfile = " + log + '\n' + simulatedProcessor("/proc/none/processor.json"));
+  const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
+  EXPECT_THAT(contentOf(log), HasSubstr("/proc/none: cannot be created: "));
+  EXPECT_THAT(contentOf(log), HasSubstr("name another file with state in [simulated] of agent.ini"));
+}
+
+TEST_F(CompositeServerTest, LogsOnceThatItsManagementProcessorIsSimulated) {
+  const std::string log = directory_ / "agent.log";
+  const auto ini = directory_.write("agent.ini", "[log]\ndestination = file\nfile = " + log + '\n' + processor());
+  const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
+  for (int i = 0; i < 3; ++i) {
+    run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
+  }
+  EXPECT_THAT(linesOf(contentOf(log)),
+              ElementsAre(AllOf(HasSubstr(" 6000 Tarnwick.SimulatedProcessor "), HasSubstr("its values are made up"))));
+}
+
+TEST_F(CompositeServerTest, ShowsNothingOfTheHostUnlessAgentIniAsksForIt) {
+  const auto ini =
+      directory_.write("agent.ini", "[log]\ndestination = off\n[system]\nname = managed.example\n" + processor());
+  const Cimomd cimomd(CompositeStack::options(), {{"QV_AGENT_INI", ini.string()}});
+  for (const char* className :
+       {"YRNQV_IPProtocolEndpoint", "YRNQV_IPAssignmentSettingData", "YRNQV_StaticIPAssignmentSettingData",
+        "YRNQV_DHCPSettingData", "YRNQV_IPRemoteServiceAccessPoint"}) {
+    const Completed completed = run({"wbemcli", "ein", cimomd.url(className, "root/yrnse")});
+    EXPECT_EQ(completed.status, 0) << completed.errors;
+    EXPECT_THAT(completed.output, AllOf(HasSubstr("eth0"), Not(HasSubstr("\"lo\"")), Not(HasSubstr("Host:")),
+                                        Not(HasSubstr("managed.example\","))))
+        << className;
+  }
 }
 
 TEST_F(CompositeServerTest, AnswersManyClientsAtOnceAlike) {

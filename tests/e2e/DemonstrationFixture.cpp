@@ -29,14 +29,25 @@ DemonstrationTest::DemonstrationTest() {
   fs::create_directory(temporary());
 }
 
-Completed DemonstrationTest::demonstrate(std::vector<std::string> arguments) const {
-  arguments.insert(arguments.begin(), SOURCE_DIR "/tools/demonstrate");
-  arguments.push_back(build().string());
-  return run(arguments, {{"TMPDIR", temporary().string()}});
+std::vector<std::string> DemonstrationTest::command(const std::vector<std::string>& arguments) const {
+  std::vector<std::string> command = {SOURCE_DIR "/tools/demonstrate"};
+  command.insert(command.end(), arguments.begin(), arguments.end());
+  command.push_back(build().string());
+  return command;
+}
+
+Environment DemonstrationTest::environment() const { return {{"TMPDIR", temporary().string()}}; }
+
+Completed DemonstrationTest::demonstrate(const std::vector<std::string>& arguments) const {
+  return run(command(arguments), environment());
 }
 
 void DemonstrationTest::expectNothingLeft() const {
   EXPECT_TRUE(fs::is_empty(temporary()));
+  expectNoProcessLeft();
+}
+
+void DemonstrationTest::expectNoProcessLeft() const {
   // What was told to end may be on its way out.
   poll([this] { return processesOf(temporary()).empty(); }, std::chrono::seconds(5));
   EXPECT_EQ(processesOf(temporary()), std::vector<std::string>());

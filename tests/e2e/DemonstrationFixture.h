@@ -16,15 +16,20 @@ class DemonstrationTest : public testing::Test {
  protected:
   DemonstrationTest();
 
-  Completed demonstrate(std::vector<std::string> arguments) const;
+  Completed demonstrate(const std::vector<std::string>& arguments) const;
+
+  // The same, for a test that runs it in its own way.
+  std::vector<std::string> command(const std::vector<std::string>& arguments) const;
+  Environment environment() const;
 
   // That what it started has ended and what it wrote outside the build directory is gone.
   void expectNothingLeft() const;
+  void expectNoProcessLeft() const;
 
   const std::filesystem::path& build() const { return directory_.path(); }
 
  private:
-  std::filesystem::path temporary() const { return build() / "temporary"; }
+  std::filesystem::path temporary() const { return build() / "temporary files"; }
 
   TemporaryDirectory directory_;
 };

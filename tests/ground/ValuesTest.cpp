@@ -39,6 +39,14 @@ TEST(ValuesTest, NamesTheWordsOfAChoice) {
   EXPECT_EQ(thrownBy([&] { parseChoice("Two", choices); }), "must be one of one, two");
 }
 
+TEST(ValuesTest, TakesYesAndNoAndNothingElseForABoolean) {
+  EXPECT_TRUE(parseBoolean("yes"));
+  EXPECT_FALSE(parseBoolean("no"));
+  for (const char* text : {"true", "1", "Yes", "on", ""}) {
+    EXPECT_EQ(thrownBy([&] { parseBoolean(text); }), "must be one of yes, no") << text;
+  }
+}
+
 TEST(ValuesTest, RefusesARelativePathAndAnEmptyText) {
   EXPECT_EQ(parseAbsolutePath("/a"), "/a");
   EXPECT_EQ(thrownBy([] { parseAbsolutePath("a"); }), "must be an absolute path");

@@ -6,12 +6,15 @@
 #include <algorithm>
 #include <chrono>
 #include <filesystem>
+#include <map>
+#include <stdexcept>
 
 #include "tests/hosts/HostProcesses.h"
 #include "tests/hosts/HostTest.h"
 #include "tests/support/client/CompositeObjects.h"
 #include "tests/support/client/FactoryState.h"
 #include "tests/support/system/Poll.h"
+#include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
@@ -21,12 +24,35 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
 using testing::SizeIs;
+using testing::ThrowsMessage;
 
 class HostLifeTest : public HostTest {
  protected:
   static void expectServing() {
     EXPECT_THAT(host().names("ein", Classes::clientAccess), SizeIs(6));
     EXPECT_EQ(host().get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  }
+
+  static void expectNothingRegistered() {
+    EXPECT_THAT(host().wbemcli("ecn", "").output, Not(HasSubstr("YRNx_")));
+    for (const ClassCase& row : classCases()) {
+      EXPECT_THAT(host().failure("ei", row.className), HasSubstr("(5) CIM_ERR_INVALID_CLASS")) << row.className;
+    }
+    for (const Enumeration& row : enumerations()) {
+      EXPECT_THAT(host().failure("ei", row.association), HasSubstr("(5) CIM_ERR_INVALID_CLASS")) << row.association;
+    }
+    EXPECT_THAT(host().failure("ei", "YRNQV_IPProtocolEndpoint", {}, "root/yrnse"),
+                HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
+    EXPECT_THAT(ObjectManager::providerProcesses(), IsEmpty());
+  }
+
+  // Has the command register the composite classes in another namespace.
+  static ObjectManager::Edit inNamespace(const std::string& nameSpace) {
+    return [nameSpace](const std::string& commands) {
+      const auto command = commands.find("compositeipconfig-register");
+      return command == std::string::npos ? commands
+                                          : commands.substr(0, commands.find('\n', command)) + " -n " + nameSpace;
+    };
   }
 
   // Comes back when they are gone and whoever started them has seen it.
@@ -107,21 +133,75 @@ TEST_F(HostLifeTest, LeavesNothingWhereItIsRemoved) {
   EXPECT_FALSE(std::filesystem::exists(INSTALL_PREFIX "/lib/cmpi/libcompositeipconfigprovider.so"));
   EXPECT_FALSE(std::filesystem::exists(INSTALL_PREFIX "/lib/libqvhelper.so.1"));
   host().start();
-  EXPECT_THAT(host().wbemcli("ecn", "").output, Not(HasSubstr("YRNx_")));
-  for (const ClassCase& row : classCases()) {
-    EXPECT_THAT(host().failure("ei", row.className), HasSubstr("(5) CIM_ERR_INVALID_CLASS")) << row.className;
-  }
-  for (const Enumeration& row : enumerations()) {
-    EXPECT_THAT(host().failure("ei", row.association), HasSubstr("(5) CIM_ERR_INVALID_CLASS")) << row.association;
-  }
-  EXPECT_THAT(host().failure("ei", "YRNQV_IPProtocolEndpoint", {}, "root/yrnse"),
-              HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
-  EXPECT_THAT(ObjectManager::providerProcesses(), IsEmpty());
+  expectNothingRegistered();
 
   host().stop();
   host().install();
   host().configureAgent(ObjectManager::simulatedProcessor());
   host().restart();
+  expectServing();
+}
+
+TEST_F(HostLifeTest, IsTakenOutAndRegisteredByTheCommandAsWell) {
+  // Given what was registered by hand
+  expectServing();
+  host().takeOutByCommand();
+  host().start();
+  expectNothingRegistered();
+
+  // When taken out again, registered, and registered again
+  host().takeOutByCommand();
+  host().registerByCommand();
+  expectServing();
+  host().stop();
+  host().registerByCommand();
+
+  // Then
+  expectServing();
+}
+
+TEST_F(HostLifeTest, IsRegisteredInAnotherNamespaceByTheCommand) {
+  host().takeOutByCommand();
+  host().registerByCommand(inNamespace("root/other"));
+  EXPECT_THAT(host().names("ein", clientAccess, "root/other"), SizeIs(6));
+  EXPECT_THAT(host().failure("ei", clientAccess), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
+
+  // It stays there until it is taken out.
+  host().stop();
+  host().registerByCommand();
+  EXPECT_THAT(host().names("ein", clientAccess, "root/other"), SizeIs(6));
+  host().stop();
+  EXPECT_THROW(host().registerByCommand(inNamespace("root/cimv2")), std::runtime_error);
+  if (!host().isListening()) {
+    host().start();
+  }
+  host().takeOutByCommand();
+  host().registerByCommand();
+  expectServing();
+  EXPECT_THAT(host().failure("ei", clientAccess, {}, "root/other"), HasSubstr("(3) CIM_ERR_INVALID_NAMESPACE"));
+}
+
+TEST_F(HostLifeTest, IsAsItWasWhereTheCommandFails) {
+  host().takeOutByCommand();
+  std::map<std::string, std::string> classes;
+  for (const char* directory : {"sfcb", "pegasus"}) {
+    const std::string file =
+        INSTALL_PREFIX "/share/compositeipconfig/" + std::string(directory) + "/UnderlyingIPConfig.mof";
+    classes[file] = readFile(file);
+    writeFile(file, classes[file] + "class\n");
+  }
+  EXPECT_THAT([] { host().registerByCommand(); },
+              ThrowsMessage<std::runtime_error>(HasSubstr(host().title() + " is as it was before")));
+  for (const auto& [file, text] : classes) {
+    writeFile(file, text);
+  }
+
+  if (!host().isListening()) {
+    host().start();
+  }
+  expectNothingRegistered();
+  host().takeOutByCommand();
+  host().registerByCommand();
   expectServing();
 }
 

@@ -168,7 +168,19 @@ TEST_F(HostMessagesTest, OfAStateThatCannotBeWrittenAreExplained) {
 
 TEST_F(HostMessagesTest, OfAMistakeInAgentIniAreExplained) {
   installOn("[processor]\nbakcend = simulated\n");
-  expectExplained(firstRequest(), "agent.ini:8: ");
+  expectExplained(firstRequest(), "agent.ini:11: ");
+}
+
+TEST_F(HostMessagesTest, OfAMissingAgentIniAreExplained) {
+  installOn("[processor]\nbackend = simulated\n");
+  std::filesystem::remove(CONFIGURATION_DIR "/agent.ini");
+  host().restart();
+  expectExplained(firstRequest(), "cannot be opened: No such file or directory; create it");
+}
+
+TEST_F(HostMessagesTest, OfAProcessorThatIsNotChosenAreExplained) {
+  installOn("");
+  expectExplained(firstRequest(), "[processor] has no key 'backend'");
 }
 
 TEST_F(HostMessagesTest, OfAnUnknownBackEndAreExplained) {

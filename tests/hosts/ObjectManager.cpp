@@ -23,7 +23,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-constexpr const char* agentIni = INSTALL_PREFIX "/etc/compositeipconfig/agent.ini";
+constexpr const char* agentIni = CONFIGURATION_DIR "/agent.ini";
 constexpr const char* agentLog = "/var/tmp/agent.log";
 constexpr const char* shared = INSTALL_PREFIX "/share/compositeipconfig";
 
@@ -113,7 +113,10 @@ Environment ObjectManager::environment() const {
 }
 
 std::map<std::string, std::string> ObjectManager::differences() const {
-  return {{"build/default", BINARY_DIR}, {"/usr/local", INSTALL_PREFIX}, {":5988", ":" + std::to_string(port_)}};
+  return {{"build/default", BINARY_DIR},
+          {"/etc/compositeipconfig", CONFIGURATION_DIR},
+          {"/usr/local", INSTALL_PREFIX},
+          {":5988", ":" + std::to_string(port_)}};
 }
 
 std::string ObjectManager::run(const std::string& commands) const {
@@ -142,29 +145,21 @@ void ObjectManager::install(const Edit& edit) {
     prepare();
   }
   prepared_ = true;
-  for (const std::string& step : installing()) {
-    carryOut(step, edit);
-    if (step == "install" && processes_ == 2) {
-      registerSeparately();
-    }
-    if (step.ends_with(" start")) {
-      awaitListening();
-    }
-  }
+  carryOutAll(installing(), edit);
 }
 
-void ObjectManager::remove(const Edit& edit) {
-  for (const std::string& step : removing()) {
-    carryOut(step, edit);
-    if (step.ends_with(" stop")) {
-      awaitEnd();
-    }
-  }
-}
+void ObjectManager::remove(const Edit& edit) { carryOutAll(removing(), edit); }
 
-void ObjectManager::upgrade() {
-  for (const std::string& step : upgrading()) {
-    carryOut(step);
+void ObjectManager::upgrade() { carryOutAll(upgrading(), {}); }
+
+void ObjectManager::registerByCommand(const Edit& edit) { carryOutAll(registeringByCommand(), edit); }
+
+void ObjectManager::takeOutByCommand() { carryOutAll(takingOutByCommand(), {}); }
+
+// Comes back when what a step starts listens, and what it stops has ended.
+void ObjectManager::carryOutAll(const std::vector<std::string>& steps, const Edit& edit) {
+  for (const std::string& step : steps) {
+    carryOut(step, edit);
     if (step == "install" && processes_ == 2) {
       registerSeparately();
     }
@@ -226,7 +221,8 @@ std::string ObjectManager::simulatedProcessor() { return Testing::simulatedProce
 void ObjectManager::configureAgent(const std::string& processor, int logThreshold) const {
   fs::remove(agentLog);
   writeFile(agentIni, "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " + std::string(agentLog) +
-                          "\nthreshold = " + std::to_string(logThreshold) + '\n' + processor);
+                          "\nthreshold = " + std::to_string(logThreshold) +
+                          "\nthreshold.Tarnwick.SimulatedProcessor = 7000\n[host]\npublish = yes\n" + processor);
 }
 
 std::string ObjectManager::log() const { return readFile(agentLog); }

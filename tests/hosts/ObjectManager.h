@@ -40,14 +40,20 @@ class ObjectManager : public WbemClient {
   // A new version over the one that is there.
   void upgrade();
 
+  // The registration alone, by the command that the document names for it: from stopped to serving, and from running to
+  // stopped.
+  void registerByCommand(const Edit& edit = {});
+  void takeOutByCommand();
+
   void start(const Edit& edit = {});
   void stop();
   void restart();
+  bool isListening() const;
   // Ends it without asking it to end.
   void kill();
 
-  // Writes agent.ini: the managed system is managed.example, and the given sections say how the management processor
-  // is reached. Takes effect with the next start of the object manager.
+  // Writes agent.ini: the managed system is managed.example, the host is shown in root/yrnse, and the given sections
+  // say how the management processor is reached. Takes effect with the next start of the object manager.
   void configureAgent(const std::string& processor, int logThreshold = 6000) const;
   std::string log() const;
   // Everything that an administrator is told beside the answer to a client.
@@ -96,12 +102,14 @@ class ObjectManager : public WbemClient {
   virtual std::vector<std::string> installing() const = 0;
   virtual std::vector<std::string> removing() const = 0;
   virtual std::vector<std::string> upgrading() const = 0;
+  virtual std::vector<std::string> registeringByCommand() const = 0;
+  virtual std::vector<std::string> takingOutByCommand() const = 0;
 
  private:
-  bool isListening() const;
   void awaitListening() const;
   void awaitEnd() const;
   void registerSeparately() const;
+  void carryOutAll(const std::vector<std::string>& steps, const Edit& edit);
 
   const std::string prefix_;
   const int processes_;

@@ -34,7 +34,8 @@ void OpenPegasus::prepare() {
 }
 
 std::vector<std::string> OpenPegasus::installing() const {
-  return {"install", "configure", "OpenPegasus providers", "OpenPegasus start", "OpenPegasus register"};
+  return {"install",           "configure",           "OpenPegasus listen", "OpenPegasus providers",
+          "OpenPegasus start", "OpenPegasus register"};
 }
 
 std::vector<std::string> OpenPegasus::removing() const {
@@ -43,6 +44,14 @@ std::vector<std::string> OpenPegasus::removing() const {
 
 std::vector<std::string> OpenPegasus::upgrading() const {
   return {"OpenPegasus stop", "install", "OpenPegasus start", "OpenPegasus upgrade"};
+}
+
+std::vector<std::string> OpenPegasus::registeringByCommand() const {
+  return {"OpenPegasus start", "OpenPegasus command register"};
+}
+
+std::vector<std::string> OpenPegasus::takingOutByCommand() const {
+  return {"OpenPegasus command remove", "OpenPegasus stop"};
 }
 
 bool OpenPegasus::unloadProviders() {

@@ -24,6 +24,8 @@ class OpenPegasus : public ObjectManager {
   std::vector<std::string> installing() const override;
   std::vector<std::string> removing() const override;
   std::vector<std::string> upgrading() const override;
+  std::vector<std::string> registeringByCommand() const override;
+  std::vector<std::string> takingOutByCommand() const override;
 };
 
 }  // namespace Testing

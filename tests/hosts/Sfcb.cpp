@@ -46,6 +46,10 @@ std::vector<std::string> Sfcb::removing() const { return {"sfcb stop", "sfcb rem
 
 std::vector<std::string> Sfcb::upgrading() const { return {"sfcb stop", "install", "sfcb register", "sfcb start"}; }
 
+std::vector<std::string> Sfcb::registeringByCommand() const { return {"sfcb command register", "sfcb start"}; }
+
+std::vector<std::string> Sfcb::takingOutByCommand() const { return {"sfcb stop", "sfcb command remove"}; }
+
 bool Sfcb::unloadProviders() {
   stop();
   run("cp -p " + configuration() + " /tmp/sfcb.cfg.patient\ncat >> " + configuration() + " <<'CFG'\n" + impatience +

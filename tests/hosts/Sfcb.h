@@ -25,6 +25,8 @@ class Sfcb : public ObjectManager {
   std::vector<std::string> installing() const override;
   std::vector<std::string> removing() const override;
   std::vector<std::string> upgrading() const override;
+  std::vector<std::string> registeringByCommand() const override;
+  std::vector<std::string> takingOutByCommand() const override;
 
  private:
   std::string configuration() const;

@@ -28,7 +28,8 @@ class ConcurrentRequestsTest : public ::testing::Test {
         directory_.write("agent.ini",
                          "[system]\nname = concurrency\n[log]\ndestination = file\n"
                          "threshold = 4000\nfile = " +
-                             directory_ / "log" + "\n[simulated]\nstate = " + directory_ / "state" + "\n");
+                             directory_ / "log" +
+                             "\n[processor]\nbackend = simulated\n[simulated]\nstate = " + directory_ / "state" + "\n");
     ::setenv("QV_AGENT_INI", agent.c_str(), 1);
     manager_.loadSchema(SOURCE_DIR "/schema");
     for (const Unit& unit : allUnits()) {

@@ -1,5 +1,8 @@
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 
+#include <string.h>
+#include <unistd.h>
+
 #include <algorithm>
 #include <stdexcept>
 
@@ -8,7 +11,23 @@
 
 namespace QV {
 
+SimulatedBackEnd::SimulatedBackEnd(const std::string& stateFile) : file_(stateFile) {
+  try {
+    file_.requireWritable();
+  } catch (const std::runtime_error& error) {
+    throw std::runtime_error(std::string(error.what()) + "; let the object manager's user, " +
+                             std::to_string(::geteuid()) +
+                             ", write there, or name another file with state in [simulated] of agent.ini");
+  }
+}
+
 ManagementProcessor SimulatedBackEnd::read() {
+  ManagementProcessor processor = readState();
+  processor.description = describedAsSimulated(processor.description);
+  return processor;
+}
+
+ManagementProcessor SimulatedBackEnd::readState() {
   if (const auto text = file_.read()) {
     return parse(*text);
   }
@@ -52,12 +71,17 @@ std::string parseSimulatedSettings(const BackEndSettings& section) {
   const Ground::Settings settings("agent.ini, [simulated]", section);
   for (const auto& [key, value] : section) {
     if (key != "state") {
-      settings.refuse(key, value, "there is no such key");
+      settings.refuse(key, value, "there is no such key: must be one of state");
     }
   }
   std::string state = "/var/lib/compositeipconfig/management-processor.json";
   settings.absolutePath("state", state);
   return state;
+}
+
+std::string describedAsSimulated(const std::string& description) {
+  return description.empty() || ::strcasestr(description.c_str(), "simulated") ? description
+                                                                               : description + " (simulated)";
 }
 
 ManagementProcessor factoryConfiguration() {

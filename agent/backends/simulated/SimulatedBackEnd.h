@@ -10,8 +10,9 @@ namespace QV {
 
 class SimulatedBackEnd : public BackEnd {
  public:
-  // Touches nothing yet: the first read or change writes the factory configuration where there is no file.
-  explicit SimulatedBackEnd(const std::string& stateFile) : file_(stateFile) {}
+  // Makes the file's directory where it is missing; the first read or change writes the factory configuration where
+  // there is no file. Throws std::runtime_error with what to do where the file could not be changed later.
+  explicit SimulatedBackEnd(const std::string& stateFile);
 
   // The file is read anew each time, since other processes change it. A damaged file is an error that names the field,
   // and no change overwrites it.
@@ -19,14 +20,17 @@ class SimulatedBackEnd : public BackEnd {
   void change(const std::string& interfaceName, const AddressChange& change) override;
 
  private:
+  ManagementProcessor readState();
   ManagementProcessor parse(const std::string& text) const;
 
   const StateFile file_;
 };
 
-// The state file that the section [simulated] names, or the usual one. Throws std::runtime_error that names the key and
-// what is wrong with it.
+// The state file that the section [simulated] names, or the usual one. Throws Ground::RefusedSetting.
 std::string parseSimulatedSettings(const BackEndSettings& section);
+
+// A simulated processor's description, which says so itself or is made to; an empty one stays empty.
+std::string describedAsSimulated(const std::string& description);
 
 // What a new simulated processor has: an interface with static addresses, one that is configured by DHCP, and two name
 // servers, all of the address blocks that are set aside for documentation (RFC 5737, RFC 3849).

@@ -9,6 +9,7 @@
 #include <cstring>
 #include <stdexcept>
 #include <string_view>
+#include <tuple>
 
 #include "agent/backends/simulated/FileLock.h"
 #include "ground/Descriptor.h"
@@ -27,7 +28,9 @@ constexpr std::chrono::milliseconds lockTimeout{4000};
 
 fs::path followLinks(fs::path path) {
   constexpr int mostLinks = 40;  // the kernel's own limit
-  for (int links = 0; fs::is_symlink(path); ++links) {
+  // A directory that may not be entered shows when the file is used, in words of ours.
+  std::error_code hidden;
+  for (int links = 0; fs::is_symlink(path, hidden); ++links) {
     if (links == mostLinks) {
       throw std::runtime_error(path.string() + ": too many symbolic links");
     }
@@ -112,18 +115,44 @@ void replace(const fs::path& target, std::string_view text) {
   }
 }
 
-}  // namespace
+fs::path lockOf(const fs::path& target) { return withSuffix(target, ".lock"); }
 
-std::optional<std::string> StateFile::read() const { return readAll(followLinks(path_)); }
-
-void StateFile::update(const std::function<std::string(const std::optional<std::string>&)>& edit) const {
-  const fs::path target = followLinks(path_);
+void makeDirectoryOf(const fs::path& target) {
   std::error_code failure;
   fs::create_directories(target.parent_path(), failure);
   if (failure) {
     throw std::runtime_error(target.parent_path().string() + ": cannot be created: " + failure.message());
   }
-  const FileLock lock(withSuffix(target, ".lock"), lockTimeout);
+}
+
+// The rights of this process, which may differ from those of who started it.
+void requireAccess(const fs::path& path, int mode, const char* what) {
+  if (::faccessat(AT_FDCWD, path.c_str(), mode, AT_EACCESS) != 0) {
+    fail(path, what);
+  }
+}
+
+}  // namespace
+
+void StateFile::requireWritable() const {
+  const fs::path target = followLinks(path_);
+  makeDirectoryOf(target);
+  requireAccess(target.parent_path(), W_OK | X_OK, "cannot be written");
+  for (const auto& [file, mode, what] :
+       {std::tuple(target, R_OK, "cannot be read"), std::tuple(lockOf(target), R_OK | W_OK, "cannot be opened")}) {
+    std::error_code hidden;
+    if (fs::exists(file, hidden)) {
+      requireAccess(file, mode, what);
+    }
+  }
+}
+
+std::optional<std::string> StateFile::read() const { return readAll(followLinks(path_)); }
+
+void StateFile::update(const std::function<std::string(const std::optional<std::string>&)>& edit) const {
+  const fs::path target = followLinks(path_);
+  makeDirectoryOf(target);
+  const FileLock lock(lockOf(target), lockTimeout);
   replace(target, edit(readAll(target)));
 }
 

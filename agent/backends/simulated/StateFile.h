@@ -15,7 +15,11 @@ class StateFile {
 
   const std::filesystem::path& path() const { return path_; }
 
-  // The text; nothing if there is no file. Throws std::runtime_error if it cannot be read.
+  // Throws std::runtime_error where this user cannot read or replace the file. A missing directory is made, else
+  // nothing.
+  void requireWritable() const;
+
+  // The text; nothing where there is no file. Throws std::runtime_error where it cannot be read.
   std::optional<std::string> read() const;
 
   // Replaces the text by what `edit` makes of the current one, alone among all processes (the lock is the file's name

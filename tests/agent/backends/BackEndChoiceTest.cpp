@@ -1,6 +1,7 @@
 // Which back end agent.ini chooses, and what is said if it cannot be had. A process has one back end, so each case
 // runs in a child, on a copy of the instrumentation library beside which the case puts what it needs.
 #include <dlfcn.h>
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <cstdio>
@@ -26,6 +27,10 @@ class BackEndChoiceTest : public testing::Test {
   ~BackEndChoiceTest() override { ::unsetenv("QV_AGENT_INI"); }
 
   void choose(const std::string& text) const { writeFile(ini_, text + "[log]\ndestination = off\n"); }
+
+  void chooseSimulated(const std::string& keys = {}) const {
+    choose("[processor]\nbackend = simulated\n" + keys + "[simulated]\nstate = " + (directory_ / "state.json") + '\n');
+  }
 
   // In the child: the processor's name and description, else what was thrown.
   static std::string describe(SharedBackEnd* sharedBackEnd) {
@@ -55,14 +60,50 @@ class BackEndChoiceTest : public testing::Test {
   const std::string ipmi_ = directory_ / "libqvbmc-ipmi.so";
 };
 
-TEST_F(BackEndChoiceTest, IsTheSimulatedProcessorByDefault) {
-  choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
+TEST_F(BackEndChoiceTest, IsTheSimulatedProcessorWhereAgentIniSaysSo) {
+  chooseSimulated();
   expect(describe, "^BMC: Simulated management processor$");
 }
 
+TEST_F(BackEndChoiceTest, IsNeverMadeForTheAdministrator) {
+  // Neither without the key, whatever else there is, nor without the file
+  choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
+  expect(
+      describe,
+      "^.*/agent.ini: .processor. has no key 'backend', so that there is no management processor; set backend = ipmi "
+      "for a BMC, or backend = simulated for made-up values$");
+  std::filesystem::remove(ini_);
+  expect(describe, "^.*/agent.ini: cannot be opened: No such file or directory; create it and choose [^\n]*$");
+  EXPECT_FALSE(std::filesystem::exists(directory_ / "state.json"));
+}
+
+TEST_F(BackEndChoiceTest, IsLoggedOnceWhereItIsTheSimulatedProcessor) {
+  const std::string log = directory_ / "agent.log";
+  writeFile(ini_, "[processor]\nbackend = simulated\n[simulated]\nstate = " + (directory_ / "state.json") +
+                      "\n[log]\ndestination = file\nfile = " + log + '\n');
+  expect(
+      [](SharedBackEnd* sharedBackEnd) {
+        sharedBackEnd()->read();
+        return describe(sharedBackEnd);
+      },
+      "^BMC: ");
+  EXPECT_THAT(readFile(log),
+              testing::MatchesRegex("[^\n]* 6000 Tarnwick.SimulatedProcessor [^\n]*: the management processor is "
+                                    "simulated \\(.*/agent.ini: backend = simulated\\): its values are made up, and "
+                                    "changes reach no hardware but .*/state.json\n"));
+}
+
 TEST_F(BackEndChoiceTest, GivesTheProcessorItsConfiguredNames) {
-  choose("[simulated]\nstate = " + (directory_ / "state.json") + "\n[processor]\nname = a\ndescription = b\n");
+  std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
+  choose("[processor]\nbackend = ipmi\nname = a\ndescription = b\n[ipmi]\nname = loaded\n");
   expect(describe, "^a: b$");
+}
+
+TEST_F(BackEndChoiceTest, SaysOfASimulatedProcessorWhatItIsUnderAnyDescription) {
+  chooseSimulated("name = a\ndescription = b\n");
+  expect(describe, "^a: b .simulated.$");
+  chooseSimulated("description = SIMULATED on rack 7\n");
+  expect(describe, "^BMC: SIMULATED on rack 7$");
 }
 
 TEST_F(BackEndChoiceTest, LoadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSettings) {
@@ -74,7 +115,9 @@ TEST_F(BackEndChoiceTest, LoadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsS
 TEST_F(BackEndChoiceTest, PassesOnWhyTheIpmiBackEndRefusesItsSettings) {
   std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
   choose("[processor]\nbackend = ipmi\n");
-  expect(describe, "^.ipmi. name is missing$");
+  expect(describe, "^/.*/agent.ini: .ipmi. name = : the key is missing and has no default$");
+  choose("[processor]\nbackend = ipmi\n[ipmi]\nname = loaded\ncolour = red\n");
+  expect(describe, "^/.*/agent.ini:5: .ipmi. colour = red: unknown$");
 }
 
 TEST_F(BackEndChoiceTest, TellsWhyTheIpmiBackEndCannotBeLoaded) {
@@ -94,7 +137,7 @@ TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse)
   expect(
       [this](SharedBackEnd* sharedBackEnd) {
         const std::string first = describe(sharedBackEnd);
-        choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
+        chooseSimulated();
         return first + "; then " + describe(sharedBackEnd);
       },
       "^the back end magic cannot be loaded: libqvbmc-magic.so: .*; install libqvbmc-magic.so, or correct backend in "
@@ -102,14 +145,29 @@ TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithAgentIniAndTriesAgainOnTheNextUse)
 }
 
 TEST_F(BackEndChoiceTest, TellsWhatIsWrongWithTheSettingsOfTheSimulatedProcessor) {
-  choose("[simulated]\nstate = here\n");
-  expect(describe, "^agent.ini, .simulated.: state = here: must be an absolute path$");
-  choose("[simulated]\nstatus = /here\n");
-  expect(describe, "^agent.ini, .simulated.: status = /here: there is no such key$");
+  choose("[processor]\nbackend = simulated\n[simulated]\nstate = here\n");
+  expect(describe, "^/.*/agent.ini:4: .simulated. state = here: must be an absolute path$");
+  choose("[processor]\nbackend = simulated\n[simulated]\nstatus = /here\n");
+  expect(describe, "^/.*/agent.ini:4: .simulated. status = /here: there is no such key: must be one of state$");
+}
+
+TEST_F(BackEndChoiceTest, TellsThatTheStateCannotBeWrittenBeforeItIsAskedForAnything) {
+  choose("[processor]\nbackend = simulated\n[simulated]\nstate = /proc/none/state.json\n");
+  expect(
+      [](SharedBackEnd* sharedBackEnd) {
+        try {
+          sharedBackEnd();
+          return std::string("opened");
+        } catch (const std::exception& error) {
+          return std::string(error.what());
+        }
+      },
+      "^/proc/none: cannot be created: [^;]*; let the object manager's user, [0-9]+, write there, or name another file "
+      "with state in .simulated. of agent.ini$");
 }
 
 TEST_F(BackEndChoiceTest, IsMadeOnceAndShared) {
-  choose("[simulated]\nstate = " + (directory_ / "state.json") + '\n');
+  chooseSimulated();
   expect(
       [](SharedBackEnd* sharedBackEnd) {
         return std::string(sharedBackEnd() == sharedBackEnd() ? "the same" : "another");

@@ -1,7 +1,6 @@
 // A back end in a shared object of its own: a processor whose name is what the setting "name" says.
-#include <stdexcept>
-
 #include "agent/processor/BackEnd.h"
+#include "ground/Settings.h"
 
 namespace {
 
@@ -18,9 +17,11 @@ class StandIn : public QV::BackEnd {
 }  // namespace
 
 extern "C" __attribute__((visibility("default"))) QV::BackEnd* qvCreateBackEnd(const QV::BackEndSettings& settings) {
-  const auto name = settings.find("name");
-  if (name == settings.end()) {
-    throw std::runtime_error("[ipmi] name is missing");
+  const Ground::Settings reader("agent.ini, [ipmi]", settings);
+  for (const auto& [key, value] : settings) {
+    if (key != "name") {
+      reader.refuse(key, value, "unknown");
+    }
   }
-  return new StandIn(name->second);
+  return new StandIn(reader.required("name"));
 }

@@ -1,6 +1,10 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <unistd.h>
 
+#include <cstdio>
+#include <cstdlib>
+#include <filesystem>
 #include <sstream>
 
 #include "Paths.h"
@@ -15,6 +19,7 @@ using namespace QV;
 using namespace Testing;
 using Destination = ChannelSettings::Destination;
 using testing::HasSubstr;
+using testing::StartsWith;
 
 AgentConfiguration parse(const std::string& text) {
   std::istringstream stream(text);
@@ -39,8 +44,9 @@ TEST(AgentConfigurationTest, AnEmptyFileMeansTheDefaults) {
   EXPECT_EQ(configuration.log.threshold, 6000);
   EXPECT_EQ(configuration.trace.destination, Destination::Off);
   EXPECT_EQ(configuration.trace.threshold, 4000);
-  EXPECT_EQ(configuration.backEnd, "simulated");
+  EXPECT_EQ(configuration.backEnd, "") << "a management processor is chosen, never assumed";
   EXPECT_TRUE(configuration.backEndSettings.empty());
+  EXPECT_FALSE(configuration.publishesHost);
 }
 
 TEST(AgentConfigurationTest, EveryKeyIsTaken) {
@@ -48,6 +54,7 @@ TEST(AgentConfigurationTest, EveryKeyIsTaken) {
       "[system]\nname = rack7.example\n"
       "[log]\ndestination = file\nfile = /l/log\nthreshold = 5000\nthreshold.Tarnwick.IPConfigProvider = 4000\n"
       "[trace]\ndestination = stderr\nfile = /l/trace\nthreshold = 1\nthreshold.A = 2\nthreshold.B = 0\n"
+      "[host]\npublish = yes\n"
       "[processor]\nbackend = ipmi\nname = bmc7\ndescription = the one in rack 7\n"
       "[simulated]\nstate = /s/state.json\n"
       "[ipmi]\nhost = 192.0.2.10\nanything = at all\n");
@@ -60,6 +67,7 @@ TEST(AgentConfigurationTest, EveryKeyIsTaken) {
   EXPECT_EQ(configuration.trace.file, "/l/trace");
   EXPECT_EQ(configuration.trace.threshold, 1);
   EXPECT_EQ(configuration.trace.componentThresholds, (std::map<std::string, int>{{"A", 2}, {"B", 0}}));
+  EXPECT_TRUE(configuration.publishesHost);
   EXPECT_EQ(configuration.backEnd, "ipmi");
   EXPECT_EQ(configuration.processorName, "bmc7");
   EXPECT_EQ(configuration.processorDescription, "the one in rack 7");
@@ -81,12 +89,13 @@ TEST(AgentConfigurationTest, TheSampleIsAFileOfDefaults) {
   EXPECT_NO_THROW(parse(sample));
   const AgentConfiguration shown = parse(inForce);
   const AgentConfiguration defaults;
-  EXPECT_NE(inForce.find("\nbackend = simulated\n"), std::string::npos);
+  EXPECT_NE(inForce.find("\npublish = no\n"), std::string::npos);
   EXPECT_EQ(shown.log.destination, defaults.log.destination);
   EXPECT_EQ(shown.log.threshold, defaults.log.threshold);
   EXPECT_EQ(shown.trace.destination, defaults.trace.destination);
   EXPECT_EQ(shown.trace.threshold, defaults.trace.threshold);
-  EXPECT_EQ(shown.backEnd, defaults.backEnd);
+  EXPECT_EQ(shown.publishesHost, defaults.publishesHost);
+  EXPECT_EQ(shown.backEnd, "ipmi") << "an example, since there is no default";
   EXPECT_NE(inForce.find("\nstate = " + parseSimulatedSettings({}) + "\n"), std::string::npos);
 }
 
@@ -104,11 +113,15 @@ TEST_P(FaultyAgentIniTest, IsRefusedWithTheLineAndTheReason) {
 INSTANTIATE_TEST_SUITE_P(
     Each, FaultyAgentIniTest,
     testing::Values(
-        Fault{"name = x\n", "agent.ini:1: the key 'name' stands before any section"},
-        Fault{"[system]\nname = x\n[sytem]\nname = y\n", "agent.ini:4: there is no section [sytem]"},
-        Fault{"\n[system]\nnane = x\n", "agent.ini:3: [system] has no key 'nane'"},
+        Fault{"name = x\n", "agent.ini:1: the key 'name' stands before any section: move it below its [section]"},
+        Fault{"[system]\nname = x\n[sytem]\nname = y\n",
+              "agent.ini:4: there is no section [sytem]: must be one of system, log, trace, host, processor, "
+              "simulated, ipmi"},
+        Fault{"\n[system]\nnane = x\n", "agent.ini:3: [system] has no key 'nane': must be one of name"},
         Fault{"[system]\nname =\n", "agent.ini:2: [system] name = : must not be empty"},
-        Fault{"[log]\nthreshold.=5\n", "agent.ini:2: [log] has no key 'threshold.'"},
+        Fault{"[log]\nthreshold.=5\n",
+              "agent.ini:2: [log] has no key 'threshold.': must be one of destination, file, threshold, "
+              "threshold.COMPONENT"},
         Fault{"[log]\nthreshold = high\n",
               "agent.ini:2: [log] threshold = high: must be a number from 0 to 2147483647"},
         Fault{"[log]\nthreshold = -1\n", "agent.ini:2: [log] threshold = -1: must be a number from 0 to 2147483647"},
@@ -124,7 +137,10 @@ INSTANTIATE_TEST_SUITE_P(
             "agent.ini:2: [processor] backend = ../magic: must be the name of a back end, of letters, digits and '-'"},
         Fault{"[processor]\nbackend =\n",
               "agent.ini:2: [processor] backend = : must be the name of a back end, of letters, digits and '-'"},
-        Fault{"[magic]\nwand = 1\n[processor]\nbackend = ipmi\n", "agent.ini:2: there is no section [magic]"},
+        Fault{"[host]\npublish = maybe\n", "agent.ini:2: [host] publish = maybe: must be one of yes, no"},
+        Fault{"[magic]\nwand = 1\n[processor]\nbackend = ipmi\n",
+              "agent.ini:2: there is no section [magic]: must be one of system, log, trace, host, processor, "
+              "simulated, ipmi"},
         Fault{"[system]\nname = a\nname = b\n", "agent.ini:3: [system] name: duplicate"},
         Fault{"[system]\njust words\n", "agent.ini:2: must be a [section] or a key = value"},
         Fault{"[system\nname = a\n", "agent.ini:1: must be a [section] or a key = value"}),
@@ -132,7 +148,7 @@ INSTANTIATE_TEST_SUITE_P(
 
 TEST(AgentConfigurationTest, TheFirstOfSeveralFaultsIsReported) {
   EXPECT_EQ(complaintAbout("[system]\nwords\n[nowhere]\na = b\n"), "agent.ini:2: must be a [section] or a key = value");
-  EXPECT_EQ(complaintAbout("[nowhere]\na = b\nwords\n"), "agent.ini:2: there is no section [nowhere]");
+  EXPECT_THAT(complaintAbout("[nowhere]\na = b\nwords\n"), StartsWith("agent.ini:2: there is no section [nowhere]"));
 }
 
 TEST(AgentConfigurationTest, AnIndentedKeyIsAKeyAndNoContinuation) {
@@ -174,7 +190,32 @@ TEST(AgentConfigurationTest, TheFileThatTheVariableNamesIsRead) {
 TEST(AgentConfigurationTest, AFileThatTheVariableNamesAndThatIsMissingIsAnError) {
   const TemporaryDirectory directory;
   const AgentIniVariable variable(directory / "none.ini");
-  EXPECT_EQ(thrownBy(readAgentConfiguration), directory / "none.ini" + ": cannot be opened: No such file or directory");
+  EXPECT_EQ(thrownBy(readAgentConfiguration),
+            directory / "none.ini" +
+                ": cannot be opened: No such file or directory; create it and choose the management processor there: "
+                "[processor] with backend = ipmi for a BMC, or backend = simulated for made-up values");
+}
+
+TEST(AgentConfigurationTest, AFileThatThisUserMayNotReadIsAnError) {
+  const Testing::TemporaryDirectory directory;
+  writeFile(directory / "a.ini", "");
+  std::filesystem::permissions(directory / "a.ini", std::filesystem::perms::none);
+  const AgentIniVariable variable(directory / "a.ini");
+  // Even root is held by permissions once it is somebody else.
+  const auto readAsSomebodyElse = [] {
+    const bool somebodyElse = ::geteuid() != 0 || ::seteuid(65534) == 0;
+    std::fputs(somebodyElse ? thrownBy(readAgentConfiguration).c_str() : "still root", stderr);
+    std::exit(0);
+  };
+  std::filesystem::permissions(directory.path(), std::filesystem::perms::all);
+  EXPECT_EXIT(readAsSomebodyElse(), testing::ExitedWithCode(0),
+              "a.ini: cannot be opened: Permission denied; let the object manager's user read it$");
+}
+
+TEST(AgentConfigurationTest, IsLookedForInOnePlaceWhateverTheInstallPrefix) {
+  EXPECT_EQ(agentConfigurationFile(), CONFIGURATION_DIR "/agent.ini");
+  const AgentIniVariable variable("/elsewhere/agent.ini");
+  EXPECT_EQ(agentConfigurationFile(), "/elsewhere/agent.ini");
 }
 
 TEST(AgentConfigurationTest, ADirectoryInPlaceOfTheFileIsAnError) {
@@ -187,7 +228,7 @@ TEST(AgentConfigurationTest, AFaultNamesTheFile) {
   const TemporaryDirectory directory;
   writeFile(directory / "a.ini", "[x]\ny = z\n");
   const AgentIniVariable variable(directory / "a.ini");
-  EXPECT_EQ(thrownBy(readAgentConfiguration), directory / "a.ini" + ":2: there is no section [x]");
+  EXPECT_THAT(thrownBy(readAgentConfiguration), StartsWith(directory / "a.ini" + ":2: there is no section [x]"));
 }
 
 }  // namespace

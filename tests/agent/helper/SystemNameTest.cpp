@@ -26,4 +26,10 @@ TEST(SystemNameTest, IsTheHostNameWhereAgentIniIsBroken) {
   expectSystemName("[nowhere]\nname = x\n", Ground::hostName());
 }
 
+TEST(SystemNameTest, IsTheHostNameWithoutAgentIni) {
+  ::setenv("QV_AGENT_INI", "/nowhere/agent.ini", 1);
+  EXPECT_EXIT(std::exit(getSystemName() == Ground::hostName() ? 0 : 1), testing::ExitedWithCode(0), "");
+  ::unsetenv("QV_AGENT_INI");
+}
+
 }  // namespace

@@ -87,6 +87,19 @@ TEST(LoggerTest, ReportsABrokenAgentIniOnceAndGoesOn) {
   ::unsetenv("QV_AGENT_INI");
 }
 
+TEST(LoggerTest, ReportsAMissingAgentIniOnceWithWhatToDoAndGoesOn) {
+  ::setenv("QV_AGENT_INI", "/nowhere/agent.ini", 1);
+  const auto report = [] {
+    log("C", 6000, "one");
+    log("C", 6000, "two");
+    std::exit(0);
+  };
+  EXPECT_EXIT(report(), ExitedWithCode(0),
+              "^management agent: /nowhere/agent.ini: cannot be opened: No such file or directory; create it[^\n]*; "
+              "logging with the defaults\n$");
+  ::unsetenv("QV_AGENT_INI");
+}
+
 TEST(LoggerTest, TakesMessagesFromSeveralThreads) {
   const TemporaryDirectory directory;
   const std::string ini = directory / "agent.ini";

@@ -39,7 +39,7 @@ TEST_F(EncapsulationTest, MessagesReachTheLog) {
 TEST_F(EncapsulationTest, TheLogIsTheStandardErrorOutputAtFirst) {
   testing::internal::CaptureStderr();
   CMLogMessage(broker, CMPI_SEV_ERROR, "ID", "text", nullptr);
-  CMLogMessage(broker, 99, nullptr, "odd", nullptr);
+  CMLogMessage(broker, static_cast<Cmpi::Severity>(7), nullptr, "odd", nullptr);
   EXPECT_EQ(testing::internal::GetCapturedStderr(), "error: ID: text\nmessage: odd\n");
 }
 

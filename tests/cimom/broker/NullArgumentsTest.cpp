@@ -157,10 +157,10 @@ TEST_F(NullArgumentsTest, InTheErrorTable) {
   REFUSED_BY_STATUS(ft.getCIMStatusCode(nullptr, st));
   REFUSED_BY_STATUS(ft.getCIMStatusCodeDescription(nullptr, st));
   REFUSED_BY_STATUS(ft.getMessageArguments(nullptr, st));
-  REFUSED(ft.setErrorType(nullptr, CMPIErrorTypeOther));
-  REFUSED(ft.setErrorSourceFormat(nullptr, CMPIErrorSrcFormatUnknown));
-  CMPIError* error = broker->eft->newCMPIError(broker, "o", "i", "m", CMPIErrorSeverityUnknown,
-                                               CMPIErrorProbableCauseUnknown, CMPI_RC_OK, nullptr);
+  REFUSED(ft.setErrorType(nullptr, static_cast<CMPIErrorType>(1)));
+  REFUSED(ft.setErrorSourceFormat(nullptr, CMPIErrorSrcFormat{}));
+  CMPIError* error = broker->eft->newCMPIError(broker, "o", "i", "m", CMPIErrorSeverity{}, CMPIErrorProbableCause{},
+                                               CMPI_RC_OK, nullptr);
   for (CMPIError* any : {static_cast<CMPIError*>(nullptr), error}) {
     REFUSED(ft.setOtherErrorType(any, nullptr));
     REFUSED(ft.setProbableCauseDescription(any, nullptr));
@@ -192,9 +192,9 @@ TEST_F(NullArgumentsTest, InTheEncapsulationTable) {
     REFUSED_BY_STATUS(eft.getMessage(none, "a", "a", st, 0));
     REFUSED_BY_STATUS(eft.getMessage2(none, "a", nullptr, "a", st, 0));
     REFUSED_BY_STATUS(
-        eft.newCMPIError(none, "a", "a", "a", CMPIErrorSeverityUnknown, CMPIErrorProbableCauseUnknown, CMPI_RC_OK, st));
-    REFUSED(eft.logMessage(none, 1, "a", "a", nullptr));
-    REFUSED(eft.trace(none, 1, "a", "a", nullptr));
+        eft.newCMPIError(none, "a", "a", "a", CMPIErrorSeverity{}, CMPIErrorProbableCause{}, CMPI_RC_OK, st));
+    REFUSED(eft.logMessage(none, Cmpi::Severity{}, "a", "a", nullptr));
+    REFUSED(eft.trace(none, Cmpi::TraceLevel{}, "a", "a", nullptr));
     REFUSED(eft.openMessageFile(none, "a", nullptr));
     REFUSED(eft.closeMessageFile(none, nullptr));
   }
@@ -211,10 +211,10 @@ TEST_F(NullArgumentsTest, InTheEncapsulationTable) {
   REFUSED_BY_STATUS(eft.getType(broker, nullptr, st));
   REFUSED_BY_STATUS(eft.getMessage(broker, "a", nullptr, st, 0));
   REFUSED_BY_STATUS(eft.getMessage2(broker, "a", nullptr, nullptr, st, 0));
-  REFUSED_BY_STATUS(eft.newCMPIError(broker, nullptr, nullptr, nullptr, CMPIErrorSeverityUnknown,
-                                     CMPIErrorProbableCauseUnknown, CMPI_RC_OK, st));
-  REFUSED(eft.logMessage(broker, 1, nullptr, nullptr, nullptr));
-  REFUSED(eft.trace(broker, 1, nullptr, nullptr, nullptr));
+  REFUSED_BY_STATUS(eft.newCMPIError(broker, nullptr, nullptr, nullptr, CMPIErrorSeverity{}, CMPIErrorProbableCause{},
+                                     CMPI_RC_OK, st));
+  REFUSED(eft.logMessage(broker, Cmpi::Severity{}, nullptr, nullptr, nullptr));
+  REFUSED(eft.trace(broker, Cmpi::TraceLevel{}, nullptr, nullptr, nullptr));
   EXPECT_NE(eft.newObjectPath(broker, nullptr, "Class", nullptr), nullptr) << "a path need not have a namespace";
 }
 

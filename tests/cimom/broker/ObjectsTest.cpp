@@ -127,25 +127,25 @@ TEST_F(ObjectsTest, RefusesMalformedDateTimes) {
 }
 
 TEST_F(ObjectsTest, AnErrorHoldsWhatIsSetAndNothingElse) {
-  CMPIError* error = broker->eft->newCMPIError(broker, "owner", "ID7", "it broke", CMPIErrorSeverityUnknown,
-                                               CMPIErrorProbableCauseUnknown, CMPI_RC_ERR_FAILED, &status);
+  CMPIError* error = broker->eft->newCMPIError(broker, "owner", "ID7", "it broke", CMPIErrorSeverity{},
+                                               CMPIErrorProbableCause{}, CMPI_RC_ERR_FAILED, &status);
   CMPIArray* actions = CMNewArray(broker, 1, CMPI_string, nullptr);
   CMSetArrayElementAt(actions, 0, "replace it", CMPI_chars);
   const auto& ft = *error->ft;
-  EXPECT_EQ(ft.setErrorType(error, CMPIErrorTypeOther).rc, CMPI_RC_OK);
+  EXPECT_EQ(ft.setErrorType(error, static_cast<CMPIErrorType>(1)).rc, CMPI_RC_OK);
   EXPECT_EQ(ft.setErrorSource(error, "disk").rc, CMPI_RC_OK);
-  EXPECT_EQ(ft.setErrorSourceFormat(error, CMPIErrorSrcFormatUnknown).rc, CMPI_RC_OK);
+  EXPECT_EQ(ft.setErrorSourceFormat(error, CMPIErrorSrcFormat{}).rc, CMPI_RC_OK);
   EXPECT_EQ(ft.setRecommendedActions(error, actions).rc, CMPI_RC_OK);
   EXPECT_EQ(ft.setMessageArguments(error, actions).rc, CMPI_RC_OK);
 
   EXPECT_EQ(shownText(ft.getOwningEntity(error, nullptr)), "owner");
   EXPECT_EQ(shownText(ft.getMessageID(error, nullptr)), "ID7");
   EXPECT_EQ(shownText(ft.getMessage(error, nullptr)), "it broke");
-  EXPECT_EQ(ft.getPerceivedSeverity(error, nullptr), CMPIErrorSeverityUnknown);
-  EXPECT_EQ(ft.getProbableCause(error, nullptr), CMPIErrorProbableCauseUnknown);
+  EXPECT_EQ(ft.getPerceivedSeverity(error, nullptr), CMPIErrorSeverity{});
+  EXPECT_EQ(ft.getProbableCause(error, nullptr), CMPIErrorProbableCause{});
   EXPECT_EQ(ft.getCIMStatusCode(error, nullptr), CMPI_RC_ERR_FAILED);
-  EXPECT_EQ(ft.getErrorType(error, nullptr), CMPIErrorTypeOther);
-  EXPECT_EQ(ft.getErrorSourceFormat(error, nullptr), CMPIErrorSrcFormatUnknown);
+  EXPECT_EQ(ft.getErrorType(error, nullptr), static_cast<CMPIErrorType>(1));
+  EXPECT_EQ(ft.getErrorSourceFormat(error, nullptr), CMPIErrorSrcFormat{});
   EXPECT_EQ(shownText(ft.getErrorSource(error, nullptr)), "disk");
   EXPECT_EQ(CMGetArrayCount(ft.getRecommendedActions(error, nullptr), nullptr), 1u);
   EXPECT_EQ(CMGetArrayCount(ft.getMessageArguments(error, nullptr), nullptr), 1u);

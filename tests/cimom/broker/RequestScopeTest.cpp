@@ -66,8 +66,8 @@ TEST_F(RequestScopeTest, EveryKindOfObjectButAResultCanBeCloned) {
   cloned(CMNewArgs(broker, nullptr));
   cloned(CMNewDateTime(broker, nullptr));
   cloned(RequestScope::current()->context());
-  cloned(broker->eft->newCMPIError(broker, "o", "i", "m", CMPIErrorSeverityUnknown, CMPIErrorProbableCauseUnknown,
-                                   CMPI_RC_OK, nullptr));
+  cloned(broker->eft->newCMPIError(broker, "o", "i", "m", CMPIErrorSeverity{}, CMPIErrorProbableCause{}, CMPI_RC_OK,
+                                   nullptr));
 }
 
 TEST_F(RequestScopeTest, AMarkEndsWithItsReleaseAndTakesLaterMarksWithIt) {

@@ -80,6 +80,25 @@ TEST_F(ThreadServicesTest, EachThreadHasItsOwnValueOfAKey) {
   EXPECT_EQ(xft.destroyThreadKey(key), 0);
 }
 
+TEST_F(ThreadServicesTest, OfAKeyNoMoreIsWrittenThanEveryProviderHasRoomFor) {
+  // Given a key of four bytes, as most headers have it, and what lies behind it in the provider's memory
+  struct {
+    std::uint32_t key = 0;
+    std::uint32_t behind = 0x12345678;
+    std::uint32_t further = 0x12345678;
+  } memory;
+  ASSERT_EQ(xft.createThreadKey(reinterpret_cast<CMPI_THREAD_KEY_TYPE*>(&memory.key), nullptr), 0);
+  EXPECT_EQ(memory.behind, 0x12345678U);
+  EXPECT_EQ(memory.further, 0x12345678U);
+
+  // And as it travels from a provider whose key has eight, with anything in the upper half
+  const auto key = static_cast<CMPI_THREAD_KEY_TYPE>(0xabcdef0000000000U | memory.key);
+  int here = 0;
+  EXPECT_EQ(xft.setThreadSpecific(key, &here), 0);
+  EXPECT_EQ(xft.getThreadSpecific(key), &here);
+  EXPECT_EQ(xft.destroyThreadKey(key), 0);
+}
+
 TEST_F(ThreadServicesTest, AConditionWakesWhoWaitsForIt) {
   struct Shared {
     const CMPIBrokerExtFT* xft;

@@ -132,8 +132,8 @@ TEST_F(InstanceOperationsTest, AFailureAfterSomeResultsIsAllThatTheCallerGets) {
 
 TEST_F(InstanceOperationsTest, AnErrorObjectThatTheProviderReturnsFailsTheOperation) {
   probe->answer = [this](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
-    CMReturnError(result, broker->eft->newCMPIError(broker, "owner", "ID1", "disk gone", CMPIErrorSeverityUnknown,
-                                                    CMPIErrorProbableCauseUnknown, CMPI_RC_ERR_ACCESS_DENIED, nullptr));
+    CMReturnError(result, broker->eft->newCMPIError(broker, "owner", "ID1", "disk gone", CMPIErrorSeverity{},
+                                                    CMPIErrorProbableCause{}, CMPI_RC_ERR_ACCESS_DENIED, nullptr));
     return ok;
   };
 

@@ -1,5 +1,6 @@
 // An agent of its own for a test program: an agent.ini whose simulated processor, log and trace lie in a temporary
-// directory. The agent's libraries read agent.ini once in a process, so it is put in place before the first test.
+// directory, which shows the host, too, and whose log does not say once in a process that the processor is simulated.
+// The agent's libraries read agent.ini once in a process, so it is put in place before the first test.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -22,8 +23,10 @@ class AgentEnvironment : public testing::Environment {
   void SetUp() override {
     directory_ = std::make_unique<TemporaryDirectory>();
     const std::string ini = *directory_ / "agent.ini";
-    writeFile(ini, "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " + log() +
-                       "\n[trace]\ndestination = file\nfile = " + trace() + "\n[simulated]\nstate = " + state() + "\n");
+    writeFile(
+        ini, "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " + log() +
+                 "\nthreshold.Tarnwick.SimulatedProcessor = 7000" + "\n[trace]\ndestination = file\nfile = " + trace() +
+                 "\n[host]\npublish = yes\n[processor]\nbackend = simulated\n[simulated]\nstate = " + state() + "\n");
     ::setenv("QV_AGENT_INI", ini.c_str(), 1);
   }
 

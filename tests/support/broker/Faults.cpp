@@ -163,7 +163,7 @@ CMPIString* FaultyBroker::newString(const CMPIBroker*, const char* characters, C
   return CMNewString(current->real(), characters, status);
 }
 
-CMPIStatus FaultyBroker::trace(const CMPIBroker*, int level, const char* component, const char* message,
+CMPIStatus FaultyBroker::trace(const CMPIBroker*, Cmpi::TraceLevel level, const char* component, const char* message,
                                const CMPIString* string) {
   current->traces.push_back({level, component, !string ? message : "unexpected string"});
   return {personality().traceCode, nullptr};

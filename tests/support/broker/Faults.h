@@ -82,7 +82,7 @@ class FaultyBroker {
   static CMPIInstance* newInstance(const CMPIBroker*, const CMPIObjectPath*, CMPIStatus*);
   static CMPIArray* newArray(const CMPIBroker*, CMPICount, CMPIType, CMPIStatus*);
   static CMPIString* newString(const CMPIBroker*, const char*, CMPIStatus*);
-  static CMPIStatus trace(const CMPIBroker*, int, const char*, const char*, const CMPIString*);
+  static CMPIStatus trace(const CMPIBroker*, Cmpi::TraceLevel, const char*, const char*, const CMPIString*);
 
   PersonalBroker personal_;
   CMPIBroker broker_;

@@ -85,8 +85,8 @@ CMPIString* PersonalBroker::newString(const CMPIBroker* broker, const char* char
   return personal(string);
 }
 
-CMPIStatus PersonalBroker::trace(const CMPIBroker* broker, int level, const char* component, const char* text,
-                                 const CMPIString* string) {
+CMPIStatus PersonalBroker::trace(const CMPIBroker* broker, Cmpi::TraceLevel level, const char* component,
+                                 const char* text, const CMPIString* string) {
   if (personality().traceCode != CMPI_RC_OK) {
     return {personality().traceCode, nullptr};
   }

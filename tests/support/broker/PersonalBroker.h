@@ -26,7 +26,7 @@ class PersonalBroker {
   static CMPIObjectPath* newObjectPath(const CMPIBroker*, const char*, const char*, CMPIStatus*);
   static CMPIInstance* newInstance(const CMPIBroker*, const CMPIObjectPath*, CMPIStatus*);
   static CMPIString* newString(const CMPIBroker*, const char*, CMPIStatus*);
-  static CMPIStatus trace(const CMPIBroker*, int, const char*, const char*, const CMPIString*);
+  static CMPIStatus trace(const CMPIBroker*, Cmpi::TraceLevel, const char*, const char*, const CMPIString*);
 
   CMPIBroker broker_;
   CMPIBrokerFT upCallTable_;

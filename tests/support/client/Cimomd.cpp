@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <stdexcept>
 
+#include "Paths.h"
 #include "tests/support/system/Poll.h"
 
 namespace Testing {

@@ -14,7 +14,7 @@ std::string contentOf(const std::filesystem::path& file) {
 CompositeStack::CompositeStack(const std::string& processor, int logThreshold) {
   const std::string ini = "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " +
                           (directory_.path() / "agent.log").string() + "\nthreshold = " + std::to_string(logThreshold) +
-                          "\n" + processor;
+                          "\nthreshold.Tarnwick.SimulatedProcessor = 7000\n[host]\npublish = yes\n" + processor;
   cimomd_ =
       std::make_unique<Cimomd>(options(), Environment{{"QV_AGENT_INI", directory_.write("agent.ini", ini).string()}});
 }

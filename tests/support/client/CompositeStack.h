@@ -11,7 +11,8 @@
 namespace Testing {
 
 // The whole product as it is installed: cimomd with the product's classes and registration, the composite and the
-// underlying provider, and an agent.ini of its own. The managed system is called managed.example.
+// underlying provider, and an agent.ini of its own. The managed system is called managed.example, and root/yrnse shows
+// the host, too, whose objects must not reach the composite. That a processor is simulated is not logged.
 class CompositeStack : public WbemClient {
  public:
   // @param processor the sections of agent.ini that say how the management processor is reached

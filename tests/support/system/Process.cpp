@@ -100,6 +100,8 @@ Process::~Process() {
 
 void Process::signal(int number) const { kill(id_, number); }
 
+void Process::signalGroup(int number) const { kill(-id_, number); }
+
 bool Process::isRunning() {
   int state = 0;
   if (status_ < 0 && waitpid(id_, &state, WNOHANG) == id_) {

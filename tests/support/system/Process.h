@@ -27,6 +27,8 @@ class Process {
   Process& operator=(const Process&) = delete;
 
   void signal(int number) const;
+  // To it and its process group, as a terminal does at ^C. The program must lead one: begin its command with setsid.
+  void signalGroup(int number) const;
 
   // The exit status; 128 and the signal's number if a signal ended it. Throws std::runtime_error when the program has
   // not ended by then.

@@ -1,6 +1,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <unistd.h>
 
+#include <cstdio>
+#include <cstdlib>
 #include <thread>
 #include <vector>
 
@@ -22,8 +25,37 @@ class SimulatedBackEndTest : public testing::Test {
   SimulatedBackEnd processor_{state_};
 };
 
-TEST_F(SimulatedBackEndTest, TouchesNothingBeforeItIsUsed) {
-  EXPECT_TRUE(std::filesystem::is_empty(directory_.path()));
+TEST_F(SimulatedBackEndTest, MakesNothingButItsDirectoryBeforeItIsUsed) {
+  EXPECT_TRUE(std::filesystem::is_empty(std::filesystem::path(state_).parent_path()));
+}
+
+TEST_F(SimulatedBackEndTest, IsDescribedAsSimulatedWhateverItsStateSays) {
+  ManagementProcessor renamed = factoryConfiguration();
+  renamed.description = "The BMC of rack 7";
+  writeFile(state_, writeState(renamed));
+  EXPECT_EQ(processor_.read().description, "The BMC of rack 7 (simulated)");
+  processor_.change("eth0", {ipv4("192.0.2.77"), {}});
+  EXPECT_THAT(readFile(state_), testing::HasSubstr("\"The BMC of rack 7\""));
+}
+
+TEST_F(SimulatedBackEndTest, IsRefusedWhereItsStateCouldNotBeChanged) {
+  const std::filesystem::path directory = std::filesystem::path(state_).parent_path();
+  std::filesystem::permissions(directory_.path(), std::filesystem::perms::all);
+  constexpr auto entered =
+      std::filesystem::perms::owner_exec | std::filesystem::perms::group_exec | std::filesystem::perms::others_exec;
+  std::filesystem::permissions(directory, entered);
+  // Even root is held by permissions once it is somebody else.
+  const auto openAsSomebodyElse = [&] {
+    const bool somebodyElse = ::geteuid() != 0 || ::seteuid(65534) == 0;
+    const auto open = [&] { const SimulatedBackEnd refused(state_); };
+    std::fputs(somebodyElse ? thrownBy(open).c_str() : "still root", stderr);
+    std::exit(0);
+  };
+  EXPECT_EXIT(openAsSomebodyElse(), testing::ExitedWithCode(0),
+              "^" + directory.string() +
+                  ": cannot be written: Permission denied; let the object manager's user, [0-9]+, write there, or name "
+                  "another file with state in .simulated. of agent.ini$");
+  std::filesystem::permissions(directory, std::filesystem::perms::owner_all);
 }
 
 TEST_F(SimulatedBackEndTest, WritesItsFactoryConfigurationOnTheFirstRead) {
