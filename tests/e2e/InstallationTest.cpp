@@ -73,7 +73,7 @@ class InstallationTest : public testing::Test {
   Cimomd serve(const fs::path& tree, const std::string& processor) {
     const auto ini =
         directory_.write("agent.ini", "[system]\nname = managed.example\n[log]\ndestination = off\n" + processor);
-    return Cimomd({}, {{"QV_AGENT_INI", ini}}, onlyFile(tree, "cimomd"));
+    return Cimomd({}, {{"QV_AGENT_INI", ini}}, tree / "sbin/cimomd");
   }
 
   fs::path installAndMove() {
