@@ -120,7 +120,7 @@ TEST_F(InstallationTest, LoadsABackEndOfTheMovedTree) {
     EXPECT_THAT(run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwComputerSystem", "root/cimv2")}).errors, HasSubstr(why));
   };
   // It is the back end that looks at its keys.
-  askFor("[ipmi]: connection = nowhere: ");
+  askFor("connection = nowhere: must be one of inband, lan");
   fs::remove(onlyFile(tree, "libqvbmc-ipmi.so"));
   askFor("the back end ipmi cannot be loaded");
 }
