@@ -74,7 +74,7 @@ class InstallationTest : public testing::Test {
   Cimomd serve(const fs::path& tree, const std::string& processor) {
     const auto ini =
         directory_.write("agent.ini", "[system]\nname = managed.example\n[log]\ndestination = off\n" + processor);
-    return Cimomd({}, {{"QV_AGENT_INI", ini}}, onlyFile(tree, "cimomd"));
+    return Cimomd({}, {{"QV_AGENT_INI", ini}}, tree / "sbin/cimomd");
   }
 
   fs::path installAndMove() {
@@ -121,7 +121,7 @@ TEST_F(InstallationTest, LoadsABackEndOfTheMovedTree) {
     EXPECT_THAT(run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwComputerSystem", "root/cimv2")}).errors, HasSubstr(why));
   };
   // It is the back end that looks at its keys.
-  askFor("[ipmi]: connection = nowhere: ");
+  askFor("connection = nowhere: must be one of inband, lan");
   fs::remove(onlyFile(tree, "libqvbmc-ipmi.so"));
   askFor("the back end ipmi cannot be loaded");
 }
