@@ -5,6 +5,7 @@
 
 #include <mutex>
 
+#include "cimom/cimxml/DocumentLimits.h"
 #include "cimom/cimxml/Errors.h"
 
 namespace Cimom::CimXml {
@@ -34,19 +35,8 @@ std::string trimmed(std::string text) {
   return text;
 }
 
-// CIM-XML has no use for entities of its own; what is never declared can neither grow nor reach a file.
-void refuseEntities(void* context, const xmlChar*, int, const xmlChar*, const xmlChar*, xmlChar*) {
-  auto* parser = static_cast<xmlParserCtxt*>(context);
-  xmlStopParser(parser);
-  parser->wellFormed = 0;
-}
-
-std::string describe(const xmlParserCtxt& context) {
-  const xmlError& error = context.lastError;
-  if (!error.message || context.errNo == XML_ERR_USER_STOP) {
-    return "the request declares entities";
-  }
-  return "line " + std::to_string(error.line) + ": " + trimmed(error.message);
+std::string describe(const xmlError& error) {
+  return "line " + std::to_string(error.line) + ": " + (error.message ? trimmed(error.message) : "cannot be parsed");
 }
 
 }  // namespace
@@ -116,17 +106,17 @@ void Element::refuse(const std::string& what) const {
 }
 
 Document::Document(std::string_view xml) : document_(nullptr, &xmlFreeDoc) {
+  requireWithinLimits(xml);
   static std::once_flag initialized;
   std::call_once(initialized, xmlInitParser);
   const ParserContext context(xmlNewParserCtxt(), &xmlFreeParserCtxt);
   if (!context) {
     throw std::bad_alloc();
   }
-  context->sax->entityDecl = &refuseEntities;
   document_.reset(xmlCtxtReadMemory(context.get(), xml.data(), static_cast<int>(xml.size()), nullptr, nullptr,
                                     XML_PARSE_NONET | XML_PARSE_NOERROR | XML_PARSE_NOWARNING | XML_PARSE_COMPACT));
   if (!document_) {
-    throw TransportError(400, "request-not-well-formed", describe(*context));
+    throw TransportError(400, "request-not-well-formed", describe(context->lastError));
   }
 }
 

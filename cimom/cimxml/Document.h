@@ -40,8 +40,8 @@ class Element {
 
 class Document {
  public:
-  // Throws TransportError "request-not-well-formed". Nothing but the text is read: no DTD, no external entity; a
-  // document that declares entities is refused, and so is one nested deeper than 256 elements.
+  // Throws TransportError "request-not-well-formed", and as requireWithinLimits does. Nothing but the text is read: no
+  // DTD, no external entity; a document nested deeper than 256 elements is refused.
   explicit Document(std::string_view xml);
 
   Element root() const;

@@ -10,6 +10,9 @@
 namespace Cimom::CimXml {
 namespace {
 
+// Keys are told apart by comparing each with those before it.
+constexpr std::size_t maxKeys = 256;
+
 ObjectName readObjectName(const Element& element);
 
 // NAMESPACE elements in a LOCALNAMESPACEPATH, as "root/cimv2".
@@ -63,6 +66,9 @@ ObjectName readInstanceName(const Element& element) {
       name.keys.push_back({"", readKeyValue(*child)});
     } else {
       child->refuse("must not stand beside other keys");
+    }
+    if (name.keys.size() > maxKeys) {
+      element.refuse("has more than " + std::to_string(maxKeys) + " keys");
     }
   }
   return name;

@@ -41,6 +41,20 @@ std::string quoted(std::string_view text) {
   return result + '"';
 }
 
+// Every level of references within references would double the text of the innermost.
+std::string shortened(std::string text) {
+  constexpr std::size_t most = 4096;
+  if (text.size() > most) {
+    std::size_t end = most;
+    while (end > 0 && (static_cast<unsigned char>(text[end]) & 0xC0) == 0x80) {
+      --end;  // not within a character of UTF-8
+    }
+    text.resize(end);
+    text += "…";
+  }
+  return text;
+}
+
 }  // namespace
 
 Value Value::null(CMPIType type) { return Value(type, {}); }
@@ -116,10 +130,10 @@ std::string Value::toString() const {
     return quoted(*string);
   }
   if (const ObjectPath* reference = path()) {
-    return quoted(reference->toString());
+    return quoted(shortened(reference->toString()));
   }
   if (const Instance* instance = embedded()) {
-    return quoted(instance->path().toString());
+    return quoted(shortened(instance->path().toString()));
   }
   if (const DateTime* dateTime = time()) {
     return quoted(dateTime->format());

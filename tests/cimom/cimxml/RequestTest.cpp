@@ -161,6 +161,48 @@ TEST(RequestTest, ReadsUtf16) {
   EXPECT_EQ(std::get<std::string>(request.parameters.at(0).value), "x");
 }
 
+std::string repeated(const std::string& text, int times) {
+  std::string all;
+  for (int i = 0; i < times; ++i) {
+    all += text;
+  }
+  return all;
+}
+
+// With these attributes of one element, each of another name.
+std::string withAttributes(int count, const std::string& separator = "=") {
+  std::string attributes;
+  for (int i = 0; i < count; ++i) {
+    attributes += " a" + std::to_string(i) + separator + "'1'";
+  }
+  return intrinsicCall("M", parameter("P", "<VALUE" + attributes + ">x</VALUE>"));
+}
+
+std::string withValues(int count) {
+  return intrinsicCall("M", parameter("P", "<VALUE.ARRAY>" + repeated("<VALUE/>", count) + "</VALUE.ARRAY>"));
+}
+
+TEST(RequestTest, TakesAsMuchAsTheLimitsAllow) {
+  EXPECT_EQ(readRequest(withAttributes(32)).method, "M");
+  EXPECT_EQ(std::get<Texts>(readRequest(withValues(65'000)).parameters.at(0).value).size(), 65'000U);
+  EXPECT_EQ(nameOf(instanceName("C", repeated(keyBinding("K", "1"), 256))).keys.size(), 256U);
+}
+
+TEST(RequestTest, CountsNothingInCommentsAndCharacterData) {
+  const std::string markup = repeated("<a b='1' c=\"2\" d='3'>", 30'000);
+  EXPECT_EQ(valueOf<std::string>("<VALUE><!--" + markup + "--><![CDATA[" + markup + "]]></VALUE>"), markup);
+  EXPECT_EQ(valueOf<std::string>("<VALUE a='" + repeated("=>", 100) + "'>x</VALUE>"), "x");
+}
+
+std::string wide(const std::string& message) {
+  std::string text = "\xFE\xFF";
+  for (const char letter : message) {
+    text += '\0';
+    text += letter;
+  }
+  return text;
+}
+
 // A message that is refused, and how.
 struct Refusal {
   const char* name;
@@ -208,6 +250,28 @@ constexpr const char* notWellFormed = "request-not-well-formed";
 constexpr const char* notValid = "request-not-valid";
 
 INSTANTIATE_TEST_SUITE_P(
+    TooCostly, RefusedRequestTest,
+    testing::Values(
+        Refusal{"Attributes", withAttributes(33), 400, notValid, "line 1: more than 32 attributes"},
+        Refusal{"AttributesInLines", replaced(withAttributes(40), " a1=", "\n a1="), 400, notValid, "line 2: "},
+        Refusal{"SpacedAttributes", withAttributes(70'000, " \n= "), 400, notValid, "more than 32 attributes"},
+        Refusal{"AttributesInUtf16", wide(replaced(withAttributes(33), "utf-8", "utf-16")), 400, notValid,
+                "more than 32 attributes"},
+        Refusal{"Elements", withValues(70'000), 400, notValid, "more than 65536 elements"},
+        Refusal{"ElementNames",
+                [] {
+                  std::string elements;
+                  for (int i = 0; i < 70; ++i) {
+                    elements += "<E" + std::to_string(i) + "/>";
+                  }
+                  return intrinsicCall("M", elements);
+                }(),
+                400, notValid, "more than 64 different elements"},
+        Refusal{"Keys", intrinsicCall("M", parameter("P", instanceName("C", repeated(keyBinding("K", "1"), 257)))), 400,
+                notValid, "has more than 256 keys"}),
+    [](const auto& test) { return test.param.name; });
+
+INSTANTIATE_TEST_SUITE_P(
     NotWellFormed, RefusedRequestTest,
     testing::Values(
         Refusal{"Empty", "", 400, notWellFormed, ""}, Refusal{"Text", "hello", 400, notWellFormed, "line 1"},
@@ -229,6 +293,12 @@ INSTANTIATE_TEST_SUITE_P(
                                  "<!ENTITY c \"&b;&b;&b;&b;&b;&b;&b;&b;\">",
                                  "&c;"),
                 400, notWellFormed, "declares entities"},
+        Refusal{"DefaultAttributes", withDocumentType("<!ATTLIST VALUE a CDATA '1'>", ""), 400, notWellFormed,
+                "declares entities or attributes"},
+        Refusal{"HiddenMarkup", replaced(good, "utf-8", "UTF-7"), 400, notWellFormed, "must be UTF-8 or UTF-16"},
+        Refusal{"AnotherMarkup", "\x4C\x6F\xA7\x94\x93", 400, notWellFormed, "must begin with <"},
+        Refusal{"TagInAnAttribute", replaced(good, "\"4711\"", "\"<x a='1'>\""), 400, notWellFormed,
+                "not allowed in a tag"},
         Refusal{"TooDeep", nested(200), 400, notWellFormed, "256"}),
     [](const auto& test) { return test.param.name; });
 

@@ -4,6 +4,7 @@
 
 #include <limits>
 
+#include "cimom/model/ObjectPath.h"
 #include "cimom/model/Value.h"
 
 namespace {
@@ -32,6 +33,24 @@ TEST(ValueTest, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value::real64(1.5).toString(), "1.5");
   EXPECT_EQ(Value::char16(65).toString(), "65");
   EXPECT_EQ(Value::array({CMPI_string, {Value::string("a"), Value::null(CMPI_string)}}).toString(), "{\"a\",NULL}");
+}
+
+TEST(ValueTest, OfReferencesWithinReferencesStaysShort) {
+  ObjectPath path{"", "root/test", "C", {}};
+  path.keys.set("K", Value::string(std::string(100, '"')));
+  for (int level = 0; level < 80; ++level) {
+    ObjectPath outer{"", "root/test", "C", {}};
+    outer.keys.set("Inner", Value::reference(path));
+    path = outer;
+  }
+  EXPECT_LT(path.toString().size(), 10'000U);
+  EXPECT_NE(path.toString().find("…"), std::string::npos);
+}
+
+TEST(ValueTest, OfAReferenceIsItsTextInQuotes) {
+  ObjectPath path{"", "root/test", "C", {}};
+  path.keys.set("K", Value::string("a\"b"));
+  EXPECT_EQ(Value::reference(path).toString(), R"("root/test:C.K=\"a\\\"b\"")");
 }
 
 }  // namespace
