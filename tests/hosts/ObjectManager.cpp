@@ -122,6 +122,7 @@ std::map<std::string, std::string> ObjectManager::differences() const {
 
 std::string ObjectManager::run(const std::string& commands) const {
   Process shell({"sh", "-euc", "cd '" SOURCE_DIR "'\n" + commands}, environment());
+  shell.closeInput();
   const int status = shell.wait(std::chrono::seconds(120));
   const std::string said = shell.output() + shell.errors();
   if (status != 0) {
