@@ -13,7 +13,7 @@ void requireNamespace(const Call& call) {
 }
 
 const ClassDefinition& requireClass(const Call& call, const std::string& name, CMPIrc whenUnknown) {
-  const ClassDefinition* definition = call.manager.classes.find(name);
+  const ClassDefinition* definition = call.manager.classes.find(call.request.nameSpace, name);
   if (!definition) {
     throw OperationError(whenUnknown, "unknown class \"" + name + "\"");
   }
@@ -32,7 +32,7 @@ std::vector<const ClassDefinition*> requestedClasses(const Call& call) {
   if (!name.empty()) {
     requireClass(call, name, CMPI_RC_ERR_INVALID_CLASS);
   }
-  return call.manager.classes.subclasses(name, call.parameters.flag("DeepInheritance", false));
+  return call.manager.classes.subclasses(call.request.nameSpace, name, call.parameters.flag("DeepInheritance", false));
 }
 
 }  // namespace

@@ -66,8 +66,9 @@ void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
   for (const Qualifier& qualifier : qualifiers) {
     const char* type = xmlTypeName(qualifier.value.type());
     const auto scope = xml_.element("QUALIFIER", "NAME", qualifier.name);
-    if (type) {
-      xml_.attribute("TYPE", type);
+    xml_.attribute("TYPE", type ? type : "string");
+    if (qualifier.propagated) {
+      xml_.attribute("PROPAGATED", truth(true));
     }
     xml_.attribute("OVERRIDABLE", truth(qualifier.overridable));
     xml_.attribute("TOSUBCLASS", truth(qualifier.toSubclass));

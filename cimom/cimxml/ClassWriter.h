@@ -8,7 +8,7 @@ namespace Cimom::CimXml {
 
 // What of a class a client wants to see (DSP0200, GetClass).
 struct ClassView {
-  bool localOnly = true;  // leaves out what the class inherits and does not override
+  bool localOnly = true;  // leaves out properties and methods that the class inherits and does not override
   bool includeQualifiers = true;
   bool includeClassOrigin = false;
   PropertyFilter properties;

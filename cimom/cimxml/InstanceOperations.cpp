@@ -12,7 +12,7 @@ using NameList = std::optional<std::vector<std::string>>;
 // Without DeepInheritance a subclass's instance shows what the requested class has, and no more.
 NameList visibleProperties(const Call& call, const std::string& className) {
   const NameList list = call.parameters.propertyList();
-  const ClassDefinition* definition = call.manager.classes.find(className);
+  const ClassDefinition* definition = call.manager.classes.find(call.request.nameSpace, className);
   if (call.parameters.flag("DeepInheritance", true) || !definition) {
     return list;
   }
@@ -106,7 +106,7 @@ void setProperty(Call& call) {
         },
         given->value);
   }
-  const auto value = call.objects.propertyValue(instance.className, property);
+  const auto value = call.objects.propertyValue(instance, property);
   requireOk(CBSetProperty(call.manager.broker, call.context, call.objects.path(instance), property.name.c_str(),
                           value.pointer(), value.type));
 }

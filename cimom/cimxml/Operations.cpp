@@ -76,7 +76,7 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
   if (!manager.classes.hasNamespace(request.nameSpace)) {
     throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
   }
-  const ClassDefinition* definition = manager.classes.find(className);
+  const ClassDefinition* definition = manager.classes.find(request.nameSpace, className);
   if (!definition) {
     throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
   }

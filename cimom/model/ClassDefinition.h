@@ -16,6 +16,7 @@ struct Qualifier {
   bool toSubclass = true;     // false: Restricted
   bool overridable = true;    // false: DisableOverride
   bool translatable = false;  // Translatable
+  bool propagated = false;    // inherited as it is
 };
 
 using Qualifiers = std::vector<Qualifier>;
@@ -33,7 +34,7 @@ struct PropertyDeclaration {
   std::string referenceClass;  // the class that a reference refers to, else empty
   unsigned arraySize = 0;      // of a fixed-size array, else 0
   Value defaultValue;          // null if the schema has none
-  Qualifiers qualifiers;       // inherited ones included
+  Qualifiers qualifiers;       // inherited ones included, but for the restricted ones
   std::string originClass;     // the class that declared it first
   bool propagated = false;     // inherited as it is; false if this class declares or overrides it
 

@@ -15,11 +15,12 @@ using Kind = MofToken::Kind;
 }  // namespace
 
 MofParser::MofParser(MofReader& reader, MofDeclarations& declarations, std::string_view mof, std::string origin,
-                     std::filesystem::path directory)
+                     std::filesystem::path directory, std::string nameSpace)
     : reader_(reader),
       declarations_(declarations),
       origin_(std::move(origin)),
       directory_(std::move(directory)),
+      nameSpace_(std::move(nameSpace)),
       lexer_(mof, origin_) {}
 
 void MofParser::parse() {
@@ -58,12 +59,13 @@ void MofParser::pragma() {
     include(argument);
   } else if (sameName(name, "namespace")) {
     declarations_.namespaces.push_back(argument);
+    nameSpace_ = argument;
   }
 }
 
 void MofParser::include(const std::string& file) {
   try {
-    reader_.readFile(directory_ / file, declarations_);
+    reader_.readFile(directory_ / file, declarations_, nameSpace_);
   } catch (const std::filesystem::filesystem_error& error) {
     fail("\"" + file + "\" cannot be included: " + error.code().message());
   }
@@ -177,6 +179,7 @@ void MofParser::classDeclaration(Qualifiers qualifiers) {
     feature(own);
   }
   expect(";");
+  declaration.nameSpace = nameSpace_;
   declarations_.classes.push_back(std::move(declaration));
 }
 

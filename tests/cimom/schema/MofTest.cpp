@@ -142,6 +142,15 @@ TEST(MofTest, PragmasNameNamespacesAndOthersAreIgnored) {
   EXPECT_THAT(declarations.namespaces, ElementsAre("root/a"));
 }
 
+TEST(MofTest, AClassIsOfTheNamespaceThatAPragmaBeforeItNames) {
+  const auto classes =
+      classesOf("class A {};\n#pragma namespace(\"root/a\")\nclass B {};\n#pragma namespace(\"root/b\")\nclass C {};");
+  ASSERT_THAT(classes, SizeIs(3));
+  EXPECT_EQ(classes[0].nameSpace, "");
+  EXPECT_EQ(classes[1].nameSpace, "root/a");
+  EXPECT_EQ(classes[2].nameSpace, "root/b");
+}
+
 TEST(MofFilesTest, ADirectoryIsReadWholeAndInOrder) {
   const TemporaryDirectory directory;
   directory.write("b.mof", "class B {};");
@@ -149,6 +158,18 @@ TEST(MofFilesTest, ADirectoryIsReadWholeAndInOrder) {
   directory.write("deep/c.mof", "class C {};");
   directory.write("notes.txt", "no MOF");
   EXPECT_THAT(namesOf(MofReader().readPath(directory.path())), ElementsAre("A", "B", "C"));
+}
+
+TEST(MofFilesTest, ANamespaceHoldsForWhatIsIncludedAndEndsWithItsFile) {
+  const TemporaryDirectory directory;
+  directory.write("a.mof", "#pragma namespace(\"root/a\")\n#pragma include(\"part/b.mof\")\nclass A {};");
+  directory.write("part/b.mof", "class B {};\n#pragma namespace(\"root/b\")\n");
+  directory.write("z.mof", "class Z {};");
+  const auto classes = MofReader().readPath(directory.path()).classes;
+  ASSERT_THAT(classes, SizeIs(3));
+  EXPECT_EQ(classes[0].nameSpace, "root/a") << classes[0].own.name;
+  EXPECT_EQ(classes[1].nameSpace, "root/a") << classes[1].own.name;
+  EXPECT_EQ(classes[2].nameSpace, "") << classes[2].own.name;
 }
 
 TEST(MofFilesTest, IncludesAreRelativeToTheirFileAndReadOnce) {
