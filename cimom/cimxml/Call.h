@@ -12,6 +12,7 @@
 #include "cimom/cimxml/ObjectWriter.h"
 #include "cimom/cimxml/Operations.h"
 #include "cimom/cimxml/Parameters.h"
+#include "cimom/cimxml/SystemHost.h"
 
 namespace Cimom::CimXml {
 
@@ -23,10 +24,14 @@ struct Call {
   const CMPIContext* context;
   const ObjectBuilder& objects;
   XmlWriter& xml;
+  std::string& host;  // stands in the answer's paths that name none
 
-  ObjectWriter writer(PropertyFilter filter = {}) const {
-    return {xml, manager.host, request.nameSpace, std::move(filter)};
+  // Gives the paths that name no host the one that the answer's objects name.
+  void takeHostOf(const std::vector<CMPIData>& answered) const {
+    host = systemHost(answered, request.nameSpace, manager.host);
   }
+
+  ObjectWriter writer(PropertyFilter filter = {}) const { return {xml, host, request.nameSpace, std::move(filter)}; }
 
   CMPIObjectPath* classPath(const std::string& className) const {
     return objects.path(ObjectName{{}, {}, className, {}});
@@ -37,12 +42,16 @@ struct Call {
 template <typename Write>
 void writeResult(const Call& call, const CMPIStatus& status, CMPIEnumeration* result, Write write) {
   requireOk(status, result);
-  const auto scope = call.xml.element("IRETURNVALUE");
+  std::vector<CMPIData> objects;
   while (CMHasNext(result, nullptr)) {
     CMPIStatus next{CMPI_RC_OK, nullptr};
-    const CMPIData data = CMGetNext(result, &next);
-    requireOk(next, data.value.dataPtr.ptr);
-    write(data.value);
+    objects.push_back(CMGetNext(result, &next));
+    requireOk(next, objects.back().value.dataPtr.ptr);
+  }
+  call.takeHostOf(objects);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  for (const CMPIData& object : objects) {
+    write(object.value);
   }
 }
 
@@ -93,5 +102,7 @@ void referenceNames(Call& call);
 void getClass(Call& call);
 void enumerateClasses(Call& call);
 void enumerateClassNames(Call& call);
+void getQualifier(Call& call);
+void enumerateQualifiers(Call& call);
 
 }  // namespace Cimom::CimXml

@@ -61,4 +61,27 @@ void enumerateClassNames(Call& call) {
   }
 }
 
+void getQualifier(Call& call) {
+  requireNamespace(call);
+  const auto name = call.parameters.text("QualifierName");
+  if (!name) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter QualifierName is missing");
+  }
+  const QualifierDeclaration* declaration = call.manager.classes.findQualifierDeclaration(*name);
+  if (!declaration) {
+    throw OperationError(CMPI_RC_ERR_NOT_FOUND, "unknown qualifier \"" + *name + "\"");
+  }
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ClassWriter(call.xml, {}).write(*declaration);
+}
+
+void enumerateQualifiers(Call& call) {
+  requireNamespace(call);
+  ClassWriter writer(call.xml, {});
+  const auto scope = call.xml.element("IRETURNVALUE");
+  for (const QualifierDeclaration* declaration : call.manager.classes.qualifierDeclarations()) {
+    writer.write(*declaration);
+  }
+}
+
 }  // namespace Cimom::CimXml

@@ -14,15 +14,17 @@ struct ClassView {
   PropertyFilter properties;
 };
 
-// Writes CLASS. Default values are made in the current request scope.
+// Writes CLASS and QUALIFIER.DECLARATION. Default values are made in the current request scope.
 class ClassWriter {
  public:
   ClassWriter(XmlWriter& xml, ClassView view) : xml_(xml), values_(xml, none_, none_), view_(std::move(view)) {}
 
   void write(const ClassDefinition& definition);
+  void write(const QualifierDeclaration& declaration);
 
  private:
   void qualifiers(const Qualifiers& qualifiers);
+  void flavor(const Qualifier& qualifier);
   void property(const PropertyDeclaration& property);
   void method(const MethodDeclaration& method);
   void parameter(const PropertyDeclaration& parameter);

@@ -52,21 +52,25 @@ void getInstance(Call& call) {
   const NameList list = call.parameters.propertyList();
   PropertyNames names(list);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIInstance* instance = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
-  requireOk(status, instance);
+  CMPIData data{CMPI_instance, CMPI_goodValue, {}};
+  data.value.inst = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
+  requireOk(status, data.value.inst);
+  call.takeHostOf({data});
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer(filterOf(list)).instance(instance);
+  call.writer(filterOf(list)).instance(data.value.inst);
 }
 
 void createInstance(Call& call) {
   const Instance& given = call.parameters.instance("NewInstance");
   const CMPIInstance* instance = call.objects.instance(given);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIObjectPath* path =
+  CMPIData data{CMPI_ref, CMPI_goodValue, {}};
+  data.value.ref =
       CBCreateInstance(call.manager.broker, call.context, call.objects.path(given.path), instance, &status);
-  requireOk(status, path);
+  requireOk(status, data.value.ref);
+  call.takeHostOf({data});
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer().instanceName(path);
+  call.writer().instanceName(data.value.ref);
 }
 
 void modifyInstance(Call& call) {
@@ -102,6 +106,9 @@ void setProperty(Call& call) {
         [&property](const auto& value) {
           if constexpr (std::is_constructible_v<Value, decltype(value)>) {
             property.value = value;
+          } else {
+            throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH,
+                                 "parameter NewValue must be a value of the property's type");
           }
         },
         given->value);

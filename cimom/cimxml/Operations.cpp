@@ -45,7 +45,9 @@ const std::vector<Operation>& operations() {
       {"EnumerateClasses",
        enumerateClasses,
        {"ClassName", "DeepInheritance", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin"}},
-      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}}};
+      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}},
+      {"GetQualifier", getQualifier, {"QualifierName"}},
+      {"EnumerateQualifiers", enumerateQualifiers, {}}};
   return table;
 }
 
@@ -98,7 +100,8 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
   const CMPIContext* context = scope.context();
   describeCaller(context, manager, parameters);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);
-  Call call{manager, request, parameters, context, objects, xml};
+  std::string host = manager.host;
+  Call call{manager, request, parameters, context, objects, xml, host};
   operation.perform(call);
 }
 

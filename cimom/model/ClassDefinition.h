@@ -21,6 +21,13 @@ struct Qualifier {
 
 using Qualifiers = std::vector<Qualifier>;
 
+// A qualifier as the schema declares it: its default value, of its type, its flavor, and what it may stand at.
+struct QualifierDeclaration {
+  Qualifier qualifier;
+  unsigned arraySize = 0;           // of a fixed-size array, else 0
+  std::vector<std::string> scopes;  // "property", "any" …
+};
+
 // The qualifier of that name, or null.
 const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view name);
 

@@ -188,6 +188,19 @@ std::vector<const ClassDefinition*> ClassRepository::subclasses(std::string_view
   return result;
 }
 
+const QualifierDeclaration* ClassRepository::findQualifierDeclaration(std::string_view name) const {
+  const auto found = qualifiers_.find(name);
+  return found == qualifiers_.end() ? nullptr : &found->second;
+}
+
+std::vector<const QualifierDeclaration*> ClassRepository::qualifierDeclarations() const {
+  std::vector<const QualifierDeclaration*> result;
+  for (const auto& [name, declaration] : qualifiers_) {
+    result.push_back(&declaration);
+  }
+  return result;
+}
+
 bool ClassRepository::hasNamespace(std::string_view nameSpace) const {
   return namespaces_.contains(bareNamespace(nameSpace));
 }
@@ -288,6 +301,9 @@ void ClassRepository::add(const MofDeclarations& declarations) {
     });
   }
   schema_.merge(schema);
+  for (const QualifierDeclaration& declaration : declarations.qualifiers) {
+    qualifiers_.insert_or_assign(declaration.qualifier.name, declaration);
+  }
   for (const std::string& nameSpace : declarations.namespaces) {
     addNamespace(nameSpace);
   }

@@ -13,8 +13,8 @@
 
 namespace Cimom {
 
-// Every class that the object manager knows, resolved: inherited features, keys and defaults in place. Names are
-// found without regard to case.
+// Every class that the object manager knows, resolved: inherited features, keys and defaults in place; and the
+// declarations of the qualifiers, which count in every namespace. Names are found without regard to case.
 //
 // A class that stands under a `#pragma namespace` belongs to that namespace, which may have a class of a name that
 // another namespace has too. All other classes are one schema, of which a namespace shows what somebody has asked to
@@ -36,6 +36,11 @@ class ClassRepository {
   // of all classes.
   std::vector<const ClassDefinition*> subclasses(std::string_view nameSpace, std::string_view className,
                                                  bool deep) const;
+
+  // The declaration of a qualifier, the last one that was added; null if there is none.
+  const QualifierDeclaration* findQualifierDeclaration(std::string_view name) const;
+  // All of them, by name.
+  std::vector<const QualifierDeclaration*> qualifierDeclarations() const;
 
   bool hasNamespace(std::string_view nameSpace) const;
   // All namespaces, by name.
@@ -65,6 +70,7 @@ class ClassRepository {
   static void revealAsked(Namespace& nameSpace, const Classes& schema);
 
   Classes schema_;
+  std::map<std::string, QualifierDeclaration, NameLess> qualifiers_;
   Namespaces namespaces_;
 };
 

@@ -67,7 +67,7 @@ void MofReader::readFile(const fs::path& file, MofDeclarations& declarations, co
   if (fs::is_directory(canonical)) {
     throw fs::filesystem_error("include", file, std::make_error_code(std::errc::is_a_directory));
   }
-  if (!files_.insert(canonical).second) {
+  if (!files_.emplace(canonical, nameSpace).second) {
     return;
   }
   std::ifstream stream(canonical, std::ios::binary);

@@ -73,12 +73,14 @@ void MofParser::include(const std::string& file) {
 
 // Qualifier NAME : TYPE [= VALUE], Scope(…) [, Flavor(…)];
 void MofParser::qualifierDeclaration() {
-  Qualifier declared;
+  QualifierDeclaration declaration;
+  Qualifier& declared = declaration.qualifier;
   declared.name = expectName("the qualifier's name");
   expect(":");
   PropertyDeclaration value;
   type(value);
   arrayBounds(value);
+  declaration.arraySize = value.arraySize;
   declared.value = accept("=") ? initializer(value.type) : Value::null(value.type);
   while (accept(",")) {
     const bool flavor = token_.isKeyword("Flavor");
@@ -91,7 +93,7 @@ void MofParser::qualifierDeclaration() {
       flavors(declared, ")");
     } else {
       do {
-        expectName("a scope");
+        declaration.scopes.push_back(expectName("a scope"));
       } while (accept(","));
     }
     expect(")");
@@ -99,7 +101,8 @@ void MofParser::qualifierDeclaration() {
   expect(";");
   Qualifiers& known = reader_.qualifierTypes_;
   std::erase_if(known, [&](const Qualifier& one) { return sameName(one.name, declared.name); });
-  known.push_back(std::move(declared));
+  known.push_back(declared);
+  declarations_.qualifiers.push_back(std::move(declaration));
 }
 
 Qualifiers MofParser::qualifierList() {

@@ -106,6 +106,30 @@ TEST_F(ClassOperationsTest, AnEmptyPropertyListLeavesNoPropertyAndAnUnknownNameN
               HasSubstr("<PROPERTY NAME=\"Extra\""));
 }
 
+TEST_F(ClassOperationsTest, QualifiersAreAnsweredAsTheSchemaDeclaresThem) {
+  const auto getQualifier = [this](const std::string& name) {
+    return returned("GetQualifier", parameter("QualifierName", "<VALUE>" + name + "</VALUE>"));
+  };
+  EXPECT_EQ(
+      getQualifier("key"),
+      "<IRETURNVALUE><QUALIFIER.DECLARATION NAME=\"Key\" TYPE=\"boolean\" ISARRAY=\"false\" OVERRIDABLE=\"false\" "
+      "TOSUBCLASS=\"true\" TRANSLATABLE=\"false\"><SCOPE CLASS=\"false\" ASSOCIATION=\"false\" REFERENCE=\"true\" "
+      "PROPERTY=\"true\" METHOD=\"false\" PARAMETER=\"false\" INDICATION=\"false\"></SCOPE><VALUE>FALSE</VALUE>"
+      "</QUALIFIER.DECLARATION></IRETURNVALUE>");
+  EXPECT_THAT(getQualifier("Values"), AllOf(HasSubstr("TYPE=\"string\" ISARRAY=\"true\" OVERRIDABLE=\"true\""),
+                                            HasSubstr("></SCOPE></QUALIFIER.DECLARATION>")));
+  EXPECT_THAT(getQualifier("Description"),
+              HasSubstr("TRANSLATABLE=\"true\"><SCOPE CLASS=\"true\" ASSOCIATION=\"true\" REFERENCE=\"true\" "
+                        "PROPERTY=\"true\" METHOD=\"true\" PARAMETER=\"true\" INDICATION=\"true\">"));
+  EXPECT_EQ(failed("GetQualifier", parameter("QualifierName", "<VALUE>Nothing</VALUE>")),
+            "6: unknown qualifier \"Nothing\"");
+  EXPECT_EQ(failed("GetQualifier", ""), "4: parameter QualifierName is missing");
+  const std::string all = returned("EnumerateQualifiers", "");
+  for (const char* name : {"Association", "Description", "Key", "Values"}) {
+    EXPECT_THAT(all, HasSubstr("<QUALIFIER.DECLARATION NAME=\"" + std::string(name) + "\""));
+  }
+}
+
 TEST_F(ClassOperationsTest, AClassShowsInItsNamespacesOnly) {
   manager_.loadSchemaText("#pragma namespace(\"root/other\")\nclass OTHER_Thing { [Key] string Name; };", "root/other");
   EXPECT_THAT(failed("GetClass", className("OTHER_Thing")), HasSubstr("6: unknown class \"OTHER_Thing\""));
