@@ -10,6 +10,7 @@
 #include "cimom/broker/BrokerCore.h"
 #include "cimom/model/Errors.h"
 #include "cimom/providers/ProviderRegistration.h"
+#include "cimom/routing/Router.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {
@@ -42,6 +43,9 @@ class ObjectManager {
   // Loads every registered library now.
   // Throws ConfigurationError for a library or a factory that is not there, or a class that the schema lacks.
   void checkProviders();
+
+  // Exact until it says otherwise; not while a request is under way.
+  void setStrictness(Strictness strictness);
 
   // Where CMLogMessage goes; by default a line on the standard error output.
   void setLog(MessageSink sink);

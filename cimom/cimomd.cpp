@@ -54,6 +54,7 @@ void load(ObjectManager& manager, const Configuration& configuration) {
   for (const auto& directory : configuration.providerDirectories) {
     manager.addProviderDirectory(directory);
   }
+  manager.setStrictness(configuration.bare ? Strictness::Bare : Strictness::Exact);
   manager.checkProviders();
 }
 

@@ -72,12 +72,16 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
   }
 }
 
-// Providers of methods are not taken, so a class's method is known at most.
-[[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
-  const std::string& className = request.target.className;
+void requireNamespace(const OperationContext& manager, const Request& request) {
   if (!manager.classes.hasNamespace(request.nameSpace)) {
     throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
   }
+}
+
+// Providers of methods are not taken, so a class's method is known at most.
+[[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
+  const std::string& className = request.target.className;
+  requireNamespace(manager, request);
   const ClassDefinition* definition = manager.classes.find(request.nameSpace, className);
   if (!definition) {
     throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
@@ -95,6 +99,7 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
     refuseMethod(manager, request);
   }
   const Operation& operation = findOperation(request.method);
+  requireNamespace(manager, request);
   const Parameters parameters(request, operation.parameters);
   RequestScope scope(manager.broker);
   const CMPIContext* context = scope.context();
