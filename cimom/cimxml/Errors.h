@@ -34,6 +34,13 @@ class OperationError : public std::runtime_error {
   int code_;
 };
 
+// CIM status codes of DSP0200 for pulled enumerations, which CMPI has no names for.
+constexpr int cimInvalidEnumerationContext = 21;
+constexpr int cimInvalidOperationTimeout = 22;
+constexpr int cimFilteredEnumerationNotSupported = 25;
+constexpr int cimContinuationOnErrorNotSupported = 26;
+constexpr int cimServerLimitsExceeded = 27;
+
 // Turns a CMPI status that is not OK into an OperationError. Return codes that are CMPI's own and no CIM status
 // (CMPI_RC_ERROR_SYSTEM and the like) become CIM_ERR_FAILED.
 inline void requireOk(const CMPIStatus& status) {

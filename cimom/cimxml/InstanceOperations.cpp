@@ -28,23 +28,40 @@ NameList visibleProperties(const Call& call, const std::string& className) {
 
 }  // namespace
 
-void enumerateInstances(Call& call) {
+Found::Found(const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown)
+    : objects(found), properties(std::move(shown)) {
+  requireOk(status, found);
+}
+
+Found findInstances(Call& call) {
   const std::string className = call.parameters.requiredClassName("ClassName");
   const NameList list = call.parameters.propertyList();
   PropertyNames names(list);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIEnumeration* result =
+  CMPIEnumeration* instances =
       CBEnumInstances(call.manager.broker, call.context, call.classPath(className), names.get(), &status);
-  ObjectWriter writer = call.writer(filterOf(visibleProperties(call, className)));
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.namedInstance(value.inst); });
+  return {status, instances, filterOf(visibleProperties(call, className))};
+}
+
+Found findInstanceNames(Call& call) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
+  CMPIEnumeration* names = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  return {status, names};
+}
+
+void enumerateInstances(Call& call) {
+  const Found found = findInstances(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ObjectWriter writer = call.writer(found.properties);
+  forEachObject(found, [&writer](const CMPIValue& value) { writer.namedInstance(value.inst); });
 }
 
 void enumerateInstanceNames(Call& call) {
-  CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
-  CMPIEnumeration* result = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  const Found found = findInstanceNames(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.instanceName(value.ref); });
+  forEachObject(found, [&writer](const CMPIValue& value) { writer.instanceName(value.ref); });
 }
 
 void getInstance(Call& call) {
