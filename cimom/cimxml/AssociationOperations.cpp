@@ -34,13 +34,17 @@ struct Traversal {
 void writeInstances(const Call& call, const Found& found) {
   const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer(found.properties);
-  forEachObject(found, [&writer](const CMPIValue& value) { writer.objectWithPath(value.inst); });
+  for (const CMPIData& object : found.objects) {
+    writer.objectWithPath(object.value.inst);
+  }
 }
 
 void writeNames(const Call& call, const Found& found) {
   const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  forEachObject(found, [&writer](const CMPIValue& value) { writer.objectPath(value.ref); });
+  for (const CMPIData& object : found.objects) {
+    writer.objectPath(object.value.ref);
+  }
 }
 
 }  // namespace
@@ -50,7 +54,7 @@ Found findAssociators(Call& call, std::string_view source) {
   CMPIEnumeration* instances =
       CBAssociators(call.manager.broker, call.context, to.source, orNull(to.assocClass), orNull(to.resultClass),
                     orNull(to.role), orNull(to.resultRole), to.names.get(), &to.status);
-  return {to.status, instances, filterOf(to.list)};
+  return {call, to.status, instances, filterOf(to.list)};
 }
 
 Found findAssociatorNames(Call& call, std::string_view source) {
@@ -58,21 +62,21 @@ Found findAssociatorNames(Call& call, std::string_view source) {
   CMPIEnumeration* names =
       CBAssociatorNames(call.manager.broker, call.context, to.source, orNull(to.assocClass), orNull(to.resultClass),
                         orNull(to.role), orNull(to.resultRole), &to.status);
-  return {to.status, names};
+  return {call, to.status, names};
 }
 
 Found findReferences(Call& call, std::string_view source) {
   Traversal to(call, source);
   CMPIEnumeration* instances = CBReferences(call.manager.broker, call.context, to.source, orNull(to.resultClass),
                                             orNull(to.role), to.names.get(), &to.status);
-  return {to.status, instances, filterOf(to.list)};
+  return {call, to.status, instances, filterOf(to.list)};
 }
 
 Found findReferenceNames(Call& call, std::string_view source) {
   Traversal to(call, source);
   CMPIEnumeration* names = CBReferenceNames(call.manager.broker, call.context, to.source, orNull(to.resultClass),
                                             orNull(to.role), &to.status);
-  return {to.status, names};
+  return {call, to.status, names};
 }
 
 void associators(Call& call) { writeInstances(call, findAssociators(call, "ObjectName")); }

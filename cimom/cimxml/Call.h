@@ -13,6 +13,7 @@
 #include "cimom/cimxml/ObjectWriter.h"
 #include "cimom/cimxml/Operations.h"
 #include "cimom/cimxml/Parameters.h"
+#include "cimom/cimxml/SystemHost.h"
 
 namespace Cimom::CimXml {
 
@@ -24,10 +25,14 @@ struct Call {
   const CMPIContext* context;
   const ObjectBuilder& objects;
   XmlWriter& xml;
+  std::string& host;  // stands in the answer's paths that name none
 
-  ObjectWriter writer(PropertyFilter filter = {}) const {
-    return {xml, manager.host, request.nameSpace, std::move(filter)};
+  // Gives the paths that name no host the one that the answer's objects name.
+  void takeHostOf(const std::vector<CMPIData>& answered) const {
+    host = systemHost(answered, request.nameSpace, manager.host);
   }
+
+  ObjectWriter writer(PropertyFilter filter = {}) const { return {xml, host, request.nameSpace, std::move(filter)}; }
 
   CMPIObjectPath* classPath(const std::string& className) const {
     return objects.path(ObjectName{{}, {}, className, {}});
@@ -37,22 +42,11 @@ struct Call {
 // What an operation that enumerates has found: instances, or paths.
 struct Found {
   // Throws OperationError for a status that is not OK.
-  Found(const CMPIStatus& status, CMPIEnumeration* objects, PropertyFilter properties = {});
+  Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown = {});
 
-  CMPIEnumeration* objects;
+  std::vector<CMPIData> objects;
   PropertyFilter properties;  // of instances: those that the client wants to see
 };
-
-// Calls `write` with every object.
-template <typename Write>
-void forEachObject(const Found& found, Write write) {
-  while (CMHasNext(found.objects, nullptr)) {
-    CMPIStatus next{CMPI_RC_OK, nullptr};
-    const CMPIData data = CMGetNext(found.objects, &next);
-    requireOk(next, data.value.dataPtr.ptr);
-    write(data.value);
-  }
-}
 
 // A text as CMPI takes one that may be missing.
 inline const char* orNull(const std::string& text) { return text.empty() ? nullptr : text.c_str(); }
@@ -122,5 +116,7 @@ void enumerationCount(Call& call);
 void getClass(Call& call);
 void enumerateClasses(Call& call);
 void enumerateClassNames(Call& call);
+void getQualifier(Call& call);
+void enumerateQualifiers(Call& call);
 
 }  // namespace Cimom::CimXml

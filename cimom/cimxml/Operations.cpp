@@ -72,7 +72,9 @@ const std::vector<Operation>& operations() {
       {"EnumerateClasses",
        enumerateClasses,
        {"ClassName", "DeepInheritance", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin"}},
-      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}}};
+      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}},
+      {"GetQualifier", getQualifier, {"QualifierName"}},
+      {"EnumerateQualifiers", enumerateQualifiers, {}}};
   return table;
 }
 
@@ -103,7 +105,7 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
   if (!manager.classes.hasNamespace(request.nameSpace)) {
     throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
   }
-  const ClassDefinition* definition = manager.classes.find(className);
+  const ClassDefinition* definition = manager.classes.find(request.nameSpace, className);
   if (!definition) {
     throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
   }
@@ -125,7 +127,8 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
   const CMPIContext* context = scope.context();
   describeCaller(context, manager, parameters);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);
-  Call call{manager, request, parameters, context, objects, xml};
+  std::string host = manager.host;
+  Call call{manager, request, parameters, context, objects, xml, host};
   operation.perform(call);
 }
 

@@ -69,16 +69,16 @@ void open(Call& call, PulledItem item, Find find) {
   const std::size_t maxCount = call.parameters.number("MaxObjectCount").value_or(0);
 
   const Found found = find(call);
-  forEachObject(found, [&](const CMPIValue& value) {
+  for (const CMPIData& object : found.objects) {
     XmlWriter xml(XmlWriter::Prolog::None);
-    ObjectWriter writer(xml, call.manager.host, call.request.nameSpace, found.properties);
+    ObjectWriter writer(xml, call.host, call.request.nameSpace, found.properties);
     if (item == PulledItem::InstanceWithPath) {
-      writer.instanceWithPath(value.inst);
+      writer.instanceWithPath(object.value.inst);
     } else {
-      writer.instancePath(value.ref);
+      writer.instancePath(object.value.ref);
     }
     enumeration.items.push_back(xml.take());
-  });
+  }
 
   writeItems(call.xml, enumeration, maxCount);
   const bool isComplete = enumeration.left() == 0;
