@@ -5,6 +5,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "cimom/cimxml/Errors.h"
@@ -38,22 +39,14 @@ struct Call {
   }
 };
 
-// Writes IRETURNVALUE with every object of the result of an up-call.
-template <typename Write>
-void writeResult(const Call& call, const CMPIStatus& status, CMPIEnumeration* result, Write write) {
-  requireOk(status, result);
+// What an operation that enumerates has found: instances, or paths.
+struct Found {
+  // Throws OperationError for a status that is not OK.
+  Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown = {});
+
   std::vector<CMPIData> objects;
-  while (CMHasNext(result, nullptr)) {
-    CMPIStatus next{CMPI_RC_OK, nullptr};
-    objects.push_back(CMGetNext(result, &next));
-    requireOk(next, objects.back().value.dataPtr.ptr);
-  }
-  call.takeHostOf(objects);
-  const auto scope = call.xml.element("IRETURNVALUE");
-  for (const CMPIData& object : objects) {
-    write(object.value);
-  }
-}
+  PropertyFilter properties;  // of instances: those that the client wants to see
+};
 
 // A text as CMPI takes one that may be missing.
 inline const char* orNull(const std::string& text) { return text.empty() ? nullptr : text.c_str(); }
@@ -82,6 +75,15 @@ inline PropertyFilter filterOf(const std::optional<std::vector<std::string>>& na
   return names ? PropertyFilter(*names) : PropertyFilter();
 }
 
+// What the operations find that return many objects. Those that start from an instance take the name of the parameter
+// that names it, which is another one if the result is pulled.
+Found findInstances(Call& call);
+Found findInstanceNames(Call& call);
+Found findAssociators(Call& call, std::string_view source);
+Found findAssociatorNames(Call& call, std::string_view source);
+Found findReferences(Call& call, std::string_view source);
+Found findReferenceNames(Call& call, std::string_view source);
+
 // The operations on instances; each writes IRETURNVALUE if it returns something.
 void enumerateInstances(Call& call);
 void enumerateInstanceNames(Call& call);
@@ -97,6 +99,18 @@ void associators(Call& call);
 void associatorNames(Call& call);
 void references(Call& call);
 void referenceNames(Call& call);
+
+// The operations whose results are pulled; each writes IRETURNVALUE, and what the operation returns beside it.
+void openEnumerateInstances(Call& call);
+void openEnumerateInstancePaths(Call& call);
+void openAssociatorInstances(Call& call);
+void openAssociatorInstancePaths(Call& call);
+void openReferenceInstances(Call& call);
+void openReferenceInstancePaths(Call& call);
+void pullInstancesWithPath(Call& call);
+void pullInstancePaths(Call& call);
+void closeEnumeration(Call& call);
+void enumerationCount(Call& call);
 
 // The operations that read the schema; each writes IRETURNVALUE.
 void getClass(Call& call);

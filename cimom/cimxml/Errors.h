@@ -35,6 +35,13 @@ class OperationError : public std::runtime_error {
   int code_;
 };
 
+// CIM status codes of DSP0200 for pulled enumerations, which CMPI has no names for.
+constexpr int cimInvalidEnumerationContext = 21;
+constexpr int cimInvalidOperationTimeout = 22;
+constexpr int cimFilteredEnumerationNotSupported = 25;
+constexpr int cimContinuationOnErrorNotSupported = 26;
+constexpr int cimServerLimitsExceeded = 27;
+
 // What a CIM status code means, for an error that comes without a text.
 inline const char* meaningOf(int code) {
   static constexpr std::array<const char*, 18> meanings = {

@@ -28,23 +28,50 @@ NameList visibleProperties(const Call& call, const std::string& className) {
 
 }  // namespace
 
-void enumerateInstances(Call& call) {
+Found::Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown)
+    : properties(std::move(shown)) {
+  requireOk(status, found);
+  while (CMHasNext(found, nullptr)) {
+    CMPIStatus next{CMPI_RC_OK, nullptr};
+    objects.push_back(CMGetNext(found, &next));
+    requireOk(next, objects.back().value.dataPtr.ptr);
+  }
+  call.takeHostOf(objects);
+}
+
+Found findInstances(Call& call) {
   const std::string className = call.parameters.requiredClassName("ClassName");
   const NameList list = call.parameters.propertyList();
   PropertyNames names(list);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIEnumeration* result =
+  CMPIEnumeration* instances =
       CBEnumInstances(call.manager.broker, call.context, call.classPath(className), names.get(), &status);
-  ObjectWriter writer = call.writer(filterOf(visibleProperties(call, className)));
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.namedInstance(value.inst); });
+  return {call, status, instances, filterOf(visibleProperties(call, className))};
+}
+
+Found findInstanceNames(Call& call) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
+  CMPIEnumeration* names = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  return {call, status, names};
+}
+
+void enumerateInstances(Call& call) {
+  const Found found = findInstances(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ObjectWriter writer = call.writer(found.properties);
+  for (const CMPIData& object : found.objects) {
+    writer.namedInstance(object.value.inst);
+  }
 }
 
 void enumerateInstanceNames(Call& call) {
-  CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
-  CMPIEnumeration* result = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  const Found found = findInstanceNames(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.instanceName(value.ref); });
+  for (const CMPIData& object : found.objects) {
+    writer.instanceName(object.value.ref);
+  }
 }
 
 void getInstance(Call& call) {
