@@ -17,7 +17,8 @@ namespace Cimom {
 
 // One operation on its way to the providers: the object manager, the caller's context and the path that it is for.
 struct Operation {
-  // Throws StatusError for a null broker, context or path, an unknown namespace or an unknown class.
+  // Throws StatusError for a null broker, context or path, an unknown namespace or an unknown class,
+  //         and after the deadline of the request.
   Operation(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path);
 
   BrokerCore& core;

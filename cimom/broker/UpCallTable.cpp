@@ -165,11 +165,11 @@ thread_local RequestScope* attached = nullptr;
 CMPIStatus attachThread(const CMPIBroker* broker, const CMPIContext* context) {
   return guarded([&] {
     coreOf(broker);
-    modelOf<Context>(context);
+    const Deadline deadline = modelOf<Context>(context).deadline;
     if (attached) {
       throw StatusError(CMPI_RC_ERR_FAILED, "the thread is already attached");
     }
-    attached = RequestScope::open(broker);
+    attached = RequestScope::open(broker, deadline);
   });
 }
 
@@ -192,7 +192,12 @@ Operation::Operation(const CMPIBroker* broker, const CMPIContext* callerContext,
     : core(coreOf(broker)),
       context(modelOf<Context>(callerContext)),
       path(modelOf<ObjectPath>(requested)),
-      definition(classFor(core, path)) {}
+      definition(classFor(core, path)) {
+  const Deadline deadline = RequestScope::currentDeadline();
+  if (deadline && std::chrono::steady_clock::now() >= *deadline) {
+    throw StatusError(CMPI_RC_ERR_FAILED, "the time limit of the request is over, " + path.className + " is not asked");
+  }
+}
 
 CMPIBrokerFT upCallTable = {
     .brokerCapabilities = CMPI_MB_InstanceManipulation | CMPI_MB_AssociationTraversal | CMPI_MB_BasicQualifierSupport |
