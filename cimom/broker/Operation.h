@@ -56,6 +56,10 @@ class OperationHandler {
   virtual std::vector<Value> references(const Operation& operation, const AssociationFilter& filter,
                                         const char** properties) = 0;
   virtual std::vector<Value> referenceNames(const Operation& operation, const AssociationFilter& filter) = 0;
+
+  // What a method of the operation's class returns; its output arguments are added to `out`.
+  virtual Value invokeMethod(const Operation& operation, const MethodDeclaration& method, const NamedValues& in,
+                             NamedValues& out) = 0;
 };
 
 }  // namespace Cimom

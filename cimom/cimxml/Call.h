@@ -73,6 +73,13 @@ inline PropertyFilter filterOf(const std::optional<std::vector<std::string>>& na
   return names ? PropertyFilter(*names) : PropertyFilter();
 }
 
+// Tells providers who asks; nothing if nobody was asked.
+inline void addPrincipal(const CMPIContext* context, const std::string& user) {
+  if (!user.empty()) {
+    requireOk(CMAddContextEntry(context, CMPIPrincipal, user.c_str(), CMPI_chars));
+  }
+}
+
 // The operations on instances; each writes IRETURNVALUE if it returns something.
 void enumerateInstances(Call& call);
 void enumerateInstanceNames(Call& call);
@@ -93,5 +100,8 @@ void referenceNames(Call& call);
 void getClass(Call& call);
 void enumerateClasses(Call& call);
 void enumerateClassNames(Call& call);
+
+// A method of a class; writes RETURNVALUE, unless it returns null, and a PARAMVALUE for each output argument.
+void callMethod(const OperationContext& manager, const Request& request, XmlWriter& xml);
 
 }  // namespace Cimom::CimXml

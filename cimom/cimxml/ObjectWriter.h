@@ -49,8 +49,12 @@ class ObjectWriter {
   // VALUE.OBJECTWITHPATH.
   void objectWithPath(const CMPIInstance* instance);
 
-  // VALUE, VALUE.ARRAY or VALUE.REFERENCE; nothing for a null value.
+  // VALUE, VALUE.ARRAY, VALUE.REFERENCE or VALUE.REFARRAY; nothing for a null value.
   void value(const CMPIData& data);
+
+  // The attributes of an element that say of which type its value is: TYPE, or by another name, and what a string
+  // embeds.
+  void type(const char* attributeName, CMPIType type);
 
  private:
   void keyBinding(const char* name, const CMPIData& data);

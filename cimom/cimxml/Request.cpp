@@ -137,6 +137,21 @@ Texts readArray(const Element& element) {
   return texts;
 }
 
+// VALUE.REFARRAY.
+ObjectNames readReferences(const Element& element) {
+  ObjectNames names;
+  for (auto child = element.first(); child; child = child->next()) {
+    if (child->is("VALUE.REFERENCE")) {
+      names.emplace_back(readObjectName(child->only()));
+    } else if (child->is("VALUE.NULL")) {
+      names.emplace_back(std::nullopt);
+    } else {
+      child->refuse("is not a reference");
+    }
+  }
+  return names;
+}
+
 Property readProperty(const Element& element) {
   Property property;
   property.name = element.requiredAttribute("NAME");
@@ -222,6 +237,8 @@ Parameter readParameter(const Element& element) {
     parameter.value = readArray(value);
   } else if (value.is("VALUE.REFERENCE")) {
     parameter.value = readObjectName(value.only());
+  } else if (value.is("VALUE.REFARRAY")) {
+    parameter.value = readReferences(value);
   } else if (isObjectName(value)) {
     parameter.value = readObjectName(value);
   } else if (isInstance(value)) {
@@ -263,6 +280,15 @@ void readExtrinsicCall(const Element& call, Request& request) {
 }
 
 }  // namespace
+
+Instance readEmbeddedInstance(std::string_view xml) {
+  const Document document(xml);
+  const Element root = document.root();
+  if (!root.is("INSTANCE")) {
+    root.refuse("is not an instance");
+  }
+  return readPlainInstance(root);
+}
 
 Request readRequest(std::string_view xml) {
   const Document document(xml);

@@ -34,7 +34,7 @@ TEST_F(ObjectsTest, AnArrayStartsWithNullsAndTakesItsTypeOnly) {
   EXPECT_EQ(CMGetArrayType(array, nullptr), CMPI_uint16);
   EXPECT_TRUE(CMIsNullValue(CMGetArrayElementAt(array, 0, nullptr)));
   EXPECT_EQ(CMSetArrayElementAt(array, 1, &number, CMPI_uint16).rc, CMPI_RC_OK);
-  EXPECT_EQ(CMSetArrayElementAt(array, 0, &wide, CMPI_uint32).rc, CMPI_RC_ERR_INVALID_DATA_TYPE);
+  EXPECT_EQ(CMSetArrayElementAt(array, 0, &wide, CMPI_uint32).rc, CMPI_RC_ERR_TYPE_MISMATCH);
   EXPECT_EQ(CMSetArrayElementAt(array, 2, &number, CMPI_uint16).rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
   EXPECT_EQ(CMGetArrayElementAt(array, 1, nullptr).value.uint16, 14);
   EXPECT_TRUE(CMIsNullValue(CMGetArrayElementAt(array, 2, &status)));
