@@ -120,7 +120,7 @@ TEST(RequestTest, ReadsEveryKindOfPath) {
 
 TEST(RequestTest, ReadsAnArrayOfReferencesWithItsNulls) {
   const auto references =
-      valueOf<References>("<VALUE.REFARRAY><VALUE.REFERENCE>" + instanceName("C", keyBinding("K", "1")) +
+      valueOf<ObjectNames>("<VALUE.REFARRAY><VALUE.REFERENCE>" + instanceName("C", keyBinding("K", "1")) +
                           "</VALUE.REFERENCE><VALUE.NULL/><VALUE.REFERENCE><CLASSNAME NAME=\"D\"/></VALUE.REFERENCE>"
                           "</VALUE.REFARRAY>");
   ASSERT_EQ(references.size(), 3u);
@@ -374,7 +374,7 @@ INSTANTIATE_TEST_SUITE_P(
             intrinsicCall("M", parameter("P", "<QUALIFIER.DECLARATION NAME=\"C\"><METHOD/></QUALIFIER.DECLARATION>")),
             400, notValid, "METHOD is not allowed in QUALIFIER.DECLARATION"},
         Refusal{"StrangeInReferences", intrinsicCall("M", parameter("P", "<VALUE.REFARRAY><VALUE/></VALUE.REFARRAY>")),
-                400, notValid, "VALUE is not an element of an array of references"},
+                400, notValid, "VALUE is not a reference"},
         Refusal{"HalfAPath", intrinsicCall("M", parameter("P", "<INSTANCEPATH><CLASSNAME NAME=\"C\"/></INSTANCEPATH>")),
                 400, notValid, "INSTANCEPATH"},
         Refusal{"HostlessPath",
