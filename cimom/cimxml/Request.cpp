@@ -264,6 +264,10 @@ void readExtrinsicCall(const Element& call, Request& request) {
 
 }  // namespace
 
+ObjectName readNameElement(const Element& element) { return readObjectName(element); }
+
+Instance readInstanceElement(const Element& element) { return readInstance(element); }
+
 Request readRequest(std::string_view xml) {
   const Document document(xml);
   const Element root = document.root();

@@ -10,6 +10,7 @@
 
 namespace Cimom::CimXml {
 
+class Element;
 struct KeyBinding;
 
 // CLASSNAME or INSTANCENAME, with whatever path stands around it.
@@ -71,5 +72,10 @@ struct Request {
 // Takes the body as it came. Throws TransportError: request-not-well-formed, request-not-valid,
 // multiple-requests-unsupported, unsupported-cim-version, unsupported-dtd-version or unsupported-protocol-version.
 Request readRequest(std::string_view xml);
+
+// A name with whatever path stands around it; an INSTANCE or VALUE.NAMEDINSTANCE. Throws TransportError
+// "request-not-valid".
+ObjectName readNameElement(const Element& element);
+Instance readInstanceElement(const Element& element);
 
 }  // namespace Cimom::CimXml
