@@ -75,7 +75,7 @@ std::optional<Options> readCommandLine(int argc, const char* const* argv) {
     }
   }
   app.add_option("--user", user, "log in with this name; the password is asked for at the terminal")->type_name("NAME");
-  app.add_flag("--json", options.json, "JSON, one object a line (docs/bmcip.schema.json)");
+  app.add_flag("--json", options.json, "JSON, one object a line (bmcip.schema.json has it)");
 
   CLI::App* show = app.add_subcommand("show", "the computer system, interfaces, gateways and DNS servers");
   show->add_option("hosts", options.hosts, "[SCHEME://]HOST[:PORT][/NAMESPACE]; the rest is that of --url")
