@@ -31,9 +31,9 @@ std::string readable(const std::string& value) {
   return value;
 }
 
-// "user:password", on the one line of a file that nobody else may read.
-void readCredentials(Options& options, const std::string& path) {
-  const Ground::Descriptor file(path, O_RDONLY);
+// A file that holds a password, which nobody else may read.
+Ground::Descriptor openPrivate(const std::string& path) {
+  Ground::Descriptor file(path, O_RDONLY);
   struct stat status {};
   if (!file.isOpen() || fstat(file.number(), &status) != 0) {
     throw std::invalid_argument(path + " cannot be read: " + std::strerror(errno));
@@ -44,6 +44,12 @@ void readCredentials(Options& options, const std::string& path) {
   if ((status.st_mode & 077) != 0) {
     throw std::invalid_argument(path + " holds a password, and others may read it: chmod 600 " + path);
   }
+  return file;
+}
+
+// "user:password", on the one line of the file.
+void readCredentials(Options& options, const std::string& path) {
+  const Ground::Descriptor file = openPrivate(path);
   std::string text(maxCredentials, '\0');
   const ssize_t size = ::read(file.number(), text.data(), text.size());
   text.resize(size > 0 ? static_cast<std::size_t>(size) : 0);
@@ -129,7 +135,13 @@ const std::vector<Setting>& settings() {
       {"credentials", "FILE", "log in with the line USER:PASSWORD of this file, whose mode must be 600", false,
        [](Options& options, const std::string& value) { readCredentials(options, value); }},
       {"netrc", "", "log in with what ~/.netrc has for the host", true,
-       [](Options& options, const std::string& value) { options.access.netrc = Ground::parseBoolean(value); }},
+       [](Options& options, const std::string& value) {
+         options.access.netrc = Ground::parseBoolean(value);
+         const char* home = std::getenv("HOME");
+         if (options.access.netrc) {
+           openPrivate(std::string(home ? home : "") + "/.netrc");
+         }
+       }},
       {"connect-timeout", "SECONDS", "give a server up that takes no connection in that time (5)", false,
        [](Options& options, const std::string& value) { options.access.connectTimeout = parseTimeout(value); }},
       {"timeout", "SECONDS", "give a request up that is not answered in that time (30)", false,
@@ -153,7 +165,9 @@ void applySettings(Options& options, const GivenSettings& given, const std::stri
     apply(options, *findSetting("url"), url, "BMCIP_URL");
   }
   for (const auto& [name, value] : given) {
-    apply(options, *findSetting(name), value, "--" + name);
+    if (!value.empty()) {
+      apply(options, *findSetting(name), value, "--" + name);
+    }
   }
 }
 

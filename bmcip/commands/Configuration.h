@@ -21,7 +21,7 @@ struct Setting {
 
 const std::vector<Setting>& settings();
 
-// The values given for settings by the command line, by their names.
+// The values given for settings by the command line, by their names; empty: none.
 using GivenSettings = std::map<std::string, std::string>;
 
 std::string systemConfigurationFile();

@@ -114,6 +114,8 @@ TEST_F(BmcipLoginTest, TakesCredentialsFromNetrc) {
   writePrivateFile(directory_ / ".netrc", "machine localhost login admin password secret\n");
   EXPECT_EQ(bmcip({"show", "--cacert", trusted(), "--netrc"}).status, 0);
   expectFailure({"--cacert", trusted()}, 13, "asks for a login");
+  std::filesystem::permissions(directory_ / ".netrc", std::filesystem::perms(0644));
+  expectFailure({"--cacert", trusted(), "--netrc"}, 2, ".netrc holds a password, and others may read it");
 }
 
 TEST_F(BmcipLoginTest, AsksForThePasswordAtTheTerminal) {

@@ -92,6 +92,7 @@ TEST_F(BmcipShowTest, ExplainsItself) {
   EXPECT_EQ(help.status, 0);
   EXPECT_THAT(help.output, AllOf(HasSubstr("--credentials FILE"), HasSubstr("bmcip set eth0 192.0.2.77/25"),
                                  HasSubstr("--dry-run")));
+  EXPECT_THAT(bmcip({"show", "--help"}).output, AllOf(HasSubstr("--hosts FILE"), Not(HasSubstr("--svg FILE"))));
   EXPECT_THAT(bmcip({"--version"}).output, StartsWith("bmcip "));
   for (const auto& mistake :
        std::vector<std::vector<std::string>>{{}, {"shw"}, {"show", "--jso"}, {"set"}, {"set", "eth0"}}) {
