@@ -86,7 +86,9 @@ Http::Response Endpoint::handle(const Http::Request& request) const {
 
 std::string Endpoint::respond(const Request& request, const std::string& user) const {
   try {
-    return responseMessage(request, [&](XmlWriter& xml) { perform({broker_, classes_, host_, user}, request, xml); });
+    return responseMessage(request, [&](XmlWriter& xml) {
+      perform({broker_, classes_, host_, *openEnumerations_, user}, request, xml);
+    });
   } catch (const OperationError& error) {
     return errorMessage(request, error.code(), error.what());
   }

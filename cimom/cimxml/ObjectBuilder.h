@@ -32,9 +32,10 @@ class ObjectBuilder {
     bool isNull = true;
     const CMPIValue* pointer() const { return isNull ? nullptr : &value; }
   };
-  TypedValue propertyValue(const std::string& className, const Property& property) const;
+  TypedValue propertyValue(const ObjectName& owner, const Property& property) const;
 
  private:
+  const ClassDefinition* classOf(const ObjectName& name) const;
   void addKey(CMPIObjectPath* path, const ObjectName& name, const KeyBinding& key) const;
   TypedValue keyValue(const KeyBinding& key, CMPIType type) const;
   TypedValue typed(const Property& property, CMPIType type) const;

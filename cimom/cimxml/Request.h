@@ -49,14 +49,22 @@ struct Property {
 };
 
 struct Instance {
-  ObjectName path;  // without keys if the client gave an INSTANCE alone
+  ObjectName path;        // without keys if the client gave an INSTANCE alone
+  std::string className;  // as INSTANCE says it
   std::vector<Property> properties;
+};
+
+using References = std::vector<std::optional<ObjectName>>;  // the same of VALUE.REFARRAY
+
+// CLASS or QUALIFIER.DECLARATION: no operation that takes one is offered, so only its name is kept.
+struct Declaration {
+  std::string name;
 };
 
 struct Parameter {
   std::string name;
   std::string type;  // the PARAMTYPE attribute; empty: none given
-  std::variant<std::monostate, std::string, Texts, ObjectName, Instance> value;
+  std::variant<std::monostate, std::string, Texts, ObjectName, References, Instance, Declaration> value;
 };
 
 struct Request {

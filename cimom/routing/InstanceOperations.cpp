@@ -37,7 +37,7 @@ template <typename Call>
 std::vector<Value> forEachClass(const ProviderRegistry& providers, const Operation& operation, Call call) {
   std::vector<Value> all;
   for (const Entry& entry : providers.entries()) {
-    const ClassDefinition* served = operation.core.classes.find(entry.registration.className);
+    const ClassDefinition* served = operation.core.classes.find(operation.path.nameSpace, entry.registration.className);
     if (!served || !servesInstances(entry, operation) || !served->isA(operation.definition.name)) {
       continue;
     }
