@@ -14,7 +14,7 @@
 namespace Bmcip {
 namespace {
 
-constexpr std::size_t maxHeaders = 64 * 1024;
+constexpr std::size_t maxHeaders = 1 << 16;
 constexpr int tickMilliseconds = 200;
 
 using Easy = std::unique_ptr<CURL, decltype(&curl_easy_cleanup)>;
@@ -77,7 +77,7 @@ std::size_t takeHeader(char* data, std::size_t, std::size_t size, void* user) {
 }
 
 std::string seconds(std::chrono::milliseconds time) {
-  const std::string text = std::to_string(time.count() / 1000.0);
+  const std::string text = std::to_string(static_cast<double>(time.count()) / 1000);
   return text.substr(0, text.find('.') + 2) + " s";
 }
 

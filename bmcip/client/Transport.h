@@ -39,7 +39,7 @@ struct Reply {
 // A process has one at a time. What a server sends is bounded, redirections and proxies are not followed.
 class Transport {
  public:
-  static constexpr std::size_t maxReply = 1024 * 1024;
+  static constexpr std::size_t maxReply = 1 << 20;
 
   // Throws std::runtime_error if libcurl cannot be used.
   explicit Transport(Access access);

@@ -15,16 +15,16 @@ using QV::Ipv4Address;
 using QV::SubnetMask;
 
 struct OutcomeRow {
-  Outcome outcome;
   const char* word;
+  Outcome outcome;
   int exitStatus;
 };
 
 constexpr OutcomeRow outcomes[] = {
-    {Outcome::Applied, "applied", 0},          {Outcome::Unchanged, "unchanged", 0},
-    {Outcome::WouldChange, "would-change", 0}, {Outcome::Refused, "refused", 3},
-    {Outcome::Ignored, "ignored", 4},          {Outcome::HalfApplied, "half-applied", 5},
-    {Outcome::Unknown, "unknown", 6},          {Outcome::NotConfirmed, "not-confirmed", 7},
+    {"applied", Outcome::Applied, 0},          {"unchanged", Outcome::Unchanged, 0},
+    {"would-change", Outcome::WouldChange, 0}, {"refused", Outcome::Refused, 3},
+    {"ignored", Outcome::Ignored, 4},          {"half-applied", Outcome::HalfApplied, 5},
+    {"unknown", Outcome::Unknown, 6},          {"not-confirmed", Outcome::NotConfirmed, 7},
 };
 
 const OutcomeRow& rowOf(Outcome outcome) { return *std::ranges::find(outcomes, outcome, &OutcomeRow::outcome); }

@@ -6,6 +6,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
@@ -162,8 +163,10 @@ std::string svgOf(const Graph& graph) {
   }
   std::string svg;
   std::rewind(output.get());
-  for (char buffer[4096]; const std::size_t size = std::fread(buffer, 1, sizeof buffer, output.get());) {
-    svg.append(buffer, size);
+  std::array<char, 4096> buffer{};
+  for (std::size_t size = 1; size > 0;) {
+    size = std::fread(buffer.data(), 1, buffer.size(), output.get());
+    svg.append(buffer.data(), size);
   }
   return svg;
 }

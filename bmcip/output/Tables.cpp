@@ -30,6 +30,7 @@ std::string withoutBlanks(std::string text) {
 
 std::vector<std::string> addressesOf(const std::vector<AccessPoint>& accessPoints) {
   std::vector<std::string> addresses;
+  addresses.reserve(accessPoints.size());
   for (const AccessPoint& accessPoint : accessPoints) {
     addresses.push_back(withoutBlanks(accessPoint.address));
   }

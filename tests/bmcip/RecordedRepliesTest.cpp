@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
-// What sfcb and OpenPegasus answered of the product, each in its own spelling: both are read as cimomd is.
+// What sfcb 1.3.18 and OpenPegasus 2.14.4 answered over HTTP with the product in them, each in its own spelling: both
+// are read as cimomd is.
 #include <gmock/gmock.h>
 
 #include "tests/bmcip/BmcipTest.h"

@@ -3,7 +3,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include "Paths.h"
 #include "bmcip/client/Operations.h"
+#include "tests/support/system/TemporaryDirectory.h"
 #include "tests/support/system/Throws.h"
 
 namespace {
@@ -90,6 +92,21 @@ TEST(RepliesTest, TellsObjectsByTheirKeysWhateverTheirOrder) {
   const std::string b = "<KEYBINDING NAME=\"b\"><KEYVALUE>2</KEYVALUE></KEYBINDING>";
   EXPECT_EQ(identityOf(name(a + b)), identityOf(name(b + a)));
   EXPECT_NE(identityOf(name(a + b)), identityOf(name(a)));
+}
+
+TEST(RepliesTest, ReadsTheNamesThatObjectManagersAnswer) {
+  for (const std::string objectManager : {"sfcb", "openpegasus"}) {
+    const std::string directory = SOURCE_DIR "/tests/bmcip/replies/" + objectManager;
+    const auto associators = readNames(Testing::readFile(directory + "/associators.xml"));
+    ASSERT_THAT(associators, SizeIs(2)) << objectManager;
+    EXPECT_EQ(associators[1].host, "managed.example");
+    EXPECT_EQ(identityOf(associators[1]),
+              "YRNx_MgmtHwIPProtocolEndPoint,creationclassname=YRNx_MgmtHwIPProtocolEndPoint,name=eth1,"
+              "systemcreationclassname=YRNx_MgmtHwComputerSystem,systemname=BMC");
+    const auto names = readNames(Testing::readFile(directory + "/names.xml"));
+    ASSERT_THAT(names, SizeIs(4)) << objectManager;
+    EXPECT_EQ(keyOf(names[3], "InstanceID"), "BMC:eth1:dhcp");
+  }
 }
 
 TEST(RepliesTest, WritesHostileNamesAsText) {
