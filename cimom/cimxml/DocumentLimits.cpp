@@ -75,7 +75,7 @@ class Scan {
 
   void run() {
     if (markup_.size() == 0 || !(markup_[0] == '<' || isBlank(markup_[0]))) {
-      refuse("request-not-well-formed", "the request must begin with <");
+      refuse("request-not-well-formed", "the message must begin with <");
     }
     while (position_ < markup_.size()) {
       if (current() != '<') {
@@ -101,7 +101,7 @@ class Scan {
   void advance() {
     const char character = current();
     if (character == '\0') {
-      refuse("request-not-well-formed", "the request contains a null character");
+      refuse("request-not-well-formed", "the message contains a null character");
     }
     line_ += character == '\n' ? 1 : 0;
     ++position_;
@@ -179,7 +179,7 @@ class Scan {
       } else if (current() == '"' || current() == '\'') {
         quote = current();
       } else if (current() == '[' && isDeclaration) {
-        refuse("request-not-well-formed", "the request declares entities or attributes");
+        refuse("request-not-well-formed", "the message declares entities or attributes");
       } else if (current() == '=' && ++attributes > DocumentLimits::attributes) {
         refuse("request-not-valid", "more than " + std::to_string(DocumentLimits::attributes) + " attributes");
       }
