@@ -78,8 +78,10 @@ class ConcurrentRequestsTest : public ::testing::Test {
   CMPIrc modify(const std::string& interface, const std::string& address) {
     const CMPIBroker* broker = manager_.broker();
     Cimom::RequestScope scope(broker);
-    CMPIObjectPath* path = CMNewObjectPath(broker, "root/cimv2", Classes::endpoint, nullptr);
-    CMAddKey(path, "Name", interface.c_str(), CMPI_chars);
+    const CMPIObjectPath* path = endpointOf(broker, scope.context(), interface);
+    if (!path) {
+      return CMPI_RC_ERR_NOT_FOUND;
+    }
     const CMPIInstance* instance = CMNewInstance(broker, path, nullptr);
     CMSetProperty(instance, "IPv4Address", address.c_str(), CMPI_chars);
     CMSetProperty(instance, "SubnetMask", "255.255.255.0", CMPI_chars);
@@ -87,6 +89,19 @@ class ConcurrentRequestsTest : public ::testing::Test {
   }
 
  private:
+  static const CMPIObjectPath* endpointOf(const CMPIBroker* broker, const CMPIContext* context,
+                                          const std::string& interface) {
+    const CMPIObjectPath* all = CMNewObjectPath(broker, "root/cimv2", Classes::endpoint, nullptr);
+    CMPIEnumeration* names = CBEnumInstanceNames(broker, context, all, nullptr);
+    while (names && CMHasNext(names, nullptr)) {
+      const CMPIObjectPath* path = CMGetNext(names, nullptr).value.ref;
+      if (interface == CMGetCharsPtr(CMGetKey(path, "Name", nullptr).value.string, nullptr)) {
+        return path;
+      }
+    }
+    return nullptr;
+  }
+
   TemporaryDirectory directory_;
   Cimom::ObjectManager manager_;
 };
