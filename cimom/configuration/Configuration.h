@@ -25,6 +25,7 @@ struct Configuration {
   unsigned maxConnections = 64;
   std::chrono::seconds idleTimeout{60};
   std::chrono::seconds shutdownTimeout{20};
+  bool bare = false;                     // requests go to the providers unchecked
   std::filesystem::path tlsCertificate;  // empty: plain HTTP
   std::filesystem::path tlsKey;
   std::filesystem::path passwordFile;  // empty: everybody may
