@@ -290,7 +290,7 @@ CMPIStatus send(const CMPIBroker* broker, MessageSink BrokerCore::*sink, int lev
                 const char* text, const CMPIString* string) {
   return guarded([&] {
     const auto& receiver = coreOf(broker).*sink;
-    const char* message = text ? text : textOf(string);
+    const char* message = required(text || !string ? text : textOf(string), "the message");
     if (receiver) {
       receiver(level, component ? component : "", message);
     }

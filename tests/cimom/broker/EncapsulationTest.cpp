@@ -33,7 +33,7 @@ TEST_F(EncapsulationTest, MessagesReachTheLog) {
   EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_WARNING, "ID", "text", nullptr).rc, CMPI_RC_OK);
   EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_ERROR, nullptr, nullptr, CMNewString(broker, "string", nullptr)).rc,
             CMPI_RC_OK);
-  EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_ERROR, "ID", nullptr, nullptr).rc, CMPI_RC_ERR_INVALID_HANDLE);
+  EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_ERROR, "ID", nullptr, nullptr).rc, CMPI_RC_ERR_INVALID_PARAMETER);
   EXPECT_THAT(messages, ElementsAre("3|ID|text", "1||string"));
 }
 
