@@ -27,10 +27,11 @@ class ObjectManager {
   // Reads MOF from a file or from every *.mof under a directory.
   // Throws ConfigurationError "FILE:LINE: what is wrong".
   void loadSchema(const std::filesystem::path& fileOrDirectory);
-  // Reads MOF from a text and makes the namespace known.
+  // Reads MOF from a text and shows its classes in the namespace; those under a `#pragma namespace` in theirs.
   void loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin = "text");
 
-  // Reads a registration file, or every *.reg of a directory (ProviderRegistration.h), and makes the namespaces known.
+  // Reads a registration file, or every *.reg of a directory (ProviderRegistration.h), and shows the classes in the
+  // namespaces.
   // Throws ConfigurationError "FILE:LINE: what is wrong".
   void loadRegistration(const std::filesystem::path& fileOrDirectory);
   // Where libraries are looked for, after the directories added before.

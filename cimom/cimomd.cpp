@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <signal.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
@@ -8,12 +9,14 @@
 #include <iostream>
 #include <iterator>
 #include <memory>
+#include <vector>
 
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Endpoint.h"
 #include "cimom/configuration/Configuration.h"
 #include "cimom/http/PasswordFile.h"
 #include "cimom/http/Server.h"
+#include "cimom/interop/InteropProvider.h"
 #include "ground/HostName.h"
 
 namespace {
@@ -53,6 +56,17 @@ void load(ObjectManager& manager, const Configuration& configuration) {
   }
   for (const auto& directory : configuration.providerDirectories) {
     manager.addProviderDirectory(directory);
+  }
+  // They stand with the classes: in the same directory, or beside a file by the same name.
+  std::vector<Profile> profiles;
+  for (std::filesystem::path path : configuration.schemas) {
+    if (std::filesystem::is_directory(path) || std::filesystem::exists(path.replace_extension(".profiles"))) {
+      std::ranges::move(readProfiles(path), std::back_inserter(profiles));
+    }
+  }
+  const LinkedProvider interop = interopProvider(manager.classes(), {Ground::hostName(), CIMOMD_VERSION, profiles});
+  for (const ProviderRegistration& registration : interop.registrations) {
+    manager.addProvider(registration, interop.instanceFactory, interop.associationFactory);
   }
   manager.checkProviders();
 }

@@ -27,8 +27,9 @@ void logToStandardError(int severity, std::string_view component, std::string_vi
 BrokerCore::BrokerCore()
     : log(logToStandardError), broker{this, &upCallTable, &encapsulationTable, &extensionTable, &memoryTable} {}
 
-const ClassDefinition& BrokerCore::requireClass(std::string_view className) const {
-  const ClassDefinition* definition = classes.find(className);
+const ClassDefinition& BrokerCore::requireClass(std::string_view nameSpace, std::string_view className) const {
+  const ClassDefinition* definition =
+      classes.hasNamespace(nameSpace) ? classes.find(nameSpace, className) : classes.find(className);
   if (!definition) {
     throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + std::string(className) + "\"");
   }

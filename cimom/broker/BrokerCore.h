@@ -20,8 +20,9 @@ using MessageSink = std::function<void(int level, std::string_view component, st
 struct BrokerCore {
   BrokerCore();
 
+  // The class as the namespace shows it, or wherever it is if the namespace is none that is known.
   // Throws StatusError CMPI_RC_ERR_INVALID_CLASS.
-  const ClassDefinition& requireClass(std::string_view className) const;
+  const ClassDefinition& requireClass(std::string_view nameSpace, std::string_view className) const;
   // Throws StatusError CMPI_RC_ERR_INVALID_NAMESPACE.
   void requireNamespace(std::string_view nameSpace) const;
 

@@ -22,7 +22,7 @@ auto made(const CMPIBroker* broker, CMPIStatus* status, Operation operation) {
 CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* status) {
   return made(broker, status, [&] {
     const ObjectPath& model = argumentOf<ObjectPath>(path);
-    return make(Instance(coreOf(broker).requireClass(model.className), model));
+    return make(Instance(coreOf(broker).requireClass(model.nameSpace, model.className), model));
   });
 }
 
@@ -74,7 +74,8 @@ CMPISelectExp* newSelectExp(const CMPIBroker* broker, const char*, const char*, 
 CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, const char* className,
                          CMPIStatus* status) {
   return made(broker, status, [&] {
-    const ClassDefinition& definition = coreOf(broker).requireClass(argumentOf<ObjectPath>(path).className);
+    const ObjectPath& model = argumentOf<ObjectPath>(path);
+    const ClassDefinition& definition = coreOf(broker).requireClass(model.nameSpace, model.className);
     return static_cast<CMPIBoolean>(definition.isA(required(className, "the class's name")));
   });
 }

@@ -8,7 +8,7 @@ namespace {
 
 const ClassDefinition& classFor(const BrokerCore& core, const ObjectPath& path) {
   core.requireNamespace(path.nameSpace);
-  return core.requireClass(path.className);
+  return core.requireClass(path.nameSpace, path.className);
 }
 
 // Runs an operation and hands its items out as an enumeration.

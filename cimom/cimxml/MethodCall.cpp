@@ -12,7 +12,7 @@ const MethodDeclaration& requireMethod(const OperationContext& manager, const Re
   if (!manager.classes.hasNamespace(request.nameSpace)) {
     throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
   }
-  const ClassDefinition* definition = manager.classes.find(className);
+  const ClassDefinition* definition = manager.classes.find(request.nameSpace, className);
   if (!definition) {
     throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
   }

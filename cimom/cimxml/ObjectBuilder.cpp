@@ -75,8 +75,12 @@ CMPIObjectPath* ObjectBuilder::path(const ObjectName& name) const {
   return path;
 }
 
+const ClassDefinition* ObjectBuilder::classOf(const ObjectName& name) const {
+  return classes_.find(name.nameSpace.empty() ? nameSpace_ : name.nameSpace, name.className);
+}
+
 void ObjectBuilder::addKey(CMPIObjectPath* path, const ObjectName& name, const KeyBinding& key) const {
-  const ClassDefinition* definition = classes_.find(name.className);
+  const ClassDefinition* definition = classOf(name);
   const std::string keyName = key.name.empty() ? loneKey(definition, name) : key.name;
   const PropertyDeclaration* declared = definition ? definition->findProperty(keyName) : nullptr;
   const TypedValue value = keyValue({keyName, key.value}, declared ? declared->type : claimedType(key.value));
@@ -103,16 +107,16 @@ CMPIInstance* ObjectBuilder::instance(const Instance& instance) const {
   CMPIInstance* object = CMNewInstance(broker_, path(instance.path), &status);
   requireOk(status, object);
   for (const Property& property : instance.properties) {
-    const TypedValue value = propertyValue(instance.path.className, property);
+    const TypedValue value = propertyValue(instance.path, property);
     requireOk(CMSetProperty(object, property.name.c_str(), value.pointer(), value.type));
   }
   return object;
 }
 
-ObjectBuilder::TypedValue ObjectBuilder::propertyValue(const std::string& className, const Property& property) const {
-  const ClassDefinition* definition = classes_.find(className);
+ObjectBuilder::TypedValue ObjectBuilder::propertyValue(const ObjectName& owner, const Property& property) const {
+  const ClassDefinition* definition = classOf(owner);
   if (!definition) {
-    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
+    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + owner.className + "\"");
   }
   const PropertyDeclaration* declared = definition->findProperty(property.name);
   if (!declared) {

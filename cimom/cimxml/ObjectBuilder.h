@@ -32,12 +32,13 @@ class ObjectBuilder {
     bool isNull = true;
     const CMPIValue* pointer() const { return isNull ? nullptr : &value; }
   };
-  TypedValue propertyValue(const std::string& className, const Property& property) const;
+  TypedValue propertyValue(const ObjectName& owner, const Property& property) const;
 
   // An argument of a method. One that does not fit its declaration is CIM_ERR_INVALID_PARAMETER.
   TypedValue argument(const PropertyDeclaration& declared, const Parameter& given) const;
 
  private:
+  const ClassDefinition* classOf(const ObjectName& name) const;
   void addKey(CMPIObjectPath* path, const ObjectName& name, const KeyBinding& key) const;
   TypedValue keyValue(const KeyBinding& key, CMPIType type) const;
   TypedValue typed(const std::string& what, const Property& property, CMPIType type) const;

@@ -7,7 +7,6 @@
 
 #include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/ScalarText.h"
-#include "cimom/model/Names.h"
 #include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
@@ -36,11 +35,6 @@ const CMPIObjectPath* pathOf(const CMPIInstance* instance) {
 }
 
 }  // namespace
-
-bool PropertyFilter::includes(const char* name) const {
-  return !names_ || std::any_of(names_->begin(), names_->end(),
-                                [name](const std::string& candidate) { return sameName(candidate, name); });
-}
 
 void ObjectWriter::instanceName(const CMPIObjectPath* path) {
   const auto name = xml_.element("INSTANCENAME", "CLASSNAME", chars(CMGetClassName(path, nullptr)));
@@ -127,8 +121,12 @@ void ObjectWriter::namedInstance(const CMPIInstance* object) {
   instance(object);
 }
 
-void ObjectWriter::objectWithPath(const CMPIInstance* object) {
-  const auto scope = xml_.element("VALUE.OBJECTWITHPATH");
+void ObjectWriter::objectWithPath(const CMPIInstance* object) { withPath("VALUE.OBJECTWITHPATH", object); }
+
+void ObjectWriter::instanceWithPath(const CMPIInstance* object) { withPath("VALUE.INSTANCEWITHPATH", object); }
+
+void ObjectWriter::withPath(const char* element, const CMPIInstance* object) {
+  const auto scope = xml_.element(element);
   instancePath(pathOf(object));
   instance(object);
 }

@@ -41,11 +41,40 @@ const std::vector<Operation>& operations() {
        references,
        {"ObjectName", "ResultClass", "Role", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
       {"ReferenceNames", referenceNames, {"ObjectName", "ResultClass", "Role"}},
+      {"OpenEnumerateInstances",
+       openEnumerateInstances,
+       {"ClassName", "DeepInheritance", "IncludeClassOrigin", "PropertyList", "FilterQueryLanguage", "FilterQuery",
+        "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenEnumerateInstancePaths",
+       openEnumerateInstancePaths,
+       {"ClassName", "FilterQueryLanguage", "FilterQuery", "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenAssociatorInstances",
+       openAssociatorInstances,
+       {"InstanceName", "AssocClass", "ResultClass", "Role", "ResultRole", "IncludeClassOrigin", "PropertyList",
+        "FilterQueryLanguage", "FilterQuery", "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenAssociatorInstancePaths",
+       openAssociatorInstancePaths,
+       {"InstanceName", "AssocClass", "ResultClass", "Role", "ResultRole", "FilterQueryLanguage", "FilterQuery",
+        "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenReferenceInstances",
+       openReferenceInstances,
+       {"InstanceName", "ResultClass", "Role", "IncludeClassOrigin", "PropertyList", "FilterQueryLanguage",
+        "FilterQuery", "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenReferenceInstancePaths",
+       openReferenceInstancePaths,
+       {"InstanceName", "ResultClass", "Role", "FilterQueryLanguage", "FilterQuery", "OperationTimeout",
+        "ContinueOnError", "MaxObjectCount"}},
+      {"PullInstancesWithPath", pullInstancesWithPath, {"EnumerationContext", "MaxObjectCount"}},
+      {"PullInstancePaths", pullInstancePaths, {"EnumerationContext", "MaxObjectCount"}},
+      {"CloseEnumeration", closeEnumeration, {"EnumerationContext"}},
+      {"EnumerationCount", enumerationCount, {"EnumerationContext"}},
       {"GetClass", getClass, {"ClassName", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
       {"EnumerateClasses",
        enumerateClasses,
        {"ClassName", "DeepInheritance", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin"}},
-      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}}};
+      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}},
+      {"GetQualifier", getQualifier, {"QualifierName"}},
+      {"EnumerateQualifiers", enumerateQualifiers, {}}};
   return table;
 }
 
@@ -80,7 +109,8 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
   const CMPIContext* context = scope.context();
   describeCaller(context, manager, parameters);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);
-  Call call{manager, request, parameters, context, objects, xml};
+  std::string host = manager.host;
+  Call call{manager, request, parameters, context, objects, xml, host};
   operation.perform(call);
 }
 

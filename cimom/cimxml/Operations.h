@@ -5,6 +5,7 @@
 
 #include <string>
 
+#include "cimom/cimxml/OpenEnumerations.h"
 #include "cimom/cimxml/Request.h"
 #include "cimom/cimxml/XmlWriter.h"
 #include "cimom/schema/ClassRepository.h"
@@ -16,6 +17,7 @@ struct OperationContext {
   const CMPIBroker* broker;
   const ClassRepository& classes;
   const std::string& host;  // stands in a path that names none
+  OpenEnumerations& openEnumerations;
   const std::string& user;  // who has authenticated; empty if nobody was asked
 };
 

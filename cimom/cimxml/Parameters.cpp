@@ -12,6 +12,9 @@
 namespace Cimom::CimXml {
 namespace {
 
+// More than any class has. Providers go through the list for every instance.
+constexpr std::size_t mostProperties = 4096;
+
 [[noreturn]] void refuse(std::string_view name, const char* what) {
   throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter " + std::string(name) + " " + what);
 }
@@ -72,6 +75,26 @@ bool Parameters::flag(std::string_view name, bool whenMissing) const {
   return parsed->boolean != 0;
 }
 
+std::optional<std::uint32_t> Parameters::number(std::string_view name) const {
+  const auto value = text(name);
+  if (!value) {
+    return std::nullopt;
+  }
+  const auto parsed = parseScalar(CMPI_uint32, *value);
+  if (!parsed) {
+    refuse(name, "must be a number from 0 to 4294967295");
+  }
+  return parsed->uint32;
+}
+
+std::string Parameters::requiredText(std::string_view name) const {
+  auto value = text(name);
+  if (!value) {
+    refuse(name, "is missing");
+  }
+  return *std::move(value);
+}
+
 std::string Parameters::className(std::string_view name) const {
   const auto* value = valueOf<ObjectName>(find(name), "must be a class name");
   if (!value) {
@@ -111,6 +134,9 @@ std::optional<std::vector<std::string>> Parameters::propertyList() const {
   const auto* texts = valueOf<Texts>(find("PropertyList"), "must be a list of names");
   if (!texts) {
     return std::nullopt;
+  }
+  if (texts->size() > mostProperties) {
+    refuse("PropertyList", "must not have more than 4096 names");
   }
   std::vector<std::string> names;
   for (const auto& text : *texts) {

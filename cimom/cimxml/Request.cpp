@@ -183,7 +183,8 @@ bool isProperty(const Element& element) {
 
 Instance readPlainInstance(const Element& element) {
   Instance instance;
-  instance.path.className = element.requiredAttribute("CLASSNAME");
+  instance.className = element.requiredAttribute("CLASSNAME");
+  instance.path.className = instance.className;
   for (auto child = element.first(); child; child = child->next()) {
     if (child->is("QUALIFIER")) {
       continue;
@@ -213,6 +214,23 @@ Instance readInstance(const Element& element) {
   return instance;
 }
 
+// CLASS and QUALIFIER.DECLARATION.
+bool isDeclaration(const Element& element) { return element.is("CLASS") || element.is("QUALIFIER.DECLARATION"); }
+
+Declaration readDeclaration(const Element& element) {
+  Declaration declaration{element.requiredAttribute("NAME")};
+  const bool isClass = element.is("CLASS");
+  for (auto child = element.first(); child; child = child->next()) {
+    if (isClass && isProperty(*child)) {
+      readProperty(*child);
+    } else if (isClass ? !child->is("QUALIFIER") && !child->is("METHOD")
+                       : !child->is("SCOPE") && !child->is("VALUE") && !child->is("VALUE.ARRAY")) {
+      child->refuse("is not allowed in " + std::string(element.name()));
+    }
+  }
+  return declaration;
+}
+
 // Minor versions add; a major version that this server does not know may mean anything.
 void requireMajorVersion(const Element& element, std::string_view attribute, char major, const char* cimError) {
   const std::string version = element.requiredAttribute(attribute);
@@ -239,6 +257,8 @@ Parameter readParameter(const Element& element) {
     parameter.value = readObjectName(value.only());
   } else if (value.is("VALUE.REFARRAY")) {
     parameter.value = readReferences(value);
+  } else if (isDeclaration(value)) {
+    parameter.value = readDeclaration(value);
   } else if (isObjectName(value)) {
     parameter.value = readObjectName(value);
   } else if (isInstance(value)) {
@@ -289,6 +309,10 @@ Instance readEmbeddedInstance(std::string_view xml) {
   }
   return readPlainInstance(root);
 }
+
+ObjectName readNameElement(const Element& element) { return readObjectName(element); }
+
+Instance readInstanceElement(const Element& element) { return readInstance(element); }
 
 Request readRequest(std::string_view xml) {
   const Document document(xml);

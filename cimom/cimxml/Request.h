@@ -11,6 +11,7 @@
 
 namespace Cimom::CimXml {
 
+class Element;
 struct KeyBinding;
 
 // CLASSNAME or INSTANCENAME, with whatever path stands around it.
@@ -51,14 +52,20 @@ struct Property {
 };
 
 struct Instance {
-  ObjectName path;  // without keys if the client gave an INSTANCE alone
+  ObjectName path;        // without keys if the client gave an INSTANCE alone
+  std::string className;  // as INSTANCE says it
   std::vector<Property> properties;
+};
+
+// CLASS or QUALIFIER.DECLARATION: no operation that takes one is offered, so only its name is kept.
+struct Declaration {
+  std::string name;
 };
 
 struct Parameter {
   std::string name;
   std::string type;  // the PARAMTYPE attribute; empty: none given
-  std::variant<std::monostate, std::string, Texts, ObjectName, ObjectNames, Instance> value;
+  std::variant<std::monostate, std::string, Texts, ObjectName, ObjectNames, Instance, Declaration> value;
 };
 
 struct Request {
@@ -77,5 +84,10 @@ Request readRequest(std::string_view xml);
 
 // Takes the text of a value that embeds an INSTANCE. Throws TransportError as above.
 Instance readEmbeddedInstance(std::string_view xml);
+
+// A name with whatever path stands around it; an INSTANCE or VALUE.NAMEDINSTANCE. Throws TransportError
+// "request-not-valid".
+ObjectName readNameElement(const Element& element);
+Instance readInstanceElement(const Element& element);
 
 }  // namespace Cimom::CimXml

@@ -41,7 +41,7 @@ std::vector<Value> forEachClass(const ProviderRegistry& providers, const Operati
   std::optional<StatusError> unsupported;
   bool isAnswered = false;
   for (const Entry& entry : providers.entries()) {
-    const ClassDefinition* served = operation.core.classes.find(entry.registration.className);
+    const ClassDefinition* served = operation.core.classes.find(operation.path.nameSpace, entry.registration.className);
     if (!served || !servesInstances(entry, operation) || !served->isA(operation.definition.name)) {
       continue;
     }
