@@ -4,6 +4,7 @@
 
 #include <strings.h>
 
+#include <chrono>
 #include <functional>
 #include <string>
 #include <string_view>
@@ -40,6 +41,9 @@ struct Request {
   Headers headers;
   std::string body;  // complete, decoded from any transfer coding
   std::string user;  // who has authenticated; empty if the server asks nobody
+
+  // When the server answers in the handler's place: whatever the handler waits for need not be waited for longer.
+  std::chrono::steady_clock::time_point deadline = std::chrono::steady_clock::time_point::max();
 };
 
 struct Response {
