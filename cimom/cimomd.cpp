@@ -77,8 +77,15 @@ Http::ServerOptions serverOptions(const Configuration& configuration) {
   options.address = configuration.address;
   options.port = configuration.port;
   options.maxRequestSize = configuration.maxRequestSize;
+  options.maxRequestMemory = configuration.maxRequestMemory;
   options.maxConnections = configuration.maxConnections;
+  options.maxConnectionsPerAddress = configuration.maxConnectionsPerAddress;
+  options.maxRequests = configuration.maxRequests;
   options.idleTimeout = configuration.idleTimeout;
+  options.requestTimeout = configuration.requestTimeout;
+  options.operationTimeout = configuration.operationTimeout;
+  options.hostNames = {configuration.serverNames.begin(), configuration.serverNames.end()};
+  options.hostNames.insert(Ground::hostName());
   options.tlsCertificate = contentOf(configuration.tlsCertificate);
   options.tlsKey = contentOf(configuration.tlsKey);
   if (!configuration.passwordFile.empty()) {
@@ -94,7 +101,11 @@ void serve(const Configuration& configuration, const EndSignals& endSignals) {
   ObjectManager manager;
   load(manager, configuration);
   const CimXml::Endpoint endpoint(manager.broker(), manager.classes(), Ground::hostName());
-  Http::Server server(serverOptions(configuration),
+  Http::ServerOptions options = serverOptions(configuration);
+  options.failureHandler = [&endpoint](const Http::Request& request, const std::string& why) {
+    return endpoint.fail(request, why);
+  };
+  Http::Server server(std::move(options),
                       [&endpoint](const Http::Request& request) { return endpoint.handle(request); });
   std::cout << "listening on " << server.endpoint() << std::endl;
   endSignals.wait();

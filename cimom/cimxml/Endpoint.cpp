@@ -60,6 +60,15 @@ Endpoint::Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std
     : broker_(broker), classes_(classes), host_(std::move(host)) {}
 
 Http::Response Endpoint::handle(const Http::Request& request) const {
+  return handle(request, [&](const Request& message) { return respond(message, request.user); });
+}
+
+Http::Response Endpoint::fail(const Http::Request& request, const std::string& why) const {
+  return handle(request,
+                [&](const Request& message) { return errorMessage(message, CMPI_RC_ERR_FAILED, why.c_str()); });
+}
+
+Http::Response Endpoint::handle(const Http::Request& request, const Answer& answer) {
   if (request.path != "/cimom" && request.path != "/") {
     return plain(404, "CIM operations must be sent to /cimom");
   }
@@ -71,7 +80,8 @@ Http::Response Endpoint::handle(const Http::Request& request) const {
     const Request message = readRequest(request.body);
     headers.requireMatch(message);
     Http::Response response;
-    response.body = respond(message, request.user);
+    response.body = answer(message);
+    response.subject = message.method + " " + message.nameSpace;
     response.headers.add("Content-Type", "application/xml; charset=\"utf-8\"");
     headers.addTo(response.headers);
     return response;

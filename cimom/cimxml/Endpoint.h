@@ -3,6 +3,7 @@
 
 #include <cmpift.h>
 
+#include <functional>
 #include <string>
 
 #include "cimom/cimxml/Request.h"
@@ -21,7 +22,13 @@ class Endpoint {
   // May be called from several threads at once.
   Http::Response handle(const Http::Request& request) const;
 
+  // What a client hears in the place of an answer that is not to be had: CIM status 1 with the reason.
+  Http::Response fail(const Http::Request& request, const std::string& why) const;
+
  private:
+  using Answer = std::function<std::string(const Request& request)>;
+
+  static Http::Response handle(const Http::Request& request, const Answer& answer);
   std::string respond(const Request& request, const std::string& user) const;
 
   const CMPIBroker* broker_;

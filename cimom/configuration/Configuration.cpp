@@ -40,9 +40,11 @@ struct Setting {
   Apply apply;  // throws UsageError for a bad value
 };
 
-std::uint64_t parseNumber(const GivenValue& value, std::uint64_t least, std::uint64_t most) {
+// What the parser makes of the value's text; its refusal names the value.
+template <typename Parser, typename... Range>
+auto parse(const GivenValue& value, Parser parser, Range... range) {
   try {
-    return Ground::parseNumber(value.text, least, most);
+    return parser(value.text, range...);
   } catch (const std::invalid_argument& refusal) {
     throw UsageError(value.origin + ": " + refusal.what() + ", not \"" + value.text + "\"");
   }
@@ -58,7 +60,7 @@ std::filesystem::path parsePath(const GivenValue& value) {
 template <typename Number>
 Apply number(Number Configuration::*member, std::uint64_t least, std::uint64_t most) {
   return [=](Configuration& configuration, const GivenValue& value) {
-    configuration.*member = Number(parseNumber(value, least, most));
+    configuration.*member = Number(parse(value, Ground::parseNumber, least, most));
   };
 }
 
@@ -87,12 +89,25 @@ const std::vector<Setting>& settings() {
        paths(&Configuration::providerDirectories)},
       {"max-request-size", "BYTES", "largest body of a request (4194304)", false,
        number(&Configuration::maxRequestSize, 1024, std::numeric_limits<std::int32_t>::max())},
-      {"max-connections", "N", "connections served at once (64)", false,
+      {"max-request-memory", "BYTES", "bodies of all requests in progress together (33554432)", false,
+       number(&Configuration::maxRequestMemory, 1024, std::numeric_limits<std::int32_t>::max())},
+      {"max-requests", "N", "requests answered at once (64)", false, number(&Configuration::maxRequests, 1, 4096)},
+      {"max-connections", "N", "connections open at once (512)", false,
        number(&Configuration::maxConnections, 1, 4096)},
+      {"max-connections-per-address", "N", "of them from one address (64)", false,
+       number(&Configuration::maxConnectionsPerAddress, 1, 4096)},
+      {"request-timeout", "SECONDS", "receive a whole request within this time (30)", false,
+       number(&Configuration::requestTimeout, 1, day)},
+      {"operation-timeout", "SECONDS", "answer a request whose provider has not within this time (60)", false,
+       number(&Configuration::operationTimeout, 1, day)},
       {"idle-timeout", "SECONDS", "close a connection after so long without traffic (60)", false,
        number(&Configuration::idleTimeout, 1, day)},
       {"shutdown-timeout", "SECONDS", "wait so long for requests in progress when shutting down (20)", false,
        number(&Configuration::shutdownTimeout, 0, day)},
+      {"server-name", "NAME", "a further host name that clients may ask this server by", true,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.serverNames.push_back(parse(value, Ground::parseText));
+       }},
       {"tls-certificate", "FILE", "PEM file with the certificate chain; with tls-key: HTTPS instead of HTTP", false,
        path(&Configuration::tlsCertificate)},
       {"tls-key", "FILE", "PEM file with the certificate's private key", false, path(&Configuration::tlsKey)},

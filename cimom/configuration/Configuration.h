@@ -21,10 +21,16 @@ struct Configuration {
   std::vector<std::filesystem::path> schemas;
   std::vector<std::filesystem::path> registrations;
   std::vector<std::filesystem::path> providerDirectories;
-  std::size_t maxRequestSize = 4 << 20;  // bytes
-  unsigned maxConnections = 64;
+  std::size_t maxRequestSize = 4 << 20;     // bytes
+  std::size_t maxRequestMemory = 32 << 20;  // bytes
+  unsigned maxConnections = 512;
+  unsigned maxConnectionsPerAddress = 64;
+  unsigned maxRequests = 64;
   std::chrono::seconds idleTimeout{60};
+  std::chrono::seconds requestTimeout{30};
+  std::chrono::seconds operationTimeout{60};
   std::chrono::seconds shutdownTimeout{20};
+  std::vector<std::string> serverNames;  // beside the host's own
   std::filesystem::path tlsCertificate;  // empty: plain HTTP
   std::filesystem::path tlsKey;
   std::filesystem::path passwordFile;  // empty: everybody may

@@ -66,6 +66,19 @@ TEST_F(ShutdownTest, GivesUpOnARequestThatTakesTooLong) {
   EXPECT_FALSE(has("cleaned"));
 }
 
+TEST_F(ShutdownTest, SaysThatAProviderDidNotAnswerInTime) {
+  auto limited = options("0");
+  limited.insert(limited.end(), {"--operation-timeout", "1"});
+  Cimomd cimomd(limited, environment());
+  const Completed late = cimomd.wbemcli({"ei"}, "TEST_Slow");
+  EXPECT_NE(late.errors.find("(1) CIM_ERR_FAILED"), std::string::npos) << late.errors;
+  EXPECT_NE(late.errors.find("the provider did not answer within 1 s"), std::string::npos) << late.errors;
+  EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
+  // The provider is still at work, and cannot be unloaded.
+  EXPECT_EQ(cimomd.stop(), 1);
+  EXPECT_FALSE(has("cleaned"));
+}
+
 TEST_F(ShutdownTest, OutlivesAClientThatGoesAway) {
   Cimomd cimomd(Cimomd::probeOptions(), environment());
   {
