@@ -19,6 +19,9 @@
 namespace Cimom {
 namespace {
 
+// The port that IANA has for CIM-XML over TLS.
+constexpr std::uint16_t wbemHttps = 5989;
+
 // A value as it was given.
 struct GivenValue {
   std::string text;
@@ -80,7 +83,8 @@ const std::vector<Setting>& settings() {
   static const std::vector<Setting> table = {
       {"address", "ADDRESS", "numeric address to listen on (127.0.0.1)", false,
        [](Configuration& configuration, const GivenValue& value) { configuration.address = value.text; }},
-      {"port", "N", "port to listen on; 0: any free port (5988)", false, number(&Configuration::port, 0, 65535)},
+      {"port", "N", "port to listen on; 0: any free port (5988, with TLS 5989)", false,
+       number(&Configuration::port, 0, 65535)},
       {"schema", "PATH", "MOF file, or directory of *.mof files, with the classes", true,
        paths(&Configuration::schemas)},
       {"registration", "PATH", "file, or directory of *.reg files: which provider serves which class", true,
@@ -112,7 +116,19 @@ const std::vector<Setting>& settings() {
        path(&Configuration::tlsCertificate)},
       {"tls-key", "FILE", "PEM file with the certificate's private key", false, path(&Configuration::tlsKey)},
       {"password-file", "FILE", "user:hash lines (crypt(5)); only these users are served", false,
-       path(&Configuration::passwordFile)}};
+       path(&Configuration::passwordFile)},
+      {"request-log", "FILE", "a line for each request; -: to the standard output", false,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.requestLog = value.text == "-" ? std::filesystem::path("-") : parsePath(value);
+       }},
+      {"trace", "YES|NO", "what providers trace, to the standard error output (no)", false,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.trace = parse(value, Ground::parseBoolean);
+       }},
+      {"user", "NAME", "the user to become, where root starts it", false,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.user = parse(value, Ground::parseText);
+       }}};
   return table;
 }
 
@@ -173,6 +189,9 @@ Configuration toConfiguration(const GivenValues& given, const Installation& inst
   }
   if (configuration.tlsCertificate.empty() != configuration.tlsKey.empty()) {
     throw UsageError("tls-certificate and tls-key must be given together");
+  }
+  if (!given.contains("port") && !configuration.tlsCertificate.empty()) {
+    configuration.port = wbemHttps;
   }
   useInstalled(configuration.schemas, "schema", installation.schema);
   useInstalled(configuration.registrations, "registration", installation.registration);

@@ -17,7 +17,7 @@ namespace Cimom {
 // What cimomd works with, from its command line and its configuration file.
 struct Configuration {
   std::string address = "127.0.0.1";
-  std::uint16_t port = 5988;
+  std::uint16_t port = 5988;  // with TLS 5989, where none is given
   std::vector<std::filesystem::path> schemas;
   std::vector<std::filesystem::path> registrations;
   std::vector<std::filesystem::path> providerDirectories;
@@ -34,6 +34,9 @@ struct Configuration {
   std::filesystem::path tlsCertificate;  // empty: plain HTTP
   std::filesystem::path tlsKey;
   std::filesystem::path passwordFile;  // empty: everybody may
+  std::filesystem::path requestLog;    // empty: none; "-": the standard output
+  bool trace = false;
+  std::string user;  // to run as; empty: as who starts it
 };
 
 // The command line or the configuration file is wrong; the text names the option, or file and line, and what is wrong.

@@ -9,6 +9,7 @@
 #include <string>
 
 #include "cimom/http/Address.h"
+#include "cimom/http/Certificate.h"
 #include "cimom/http/Timers.h"
 
 namespace Cimom::Http {
@@ -18,6 +19,7 @@ struct Connection {
   Address arrivedAt;
   // Beyond a limit: it is served for as long as it takes to say so.
   bool isSurplus = false;
+  std::shared_ptr<Certificate> certificate;  // of TLS
 
   // Ends the traffic of the socket, whatever the connection is waiting for. Does nothing once it is closed.
   void cut();

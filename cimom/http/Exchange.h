@@ -48,8 +48,10 @@ class Exchange {
   bool isHttp11 = true;
   bool counted = false;  // among the replies that a drain waits for
   std::chrono::steady_clock::time_point begun = std::chrono::steady_clock::now();
-  unsigned status = 0;  // of the reply
-  std::string subject;  // of the request log
+  std::string group;     // of addresses, and
+  std::string password;  // while they are checked
+  unsigned status = 0;   // of the reply
+  std::string subject;   // of the request log
   Timers::Ticket timeLimit;
 
   // Takes a part of the body. Returns false for a client that goes on although its request is refused.

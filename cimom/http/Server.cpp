@@ -2,6 +2,7 @@
 #include "cimom/http/Server.h"
 
 #include <cxxabi.h>
+#include <gnutls/gnutls.h>
 #include <microhttpd.h>
 #include <sys/resource.h>
 #include <sys/socket.h>
@@ -20,12 +21,15 @@
 #include <vector>
 
 #include "cimom/http/Acceptor.h"
+#include "cimom/http/Certificate.h"
 #include "cimom/http/Connections.h"
 #include "cimom/http/Exchange.h"
+#include "cimom/http/LoginDelay.h"
 #include "cimom/http/Reply.h"
 #include "cimom/http/RequestHead.h"
 #include "cimom/http/Timers.h"
 #include "cimom/http/Workers.h"
+#include "ground/Printable.h"
 
 namespace Cimom::Http {
 namespace {
@@ -44,6 +48,9 @@ constexpr std::chrono::milliseconds farewell{1000};
 // libmicrohttpd 0.9.75 locks itself up when a connection that is handed to it exceeds its own limit (it returns with
 // its mutex held): the limits are those of Connections.
 constexpr std::intptr_t beyondAllLimits = 1 << 30;
+
+// TLS 1.2 at least, and no key exchange whose traffic can be read later with the server's key.
+constexpr const char* priorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2:-RSA:%SERVER_PRECEDENCE";
 
 // Descriptors for what is no connection: files, providers, their sessions.
 constexpr rlim_t otherDescriptors = 64;
@@ -149,6 +156,19 @@ struct Credentials {
   std::string password;
 };
 
+// The certificate for a handshake, as the connection holds it.
+int retrieveCertificate(gnutls_session_t session, const gnutls_datum_t*, int, const gnutls_pk_algorithm_t*, int,
+                        gnutls_pcert_st** chain, unsigned* length, gnutls_privkey_t* key) {
+  const auto* connection = static_cast<const Connection*>(gnutls_session_get_ptr(session));
+  if (!connection || !connection->certificate) {
+    return -1;
+  }
+  *chain = connection->certificate->chain().data();
+  *length = static_cast<unsigned>(connection->certificate->chain().size());
+  *key = connection->certificate->key();
+  return 0;
+}
+
 void freeText(char* text) { MHD_free(text); }
 
 std::optional<Credentials> credentialsOf(MHD_Connection* connection) {
@@ -173,6 +193,9 @@ struct Server::State {
   Suspensions suspensions;
   Timers timers;
   Connections connections;
+  LoginDelay loginDelay;
+  std::mutex certificateMutex;
+  std::shared_ptr<Certificate> certificate;  // none: plain HTTP
   Workers workers;
   Workers logins;
   Workers failures;
@@ -205,7 +228,11 @@ struct Server::State {
 
   void start() {
     Listener listener(options.address, options.port);
+    requireProtection(listener);
     requireDescriptors();
+    if (isTls()) {
+      certificate = std::make_shared<Certificate>(options.tlsCertificate, options.tlsKey);
+    }
     startDaemon();
     listener.listen();
     endpoint = std::string(isTls() ? "https://" : "http://") + listener.endpoint();
@@ -217,6 +244,16 @@ struct Server::State {
   }
 
   bool isTls() const { return !options.tlsCertificate.empty(); }
+
+  // Whoever reaches the server may change what the providers let be changed.
+  void requireProtection(const Listener& listener) const {
+    if (listener.address().isLoopback() || (isTls() && options.authenticator)) {
+      return;
+    }
+    throw ServerError("cannot listen on " + options.address + " port " + std::to_string(listener.port()) +
+                      ": other machines reach it, so that tls-certificate, tls-key and password-file must be given; "
+                      "without them only a loopback address can be, 127.0.0.1 or ::1");
+  }
 
   // All connections, or none: a limit that cannot be kept would show on the worst day.
   void requireDescriptors() const {
@@ -244,17 +281,14 @@ struct Server::State {
         {MHD_OPTION_NOTIFY_COMPLETED, reinterpret_cast<std::intptr_t>(&State::onCompleted), this}};
     if (isTls()) {
       flags |= MHD_USE_TLS;
-      settings.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0, options.tlsCertificate.data()});
-      settings.push_back({MHD_OPTION_HTTPS_MEM_KEY, 0, options.tlsKey.data()});
+      settings.push_back({MHD_OPTION_HTTPS_CERT_CALLBACK, 0, reinterpret_cast<void*>(&retrieveCertificate)});
+      settings.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(priorities)});
     }
     settings.push_back({MHD_OPTION_END, 0, nullptr});
     daemon = MHD_start_daemon(flags, 0, nullptr, nullptr, &State::onRequest, this, MHD_OPTION_ARRAY, settings.data(),
                               MHD_OPTION_END);
     if (!daemon) {
-      throw ServerError(isTls()
-                            ? "cannot start the HTTPS server: certificate and key must be unencrypted PEM and belong "
-                              "together"
-                            : "cannot start the HTTP server");
+      throw ServerError(isTls() ? "cannot start the HTTPS server" : "cannot start the HTTP server");
     }
   }
 
@@ -276,6 +310,11 @@ struct Server::State {
       const auto* peer = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
       auto pointer = std::make_unique<ConnectionPointer>();
       *pointer = connections.open(descriptor, peer->client_addr, options.requestTimeout);
+      if (const auto* session = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_GNUTLS_SESSION)) {
+        const std::lock_guard lock(certificateMutex);
+        (*pointer)->certificate = certificate;
+        gnutls_session_set_ptr(static_cast<gnutls_session_t>(session->tls_session), pointer->get());
+      }
       *record = pointer.release();
     } catch (const std::exception&) {
       ::shutdown(descriptor, SHUT_RDWR);
@@ -334,18 +373,23 @@ struct Server::State {
     if (!credentials) {
       return reply(connection, record, *exchange, challenge());
     }
+    const auto now = std::chrono::steady_clock::now();
+    const auto delay = loginDelay.admit(record->group, credentials->user, now);
+    if (!delay) {
+      Response response = refusal(MHD_HTTP_TOO_MANY_REQUESTS, "too many failed logins");
+      response.headers.add("Retry-After", "10");
+      return reply(connection, record, *exchange, std::move(response));
+    }
     exchange->phase = Exchange::Phase::Login;
+    exchange->group = record->group;
+    exchange->request.user = std::move(credentials->user);
+    exchange->password = std::move(credentials->password);
     if (!suspensions.add(exchange, connection)) {
       return MHD_NO;
     }
-    try {
-      if (logins.run([this, exchange, given = std::move(*credentials)] { check(exchange, given); })) {
-        return MHD_YES;
-      }
-    } catch (const std::exception&) {
-      // no memory: there is no room, then
-    }
-    turnAway(exchange, "too many logins at once");
+    // Who has to wait costs no thread meanwhile.
+    connections.unlimit(*record);
+    delayLogin(exchange, now + *delay, *delay == delay->zero());
     return MHD_YES;
   }
 
@@ -371,6 +415,7 @@ struct Server::State {
         if (auto response = exchange->takeResponse()) {
           return reply(connection, record, *exchange, std::move(*response));
         }
+        connections.limit(record, options.requestTimeout);
         return expectBody(connection, record, *exchange);
       case Exchange::Phase::Body:
         if (size > 0) {
@@ -426,6 +471,7 @@ struct Server::State {
     if (!exchange) {
       return;
     }
+    state.record(**exchange);
     if ((*exchange)->counted) {
       state.inFlight.replied();
     }
@@ -439,6 +485,21 @@ struct Server::State {
     }
   }
 
+  void record(const Exchange& exchange) const {
+    if (!options.requestLog || exchange.status == 0) {
+      return;
+    }
+    try {
+      const Request& request = exchange.request;
+      options.requestLog(
+          {std::chrono::duration_cast<std::chrono::milliseconds>(std::chrono::steady_clock::now() - exchange.begun),
+           request.client, request.user,
+           exchange.subject.empty() ? request.method + " " + request.path : exchange.subject, exchange.status});
+    } catch (const std::exception&) {
+      // a line is lost, and nothing else
+    }
+  }
+
   // --- In other threads.
 
   void turnAway(const ExchangePointer& exchange, const char* reason) {
@@ -449,13 +510,41 @@ struct Server::State {
     }
   }
 
-  void check(const ExchangePointer& exchange, const Credentials& credentials) {
-    std::optional<Response> response = guarded([&] {
-      const bool accepted = options.authenticator(credentials.user, credentials.password);
-      if (accepted) {
-        exchange->request.user = credentials.user;
+  void delayLogin(const ExchangePointer& exchange, std::chrono::steady_clock::time_point time, bool now) {
+    try {
+      if (now) {
+        startLogin(exchange);
+      } else {
+        timers.at(time, [this, exchange] { startLogin(exchange); });
       }
-      return accepted ? Response{0, {}, {}} : challenge();
+    } catch (const std::exception&) {
+      turnAway(exchange, "the server is out of memory");
+    }
+  }
+
+  void startLogin(const ExchangePointer& exchange) {
+    try {
+      if (logins.run([this, exchange] { check(exchange); })) {
+        return;
+      }
+    } catch (const std::exception&) {
+      // no memory: there is no room, then
+    }
+    turnAway(exchange, "too many logins at once");
+  }
+
+  void check(const ExchangePointer& exchange) {
+    std::optional<Response> response = guarded([&] {
+      const std::string& user = exchange->request.user;
+      if (options.authenticator(user, exchange->password)) {
+        loginDelay.succeeded(exchange->group, user);
+        return Response{0, {}, {}};
+      }
+      loginDelay.failed(exchange->group, user, std::chrono::steady_clock::now());
+      if (options.log) {
+        options.log("login failed: user \"" + Ground::printable(user) + "\" from " + exchange->request.client);
+      }
+      return challenge();
     });
     if (response->status == 0) {
       response.reset();
@@ -535,6 +624,12 @@ Server::~Server() = default;
 std::string Server::endpoint() const { return state_->endpoint; }
 
 std::uint16_t Server::port() const { return state_->port; }
+
+void Server::useCertificate(const std::string& chain, const std::string& key) {
+  auto replacement = std::make_shared<Certificate>(chain, key);
+  const std::lock_guard lock(state_->certificateMutex);
+  state_->certificate.swap(replacement);
+}
 
 void Server::adopt(int descriptor) {
   sockaddr_storage none{};

@@ -21,6 +21,15 @@ namespace Cimom::Http {
 // Whether the password is that user's; called from several threads at once.
 using Authenticator = std::function<bool(const std::string& user, const std::string& password)>;
 
+// What a request log says of a request.
+struct RequestRecord {
+  std::chrono::milliseconds duration;
+  std::string client;
+  std::string user;
+  std::string subject;  // as the handler names it; else the method and the path
+  unsigned status;      // of HTTP
+};
+
 struct ServerOptions {
   std::string address = "127.0.0.1";                  // numeric
   std::uint16_t port = 0;                             // 0: a free one
@@ -37,11 +46,14 @@ struct ServerOptions {
   std::string tlsKey;                                 // PEM, unencrypted
   Authenticator authenticator;                        // none: everybody may
   FailureHandler failureHandler;                      // none: a 500 with the reason
+  std::function<void(const std::string& line)> log;   // what an administrator should see; none: nobody
+  std::function<void(const RequestRecord& record)> requestLog;  // every request, once it has been answered
 };
 
 class Server {
  public:
-  // Listens and serves when it returns. Throws ServerError.
+  // Listens and serves when it returns. Throws ServerError, also where other machines would reach a server without TLS
+  // or without authentication.
   Server(ServerOptions options, Handler handler);
 
   // Waits for the handlers that are at work.
@@ -52,6 +64,10 @@ class Server {
 
   std::string endpoint() const;  // where it listens: "http://127.0.0.1:5988"
   std::uint16_t port() const;
+
+  // Another certificate and key, for the connections that begin from now on. Throws ServerError, and keeps the old
+  // ones.
+  void useCertificate(const std::string& chain, const std::string& key);
 
   // Serves a connected stream socket, as if it had been accepted, and closes it.
   void adopt(int descriptor);
