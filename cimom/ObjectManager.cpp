@@ -15,30 +15,40 @@ struct ObjectManager::Parts {
   // Ends first: a provider may still make up-calls while it is cleaned up.
   Router router{&core.broker};
 
-  void addNamespaces(const ProviderRegistration& registration) {
+  void showClass(const ProviderRegistration& registration) {
     for (const std::string& nameSpace : registration.namespaces) {
-      core.classes.addNamespace(nameSpace);
+      core.classes.show(nameSpace, registration.className);
     }
   }
 };
 
 ObjectManager::ObjectManager() : parts_(std::make_unique<Parts>()) {}
 
-ObjectManager::~ObjectManager() = default;
+ObjectManager::~ObjectManager() {
+  if (!parts_->router.providers().cleanUp()) {
+    [[maybe_unused]] const Parts* stays = parts_.release();
+  }
+}
 
 void ObjectManager::loadSchema(const std::filesystem::path& fileOrDirectory) {
   parts_->core.classes.add(parts_->reader.readPath(fileOrDirectory));
 }
 
 void ObjectManager::loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin) {
-  parts_->core.classes.add(parts_->reader.readText(mof, std::string(origin)));
+  const MofDeclarations declarations = parts_->reader.readText(mof, std::string(origin));
+  parts_->core.classes.add(declarations);
   parts_->core.classes.addNamespace(nameSpace);
+  for (const ClassDeclaration& declaration : declarations.classes) {
+    if (declaration.nameSpace.empty()) {
+      parts_->core.classes.show(nameSpace, declaration.own.name);
+    }
+  }
 }
 
 void ObjectManager::loadRegistration(const std::filesystem::path& fileOrDirectory) {
   for (const ProviderRegistration& registration : readRegistration(fileOrDirectory)) {
     parts_->router.providers().add(registration);
-    parts_->addNamespaces(registration);
+    parts_->showClass(registration);
   }
 }
 
@@ -47,18 +57,26 @@ void ObjectManager::addProviderDirectory(const std::filesystem::path& directory)
 }
 
 void ObjectManager::addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
-                                AssociationFactory associationFactory) {
-  parts_->router.providers().add(registration, std::move(instanceFactory), std::move(associationFactory));
-  parts_->addNamespaces(registration);
+                                AssociationFactory associationFactory, MethodFactory methodFactory) {
+  parts_->router.providers().add(
+      registration, {std::move(instanceFactory), std::move(associationFactory), std::move(methodFactory)});
+  parts_->showClass(registration);
 }
+
+void ObjectManager::setProviderLimit(std::chrono::milliseconds limit) { parts_->router.providers().setLimit(limit); }
 
 void ObjectManager::checkProviders() {
   for (const auto& [registration, provider] : parts_->router.providers().entries()) {
-    if (parts_->core.classes.find(registration.className)) {
-      continue;
+    for (const std::string& nameSpace : registration.namespaces) {
+      if (parts_->core.classes.find(nameSpace, registration.className)) {
+        continue;
+      }
+      const bool elsewhere = parts_->core.classes.find(registration.className) != nullptr;
+      throw ConfigurationError(
+          (registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") + "class " +
+          registration.className +
+          (elsewhere ? " is declared for another namespace than " + nameSpace : " is not in the schema"));
     }
-    throw ConfigurationError((registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") + "class " +
-                             registration.className + " is not in the schema");
   }
   parts_->router.providers().load();
 }

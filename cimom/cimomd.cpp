@@ -2,6 +2,7 @@
 #include <netdb.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdlib>
 #include <iostream>
 #include <memory>
@@ -9,6 +10,7 @@
 #include <set>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Endpoint.h"
@@ -19,6 +21,7 @@
 #include "cimom/http/PasswordFile.h"
 #include "cimom/http/SecretFile.h"
 #include "cimom/http/Server.h"
+#include "cimom/interop/InteropProvider.h"
 #include "ground/HostName.h"
 #include "ground/Names.h"
 #include "ground/Printable.h"
@@ -39,6 +42,17 @@ void load(ObjectManager& manager, const Configuration& configuration) {
   }
   for (const auto& directory : configuration.providerDirectories) {
     manager.addProviderDirectory(directory);
+  }
+  // They stand with the classes: in the same directory, or beside a file by the same name.
+  std::vector<Profile> profiles;
+  for (std::filesystem::path path : configuration.schemas) {
+    if (std::filesystem::is_directory(path) || std::filesystem::exists(path.replace_extension(".profiles"))) {
+      std::ranges::move(readProfiles(path), std::back_inserter(profiles));
+    }
+  }
+  const LinkedProvider interop = interopProvider(manager.classes(), {Ground::hostName(), CIMOMD_VERSION, profiles});
+  for (const ProviderRegistration& registration : interop.registrations) {
+    manager.addProvider(registration, interop.instanceFactory, interop.associationFactory);
   }
   manager.checkProviders();
 }

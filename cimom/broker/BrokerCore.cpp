@@ -28,8 +28,9 @@ void logToStandardError(int severity, std::string_view component, std::string_vi
 BrokerCore::BrokerCore()
     : log(logToStandardError), broker{this, &upCallTable, &encapsulationTable, &extensionTable, &memoryTable} {}
 
-const ClassDefinition& BrokerCore::requireClass(std::string_view className) const {
-  const ClassDefinition* definition = classes.find(className);
+const ClassDefinition& BrokerCore::requireClass(std::string_view nameSpace, std::string_view className) const {
+  const ClassDefinition* definition =
+      classes.hasNamespace(nameSpace) ? classes.find(nameSpace, className) : classes.find(className);
   if (!definition) {
     throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + std::string(className) + "\"");
   }
@@ -39,6 +40,12 @@ const ClassDefinition& BrokerCore::requireClass(std::string_view className) cons
 void BrokerCore::requireNamespace(std::string_view nameSpace) const {
   if (!classes.hasNamespace(nameSpace)) {
     throw StatusError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + std::string(nameSpace) + "\"");
+  }
+}
+
+void logError(const BrokerCore& core, std::string_view text) {
+  if (core.log) {
+    core.log(CMPI_SEV_ERROR, "cimomd", text);
   }
 }
 

@@ -20,8 +20,9 @@ using MessageSink = std::function<void(int level, std::string_view component, st
 struct BrokerCore {
   BrokerCore();
 
+  // The class as the namespace shows it, or wherever it is if the namespace is none that is known.
   // Throws StatusError CMPI_RC_ERR_INVALID_CLASS.
-  const ClassDefinition& requireClass(std::string_view className) const;
+  const ClassDefinition& requireClass(std::string_view nameSpace, std::string_view className) const;
   // Throws StatusError CMPI_RC_ERR_INVALID_NAMESPACE.
   void requireNamespace(std::string_view nameSpace) const;
 
@@ -31,6 +32,9 @@ struct BrokerCore {
   OperationHandler* operations = nullptr;  // who carries up-calls out; there before the first of them
   CMPIBroker broker;
 };
+
+// Logs what the object manager itself has to say.
+void logError(const BrokerCore& core, std::string_view text);
 
 // Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the broker or its handle is null.
 BrokerCore& coreOf(const CMPIBroker* broker);

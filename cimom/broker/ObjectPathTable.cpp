@@ -54,12 +54,12 @@ CMPIStatus setHostAndNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObj
 
 // The path's class, as the broker of the current request knows it.
 const ClassDefinition& classOf(const CMPIObjectPath* path) {
-  const std::string& name = modelOf<ObjectPath>(path).className;
+  const ObjectPath& model = modelOf<ObjectPath>(path);
   const CMPIBroker* broker = RequestScope::currentBroker();
   if (!broker) {
     throw StatusError(CMPI_RC_ERR_FAILED, "qualifiers can only be read within a request");
   }
-  return coreOf(broker).requireClass(name);
+  return coreOf(broker).requireClass(model.nameSpace, model.className);
 }
 
 template <typename Declaration>

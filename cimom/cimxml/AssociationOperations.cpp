@@ -6,14 +6,14 @@ namespace {
 
 // What every traversal takes. DSP0200 lets it start from a class too; that asks the schema, which this server does not.
 struct Traversal {
-  explicit Traversal(const Call& call)
+  Traversal(const Call& call, std::string_view sourceParameter)
       : assocClass(call.parameters.className("AssocClass")),
         resultClass(call.parameters.className("ResultClass")),
         role(call.parameters.text("Role").value_or("")),
         resultRole(call.parameters.text("ResultRole").value_or("")),
         list(call.parameters.propertyList()),
         names(list) {
-    const ObjectName& name = call.parameters.instanceName("ObjectName");
+    const ObjectName& name = call.parameters.instanceName(sourceParameter);
     if (name.keys.empty()) {
       throw OperationError(CMPI_RC_ERR_NOT_SUPPORTED,
                            "association traversal from a class is not supported: name an instance");
@@ -31,45 +31,60 @@ struct Traversal {
   CMPIStatus status{CMPI_RC_OK, nullptr};
 };
 
-void writeInstances(const Call& call, const Traversal& traversal, CMPIEnumeration* result) {
-  ObjectWriter writer = call.writer(filterOf(traversal.list));
-  writeResult(call, traversal.status, result, [&writer](const CMPIValue& value) { writer.objectWithPath(value.inst); });
+void writeInstances(const Call& call, const Found& found) {
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ObjectWriter writer = call.writer(found.properties);
+  for (const CMPIData& object : found.objects) {
+    writer.objectWithPath(object.value.inst);
+  }
 }
 
-void writeNames(const Call& call, const Traversal& traversal, CMPIEnumeration* result) {
+void writeNames(const Call& call, const Found& found) {
+  const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  writeResult(call, traversal.status, result, [&writer](const CMPIValue& value) { writer.objectPath(value.ref); });
+  for (const CMPIData& object : found.objects) {
+    writer.objectPath(object.value.ref);
+  }
 }
 
 }  // namespace
 
-void associators(Call& call) {
-  Traversal to(call);
-  writeInstances(
-      call, to,
+Found findAssociators(Call& call, std::string_view source) {
+  Traversal to(call, source);
+  CMPIEnumeration* instances =
       CBAssociators(call.manager.broker, call.context, to.source, orNull(to.assocClass), orNull(to.resultClass),
-                    orNull(to.role), orNull(to.resultRole), to.names.get(), &to.status));
+                    orNull(to.role), orNull(to.resultRole), to.names.get(), &to.status);
+  return {call, to.status, instances, filterOf(to.list)};
 }
 
-void associatorNames(Call& call) {
-  Traversal to(call);
-  writeNames(call, to,
-             CBAssociatorNames(call.manager.broker, call.context, to.source, orNull(to.assocClass),
-                               orNull(to.resultClass), orNull(to.role), orNull(to.resultRole), &to.status));
+Found findAssociatorNames(Call& call, std::string_view source) {
+  Traversal to(call, source);
+  CMPIEnumeration* names =
+      CBAssociatorNames(call.manager.broker, call.context, to.source, orNull(to.assocClass), orNull(to.resultClass),
+                        orNull(to.role), orNull(to.resultRole), &to.status);
+  return {call, to.status, names};
 }
 
-void references(Call& call) {
-  Traversal to(call);
-  writeInstances(call, to,
-                 CBReferences(call.manager.broker, call.context, to.source, orNull(to.resultClass), orNull(to.role),
-                              to.names.get(), &to.status));
+Found findReferences(Call& call, std::string_view source) {
+  Traversal to(call, source);
+  CMPIEnumeration* instances = CBReferences(call.manager.broker, call.context, to.source, orNull(to.resultClass),
+                                            orNull(to.role), to.names.get(), &to.status);
+  return {call, to.status, instances, filterOf(to.list)};
 }
 
-void referenceNames(Call& call) {
-  Traversal to(call);
-  writeNames(call, to,
-             CBReferenceNames(call.manager.broker, call.context, to.source, orNull(to.resultClass), orNull(to.role),
-                              &to.status));
+Found findReferenceNames(Call& call, std::string_view source) {
+  Traversal to(call, source);
+  CMPIEnumeration* names = CBReferenceNames(call.manager.broker, call.context, to.source, orNull(to.resultClass),
+                                            orNull(to.role), &to.status);
+  return {call, to.status, names};
 }
+
+void associators(Call& call) { writeInstances(call, findAssociators(call, "ObjectName")); }
+
+void associatorNames(Call& call) { writeNames(call, findAssociatorNames(call, "ObjectName")); }
+
+void references(Call& call) { writeInstances(call, findReferences(call, "ObjectName")); }
+
+void referenceNames(Call& call) { writeNames(call, findReferenceNames(call, "ObjectName")); }
 
 }  // namespace Cimom::CimXml

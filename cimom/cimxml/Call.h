@@ -5,6 +5,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "cimom/cimxml/Errors.h"
@@ -12,6 +13,7 @@
 #include "cimom/cimxml/ObjectWriter.h"
 #include "cimom/cimxml/Operations.h"
 #include "cimom/cimxml/Parameters.h"
+#include "cimom/cimxml/SystemHost.h"
 
 namespace Cimom::CimXml {
 
@@ -23,28 +25,28 @@ struct Call {
   const CMPIContext* context;
   const ObjectBuilder& objects;
   XmlWriter& xml;
+  std::string& host;  // stands in the answer's paths that name none
 
-  ObjectWriter writer(PropertyFilter filter = {}) const {
-    return {xml, manager.host, request.nameSpace, std::move(filter)};
+  // Gives the paths that name no host the one that the answer's objects name.
+  void takeHostOf(const std::vector<CMPIData>& answered) const {
+    host = systemHost(answered, request.nameSpace, manager.host);
   }
+
+  ObjectWriter writer(PropertyFilter filter = {}) const { return {xml, host, request.nameSpace, std::move(filter)}; }
 
   CMPIObjectPath* classPath(const std::string& className) const {
     return objects.path(ObjectName{{}, {}, className, {}});
   }
 };
 
-// Writes IRETURNVALUE with every object of the result of an up-call.
-template <typename Write>
-void writeResult(const Call& call, const CMPIStatus& status, CMPIEnumeration* result, Write write) {
-  requireOk(status, result);
-  const auto scope = call.xml.element("IRETURNVALUE");
-  while (CMHasNext(result, nullptr)) {
-    CMPIStatus next{CMPI_RC_OK, nullptr};
-    const CMPIData data = CMGetNext(result, &next);
-    requireOk(next, data.value.dataPtr.ptr);
-    write(data.value);
-  }
-}
+// What an operation that enumerates has found: instances, or paths.
+struct Found {
+  // Throws OperationError for a status that is not OK.
+  Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown = {});
+
+  std::vector<CMPIData> objects;
+  PropertyFilter properties;  // of instances: those that the client wants to see
+};
 
 // A text as CMPI takes one that may be missing.
 inline const char* orNull(const std::string& text) { return text.empty() ? nullptr : text.c_str(); }
@@ -73,6 +75,22 @@ inline PropertyFilter filterOf(const std::optional<std::vector<std::string>>& na
   return names ? PropertyFilter(*names) : PropertyFilter();
 }
 
+// Tells providers who asks; nothing if nobody was asked.
+inline void addPrincipal(const CMPIContext* context, const std::string& user) {
+  if (!user.empty()) {
+    requireOk(CMAddContextEntry(context, CMPIPrincipal, user.c_str(), CMPI_chars));
+  }
+}
+
+// What the operations find that return many objects. Those that start from an instance take the name of the parameter
+// that names it, which is another one if the result is pulled.
+Found findInstances(Call& call);
+Found findInstanceNames(Call& call);
+Found findAssociators(Call& call, std::string_view source);
+Found findAssociatorNames(Call& call, std::string_view source);
+Found findReferences(Call& call, std::string_view source);
+Found findReferenceNames(Call& call, std::string_view source);
+
 // The operations on instances; each writes IRETURNVALUE if it returns something.
 void enumerateInstances(Call& call);
 void enumerateInstanceNames(Call& call);
@@ -89,9 +107,26 @@ void associatorNames(Call& call);
 void references(Call& call);
 void referenceNames(Call& call);
 
+// The operations whose results are pulled; each writes IRETURNVALUE, and what the operation returns beside it.
+void openEnumerateInstances(Call& call);
+void openEnumerateInstancePaths(Call& call);
+void openAssociatorInstances(Call& call);
+void openAssociatorInstancePaths(Call& call);
+void openReferenceInstances(Call& call);
+void openReferenceInstancePaths(Call& call);
+void pullInstancesWithPath(Call& call);
+void pullInstancePaths(Call& call);
+void closeEnumeration(Call& call);
+void enumerationCount(Call& call);
+
 // The operations that read the schema; each writes IRETURNVALUE.
 void getClass(Call& call);
 void enumerateClasses(Call& call);
 void enumerateClassNames(Call& call);
+void getQualifier(Call& call);
+void enumerateQualifiers(Call& call);
+
+// A method of a class; writes RETURNVALUE, unless it returns null, and a PARAMVALUE for each output argument.
+void callMethod(const OperationContext& manager, const Request& request, XmlWriter& xml);
 
 }  // namespace Cimom::CimXml

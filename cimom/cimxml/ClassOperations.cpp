@@ -13,7 +13,7 @@ void requireNamespace(const Call& call) {
 }
 
 const ClassDefinition& requireClass(const Call& call, const std::string& name, CMPIrc whenUnknown) {
-  const ClassDefinition* definition = call.manager.classes.find(name);
+  const ClassDefinition* definition = call.manager.classes.find(call.request.nameSpace, name);
   if (!definition) {
     throw OperationError(whenUnknown, "unknown class \"" + name + "\"");
   }
@@ -32,7 +32,7 @@ std::vector<const ClassDefinition*> requestedClasses(const Call& call) {
   if (!name.empty()) {
     requireClass(call, name, CMPI_RC_ERR_INVALID_CLASS);
   }
-  return call.manager.classes.subclasses(name, call.parameters.flag("DeepInheritance", false));
+  return call.manager.classes.subclasses(call.request.nameSpace, name, call.parameters.flag("DeepInheritance", false));
 }
 
 }  // namespace
@@ -58,6 +58,29 @@ void enumerateClassNames(Call& call) {
   const auto scope = call.xml.element("IRETURNVALUE");
   for (const ClassDefinition* definition : classes) {
     const auto name = call.xml.element("CLASSNAME", "NAME", definition->name);
+  }
+}
+
+void getQualifier(Call& call) {
+  requireNamespace(call);
+  const auto name = call.parameters.text("QualifierName");
+  if (!name) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter QualifierName is missing");
+  }
+  const QualifierDeclaration* declaration = call.manager.classes.findQualifierDeclaration(*name);
+  if (!declaration) {
+    throw OperationError(CMPI_RC_ERR_NOT_FOUND, "unknown qualifier \"" + *name + "\"");
+  }
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ClassWriter(call.xml, {}).write(*declaration);
+}
+
+void enumerateQualifiers(Call& call) {
+  requireNamespace(call);
+  ClassWriter writer(call.xml, {});
+  const auto scope = call.xml.element("IRETURNVALUE");
+  for (const QualifierDeclaration* declaration : call.manager.classes.qualifierDeclarations()) {
+    writer.write(*declaration);
   }
 }
 

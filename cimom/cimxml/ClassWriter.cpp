@@ -3,7 +3,10 @@
 
 #include <cmpimacs.h>
 
+#include <algorithm>
+
 #include "cimom/broker/CmpiValue.h"
+#include "cimom/model/Names.h"
 #include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
@@ -37,6 +40,15 @@ void writeType(XmlWriter& xml, const PropertyDeclaration& declaration) {
   }
 }
 
+// SCOPE: what a qualifier may stand at.
+void writeScope(XmlWriter& xml, const std::vector<std::string>& scopes) {
+  const auto element = xml.element("SCOPE");
+  for (const char* name : {"CLASS", "ASSOCIATION", "REFERENCE", "PROPERTY", "METHOD", "PARAMETER", "INDICATION"}) {
+    const auto covers = [name](const std::string& scope) { return sameName(scope, name) || sameName(scope, "any"); };
+    xml.attribute(name, truth(std::ranges::any_of(scopes, covers)));
+  }
+}
+
 }  // namespace
 
 void ClassWriter::write(const ClassDefinition& definition) {
@@ -57,6 +69,19 @@ void ClassWriter::write(const ClassDefinition& definition) {
   }
 }
 
+void ClassWriter::write(const QualifierDeclaration& declaration) {
+  const Qualifier& qualifier = declaration.qualifier;
+  const auto scope = xml_.element("QUALIFIER.DECLARATION", "NAME", qualifier.name);
+  xml_.attribute("TYPE", xmlTypeName(qualifier.value.type()));
+  xml_.attribute("ISARRAY", truth(isArray(qualifier.value.type())));
+  if (declaration.arraySize > 0) {
+    xml_.attribute("ARRAYSIZE", std::to_string(declaration.arraySize));
+  }
+  flavor(qualifier);
+  writeScope(xml_, declaration.scopes);
+  values_.value(toCmpi(qualifier.value));
+}
+
 bool ClassWriter::isShown(bool propagated) const { return !view_.localOnly || !propagated; }
 
 void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
@@ -66,14 +91,19 @@ void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
   for (const Qualifier& qualifier : qualifiers) {
     const char* type = xmlTypeName(qualifier.value.type());
     const auto scope = xml_.element("QUALIFIER", "NAME", qualifier.name);
-    if (type) {
-      xml_.attribute("TYPE", type);
+    xml_.attribute("TYPE", type ? type : "string");
+    if (qualifier.propagated) {
+      xml_.attribute("PROPAGATED", truth(true));
     }
-    xml_.attribute("OVERRIDABLE", truth(qualifier.overridable));
-    xml_.attribute("TOSUBCLASS", truth(qualifier.toSubclass));
-    xml_.attribute("TRANSLATABLE", truth(qualifier.translatable));
+    flavor(qualifier);
     values_.value(toCmpi(qualifier.value));
   }
+}
+
+void ClassWriter::flavor(const Qualifier& qualifier) {
+  xml_.attribute("OVERRIDABLE", truth(qualifier.overridable));
+  xml_.attribute("TOSUBCLASS", truth(qualifier.toSubclass));
+  xml_.attribute("TRANSLATABLE", truth(qualifier.translatable));
 }
 
 void ClassWriter::property(const PropertyDeclaration& property) {

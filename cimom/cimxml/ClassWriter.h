@@ -8,21 +8,23 @@ namespace Cimom::CimXml {
 
 // What of a class a client wants to see (DSP0200, GetClass).
 struct ClassView {
-  bool localOnly = true;  // leaves out what the class inherits and does not override
+  bool localOnly = true;  // leaves out properties and methods that the class inherits and does not override
   bool includeQualifiers = true;
   bool includeClassOrigin = false;
   PropertyFilter properties;
 };
 
-// Writes CLASS. Default values are made in the current request scope.
+// Writes CLASS and QUALIFIER.DECLARATION. Default values are made in the current request scope.
 class ClassWriter {
  public:
   ClassWriter(XmlWriter& xml, ClassView view) : xml_(xml), values_(xml, none_, none_), view_(std::move(view)) {}
 
   void write(const ClassDefinition& definition);
+  void write(const QualifierDeclaration& declaration);
 
  private:
   void qualifiers(const Qualifiers& qualifiers);
+  void flavor(const Qualifier& qualifier);
   void property(const PropertyDeclaration& property);
   void method(const MethodDeclaration& method);
   void parameter(const PropertyDeclaration& parameter);

@@ -96,7 +96,9 @@ Http::Response Endpoint::handle(const Http::Request& request, const Answer& answ
 
 std::string Endpoint::respond(const Request& request, const std::string& user) const {
   try {
-    return responseMessage(request, [&](XmlWriter& xml) { perform({broker_, classes_, host_, user}, request, xml); });
+    return responseMessage(request, [&](XmlWriter& xml) {
+      perform({broker_, classes_, host_, *openEnumerations_, user}, request, xml);
+    });
   } catch (const OperationError& error) {
     return errorMessage(request, error.code(), error.what());
   }

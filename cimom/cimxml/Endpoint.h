@@ -4,8 +4,10 @@
 #include <cmpift.h>
 
 #include <functional>
+#include <memory>
 #include <string>
 
+#include "cimom/cimxml/OpenEnumerations.h"
 #include "cimom/cimxml/Request.h"
 #include "cimom/http/Message.h"
 #include "cimom/schema/ClassRepository.h"
@@ -34,6 +36,7 @@ class Endpoint {
   const CMPIBroker* broker_;
   const ClassRepository& classes_;
   std::string host_;
+  std::unique_ptr<OpenEnumerations> openEnumerations_ = std::make_unique<OpenEnumerations>();
 };
 
 }  // namespace Cimom::CimXml

@@ -4,6 +4,7 @@
 
 #include <cmpimacs.h>
 
+#include <array>
 #include <stdexcept>
 #include <string>
 
@@ -34,6 +35,39 @@ class OperationError : public std::runtime_error {
   int code_;
 };
 
+// CIM status codes of DSP0200 for pulled enumerations, which CMPI has no names for.
+constexpr int cimInvalidEnumerationContext = 21;
+constexpr int cimInvalidOperationTimeout = 22;
+constexpr int cimFilteredEnumerationNotSupported = 25;
+constexpr int cimContinuationOnErrorNotSupported = 26;
+constexpr int cimServerLimitsExceeded = 27;
+
+// What a CIM status code means, for an error that comes without a text.
+inline const char* meaningOf(int code) {
+  static constexpr std::array<const char*, 18> meanings = {
+      "no error",
+      "the operation failed for a reason that is not known",
+      "access is denied",
+      "the namespace does not exist",
+      "a parameter is not valid",
+      "the class does not exist",
+      "the object does not exist",
+      "the operation is not supported",
+      "the class has subclasses",
+      "the class has instances",
+      "the superclass does not exist",
+      "the object exists already",
+      "the property does not exist",
+      "the value is not of the declared type",
+      "the query language is not supported",
+      "the query is not valid",
+      "the method is not available",
+      "the method does not exist",
+  };
+  const auto index = static_cast<std::size_t>(code);
+  return meanings[index < meanings.size() ? index : static_cast<std::size_t>(CMPI_RC_ERR_FAILED)];
+}
+
 // Turns a CMPI status that is not OK into an OperationError. Return codes that are CMPI's own and no CIM status
 // (CMPI_RC_ERROR_SYSTEM and the like) become CIM_ERR_FAILED.
 inline void requireOk(const CMPIStatus& status) {
@@ -43,7 +77,11 @@ inline void requireOk(const CMPIStatus& status) {
   const char* text = status.msg ? CMGetCharsPtr(status.msg, nullptr) : nullptr;
   const bool isCimStatus = status.rc <= CMPI_RC_ERR_METHOD_NOT_FOUND;
   const int code = isCimStatus ? static_cast<int>(status.rc) : static_cast<int>(CMPI_RC_ERR_FAILED);
-  throw OperationError(code, text ? text : "the operation failed with return code " + std::to_string(status.rc));
+  if (text && *text) {
+    throw OperationError(code, text);
+  }
+  throw OperationError(
+      code, isCimStatus ? meaningOf(code) : "the operation failed with return code " + std::to_string(status.rc));
 }
 
 // The same, and the object must be there.

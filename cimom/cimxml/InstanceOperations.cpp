@@ -12,7 +12,7 @@ using NameList = std::optional<std::vector<std::string>>;
 // Without DeepInheritance a subclass's instance shows what the requested class has, and no more.
 NameList visibleProperties(const Call& call, const std::string& className) {
   const NameList list = call.parameters.propertyList();
-  const ClassDefinition* definition = call.manager.classes.find(className);
+  const ClassDefinition* definition = call.manager.classes.find(call.request.nameSpace, className);
   if (call.parameters.flag("DeepInheritance", true) || !definition) {
     return list;
   }
@@ -28,23 +28,50 @@ NameList visibleProperties(const Call& call, const std::string& className) {
 
 }  // namespace
 
-void enumerateInstances(Call& call) {
+Found::Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown)
+    : properties(std::move(shown)) {
+  requireOk(status, found);
+  while (CMHasNext(found, nullptr)) {
+    CMPIStatus next{CMPI_RC_OK, nullptr};
+    objects.push_back(CMGetNext(found, &next));
+    requireOk(next, objects.back().value.dataPtr.ptr);
+  }
+  call.takeHostOf(objects);
+}
+
+Found findInstances(Call& call) {
   const std::string className = call.parameters.requiredClassName("ClassName");
   const NameList list = call.parameters.propertyList();
   PropertyNames names(list);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIEnumeration* result =
+  CMPIEnumeration* instances =
       CBEnumInstances(call.manager.broker, call.context, call.classPath(className), names.get(), &status);
-  ObjectWriter writer = call.writer(filterOf(visibleProperties(call, className)));
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.namedInstance(value.inst); });
+  return {call, status, instances, filterOf(visibleProperties(call, className))};
+}
+
+Found findInstanceNames(Call& call) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
+  CMPIEnumeration* names = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  return {call, status, names};
+}
+
+void enumerateInstances(Call& call) {
+  const Found found = findInstances(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
+  ObjectWriter writer = call.writer(found.properties);
+  for (const CMPIData& object : found.objects) {
+    writer.namedInstance(object.value.inst);
+  }
 }
 
 void enumerateInstanceNames(Call& call) {
-  CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIObjectPath* path = call.classPath(call.parameters.requiredClassName("ClassName"));
-  CMPIEnumeration* result = CBEnumInstanceNames(call.manager.broker, call.context, path, &status);
+  const Found found = findInstanceNames(call);
+  const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  writeResult(call, status, result, [&writer](const CMPIValue& value) { writer.instanceName(value.ref); });
+  for (const CMPIData& object : found.objects) {
+    writer.instanceName(object.value.ref);
+  }
 }
 
 void getInstance(Call& call) {
@@ -52,21 +79,25 @@ void getInstance(Call& call) {
   const NameList list = call.parameters.propertyList();
   PropertyNames names(list);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIInstance* instance = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
-  requireOk(status, instance);
+  CMPIData data{CMPI_instance, CMPI_goodValue, {}};
+  data.value.inst = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
+  requireOk(status, data.value.inst);
+  call.takeHostOf({data});
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer(filterOf(list)).instance(instance);
+  call.writer(filterOf(list)).instance(data.value.inst);
 }
 
 void createInstance(Call& call) {
   const Instance& given = call.parameters.instance("NewInstance");
   const CMPIInstance* instance = call.objects.instance(given);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIObjectPath* path =
+  CMPIData data{CMPI_ref, CMPI_goodValue, {}};
+  data.value.ref =
       CBCreateInstance(call.manager.broker, call.context, call.objects.path(given.path), instance, &status);
-  requireOk(status, path);
+  requireOk(status, data.value.ref);
+  call.takeHostOf({data});
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer().instanceName(path);
+  call.writer().instanceName(data.value.ref);
 }
 
 void modifyInstance(Call& call) {
@@ -102,11 +133,14 @@ void setProperty(Call& call) {
         [&property](const auto& value) {
           if constexpr (std::is_constructible_v<Value, decltype(value)>) {
             property.value = value;
+          } else {
+            throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH,
+                                 "parameter NewValue must be a value of the property's type");
           }
         },
         given->value);
   }
-  const auto value = call.objects.propertyValue(instance.className, property);
+  const auto value = call.objects.propertyValue(instance, property);
   requireOk(CBSetProperty(call.manager.broker, call.context, call.objects.path(instance), property.name.c_str(),
                           value.pointer(), value.type));
 }

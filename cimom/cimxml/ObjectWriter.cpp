@@ -119,8 +119,12 @@ void ObjectWriter::namedInstance(const CMPIInstance* object) {
   instance(object);
 }
 
-void ObjectWriter::objectWithPath(const CMPIInstance* object) {
-  const auto scope = xml_.element("VALUE.OBJECTWITHPATH");
+void ObjectWriter::objectWithPath(const CMPIInstance* object) { withPath("VALUE.OBJECTWITHPATH", object); }
+
+void ObjectWriter::instanceWithPath(const CMPIInstance* object) { withPath("VALUE.INSTANCEWITHPATH", object); }
+
+void ObjectWriter::withPath(const char* element, const CMPIInstance* object) {
+  const auto scope = xml_.element(element);
   instancePath(pathOf(object));
   instance(object);
 }

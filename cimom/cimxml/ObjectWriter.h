@@ -49,6 +49,9 @@ class ObjectWriter {
   // VALUE.OBJECTWITHPATH.
   void objectWithPath(const CMPIInstance* instance);
 
+  // VALUE.INSTANCEWITHPATH, which is the same by another name.
+  void instanceWithPath(const CMPIInstance* instance);
+
   // VALUE, VALUE.ARRAY or VALUE.REFERENCE; nothing for a null value.
   void value(const CMPIData& data);
 
@@ -57,6 +60,7 @@ class ObjectWriter {
   void nameSpacePath(const CMPIObjectPath* path);
   void property(const char* name, const CMPIData& data);
   void reference(const CMPIObjectPath* path);
+  void withPath(const char* element, const CMPIInstance* instance);
   void array(const CMPIData& data);
   std::string scalar(CMPIType type, const CMPIValue& value) const;
 

@@ -41,11 +41,40 @@ const std::vector<Operation>& operations() {
        references,
        {"ObjectName", "ResultClass", "Role", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
       {"ReferenceNames", referenceNames, {"ObjectName", "ResultClass", "Role"}},
+      {"OpenEnumerateInstances",
+       openEnumerateInstances,
+       {"ClassName", "DeepInheritance", "IncludeClassOrigin", "PropertyList", "FilterQueryLanguage", "FilterQuery",
+        "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenEnumerateInstancePaths",
+       openEnumerateInstancePaths,
+       {"ClassName", "FilterQueryLanguage", "FilterQuery", "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenAssociatorInstances",
+       openAssociatorInstances,
+       {"InstanceName", "AssocClass", "ResultClass", "Role", "ResultRole", "IncludeClassOrigin", "PropertyList",
+        "FilterQueryLanguage", "FilterQuery", "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenAssociatorInstancePaths",
+       openAssociatorInstancePaths,
+       {"InstanceName", "AssocClass", "ResultClass", "Role", "ResultRole", "FilterQueryLanguage", "FilterQuery",
+        "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenReferenceInstances",
+       openReferenceInstances,
+       {"InstanceName", "ResultClass", "Role", "IncludeClassOrigin", "PropertyList", "FilterQueryLanguage",
+        "FilterQuery", "OperationTimeout", "ContinueOnError", "MaxObjectCount"}},
+      {"OpenReferenceInstancePaths",
+       openReferenceInstancePaths,
+       {"InstanceName", "ResultClass", "Role", "FilterQueryLanguage", "FilterQuery", "OperationTimeout",
+        "ContinueOnError", "MaxObjectCount"}},
+      {"PullInstancesWithPath", pullInstancesWithPath, {"EnumerationContext", "MaxObjectCount"}},
+      {"PullInstancePaths", pullInstancePaths, {"EnumerationContext", "MaxObjectCount"}},
+      {"CloseEnumeration", closeEnumeration, {"EnumerationContext"}},
+      {"EnumerationCount", enumerationCount, {"EnumerationContext"}},
       {"GetClass", getClass, {"ClassName", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin", "PropertyList"}},
       {"EnumerateClasses",
        enumerateClasses,
        {"ClassName", "DeepInheritance", "LocalOnly", "IncludeQualifiers", "IncludeClassOrigin"}},
-      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}}};
+      {"EnumerateClassNames", enumerateClassNames, {"ClassName", "DeepInheritance"}},
+      {"GetQualifier", getQualifier, {"QualifierName"}},
+      {"EnumerateQualifiers", enumerateQualifiers, {}}};
   return table;
 }
 
@@ -65,32 +94,14 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
                  (parameters.flag("IncludeQualifiers", false) ? CMPI_FLAG_IncludeQualifiers : 0) |
                  (parameters.flag("IncludeClassOrigin", false) ? CMPI_FLAG_IncludeClassOrigin : 0);
   requireOk(CMAddContextEntry(context, CMPIInvocationFlags, &flags, CMPI_uint32));
-  if (!manager.user.empty()) {
-    requireOk(CMAddContextEntry(context, CMPIPrincipal, manager.user.c_str(), CMPI_chars));
-  }
-}
-
-// Providers of methods are not taken, so a class's method is known at most.
-[[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
-  const std::string& className = request.target.className;
-  if (!manager.classes.hasNamespace(request.nameSpace)) {
-    throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
-  }
-  const ClassDefinition* definition = manager.classes.find(className);
-  if (!definition) {
-    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
-  }
-  if (!definition->findMethod(request.method)) {
-    throw OperationError(CMPI_RC_ERR_METHOD_NOT_FOUND, "class " + className + " has no method " + request.method);
-  }
-  throw OperationError(CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "method " + request.method + " has no provider");
+  addPrincipal(context, manager.user);
 }
 
 }  // namespace
 
 void perform(const OperationContext& manager, const Request& request, XmlWriter& xml) {
   if (!request.isIntrinsic) {
-    refuseMethod(manager, request);
+    return callMethod(manager, request, xml);
   }
   const Operation& operation = findOperation(request.method);
   const Parameters parameters(request, operation.parameters);
@@ -98,7 +109,8 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
   const CMPIContext* context = scope.context();
   describeCaller(context, manager, parameters);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);
-  Call call{manager, request, parameters, context, objects, xml};
+  std::string host = manager.host;
+  Call call{manager, request, parameters, context, objects, xml, host};
   operation.perform(call);
 }
 

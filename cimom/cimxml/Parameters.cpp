@@ -72,6 +72,26 @@ bool Parameters::flag(std::string_view name, bool whenMissing) const {
   return parsed->boolean != 0;
 }
 
+std::optional<std::uint32_t> Parameters::number(std::string_view name) const {
+  const auto value = text(name);
+  if (!value) {
+    return std::nullopt;
+  }
+  const auto parsed = parseScalar(CMPI_uint32, *value);
+  if (!parsed) {
+    refuse(name, "must be a number from 0 to 4294967295");
+  }
+  return parsed->uint32;
+}
+
+std::string Parameters::requiredText(std::string_view name) const {
+  auto value = text(name);
+  if (!value) {
+    refuse(name, "is missing");
+  }
+  return *std::move(value);
+}
+
 std::string Parameters::className(std::string_view name) const {
   const auto* value = valueOf<ObjectName>(find(name), "must be a class name");
   if (!value) {

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -19,11 +20,14 @@ class Parameters {
 
   bool flag(std::string_view name, bool whenMissing) const;
   std::optional<std::string> text(std::string_view name) const;
+  // A uint32.
+  std::optional<std::uint32_t> number(std::string_view name) const;
 
   // The name of a class; empty if none is given.
   std::string className(std::string_view name) const;
 
-  // Throws if it is missing, too.
+  // Throw if it is missing, too.
+  std::string requiredText(std::string_view name) const;
   std::string requiredClassName(std::string_view name) const;
   const ObjectName& instanceName(std::string_view name) const;
   const Instance& instance(std::string_view name) const;

@@ -137,6 +137,21 @@ Texts readArray(const Element& element) {
   return texts;
 }
 
+// VALUE.REFARRAY.
+ObjectNames readReferences(const Element& element) {
+  ObjectNames names;
+  for (auto child = element.first(); child; child = child->next()) {
+    if (child->is("VALUE.REFERENCE")) {
+      names.emplace_back(readObjectName(child->only()));
+    } else if (child->is("VALUE.NULL")) {
+      names.emplace_back(std::nullopt);
+    } else {
+      child->refuse("is not a reference");
+    }
+  }
+  return names;
+}
+
 Property readProperty(const Element& element) {
   Property property;
   property.name = element.requiredAttribute("NAME");
@@ -168,7 +183,8 @@ bool isProperty(const Element& element) {
 
 Instance readPlainInstance(const Element& element) {
   Instance instance;
-  instance.path.className = element.requiredAttribute("CLASSNAME");
+  instance.className = element.requiredAttribute("CLASSNAME");
+  instance.path.className = instance.className;
   for (auto child = element.first(); child; child = child->next()) {
     if (child->is("QUALIFIER")) {
       continue;
@@ -198,6 +214,23 @@ Instance readInstance(const Element& element) {
   return instance;
 }
 
+// CLASS and QUALIFIER.DECLARATION.
+bool isDeclaration(const Element& element) { return element.is("CLASS") || element.is("QUALIFIER.DECLARATION"); }
+
+Declaration readDeclaration(const Element& element) {
+  Declaration declaration{element.requiredAttribute("NAME")};
+  const bool isClass = element.is("CLASS");
+  for (auto child = element.first(); child; child = child->next()) {
+    if (isClass && isProperty(*child)) {
+      readProperty(*child);
+    } else if (isClass ? !child->is("QUALIFIER") && !child->is("METHOD")
+                       : !child->is("SCOPE") && !child->is("VALUE") && !child->is("VALUE.ARRAY")) {
+      child->refuse("is not allowed in " + std::string(element.name()));
+    }
+  }
+  return declaration;
+}
+
 // Minor versions add; a major version that this server does not know may mean anything.
 void requireMajorVersion(const Element& element, std::string_view attribute, char major, const char* cimError) {
   const std::string version = element.requiredAttribute(attribute);
@@ -222,6 +255,10 @@ Parameter readParameter(const Element& element) {
     parameter.value = readArray(value);
   } else if (value.is("VALUE.REFERENCE")) {
     parameter.value = readObjectName(value.only());
+  } else if (value.is("VALUE.REFARRAY")) {
+    parameter.value = readReferences(value);
+  } else if (isDeclaration(value)) {
+    parameter.value = readDeclaration(value);
   } else if (isObjectName(value)) {
     parameter.value = readObjectName(value);
   } else if (isInstance(value)) {
@@ -263,6 +300,15 @@ void readExtrinsicCall(const Element& call, Request& request) {
 }
 
 }  // namespace
+
+Instance readEmbeddedInstance(std::string_view xml) {
+  const Document document(xml);
+  const Element root = document.root();
+  if (!root.is("INSTANCE")) {
+    root.refuse("is not an instance");
+  }
+  return readPlainInstance(root);
+}
 
 Request readRequest(std::string_view xml) {
   const Document document(xml);

@@ -5,6 +5,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <variant>
 #include <vector>
 
@@ -37,8 +38,10 @@ struct KeyBinding {
 
 using Texts = std::vector<std::optional<std::string>>;  // an array's elements; one without a value is VALUE.NULL
 
-// No value, VALUE, VALUE.ARRAY, a reference.
-using Value = std::variant<std::monostate, std::string, Texts, ObjectName>;
+using ObjectNames = std::vector<std::optional<ObjectName>>;  // the same of an array of references
+
+// No value, VALUE, VALUE.ARRAY, a reference, VALUE.REFARRAY.
+using Value = std::variant<std::monostate, std::string, Texts, ObjectName, ObjectNames>;
 
 struct Property {
   std::string name;
@@ -48,14 +51,20 @@ struct Property {
 };
 
 struct Instance {
-  ObjectName path;  // without keys if the client gave an INSTANCE alone
+  ObjectName path;        // without keys if the client gave an INSTANCE alone
+  std::string className;  // as INSTANCE says it
   std::vector<Property> properties;
+};
+
+// CLASS or QUALIFIER.DECLARATION: no operation that takes one is offered, so only its name is kept.
+struct Declaration {
+  std::string name;
 };
 
 struct Parameter {
   std::string name;
   std::string type;  // the PARAMTYPE attribute; empty: none given
-  std::variant<std::monostate, std::string, Texts, ObjectName, Instance> value;
+  std::variant<std::monostate, std::string, Texts, ObjectName, ObjectNames, Instance, Declaration> value;
 };
 
 struct Request {
@@ -71,5 +80,8 @@ struct Request {
 // Takes the body as it came. Throws TransportError: request-not-well-formed, request-not-valid,
 // multiple-requests-unsupported, unsupported-cim-version, unsupported-dtd-version or unsupported-protocol-version.
 Request readRequest(std::string_view xml);
+
+// Takes the text of a value that embeds an INSTANCE. Throws TransportError as above.
+Instance readEmbeddedInstance(std::string_view xml);
 
 }  // namespace Cimom::CimXml

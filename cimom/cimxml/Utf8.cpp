@@ -58,26 +58,12 @@ bool isXmlCharacter(char32_t codePoint) {
   return codePoint != 0xFFFE && codePoint != 0xFFFF;
 }
 
-bool isPlain(char byte) { return byte >= 0x20 && byte < 0x7F; }
-
 }  // namespace
 
-std::string toXmlText(std::string_view text) {
-  std::string result;
-  result.reserve(text.size());
-  while (!text.empty()) {
-    const auto plain = static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), isPlain) - text.begin());
-    result += text.substr(0, plain);
-    text.remove_prefix(plain);
-    if (text.empty()) {
-      break;
-    }
-    const Decoded decoded = decode(text);
-    const bool isGood = decoded.size > 0 && isXmlCharacter(decoded.codePoint);
-    result += isGood ? text.substr(0, decoded.size) : replacement;
-    text.remove_prefix(std::max<std::size_t>(decoded.size, 1));
-  }
-  return result;
+XmlCharacter firstXmlCharacter(std::string_view text) {
+  const Decoded decoded = decode(text);
+  const bool isGood = decoded.size > 0 && isXmlCharacter(decoded.codePoint);
+  return {isGood ? text.substr(0, decoded.size) : replacement, std::max<std::size_t>(decoded.size, 1)};
 }
 
 std::optional<char32_t> decodeOne(std::string_view text) {

@@ -2,10 +2,6 @@
 // Writes an XML document into memory.
 #pragma once
 
-#include <libxml/tree.h>
-#include <libxml/xmlwriter.h>
-
-#include <memory>
 #include <string>
 #include <string_view>
 
@@ -21,28 +17,40 @@ class XmlWriter {
   // An element that ends with its scope.
   class [[nodiscard]] Scope {
    public:
-    explicit Scope(XmlWriter& writer) : writer_(writer) {}
+    Scope(XmlWriter& writer, const char* name) : writer_(writer), name_(name) {}
     ~Scope();
     Scope(const Scope&) = delete;
     Scope& operator=(const Scope&) = delete;
 
    private:
     XmlWriter& writer_;
+    const char* name_;
   };
 
+  // Names must outlive the element, as literals do.
   Scope element(const char* name);
   Scope element(const char* name, const char* attributeName, std::string_view attributeValue);
 
-  void attribute(const char* name, std::string_view value);  // of the element begun last
+  void attribute(const char* name, std::string_view value);  // of the element begun last, before its content
   void text(std::string_view text);
   void textElement(const char* name, std::string_view text);
+  // Elements that another writer has written without a prolog.
+  void written(std::string_view xml);
 
   // The document so far; complete when every scope has ended.
+  // Throws std::bad_alloc if memory ran out at the end of an element.
   std::string take();
 
  private:
-  std::unique_ptr<xmlBuffer, decltype(&xmlBufferFree)> buffer_;
-  std::unique_ptr<xmlTextWriter, decltype(&xmlFreeTextWriter)> writer_;
+  enum class Place { Content, AttributeValue };
+
+  void endTag(const char* name);
+  void closeStartTag();
+  void append(std::string_view text, Place place);
+
+  std::string xml_;
+  bool inStartTag_ = false;
+  bool isCut_ = false;
 };
 
 }  // namespace Cimom::CimXml

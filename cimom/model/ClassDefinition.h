@@ -16,15 +16,27 @@ struct Qualifier {
   bool toSubclass = true;     // false: Restricted
   bool overridable = true;    // false: DisableOverride
   bool translatable = false;  // Translatable
+  bool propagated = false;    // inherited as it is
 };
 
 using Qualifiers = std::vector<Qualifier>;
+
+// A qualifier as the schema declares it: its default value, of its type, its flavor, and what it may stand at.
+struct QualifierDeclaration {
+  Qualifier qualifier;
+  unsigned arraySize = 0;           // of a fixed-size array, else 0
+  std::vector<std::string> scopes;  // "property", "any" …
+};
 
 // The qualifier of that name, or null.
 const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view name);
 
 // Whether a boolean qualifier is there and true.
 bool isQualified(const Qualifiers& qualifiers, std::string_view name);
+
+// The type of the values of what is declared with that type and those qualifiers: a string that embeds an instance or
+// object has instances as values.
+CMPIType valueType(CMPIType type, const Qualifiers& qualifiers);
 
 // A property of a class, or a parameter of a method.
 struct PropertyDeclaration {
@@ -33,12 +45,13 @@ struct PropertyDeclaration {
   std::string referenceClass;  // the class that a reference refers to, else empty
   unsigned arraySize = 0;      // of a fixed-size array, else 0
   Value defaultValue;          // null if the schema has none
-  Qualifiers qualifiers;       // inherited ones included
+  Qualifiers qualifiers;       // inherited ones included, but for the restricted ones
   std::string originClass;     // the class that declared it first
   bool propagated = false;     // inherited as it is; false if this class declares or overrides it
 
   bool isKey() const { return isQualified(qualifiers, "Key"); }
   bool isReference() const { return !referenceClass.empty(); }
+  CMPIType valueType() const { return Cimom::valueType(type, qualifiers); }
 };
 
 struct MethodDeclaration {

@@ -26,13 +26,14 @@ bool isAsked(const ClassDefinition& association, const Operation& operation, con
 template <typename Call>
 std::vector<Value> forEachAssociation(const ProviderRegistry& providers, const Operation& operation, const char* named,
                                       Call call) {
-  if (named && !operation.core.classes.find(named)) {
+  if (named && !operation.core.classes.find(operation.path.nameSpace, named)) {
     throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string("unknown association class \"") + named + "\"");
   }
   const auto path = lend(operation.path);
   std::vector<Value> all;
   for (const auto& entry : providers.entries()) {
-    const ClassDefinition* association = operation.core.classes.find(entry.registration.className);
+    const ClassDefinition* association =
+        operation.core.classes.find(operation.path.nameSpace, entry.registration.className);
     if (!association || !entry.registration.association || !entry.serves(operation.path.nameSpace)) {
       continue;
     }

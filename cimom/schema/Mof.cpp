@@ -17,9 +17,9 @@ namespace fs = std::filesystem;
 // a value. A schema need not declare them to use them.
 Qualifiers standardQualifiers() {
   const auto restricted = [](const char* name, CMPIType type) { return Qualifier{name, Value::null(type), false}; };
-  return {restricted("Abstract", CMPI_boolean), restricted("Deprecated", CMPI_stringA),
-          restricted("Experimental", CMPI_boolean), restricted("Terminal", CMPI_boolean),
-          restricted("Version", CMPI_string)};
+  return {restricted("Abstract", CMPI_boolean),     restricted("Deprecated", CMPI_stringA),
+          restricted("Experimental", CMPI_boolean), restricted("Override", CMPI_string),
+          restricted("Terminal", CMPI_boolean),     restricted("Version", CMPI_string)};
 }
 
 std::vector<fs::path> mofFilesUnder(const fs::path& directory) {
@@ -45,10 +45,10 @@ MofDeclarations MofReader::readPath(const fs::path& fileOrDirectory) {
   try {
     if (fs::is_directory(fileOrDirectory)) {
       for (const fs::path& file : mofFilesUnder(fileOrDirectory)) {
-        readFile(file, declarations);
+        readFile(file, declarations, {});
       }
     } else {
-      readFile(fileOrDirectory, declarations);
+      readFile(fileOrDirectory, declarations, {});
     }
   } catch (const fs::filesystem_error& error) {
     throw ConfigurationError(fileOrDirectory.string() + ": cannot be read: " + error.code().message());
@@ -58,16 +58,16 @@ MofDeclarations MofReader::readPath(const fs::path& fileOrDirectory) {
 
 MofDeclarations MofReader::readText(std::string_view mof, const std::string& origin) {
   MofDeclarations declarations;
-  MofParser(*this, declarations, mof, origin, {}).parse();
+  MofParser(*this, declarations, mof, origin, {}, {}).parse();
   return declarations;
 }
 
-void MofReader::readFile(const fs::path& file, MofDeclarations& declarations) {
+void MofReader::readFile(const fs::path& file, MofDeclarations& declarations, const std::string& nameSpace) {
   const fs::path canonical = fs::canonical(file);
   if (fs::is_directory(canonical)) {
     throw fs::filesystem_error("include", file, std::make_error_code(std::errc::is_a_directory));
   }
-  if (!files_.insert(canonical).second) {
+  if (!files_.emplace(canonical, nameSpace).second) {
     return;
   }
   std::ifstream stream(canonical, std::ios::binary);
@@ -75,7 +75,7 @@ void MofReader::readFile(const fs::path& file, MofDeclarations& declarations) {
     throw fs::filesystem_error("open", file, std::make_error_code(std::errc::permission_denied));
   }
   const std::string text{std::istreambuf_iterator<char>(stream), {}};
-  MofParser(*this, declarations, text, file.string(), file.parent_path()).parse();
+  MofParser(*this, declarations, text, file.string(), file.parent_path(), nameSpace).parse();
 }
 
 }  // namespace Cimom

@@ -5,6 +5,7 @@
 #include <set>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "cimom/model/ClassDefinition.h"
@@ -15,17 +16,20 @@ namespace Cimom {
 struct ClassDeclaration {
   ClassDefinition own;
   std::string superclassName;
+  std::string nameSpace;  // of the `#pragma namespace` before it; empty if there is none
 };
 
 // What a schema in the Managed Object Format (DSP0004, annex A) declares.
 struct MofDeclarations {
   std::vector<ClassDeclaration> classes;
+  std::vector<QualifierDeclaration> qualifiers;
   std::vector<std::string> namespaces;  // of `#pragma namespace`
 };
 
-// Reads classes, qualifier declarations and the pragmas include and namespace; other pragmas mean nothing here.
-// A qualifier's declaration counts from there on, in later texts and files too. A file is read once, however often
-// it is named or included.
+// Reads classes, qualifier declarations and the pragmas include and namespace; other pragmas mean nothing here. A
+// namespace holds up to the next one or the end of its file, for what is included in between too.
+// A qualifier's declaration counts from there on, in later texts and files too. A file is read once for a namespace,
+// however often it is named or included.
 class MofReader {
  public:
   MofReader();
@@ -41,10 +45,10 @@ class MofReader {
  private:
   friend class MofParser;
 
-  void readFile(const std::filesystem::path& file, MofDeclarations& declarations);
+  void readFile(const std::filesystem::path& file, MofDeclarations& declarations, const std::string& nameSpace);
 
   Qualifiers qualifierTypes_;  // the declared qualifiers, with their types, defaults and flavors
-  std::set<std::filesystem::path> files_;
+  std::set<std::pair<std::filesystem::path, std::string>> files_;  // that were read, and for which namespace
 };
 
 }  // namespace Cimom

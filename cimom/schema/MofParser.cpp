@@ -15,11 +15,12 @@ using Kind = MofToken::Kind;
 }  // namespace
 
 MofParser::MofParser(MofReader& reader, MofDeclarations& declarations, std::string_view mof, std::string origin,
-                     std::filesystem::path directory)
+                     std::filesystem::path directory, std::string nameSpace)
     : reader_(reader),
       declarations_(declarations),
       origin_(std::move(origin)),
       directory_(std::move(directory)),
+      nameSpace_(std::move(nameSpace)),
       lexer_(mof, origin_) {}
 
 void MofParser::parse() {
@@ -58,12 +59,13 @@ void MofParser::pragma() {
     include(argument);
   } else if (sameName(name, "namespace")) {
     declarations_.namespaces.push_back(argument);
+    nameSpace_ = argument;
   }
 }
 
 void MofParser::include(const std::string& file) {
   try {
-    reader_.readFile(directory_ / file, declarations_);
+    reader_.readFile(directory_ / file, declarations_, nameSpace_);
   } catch (const std::filesystem::filesystem_error& error) {
     fail("\"" + file + "\" cannot be included: " + error.code().message());
   }
@@ -71,12 +73,14 @@ void MofParser::include(const std::string& file) {
 
 // Qualifier NAME : TYPE [= VALUE], Scope(…) [, Flavor(…)];
 void MofParser::qualifierDeclaration() {
-  Qualifier declared;
+  QualifierDeclaration declaration;
+  Qualifier& declared = declaration.qualifier;
   declared.name = expectName("the qualifier's name");
   expect(":");
   PropertyDeclaration value;
   type(value);
   arrayBounds(value);
+  declaration.arraySize = value.arraySize;
   declared.value = accept("=") ? initializer(value.type) : Value::null(value.type);
   while (accept(",")) {
     const bool flavor = token_.isKeyword("Flavor");
@@ -89,7 +93,7 @@ void MofParser::qualifierDeclaration() {
       flavors(declared, ")");
     } else {
       do {
-        expectName("a scope");
+        declaration.scopes.push_back(expectName("a scope"));
       } while (accept(","));
     }
     expect(")");
@@ -97,7 +101,8 @@ void MofParser::qualifierDeclaration() {
   expect(";");
   Qualifiers& known = reader_.qualifierTypes_;
   std::erase_if(known, [&](const Qualifier& one) { return sameName(one.name, declared.name); });
-  known.push_back(std::move(declared));
+  known.push_back(declared);
+  declarations_.qualifiers.push_back(std::move(declaration));
 }
 
 Qualifiers MofParser::qualifierList() {
@@ -177,6 +182,7 @@ void MofParser::classDeclaration(Qualifiers qualifiers) {
     feature(own);
   }
   expect(";");
+  declaration.nameSpace = nameSpace_;
   declarations_.classes.push_back(std::move(declaration));
 }
 

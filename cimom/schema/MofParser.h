@@ -13,9 +13,9 @@ namespace Cimom {
 // Parses one MOF text by recursive descent; the grammar is that of DSP0004, annex A, without instances.
 class MofParser {
  public:
-  // `directory` is where the text's relative includes are.
+  // `directory` is where the text's relative includes are, `nameSpace` where its classes are until it says otherwise.
   MofParser(MofReader& reader, MofDeclarations& declarations, std::string_view mof, std::string origin,
-            std::filesystem::path directory);
+            std::filesystem::path directory, std::string nameSpace);
 
   // Throws ConfigurationError "ORIGIN:LINE: what is wrong".
   void parse();
@@ -50,6 +50,7 @@ class MofParser {
   MofDeclarations& declarations_;
   std::string origin_;
   std::filesystem::path directory_;
+  std::string nameSpace_;
   MofLexer lexer_;
   MofToken token_;
 };

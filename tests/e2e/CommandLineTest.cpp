@@ -132,7 +132,7 @@ TEST_F(CommandLineTest, FailsForAPortThatIsTaken) {
 }
 
 TEST_F(CommandLineTest, TakesItsOptionsFromTheFileRelativeToIt) {
-  directory_.write("probe.mof", "class TEST_Local { };");
+  directory_.write("probe.mof", "#pragma namespace(\"root/test\")\nclass TEST_Local { };");
   const Cimomd cimomd(
       {"--config", file("schema = probe.mof\nregistration = " SOURCE_DIR "/tests/support/probe/Probe.reg\n"
                         "schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\n"

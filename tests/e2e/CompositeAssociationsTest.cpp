@@ -15,6 +15,7 @@ namespace {
 using namespace Testing;
 using testing::AllOf;
 using testing::Contains;
+using testing::ContainsRegex;
 using testing::Each;
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -81,6 +82,17 @@ TEST_F(CompositeAssociationTest, NamesTheManagedSystemAsTheHostOfWhatItAnswers) 
   for (const View& view : views()) {
     EXPECT_THAT(stack_.paths(scoped("ain", "-ac", view.association), view.source),
                 AllOf(Not(IsEmpty()), Each(StartsWith("managed.example/root/cimv2:"))));
+  }
+}
+
+TEST_F(CompositeAssociationTest, NamesTheManagedSystemAlikeInAllThatItAnswers) {
+  for (const char* operation : {"ri", "rin", "ai", "ain"}) {
+    for (const std::string& source : {endpoint("eth0"), sequence("eth0:dhcp")}) {
+      const std::string shown = stack_.wbemcli(std::string("-dx ") + operation, source).errors;
+      const std::string answer = shown.substr(shown.find("SIMPLERSP"));
+      EXPECT_THAT(answer, HasSubstr("<HOST>managed.example</HOST>")) << operation;
+      EXPECT_THAT(answer, Not(ContainsRegex("<HOST>[^m]"))) << operation;
+    }
   }
 }
 

@@ -12,8 +12,10 @@
 namespace {
 
 using namespace Testing;
+using testing::AllOf;
 using testing::Contains;
 using testing::ElementsAre;
+using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
 
@@ -42,6 +44,16 @@ TEST_F(CompositeSchemaTest, ShowsAddressAndMaskAsWritable) {
   EXPECT_THAT(writable("YRNx_MgmtHwStaticIPAssignmentSettingData"), ElementsAre("IPv4Address", "SubnetMask"));
   EXPECT_THAT(writable("CIM_IPProtocolEndpoint"), ElementsAre("EnabledDefault"));
   EXPECT_THAT(writable("CIM_StaticIPAssignmentSettingData"), Contains("GatewayIPv4Address"));
+}
+
+TEST_F(CompositeSchemaTest, ShowsEveryClassInItsOwnNamespaceOnly) {
+  const auto classesIn = [&](const char* nameSpace) { return stack_.wbemcli("ecn", "", {}, nameSpace).output; };
+  EXPECT_THAT(classesIn("root/cimv2"), AllOf(HasSubstr(":YRNx_MgmtHwClientAccess"), HasSubstr(":CIM_ComputerSystem"),
+                                             HasSubstr(":CIM_OrderedComponent"), Not(HasSubstr("YRNQV_"))));
+  EXPECT_THAT(classesIn("root/yrnse"), AllOf(HasSubstr(":YRNQV_SPComputerSystem"), HasSubstr(":CIM_ComputerSystem"),
+                                             Not(HasSubstr("YRNx_")), Not(HasSubstr("CIM_OrderedComponent"))));
+  EXPECT_THAT(stack_.failure("ei", "YRNQV_SPComputerSystem"), HasSubstr("(5) CIM_ERR_INVALID_CLASS"));
+  EXPECT_THAT(stack_.failure("gc", "YRNQV_SPComputerSystem"), HasSubstr("(6) CIM_ERR_NOT_FOUND"));
 }
 
 // Whatever a client sees either stands in our class, with its meaning, or is what the schema gives by default.

@@ -15,6 +15,7 @@ namespace {
 
 using namespace Testing;
 using testing::AllOf;
+using testing::Contains;
 using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::Not;
@@ -243,6 +244,21 @@ TEST_F(CompositeServerTest, EndsCleanlyAfterRequests) {
   stack.instances("ei", "YRNx_MgmtHwIPElementSettingData");
   EXPECT_EQ(stack.cimomd().stop(), 0);
   EXPECT_EQ(stack.cimomd().process().errors(), "");
+}
+
+// A client that knows nothing but the address finds the server's namespaces, its profiles and what conforms to them.
+TEST_F(RawRequestTest, TheInteropNamespaceLeadsToTheInstances) {
+  std::vector<std::string> namespaces;
+  for (const Printed& one : stack_.instances("ei", "CIM_Namespace", {}, "root/interop")) {
+    namespaces.push_back(one.values.at("Name"));
+  }
+  EXPECT_THAT(namespaces, ElementsAre("\"root/cimv2\"", "\"root/interop\"", "\"root/yrnse\""));
+  EXPECT_THAT(stack_.paths("ein", "CIM_RegisteredProfile", "root/interop"), SizeIs(4));
+  const auto conforming = stack_.names(
+      "ain", "CIM_RegisteredProfile.InstanceID=\"CompositeIPConfig:IP Interface (in part):1.0.0\"", "root/interop");
+  for (const std::string& endpoint : stack_.names("ein", "YRNx_MgmtHwIPProtocolEndPoint")) {
+    EXPECT_THAT(conforming, Contains(endpoint));
+  }
 }
 
 }  // namespace

@@ -55,7 +55,6 @@ class ReloadTest : public ::testing::Test {
              directory_.write("agent.ini", "[log]\ndestination = file\nfile = " + directory_ / "log" + "\n").c_str(),
              1);
     manager_.loadSchema(SOURCE_DIR "/schema");
-    manager_.loadSchemaText("", "root/cimv2");
     const CMPIObjectPath* path = CMNewObjectPath(faults.real(), "root/yrnse", "YRNQV_SPComputerSystem", nullptr);
     CMPIInstance* system = CMNewInstance(faults.real(), path, nullptr);
     CMSetProperty(system, "Name", "sp1", CMPI_chars);

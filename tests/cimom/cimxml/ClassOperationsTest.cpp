@@ -66,10 +66,76 @@ TEST_F(ClassOperationsTest, GetClassShowsWhatTheClassOverrides) {
               HasSubstr("NAME=\"WithDefault\" TYPE=\"uint16\" CLASSORIGIN=\"TEST_Thing\" PROPAGATED=\"false\""));
 }
 
+TEST_F(ClassOperationsTest, AnOverriddenKeyOrReferenceIsShownWithLocalOnlyAndKeepsItsQualifiers) {
+  manager_.loadSchemaText(
+      "class TEST_Base { [Key, Description(\"base\")] string Id; [Deprecated{\"No\"}] string Old; };\n"
+      "class TEST_Derived : TEST_Base { [Override(\"Id\"), Description(\"derived\")] string Id; };\n"
+      "class TEST_Last : TEST_Derived {};\n"
+      "class TEST_Narrowed : TEST_Link { [Override(\"Whole\")] TEST_Part ref Whole; };",
+      "root/test");
+  EXPECT_THAT(
+      getClass("TEST_Derived", flag("IncludeClassOrigin", "TRUE")),
+      AllOf(HasSubstr("<PROPERTY NAME=\"Id\" TYPE=\"string\" CLASSORIGIN=\"TEST_Base\" PROPAGATED=\"false\">"
+                      "<QUALIFIER NAME=\"Override\" TYPE=\"string\" OVERRIDABLE=\"true\" TOSUBCLASS=\"false\" "),
+            HasSubstr("<QUALIFIER NAME=\"Key\" TYPE=\"boolean\" PROPAGATED=\"true\" OVERRIDABLE=\"false\" "),
+            HasSubstr("<QUALIFIER NAME=\"Description\" TYPE=\"string\" OVERRIDABLE=\"true\" "),
+            Not(HasSubstr("NAME=\"Old\""))));
+  EXPECT_THAT(getClass("TEST_Narrowed"),
+              AllOf(HasSubstr("NAME=\"Whole\" REFERENCECLASS=\"TEST_Part\" PROPAGATED=\"false\""),
+                    HasSubstr("<QUALIFIER NAME=\"Association\" TYPE=\"boolean\" PROPAGATED=\"true\""),
+                    Not(HasSubstr("NAME=\"Part\""))));
+  EXPECT_THAT(getClass("TEST_Last", everything),
+              AllOf(HasSubstr("<PROPERTY NAME=\"Id\" TYPE=\"string\" PROPAGATED=\"true\">"), HasSubstr("NAME=\"Key\""),
+                    HasSubstr("<VALUE>derived</VALUE>"), HasSubstr("NAME=\"Old\""), Not(HasSubstr("Override")),
+                    Not(HasSubstr("Deprecated"))))
+      << "restricted qualifiers stay with the class that has them";
+}
+
 TEST_F(ClassOperationsTest, APropertyListTrimsTheClass) {
   EXPECT_THAT(
       getClass("TEST_Part", everything + parameter("PropertyList", "<VALUE.ARRAY><VALUE>u64</VALUE></VALUE.ARRAY>")),
       AllOf(HasSubstr("NAME=\"U64\""), Not(HasSubstr("NAME=\"Extra\""))));
+}
+
+TEST_F(ClassOperationsTest, AnEmptyPropertyListLeavesNoPropertyAndAnUnknownNameNoTrace) {
+  EXPECT_THAT(getClass("TEST_Part", everything + parameter("PropertyList", "<VALUE.ARRAY></VALUE.ARRAY>")),
+              AllOf(Not(HasSubstr("<PROPERTY")), HasSubstr("<METHOD NAME=\"Reset\"")));
+  EXPECT_THAT(getClass("TEST_Part", parameter("PropertyList",
+                                              "<VALUE.ARRAY><VALUE>Extra</VALUE><VALUE>None</VALUE>"
+                                              "<VALUE>extra</VALUE></VALUE.ARRAY>")),
+              HasSubstr("<PROPERTY NAME=\"Extra\""));
+}
+
+TEST_F(ClassOperationsTest, QualifiersAreAnsweredAsTheSchemaDeclaresThem) {
+  const auto getQualifier = [this](const std::string& name) {
+    return returned("GetQualifier", parameter("QualifierName", "<VALUE>" + name + "</VALUE>"));
+  };
+  EXPECT_EQ(
+      getQualifier("key"),
+      "<IRETURNVALUE><QUALIFIER.DECLARATION NAME=\"Key\" TYPE=\"boolean\" ISARRAY=\"false\" OVERRIDABLE=\"false\" "
+      "TOSUBCLASS=\"true\" TRANSLATABLE=\"false\"><SCOPE CLASS=\"false\" ASSOCIATION=\"false\" REFERENCE=\"true\" "
+      "PROPERTY=\"true\" METHOD=\"false\" PARAMETER=\"false\" INDICATION=\"false\"></SCOPE><VALUE>FALSE</VALUE>"
+      "</QUALIFIER.DECLARATION></IRETURNVALUE>");
+  EXPECT_THAT(getQualifier("Values"), AllOf(HasSubstr("TYPE=\"string\" ISARRAY=\"true\" OVERRIDABLE=\"true\""),
+                                            HasSubstr("></SCOPE></QUALIFIER.DECLARATION>")));
+  EXPECT_THAT(getQualifier("Description"),
+              HasSubstr("TRANSLATABLE=\"true\"><SCOPE CLASS=\"true\" ASSOCIATION=\"true\" REFERENCE=\"true\" "
+                        "PROPERTY=\"true\" METHOD=\"true\" PARAMETER=\"true\" INDICATION=\"true\">"));
+  EXPECT_EQ(failed("GetQualifier", parameter("QualifierName", "<VALUE>Nothing</VALUE>")),
+            "6: unknown qualifier \"Nothing\"");
+  EXPECT_EQ(failed("GetQualifier", ""), "4: parameter QualifierName is missing");
+  const std::string all = returned("EnumerateQualifiers", "");
+  for (const char* name : {"Association", "Description", "Key", "Values"}) {
+    EXPECT_THAT(all, HasSubstr("<QUALIFIER.DECLARATION NAME=\"" + std::string(name) + "\""));
+  }
+}
+
+TEST_F(ClassOperationsTest, AClassShowsInItsNamespacesOnly) {
+  manager_.loadSchemaText("#pragma namespace(\"root/other\")\nclass OTHER_Thing { [Key] string Name; };", "root/other");
+  EXPECT_THAT(failed("GetClass", className("OTHER_Thing")), HasSubstr("6: unknown class \"OTHER_Thing\""));
+  EXPECT_THAT(failed("EnumerateClassNames", className("OTHER_Thing")), HasSubstr("5: unknown class \"OTHER_Thing\""));
+  EXPECT_THAT(failed("EnumerateInstances", className("OTHER_Thing")), HasSubstr("5: unknown class \"OTHER_Thing\""));
+  EXPECT_THAT(returned("EnumerateClassNames", flag("DeepInheritance", "TRUE")), Not(HasSubstr("OTHER_Thing")));
 }
 
 TEST_F(ClassOperationsTest, EnumeratesTheClassesBelow) {

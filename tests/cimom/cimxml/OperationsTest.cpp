@@ -3,6 +3,7 @@
 #include <cmpidt.h>
 
 #include "tests/cimom/cimxml/EndpointTest.h"
+#include "tests/support/broker/RecordingProvider.h"
 #include "tests/support/probe/ProbeObjects.h"
 
 namespace {
@@ -232,10 +233,77 @@ TEST_F(OperationsTest, UnknownNamesHaveStatusesOfTheirOwn) {
   EXPECT_EQ(failed("GetClass", className("TEST_Nowhere")), "6: unknown class \"TEST_Nowhere\"");
   EXPECT_EQ(failed("EnumerateClassNames", className("TEST_Nowhere")), "5: unknown class \"TEST_Nowhere\"");
   EXPECT_EQ(failed("Frobnicate", ""), "7: operation Frobnicate is not supported");
-  for (const char* method : {"CreateClass", "ModifyClass", "DeleteClass", "ExecQuery", "GetQualifier"}) {
-    EXPECT_EQ(failed(method, ""), "7: operation " + std::string(method) + " is not supported");
-  }
   EXPECT_EQ(returned("EnumerateInstances", className("TEST_Unserved")), "<IRETURNVALUE></IRETURNVALUE>");
+}
+
+TEST_F(OperationsTest, ChangesOfTheSchemaAndQueriesAreNotSupported) {
+  const std::string klass =
+      "<CLASS NAME=\"TEST_New\" SUPERCLASS=\"TEST_Thing\"><PROPERTY NAME=\"A\" TYPE=\"string\"/></CLASS>";
+  const std::string qualifier = parameter("QualifierDeclaration",
+                                          "<QUALIFIER.DECLARATION NAME=\"New\" TYPE=\"boolean\" ISARRAY=\"false\">"
+                                          "<SCOPE CLASS=\"true\"/><VALUE>FALSE</VALUE></QUALIFIER.DECLARATION>");
+  const std::pair<std::string, std::string> calls[] = {
+      {"CreateClass", parameter("NewClass", klass)},
+      {"ModifyClass", parameter("ModifiedClass", klass)},
+      {"DeleteClass", className("TEST_Thing")},
+      {"SetQualifier", qualifier},
+      {"DeleteQualifier", parameter("QualifierName", value("Key"))},
+      {"ExecQuery", parameter("QueryLanguage", value("WQL")) + parameter("Query", value("SELECT * FROM TEST_Thing"))},
+  };
+  for (const auto& [method, parameters] : calls) {
+    EXPECT_EQ(failed(method, parameters), "7: operation " + method + " is not supported");
+  }
+}
+
+TEST_F(OperationsTest, AnErrorWithoutATextHasTheMeaningOfItsCode) {
+  const auto provider = std::make_shared<RecordingProvider>();
+  provider->serve(manager_, "TEST_Unserved", "root/test");
+  const auto describe = [&](CMPIStatus status) {
+    provider->answer = [status](const auto&...) { return status; };
+    return failed("EnumerateInstances", className("TEST_Unserved"));
+  };
+  EXPECT_EQ(describe({CMPI_RC_ERR_ACCESS_DENIED, nullptr}), "2: access is denied");
+  EXPECT_EQ(describe({CMPI_RC_ERR_FAILED, nullptr}), "1: the operation failed for a reason that is not known");
+  EXPECT_EQ(describe({CMPI_RC_ERR_METHOD_NOT_FOUND, nullptr}), "17: the method does not exist");
+  EXPECT_EQ(describe({CMPI_RC_ERROR_SYSTEM, nullptr}), "1: the operation failed with return code 100");
+  EXPECT_EQ(describe({CMPI_RC_ERR_NOT_FOUND, CMNewString(manager_.broker(), "", nullptr)}),
+            "6: the object does not exist");
+}
+
+// A provider may name its system in some paths and leave it to the object manager in others.
+TEST_F(OperationsTest, OneSystemHasOneNameInAnAnswer) {
+  const auto provider = std::make_shared<RecordingProvider>();
+  manager_.loadSchemaText(
+      "class TEST_Host { [Key] string Id; };\n"
+      "[Association] class TEST_Pair { [Key] TEST_Host ref A; [Key] TEST_Host ref B; };",
+      "root/test");
+  provider->serve(manager_, "TEST_Pair", "root/test");
+  const auto answerWith = [&](std::vector<std::string> hosts, const char* nameSpace) {
+    provider->answer = [=](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* asked,
+                           const CMPIInstance*) {
+      const CMPIBroker* broker = provider->broker;
+      CMPIInstance* pair = CMNewInstance(broker, asked, nullptr);
+      for (std::size_t i = 0; i < hosts.size(); ++i) {
+        CMPIObjectPath* end = CMNewObjectPath(broker, nameSpace, "TEST_Host", nullptr);
+        CMAddKey(end, "Id", i == 0 ? "a" : "b", CMPI_chars);
+        if (!hosts[i].empty()) {
+          CMSetHostname(end, hosts[i].c_str());
+        }
+        CMSetProperty(pair, i == 0 ? "A" : "B", &end, CMPI_ref);
+      }
+      CMReturnInstance(result, pair);
+      return ok;
+    };
+    return returned("EnumerateInstances", className("TEST_Pair"));
+  };
+  const std::string named = answerWith({"managed.example", ""}, "root/test");
+  EXPECT_EQ(count(named, "<HOST>managed.example</HOST>"), 4);
+  EXPECT_EQ(count(named, "<HOST>"), 4);
+  EXPECT_EQ(count(answerWith({"", ""}, "root/test"), "<HOST>server</HOST>"), 4);
+  EXPECT_EQ(count(answerWith({"one.example", "two.example"}, "root/test"), "<HOST>two.example</HOST>"), 2)
+      << "what a provider says stands";
+  EXPECT_EQ(count(answerWith({"far.example", ""}, "root/far"), "<HOST>server</HOST>"), 2)
+      << "what is in another namespace says nothing of this one";
 }
 
 TEST_F(OperationsTest, ParametersAreCheckedByNameAndKind) {
@@ -267,13 +335,18 @@ TEST_F(OperationsTest, GetPropertyAndSetPropertyGoToTheBroker) {
                      instanceOne + parameter("PropertyName", value("Text")) + parameter("NewValue", value("set"))),
             "");
   EXPECT_EQ(Probe::text(), "set");
+  EXPECT_EQ(failed("SetProperty", instanceOne + parameter("PropertyName", value("Text")) +
+                                      parameter("NewValue", "<INSTANCE CLASSNAME=\"TEST_Thing\"/>")),
+            "13: parameter NewValue must be a value of the property's type");
+  EXPECT_EQ(Probe::text(), "set");
 }
 
 TEST_F(OperationsTest, MethodsOfAClassHaveStatusesOfTheirOwn) {
-  const auto call = [this](const std::string& method, const std::string& klass, const std::string& nameSpace) {
-    Cimom::Http::Request sent =
-        request(method, messageOf("<METHODCALL NAME=\"" + method + "\"><LOCALCLASSPATH>" + nameSpacePath(nameSpace) +
-                                  "<CLASSNAME NAME=\"" + klass + "\"/></LOCALCLASSPATH></METHODCALL>"));
+  const auto call = [this](const std::string& method, const std::string& klass, const std::string& nameSpace,
+                           const std::string& arguments = {}) {
+    Cimom::Http::Request sent = request(
+        method, messageOf("<METHODCALL NAME=\"" + method + "\"><LOCALCLASSPATH>" + nameSpacePath(nameSpace) +
+                          "<CLASSNAME NAME=\"" + klass + "\"/></LOCALCLASSPATH>" + arguments + "</METHODCALL>"));
     sent.headers = {};
     sent.headers.add("CIMOperation", "MethodCall");
     sent.headers.add("CIMMethod", method);
@@ -285,6 +358,9 @@ TEST_F(OperationsTest, MethodsOfAClassHaveStatusesOfTheirOwn) {
   EXPECT_THAT(call("Nothing", "TEST_Part", "test"), HasSubstr("<ERROR CODE=\"17\""));
   EXPECT_THAT(call("Reset", "TEST_Nowhere", "test"), HasSubstr("<ERROR CODE=\"5\""));
   EXPECT_THAT(call("Reset", "TEST_Part", "nowhere"), HasSubstr("<ERROR CODE=\"3\""));
+  const std::string others = "<PARAMVALUE NAME=\"Others\"><VALUE.REFARRAY><VALUE.REFERENCE>" + thingName() +
+                             "</VALUE.REFERENCE><VALUE.NULL/></VALUE.REFARRAY></PARAMVALUE>";
+  EXPECT_THAT(call("Nothing", "TEST_Part", "test", others), HasSubstr("<ERROR CODE=\"17\""));
 }
 
 }  // namespace

@@ -118,12 +118,36 @@ TEST(RequestTest, ReadsEveryKindOfPath) {
   }
 }
 
+TEST(RequestTest, ReadsAnArrayOfReferencesWithItsNulls) {
+  const auto references =
+      valueOf<ObjectNames>("<VALUE.REFARRAY><VALUE.REFERENCE>" + instanceName("C", keyBinding("K", "1")) +
+                          "</VALUE.REFERENCE><VALUE.NULL/><VALUE.REFERENCE><CLASSNAME NAME=\"D\"/></VALUE.REFERENCE>"
+                          "</VALUE.REFARRAY>");
+  ASSERT_EQ(references.size(), 3u);
+  EXPECT_EQ(references[0]->keys.size(), 1u);
+  EXPECT_FALSE(references[1]);
+  EXPECT_EQ(references[2]->className, "D");
+}
+
+TEST(RequestTest, TakesDeclarationsOfClassesAndQualifiers) {
+  EXPECT_EQ(valueOf<Declaration>("<CLASS NAME=\"C\" SUPERCLASS=\"B\"><QUALIFIER NAME=\"Q\" TYPE=\"boolean\"/>"
+                                 "<PROPERTY NAME=\"P\" TYPE=\"string\"/><PROPERTY.ARRAY NAME=\"A\" TYPE=\"string\"/>"
+                                 "<PROPERTY.REFERENCE NAME=\"R\" REFERENCECLASS=\"C\"/><METHOD NAME=\"M\"/></CLASS>")
+                .name,
+            "C");
+  EXPECT_EQ(valueOf<Declaration>("<QUALIFIER.DECLARATION NAME=\"Q\" TYPE=\"string\"><SCOPE CLASS=\"true\"/>"
+                                 "<VALUE>x</VALUE></QUALIFIER.DECLARATION>")
+                .name,
+            "Q");
+}
+
 TEST(RequestTest, ReadsANamedInstance) {
   const auto instance = valueOf<Instance>("<VALUE.NAMEDINSTANCE>" + instanceName("C", keyBinding("K", "1")) +
                                           "<INSTANCE CLASSNAME=\"C\"><QUALIFIER NAME=\"Q\" TYPE=\"boolean\"/>"
                                           "<PROPERTY NAME=\"A\" TYPE=\"string\"><VALUE>x</VALUE></PROPERTY></INSTANCE>"
                                           "</VALUE.NAMEDINSTANCE>");
   EXPECT_EQ(instance.path.className, "C");
+  EXPECT_EQ(instance.className, "C");
   EXPECT_EQ(instance.path.keys.size(), 1u);
   ASSERT_EQ(instance.properties.size(), 1u);
   EXPECT_EQ(instance.properties[0].name, "A");
@@ -342,6 +366,15 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"TwoLoneKeys",
                 intrinsicCall("M", parameter("P", instanceName("C", "<KEYVALUE>1</KEYVALUE><KEYVALUE>2</KEYVALUE>"))),
                 400, notValid, "KEYVALUE"},
+        Refusal{"NamelessClass", intrinsicCall("M", parameter("P", "<CLASS/>")), 400, notValid, "NAME"},
+        Refusal{"StrangeInClass", intrinsicCall("M", parameter("P", "<CLASS NAME=\"C\"><VALUE/></CLASS>")), 400,
+                notValid, "VALUE is not allowed in CLASS"},
+        Refusal{
+            "StrangeInQualifier",
+            intrinsicCall("M", parameter("P", "<QUALIFIER.DECLARATION NAME=\"C\"><METHOD/></QUALIFIER.DECLARATION>")),
+            400, notValid, "METHOD is not allowed in QUALIFIER.DECLARATION"},
+        Refusal{"StrangeInReferences", intrinsicCall("M", parameter("P", "<VALUE.REFARRAY><VALUE/></VALUE.REFARRAY>")),
+                400, notValid, "VALUE is not a reference"},
         Refusal{"HalfAPath", intrinsicCall("M", parameter("P", "<INSTANCEPATH><CLASSNAME NAME=\"C\"/></INSTANCEPATH>")),
                 400, notValid, "INSTANCEPATH"},
         Refusal{"HostlessPath",

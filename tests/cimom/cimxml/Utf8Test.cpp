@@ -9,6 +9,16 @@ using namespace Cimom::CimXml;
 
 constexpr const char* replacement = "\xEF\xBF\xBD";
 
+std::string toXmlText(std::string_view text) {
+  std::string result;
+  while (!text.empty()) {
+    const XmlCharacter first = firstXmlCharacter(text);
+    result += first.text;
+    text.remove_prefix(first.size);
+  }
+  return result;
+}
+
 TEST(Utf8Test, KeepsWhatXmlCanCarry) {
   for (const char* text : {"", "plain", "tab\tline\nreturn\r", "\x7F", "äöü€", "\xF0\x9F\x98\x80", "\xED\x9F\xBF"}) {
     EXPECT_EQ(toXmlText(text), text);

@@ -36,6 +36,17 @@ TEST(XmlWriterTest, WritesTextThatReadsBackAsItWas) {
   EXPECT_EQ(document.root().text(), text);
 }
 
+TEST(XmlWriterTest, TakesWhatAnotherWriterWrote) {
+  XmlWriter inner(XmlWriter::Prolog::None);
+  inner.textElement("B", "<");
+  XmlWriter xml(XmlWriter::Prolog::None);
+  {
+    const auto element = xml.element("A");
+    xml.written(inner.take());
+  }
+  EXPECT_EQ(xml.take(), "<A><B>&lt;</B></A>");
+}
+
 TEST(XmlWriterTest, StaysWellFormedWhateverTheText) {
   for (int byte = 0; byte < 256; ++byte) {
     const std::string text = std::string("a") + static_cast<char>(byte) + "b";

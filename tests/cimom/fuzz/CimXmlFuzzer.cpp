@@ -32,6 +32,7 @@ const ObjectManager& manager() {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  static CimXml::OpenEnumerations openEnumerations;
   const std::string host = "host";
   const std::string user;
   try {
@@ -39,7 +40,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     CimXml::XmlWriter xml;
     {
       const auto root = xml.element("R");
-      CimXml::perform({manager().broker(), manager().classes(), host, user}, request, xml);
+      CimXml::perform({manager().broker(), manager().classes(), host, openEnumerations, user}, request, xml);
     }
     const CimXml::Document wellFormed(xml.take());
   } catch (const CimXml::TransportError&) {

@@ -19,7 +19,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Cimom::ClassRepository repository;
     repository.add(Cimom::MofReader().readText(text, "fuzz"));
     for (const auto* definition : repository.all()) {
-      if (repository.find(definition->name) != definition) {
+      if (!repository.find(definition->name)) {
         std::abort();
       }
     }

@@ -2,6 +2,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <map>
+
 #include "cimom/model/Errors.h"
 #include "cimom/schema/ClassRepository.h"
 #include "tests/support/broker/ManagedElements.h"
@@ -75,6 +77,38 @@ TEST_F(ClassRepositoryTest, InheritsQualifiersButTheRestrictedOnes) {
             "\"A system\"");
 }
 
+TEST_F(ClassRepositoryTest, RestrictedQualifiersStayWithTheFeatureThatHasThem) {
+  load(repository, R"(
+      Qualifier Local : string = null, Scope(any), Flavor(Restricted);
+      Qualifier Common : string = null, Scope(any), Flavor(ToSubclass);
+      class Base {
+        [Local("l"), Common("c")] string Property;
+        [Local("l"), Common("c"), Override("Method")] uint32 Method([Local("l"), Common("c")] string Parameter);
+      };
+      class Derived : Base {};
+      class Overriding : Base {
+        [Local("o")] string Property;
+        uint32 Method([Local("o")] string Parameter);
+      };)");
+  const auto expectQualifiers = [](const Qualifiers& qualifiers, const std::map<std::string, bool>& expected) {
+    std::map<std::string, bool> found;
+    for (const Qualifier& qualifier : qualifiers) {
+      found[qualifier.name + "=" + *qualifier.value.text()] = qualifier.propagated;
+    }
+    EXPECT_EQ(found, expected);
+  };
+  const ClassDefinition& base = *repository.find("Base");
+  expectQualifiers(base.properties[0].qualifiers, {{"Local=l", false}, {"Common=c", false}});
+  const ClassDefinition& derived = *repository.find("Derived");
+  expectQualifiers(derived.properties[0].qualifiers, {{"Common=c", true}});
+  expectQualifiers(derived.methods[0].qualifiers, {{"Common=c", true}});
+  expectQualifiers(derived.methods[0].parameters[0].qualifiers, {{"Common=c", true}});
+  const ClassDefinition& overriding = *repository.find("Overriding");
+  expectQualifiers(overriding.properties[0].qualifiers, {{"Local=o", false}, {"Common=c", true}});
+  expectQualifiers(overriding.methods[0].qualifiers, {{"Common=c", true}});
+  expectQualifiers(overriding.methods[0].parameters[0].qualifiers, {{"Local=o", false}, {"Common=c", true}});
+}
+
 TEST_F(ClassRepositoryTest, AnOverridingPropertyTakesThePlaceAndTheQualifiersOfTheOther) {
   load(repository, R"(
       class Base { [Key, Description("base")] string Id = "b"; uint8 Other; string Kept = "k"; };
@@ -107,14 +141,68 @@ TEST_F(ClassRepositoryTest, ClassesMayDeriveFromThoseLoadedBefore) {
   EXPECT_EQ(repository.find("B")->superclass, repository.find("A"));
 }
 
-TEST_F(ClassRepositoryTest, ListsSubclasses) {
-  load(repository, testSchema);
-  EXPECT_THAT(namesOf(repository.subclasses("cim_element", false)), ElementsAre("CIM_Point", "CIM_System"));
-  EXPECT_THAT(namesOf(repository.subclasses("CIM_Element", true)),
+TEST_F(ClassRepositoryTest, ListsTheSubclassesThatTheNamespaceShows) {
+  load(repository, std::string("#pragma namespace(\"root/all\")\n") + testSchema);
+  EXPECT_THAT(namesOf(repository.subclasses("root/all", "cim_element", false)), ElementsAre("CIM_Point", "CIM_System"));
+  EXPECT_THAT(namesOf(repository.subclasses("ROOT/ALL/", "CIM_Element", true)),
               ElementsAre("CIM_Point", "CIM_System", "TST_Other", "TST_Point", "TST_Processor"));
-  EXPECT_THAT(namesOf(repository.subclasses("", false)), ElementsAre("CIM_Element", "CIM_Hosted", "TST_Peers"));
-  EXPECT_EQ(repository.subclasses("", true).size(), repository.all().size());
-  EXPECT_THAT(namesOf(repository.subclasses("TST_Other", true)), ElementsAre());
+  EXPECT_THAT(namesOf(repository.subclasses("root/all", "", false)),
+              ElementsAre("CIM_Element", "CIM_Hosted", "TST_Peers"));
+  EXPECT_EQ(repository.subclasses("root/all", "", true).size(), repository.all().size());
+  EXPECT_THAT(namesOf(repository.subclasses("root/all", "TST_Other", true)), ElementsAre());
+  EXPECT_THAT(namesOf(repository.subclasses("root/none", "", true)), ElementsAre());
+}
+
+TEST_F(ClassRepositoryTest, ANamespaceShowsWhatIsAskedForAndWhatThatIsMadeFrom) {
+  load(repository, std::string(testSchema) + R"(
+      class TST_Made : TST_Other { [EmbeddedInstance("TST_Part")] string Part; uint32 Go(TST_Peers REF Peers[]); };
+      class TST_Part {};)");
+  repository.show("root/a", "tst_hosted");
+  repository.show("root/b", "TST_Made");
+  EXPECT_THAT(namesOf(repository.subclasses("root/a", "", true)),
+              ElementsAre("CIM_Element", "CIM_Hosted", "CIM_Point", "CIM_System", "TST_Hosted"));
+  EXPECT_THAT(namesOf(repository.subclasses("root/b", "", true)),
+              ElementsAre("CIM_Element", "CIM_Point", "CIM_System", "TST_Made", "TST_Other", "TST_Part", "TST_Peers"));
+  EXPECT_EQ(repository.find("root/a", "TST_Made"), nullptr);
+  EXPECT_NE(repository.find("/ROOT/B", "tst_made"), nullptr);
+  EXPECT_EQ(repository.find("root/none", "TST_Made"), nullptr);
+}
+
+TEST_F(ClassRepositoryTest, WhatIsAskedForMayBeDeclaredLater) {
+  repository.show("root/a", "A");
+  EXPECT_EQ(repository.find("root/a", "A"), nullptr);
+  load(repository, "class A : B {}; class B {};");
+  EXPECT_THAT(namesOf(repository.subclasses("root/a", "", true)), ElementsAre("A", "B"));
+}
+
+TEST_F(ClassRepositoryTest, APragmaGivesANamespaceClassesOfItsOwn) {
+  load(repository, R"(
+      class Common { string Text; };
+      #pragma namespace("root/a")
+      class One : Common {};
+      class Same { uint8 A; };
+      #pragma namespace("root/b")
+      class Same { uint8 B; };
+      class Common { string Other; };
+      class Two : Common {};)");
+  EXPECT_THAT(namesOf(repository.subclasses("root/a", "", true)), ElementsAre("Common", "One", "Same"));
+  EXPECT_THAT(propertiesOf(*repository.find("root/a", "One")), ElementsAre("Text"));
+  EXPECT_THAT(propertiesOf(*repository.find("root/a", "Same")), ElementsAre("A"));
+  EXPECT_THAT(namesOf(repository.subclasses("root/b", "", true)), ElementsAre("Common", "Same", "Two"));
+  EXPECT_THAT(propertiesOf(*repository.find("root/b", "Two")), ElementsAre("Other"));
+  EXPECT_THAT(propertiesOf(*repository.find("root/b", "Same")), ElementsAre("B"));
+  EXPECT_THAT(propertiesOf(*repository.find("Common")), ElementsAre("Text"));
+  EXPECT_EQ(complaint(repository, "#pragma namespace(\"root/b\")\nclass same {};"),
+            "text:2: class same is already declared at text:7");
+  repository.show("root/c", "Same");
+  EXPECT_EQ(repository.find("root/c", "Same"), nullptr) << "no class of the schema";
+}
+
+TEST_F(ClassRepositoryTest, ANamespacesOwnClassGoesBeforeTheSchemas) {
+  load(repository, "class A { string P; };");
+  repository.show("root/a", "A");
+  load(repository, "#pragma namespace(\"root/a\")\nclass A { string Q; };");
+  EXPECT_THAT(propertiesOf(*repository.find("root/a", "A")), ElementsAre("Q"));
 }
 
 TEST_F(ClassRepositoryTest, KnowsTheNamespacesThatSomebodyNamed) {

@@ -117,6 +117,24 @@ TEST(MofTest, QualifiersTakeTheDeclaredTypeDefaultAndFlavor) {
   EXPECT_FALSE(findQualifier(qualifiers, "Override")->toSubclass);
 }
 
+TEST(MofTest, QualifierDeclarationsAreKeptWhole) {
+  const auto declarations = MofReader().readText(
+      R"(Qualifier Tone : uint8[3] = {1, 2}, Scope(property, REFERENCE), Flavor(DisableOverride, Restricted);
+         Qualifier Note : string, Scope(any);)",
+      "text");
+  ASSERT_THAT(declarations.qualifiers, SizeIs(2));
+  const QualifierDeclaration& tone = declarations.qualifiers[0];
+  EXPECT_EQ(tone.qualifier.name, "Tone");
+  EXPECT_EQ(tone.qualifier.value.type(), CMPI_uint8A);
+  EXPECT_EQ(tone.qualifier.value.toString(), "{1,2}");
+  EXPECT_FALSE(tone.qualifier.overridable);
+  EXPECT_FALSE(tone.qualifier.toSubclass);
+  EXPECT_EQ(tone.arraySize, 3u);
+  EXPECT_THAT(tone.scopes, ElementsAre("property", "REFERENCE"));
+  EXPECT_EQ(declarations.qualifiers[1].qualifier.value.type(), CMPI_string);
+  EXPECT_TRUE(declarations.qualifiers[1].qualifier.value.isNull());
+}
+
 TEST(MofTest, AKeyMayBeSaidNotToBeOne) {
   EXPECT_TRUE(propertyOf("[Key(true)] string P;").isKey());
   EXPECT_FALSE(propertyOf("[Key(false)] string P;").isKey());
@@ -142,6 +160,15 @@ TEST(MofTest, PragmasNameNamespacesAndOthersAreIgnored) {
   EXPECT_THAT(declarations.namespaces, ElementsAre("root/a"));
 }
 
+TEST(MofTest, AClassIsOfTheNamespaceThatAPragmaBeforeItNames) {
+  const auto classes =
+      classesOf("class A {};\n#pragma namespace(\"root/a\")\nclass B {};\n#pragma namespace(\"root/b\")\nclass C {};");
+  ASSERT_THAT(classes, SizeIs(3));
+  EXPECT_EQ(classes[0].nameSpace, "");
+  EXPECT_EQ(classes[1].nameSpace, "root/a");
+  EXPECT_EQ(classes[2].nameSpace, "root/b");
+}
+
 TEST(MofFilesTest, ADirectoryIsReadWholeAndInOrder) {
   const TemporaryDirectory directory;
   directory.write("b.mof", "class B {};");
@@ -149,6 +176,31 @@ TEST(MofFilesTest, ADirectoryIsReadWholeAndInOrder) {
   directory.write("deep/c.mof", "class C {};");
   directory.write("notes.txt", "no MOF");
   EXPECT_THAT(namesOf(MofReader().readPath(directory.path())), ElementsAre("A", "B", "C"));
+}
+
+TEST(MofFilesTest, ANamespaceHoldsForWhatIsIncludedAndEndsWithItsFile) {
+  const TemporaryDirectory directory;
+  directory.write("a.mof", "#pragma namespace(\"root/a\")\n#pragma include(\"part/b.inc\")\nclass A {};");
+  directory.write("part/b.inc", "class B {};\n#pragma namespace(\"root/b\")\n");
+  directory.write("z.mof", "class Z {};");
+  const auto classes = MofReader().readPath(directory.path()).classes;
+  ASSERT_THAT(classes, SizeIs(3));
+  EXPECT_EQ(classes[0].nameSpace, "root/a") << classes[0].own.name;
+  EXPECT_EQ(classes[1].nameSpace, "root/a") << classes[1].own.name;
+  EXPECT_EQ(classes[2].nameSpace, "") << classes[2].own.name;
+}
+
+TEST(MofFilesTest, AFileIsReadOnceForEachNamespace) {
+  const TemporaryDirectory directory;
+  directory.write("a.mof", "class A {};");
+  const auto all =
+      directory.write("all.mof",
+                      "#pragma include(\"a.mof\")\n#pragma namespace(\"root/a\")\n"
+                      "#pragma include(\"a.mof\")\n#pragma include(\"a.mof\")\n#pragma include(\"all.mof\")\n");
+  const auto classes = MofReader().readPath(all).classes;
+  ASSERT_THAT(classes, SizeIs(2));
+  EXPECT_EQ(classes[0].nameSpace, "");
+  EXPECT_EQ(classes[1].nameSpace, "root/a");
 }
 
 TEST(MofFilesTest, IncludesAreRelativeToTheirFileAndReadOnce) {
