@@ -75,12 +75,15 @@ class Scan {
 
   void run() {
     if (markup_.size() == 0 || !(markup_[0] == '<' || isBlank(markup_[0]))) {
-      refuse("request-not-well-formed", "the request must begin with <");
+      refuse("request-not-well-formed", "the message must begin with <");
     }
     while (position_ < markup_.size()) {
       if (current() != '<') {
         advance();
-      } else if (markup_.has(position_, "<!--")) {
+        continue;
+      }
+      countNode();
+      if (markup_.has(position_, "<!--")) {
         skipTo("-->");
       } else if (markup_.has(position_, "<![CDATA[")) {
         skipTo("]]>");
@@ -98,7 +101,7 @@ class Scan {
   void advance() {
     const char character = current();
     if (character == '\0') {
-      refuse("request-not-well-formed", "the request contains a null character");
+      refuse("request-not-well-formed", "the message contains a null character");
     }
     line_ += character == '\n' ? 1 : 0;
     ++position_;
@@ -146,15 +149,20 @@ class Scan {
       advance();
     }
     if (!isEnd) {
-      countElement(markup_.text(begin, position_));
+      countName(markup_.text(begin, position_));
     }
     readAttributes(markup_.has(begin, "!"));
   }
 
-  void countElement(const std::string& name) {
-    if (++elements_ > DocumentLimits::elements) {
-      refuse("request-not-valid", "more than " + std::to_string(DocumentLimits::elements) + " elements");
+  // Whatever begins with <, but the end of an element, becomes a node in the parser's memory.
+  void countNode() {
+    if (!markup_.has(position_, "</") && ++nodes_ > DocumentLimits::elements) {
+      refuse("request-not-valid",
+             "more than " + std::to_string(DocumentLimits::elements) + " elements, comments and the like");
     }
+  }
+
+  void countName(const std::string& name) {
     names_.insert(name);
     if (names_.size() > DocumentLimits::elementNames) {
       refuse("request-not-valid", "more than " + std::to_string(DocumentLimits::elementNames) + " different elements");
@@ -171,7 +179,7 @@ class Scan {
       } else if (current() == '"' || current() == '\'') {
         quote = current();
       } else if (current() == '[' && isDeclaration) {
-        refuse("request-not-well-formed", "the request declares entities or attributes");
+        refuse("request-not-well-formed", "the message declares entities or attributes");
       } else if (current() == '=' && ++attributes > DocumentLimits::attributes) {
         refuse("request-not-valid", "more than " + std::to_string(DocumentLimits::attributes) + " attributes");
       }
@@ -192,7 +200,7 @@ class Scan {
   const Markup markup_;
   std::size_t position_ = 0;
   std::size_t line_ = 1;
-  std::size_t elements_ = 0;
+  std::size_t nodes_ = 0;
   std::set<std::string> names_;
 };
 

@@ -28,10 +28,16 @@ class Endpoint {
   Http::Response fail(const Http::Request& request, const std::string& why) const;
 
  private:
-  using Answer = std::function<std::string(const Request& request)>;
+  // The body of a response, and its CIM status.
+  struct Answer {
+    std::string body;
+    int status;
+  };
+  using Answering = std::function<Answer(const Request& request)>;
 
-  static Http::Response handle(const Http::Request& request, const Answer& answer);
-  std::string respond(const Request& request, const std::string& user) const;
+  static Http::Response handle(const Http::Request& request, const Answering& answer);
+  static Answer errorAnswer(const Request& request, int code, const char* description);
+  Answer respond(const Request& request, const Http::Request& message) const;
 
   const CMPIBroker* broker_;
   const ClassRepository& classes_;

@@ -11,6 +11,7 @@
 
 namespace Cimom::CimXml {
 
+class Element;
 struct KeyBinding;
 
 // CLASSNAME or INSTANCENAME, with whatever path stands around it.
@@ -83,5 +84,10 @@ Request readRequest(std::string_view xml);
 
 // Takes the text of a value that embeds an INSTANCE. Throws TransportError as above.
 Instance readEmbeddedInstance(std::string_view xml);
+
+// A name with whatever path stands around it; an INSTANCE or VALUE.NAMEDINSTANCE. Throws TransportError
+// "request-not-valid".
+ObjectName readNameElement(const Element& element);
+Instance readInstanceElement(const Element& element);
 
 }  // namespace Cimom::CimXml

@@ -61,6 +61,16 @@ TEST(CompletionTest, OffersFilesAndDirectoriesToCimomd) {
   EXPECT_THAT(offered("cimomd", {"--port", ""}, directory.path()), IsEmpty());
 }
 
+TEST(CompletionTest, OffersTheCommandsAndOptionsOfBmcip) {
+  const TemporaryDirectory directory;
+  directory.write("hosts.txt", "");
+  EXPECT_THAT(offered("bmcip", {""}), UnorderedElementsAre("show", "set", "watch", "model"));
+  EXPECT_THAT(offered("bmcip", {"show", "--host"}), ElementsAre("--hosts"));
+  EXPECT_THAT(offered("bmcip", {"-"}), AllOf(Contains("-h"), Contains("--json"), Contains("--dry-run")));
+  EXPECT_THAT(offered("bmcip", {"show", "--hosts", "ho"}, directory.path()), ElementsAre("hosts.txt"));
+  EXPECT_THAT(offered("bmcip", {"--timeout", ""}), IsEmpty());
+}
+
 TEST(CompletionTest, OffersTheOptionsAndObjectManagersOfTheRegistration) {
   const std::string program = "compositeipconfig-register";
   EXPECT_THAT(offered(program, {""}), UnorderedElementsAre("-t", "-n", "-d", "-h", "--help"));

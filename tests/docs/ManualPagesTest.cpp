@@ -80,7 +80,7 @@ Names sampleKeysOf(const std::string& text) {
 Names programOptions(const std::string& program) {
   Names options;
   const Completed help = run({BINARY_DIR "/bin/" + program, "--help"});
-  for (const std::string& line : namesOf(help, "^  (-[a-z-]+(?:, ?--[a-z-]+)?)")) {
+  for (const std::string& line : namesOf(help, "^(?:  |    )(-[a-z-]+(?:, ?--[a-z-]+)?)")) {
     options.merge(matches(line, "(-[a-z-]+)"));
   }
   return options;
@@ -90,7 +90,7 @@ TEST(ManualPagesTest, AreClean) {
   if (run({"sh", "-c", "command -v mandoc"}).status != 0) {
     GTEST_SKIP() << "mandoc is not there";
   }
-  for (const char* page : {"agent.ini.5", "cimomd.8", "cimomd.ini.5", "compositeipconfig-register.8"}) {
+  for (const char* page : {"agent.ini.5", "cimomd.8", "cimomd.ini.5", "compositeipconfig-register.8", "bmcip.1"}) {
     const Completed checked = run({"mandoc", "-T", "lint", "-W", "warning", pathOf(page)});
     EXPECT_EQ(checked.status, 0);
     EXPECT_THAT(checked.output, IsEmpty()) << page;
@@ -98,8 +98,8 @@ TEST(ManualPagesTest, AreClean) {
 }
 
 TEST(ManualPagesTest, ExplainTheOptionsOfTheProgramsAndNoOther) {
-  for (const char* program : {"cimomd", "compositeipconfig-register"}) {
-    EXPECT_EQ(optionsOf(std::string(program) + ".8"), programOptions(program));
+  for (const std::string program : {"cimomd", "compositeipconfig-register", "bmcip"}) {
+    EXPECT_EQ(optionsOf(program + (program == "bmcip" ? ".1" : ".8")), programOptions(program));
   }
 }
 

@@ -185,7 +185,7 @@ TEST_F(SecurityTest, WritesALineForEachRequestWhereItIsAskedTo) {
       << readFile(file);
   const std::string line = linesOf(readFile(file)).back();
   EXPECT_TRUE(std::regex_match(line, std::regex(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\.\d{3}Z 127\.0\.0\.1 admin 200 \d+ )"
-                                                R"(EnumerateInstanceNames root/test.*)")))
+                                                R"(EnumerateInstanceNames root/test:TEST_Thing 0)")))
       << line;
   EXPECT_EQ(std::filesystem::status(file).permissions() & std::filesystem::perms::others_all,
             std::filesystem::perms::none);

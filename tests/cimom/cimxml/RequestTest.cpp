@@ -121,8 +121,8 @@ TEST(RequestTest, ReadsEveryKindOfPath) {
 TEST(RequestTest, ReadsAnArrayOfReferencesWithItsNulls) {
   const auto references =
       valueOf<ObjectNames>("<VALUE.REFARRAY><VALUE.REFERENCE>" + instanceName("C", keyBinding("K", "1")) +
-                          "</VALUE.REFERENCE><VALUE.NULL/><VALUE.REFERENCE><CLASSNAME NAME=\"D\"/></VALUE.REFERENCE>"
-                          "</VALUE.REFARRAY>");
+                           "</VALUE.REFERENCE><VALUE.NULL/><VALUE.REFERENCE><CLASSNAME NAME=\"D\"/></VALUE.REFERENCE>"
+                           "</VALUE.REFARRAY>");
   ASSERT_EQ(references.size(), 3u);
   EXPECT_EQ(references[0]->keys.size(), 1u);
   EXPECT_FALSE(references[1]);
@@ -282,6 +282,11 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"AttributesInUtf16", wide(replaced(withAttributes(33), "utf-8", "utf-16")), 400, notValid,
                 "more than 32 attributes"},
         Refusal{"Elements", withValues(70'000), 400, notValid, "more than 65536 elements"},
+        Refusal{"Comments", intrinsicCall("M", repeated("<!---->", 66'000)), 400, notValid,
+                "more than 65536 elements, comments and the like"},
+        Refusal{"Instructions", intrinsicCall("M", repeated("<?a?>", 66'000)), 400, notValid, "more than 65536"},
+        Refusal{"CharacterData", intrinsicCall("M", repeated("<![CDATA[]]>", 66'000)), 400, notValid,
+                "more than 65536"},
         Refusal{"ElementNames",
                 [] {
                   std::string elements;
