@@ -112,7 +112,7 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
   const Operation& operation = findOperation(request.method);
   requireNamespace(manager, request);
   const Parameters parameters(request, operation.parameters);
-  RequestScope scope(manager.broker);
+  RequestScope scope(manager.broker, manager.deadline);
   const CMPIContext* context = scope.context();
   describeCaller(context, manager, parameters);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);
