@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <array>
 #include <future>
+#include <system_error>
 #include <thread>
 
 #include "cimom/broker/BrokerCore.h"
@@ -71,7 +72,7 @@ void reportThreadEnd(const std::string& what) noexcept {
   ProviderFrame::endThread(what);
   try {
     if (const CMPIBroker* broker = RequestScope::currentBroker()) {
-      logError(coreOf(broker), what + " ended the thread of its request");
+      logError(coreOf(broker), what + " ended its thread");
     }
   } catch (const std::exception&) {
     // Without memory for the line, the client's answer has to do.
@@ -194,9 +195,15 @@ bool Provider::cleanUp(const CMPIBroker* broker, Limit limit) {
   std::promise<bool> outcome;
   std::future<bool> mayUnload = outcome.get_future();
   // On a thread of its own, which ends with the provider's; a promise that nobody keeps says so.
-  std::thread cleaner([what, made, broker, outcome = std::move(outcome)]() mutable {
-    outcome.set_value(std::apply([&](auto*... mi) { return (clean(what, mi, broker) & ...); }, made));
-  });
+  std::thread cleaner;
+  try {
+    cleaner = std::thread([what, made, broker, outcome = std::move(outcome)]() mutable {
+      outcome.set_value(std::apply([&](auto*... mi) { return (clean(what, mi, broker) & ...); }, made));
+    });
+  } catch (const std::system_error& error) {
+    keep(std::string(" is left out: ") + error.what());
+    return true;
+  }
   if (mayUnload.wait_for(limit) == std::future_status::timeout) {
     cleaner.detach();
     keep(" has not ended after " + std::to_string(limit.count()) + " ms");
@@ -208,7 +215,7 @@ bool Provider::cleanUp(const CMPIBroker* broker, Limit limit) {
       library_.keep();
     }
   } catch (const std::future_error&) {
-    keep(" has ended its thread");
+    library_.keep();  // the provider ended the thread, as the log says
   }
   return true;
 }

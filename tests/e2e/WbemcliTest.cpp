@@ -120,6 +120,15 @@ TEST_F(WbemcliTest, IsToldWhatFailed) {
   EXPECT_THAT(elsewhere.errors + elsewhere.output, HasSubstr("CIM_ERR_INVALID_NAMESPACE"));
 }
 
+TEST_F(WbemcliTest, CallsAMethod) {
+  const std::string machine = "TEST_Machine.Name=\"machine\"";
+  EXPECT_THAT(
+      ask({"cm"}, machine, {"Echo.U8=7,Text=\"a text\""}),
+      AllOf(HasSubstr("Echo: U8:80 Text:1600"), HasSubstr("U8 (uint8): 7"), HasSubstr("Text (string): a text")));
+  EXPECT_THAT(fail({"cm"}, machine, {"Unimplemented"}),
+              AllOf(HasSubstr("CIM_ERR_METHOD_NOT_AVAILABLE"), HasSubstr("not today")));
+}
+
 TEST_F(WbemcliTest, GetsAnEmptyAnswerFromAClassWithoutAProvider) { EXPECT_EQ(ask({"ei"}, "TEST_Unserved"), ""); }
 
 TEST_F(WbemcliTest, IsServedBesideOthers) {

@@ -116,7 +116,7 @@ TEST_F(ProviderGuardTest, AThreadThatAProviderEndsPastTheBrokerIsUnwoundAsAWhole
   EXPECT_FALSE(isBack);
   EXPECT_EQ(told, "provider TST_Other ended the thread of its request");
   ASSERT_FALSE(log.empty());
-  EXPECT_EQ(log.front(), told);
+  EXPECT_EQ(log.front(), "provider TST_Other ended its thread");
   // And other threads are served as before
   other->answer = nullptr;
   EXPECT_EQ(enumerated(), "0: ");
@@ -296,8 +296,7 @@ TEST_F(CleanUpTest, AThreadThatItEndsIsLogged) {
   GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
 #endif
   EXPECT_THAT(cleanedUp([]() -> CMPIStatus { pthread_exit(nullptr); }),
-              ElementsAre("cimomd: the clean-up of provider TST_Processor has ended its thread; its library stays "
-                          "loaded"));
+              ElementsAre("cimomd: the clean-up of provider TST_Processor ended its thread"));
 }
 
 TEST_F(CleanUpTest, NobodyWaitsLongForWhatHangsAndItMayStillUseTheBroker) {
