@@ -43,6 +43,7 @@ void load(ObjectManager& manager, const Configuration& configuration) {
   for (const auto& directory : configuration.providerDirectories) {
     manager.addProviderDirectory(directory);
   }
+  manager.setStrictness(configuration.bare ? Strictness::Bare : Strictness::Exact);
   // They stand with the classes: in the same directory, or beside a file by the same name.
   std::vector<Profile> profiles;
   for (std::filesystem::path path : configuration.schemas) {

@@ -77,6 +77,13 @@ Apply paths(std::vector<std::filesystem::path> Configuration::*member) {
   };
 }
 
+void strictness(Configuration& configuration, const GivenValue& value) {
+  if (value.text != "exact" && value.text != "bare") {
+    throw UsageError(value.origin + ": must be exact or bare, not \"" + value.text + "\"");
+  }
+  configuration.bare = value.text == "bare";
+}
+
 // In the order of the help.
 const std::vector<Setting>& settings() {
   constexpr std::uint64_t day = 86400;
@@ -108,6 +115,9 @@ const std::vector<Setting>& settings() {
        number(&Configuration::idleTimeout, 1, day)},
       {"shutdown-timeout", "SECONDS", "wait so long for requests in progress when shutting down (20)", false,
        number(&Configuration::shutdownTimeout, 0, day)},
+      {"strictness", "MODE",
+       "exact: check requests as DSP0200 asks; bare: leave that to the providers, as others do (exact)", false,
+       strictness},
       {"server-name", "NAME", "a further host name that clients may ask this server by", true,
        [](Configuration& configuration, const GivenValue& value) {
          configuration.serverNames.push_back(parse(value, Ground::parseText));

@@ -30,6 +30,7 @@ struct Configuration {
   std::chrono::seconds requestTimeout{30};
   std::chrono::seconds operationTimeout{60};
   std::chrono::seconds shutdownTimeout{20};
+  bool bare = false;                     // requests go to the providers unchecked
   std::vector<std::string> serverNames;  // beside the host's own
   std::filesystem::path tlsCertificate;  // empty: plain HTTP
   std::filesystem::path tlsKey;
