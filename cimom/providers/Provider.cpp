@@ -195,7 +195,7 @@ bool Provider::cleanUp(const CMPIBroker* broker, Limit limit) {
   std::future<bool> mayUnload = outcome.get_future();
   // On a thread of its own, which ends with the provider's; a promise that nobody keeps says so.
   std::thread cleaner([what, made, broker, outcome = std::move(outcome)]() mutable {
-    outcome.set_value(std::apply([&](auto*... mi) { return (clean(what, mi, broker) & ...); }, made));
+    outcome.set_value(std::apply([&](auto*... mi) { return (int{clean(what, mi, broker)} & ...) != 0; }, made));
   });
   if (mayUnload.wait_for(limit) == std::future_status::timeout) {
     cleaner.detach();
