@@ -15,6 +15,7 @@
 #include "Paths.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Endpoint.h"
+#include "cimom/http/Acceptor.h"
 #include "cimom/http/Server.h"
 #include "tests/bmcip/RawServer.h"
 #include "tests/support/system/Process.h"
@@ -93,17 +94,23 @@ int measure() {
   manager.checkProviders();
   const Cimom::CimXml::Endpoint endpoint(manager.broker(), manager.classes(), "fleet.example");
   Cimom::Http::ServerOptions options;
-  options.address = "0.0.0.0";
   options.maxConnections = servers;
+  options.maxConnectionsPerAddress = servers;
   Cimom::Http::Server server(options, [&](const Cimom::Http::Request& request) { return endpoint.handle(request); });
+
+  // One server behind all the addresses, which of itself serves no more than one without TLS.
+  Cimom::Http::Listener listener("0.0.0.0", 0);
+  listener.listen();
+  const std::uint16_t port = listener.port();
+  const Cimom::Http::Acceptor acceptor(
+      std::move(listener), [&](int descriptor, const sockaddr_storage&, socklen_t) { server.adopt(descriptor); });
 
   const RawServer hanging(RawServer::Manner::Hang);
   const RawServer breaking(RawServer::Manner::BreakOff);
   const std::string faulty[] = {hanging.url(), breaking.url(), "http://127.0.0.1:1"};
   std::ofstream hosts(directory / "hosts");
   for (int i = 0; i < servers; ++i) {
-    hosts << (i % 10 == 7 ? faulty[i / 10 % 3] : "http://" + addressOf(i) + ":" + std::to_string(server.port()))
-          << '\n';
+    hosts << (i % 10 == 7 ? faulty[i / 10 % 3] : "http://" + addressOf(i) + ":" + std::to_string(port)) << '\n';
   }
   hosts.close();
 

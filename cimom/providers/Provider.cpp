@@ -198,7 +198,7 @@ bool Provider::cleanUp(const CMPIBroker* broker, Limit limit) {
   std::thread cleaner;
   try {
     cleaner = std::thread([what, made, broker, outcome = std::move(outcome)]() mutable {
-      outcome.set_value(std::apply([&](auto*... mi) { return (clean(what, mi, broker) & ...); }, made));
+      outcome.set_value(std::apply([&](auto*... mi) { return (int{clean(what, mi, broker)} & ...) != 0; }, made));
     });
   } catch (const std::system_error& error) {
     keep(std::string(" is left out: ") + error.what());
