@@ -24,7 +24,11 @@ struct ObjectManager::Parts {
 
 ObjectManager::ObjectManager() : parts_(std::make_unique<Parts>()) {}
 
-ObjectManager::~ObjectManager() = default;
+ObjectManager::~ObjectManager() {
+  if (!parts_->router.providers().cleanUp()) {
+    [[maybe_unused]] const Parts* stays = parts_.release();
+  }
+}
 
 void ObjectManager::loadSchema(const std::filesystem::path& fileOrDirectory) {
   parts_->core.classes.add(parts_->reader.readPath(fileOrDirectory));
@@ -53,10 +57,13 @@ void ObjectManager::addProviderDirectory(const std::filesystem::path& directory)
 }
 
 void ObjectManager::addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
-                                AssociationFactory associationFactory) {
-  parts_->router.providers().add(registration, std::move(instanceFactory), std::move(associationFactory));
+                                AssociationFactory associationFactory, MethodFactory methodFactory) {
+  parts_->router.providers().add(
+      registration, {std::move(instanceFactory), std::move(associationFactory), std::move(methodFactory)});
   parts_->showClass(registration);
 }
+
+void ObjectManager::setProviderLimit(std::chrono::milliseconds limit) { parts_->router.providers().setLimit(limit); }
 
 void ObjectManager::checkProviders() {
   for (const auto& [registration, provider] : parts_->router.providers().entries()) {

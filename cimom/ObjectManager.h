@@ -20,7 +20,8 @@ namespace Cimom {
 class ObjectManager {
  public:
   ObjectManager();
-  // Cleans every provider up that was used, then unloads the libraries. No request may be under way.
+  // Cleans every provider up that was used, then unloads the libraries. No request may be under way. A provider whose
+  // clean-up does not end stays, and all that it may use.
   ~ObjectManager();
 
   // Reads MOF from a file or from every *.mof under a directory.
@@ -38,9 +39,11 @@ class ObjectManager {
   // Registers a provider that is linked into this program; a factory of a type that the registration does not name
   // may be null.
   void addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
-                   AssociationFactory associationFactory);
-  // Loads every registered library now.
-  // Throws ConfigurationError for a library or a factory that is not there, or a class that the schema lacks.
+                   AssociationFactory associationFactory, MethodFactory methodFactory = nullptr);
+  // How long a provider's factory or clean-up may take before nobody waits for it any more.
+  void setProviderLimit(std::chrono::milliseconds limit);
+  // Loads every registered library now and logs what cannot be had; requests for it try again, and fail with the reason.
+  // Throws ConfigurationError for a class that the schema lacks, and if nothing can be had.
   void checkProviders();
 
   // Where CMLogMessage goes; by default a line on the standard error output.

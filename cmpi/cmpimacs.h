@@ -25,8 +25,43 @@
 #define CDToString(b, object, rc) ((b)->eft->toString((b), (object), (rc)))
 #define CDIsOfType(b, object, type, rc) ((b)->eft->isOfType((b), (object), (type), (rc)))
 #define CDGetType(b, object, rc) ((b)->eft->getType((b), (object), (rc)))
+#define CMNewCMPIError(b, owner, id, message, severity, cause, code, rc) \
+  ((b)->eft->newCMPIError((b), (owner), (id), (message), (severity), (cause), (code), (rc)))
 #define CMLogMessage(b, severity, id, text, string) ((b)->eft->logMessage((b), (severity), (id), (text), (string)))
 #define CMTraceMessage(b, level, component, text, string) ((b)->eft->trace((b), (level), (component), (text), (string)))
+
+/*
+ * Messages: the text of a message file, or the default text, with "$0" ... "$9" replaced by arguments. Both take what
+ * the CMFmtArgs of their number makes of the arguments, each of which comes from the CMFmt of its type: CMGetMessage(b,
+ * "id", "$0 of $1", rc, CMFmtArgs2(CMFmtUint(1), CMFmtChars("two"))).
+ */
+
+#define CMOpenMessageFile(b, file, handle) ((b)->eft->openMessageFile((b), (file), (handle)))
+#define CMCloseMessageFile(b, handle) ((b)->eft->closeMessageFile((b), (handle)))
+#define CMGetMessage(b, id, text, rc, arguments) ((b)->eft->getMessage((b), (id), (text), (rc), arguments))
+#define CMGetMessage2(b, id, handle, text, rc, arguments) \
+  ((b)->eft->getMessage2((b), (id), (handle), (text), (rc), arguments))
+
+#define CMFmtBoolean(v) CMPI_boolean, ((int)(v))
+#define CMFmtSint(v) CMPI_sint32, ((CMPISint32)(v))
+#define CMFmtUint(v) CMPI_uint32, ((CMPIUint32)(v))
+#define CMFmtSint64(v) CMPI_sint64, ((CMPISint64)(v))
+#define CMFmtUint64(v) CMPI_uint64, ((CMPIUint64)(v))
+#define CMFmtReal(v) CMPI_real64, ((double)(v))
+#define CMFmtChars(v) CMPI_chars, ((const char*)(v))
+#define CMFmtString(v) CMPI_string, ((const CMPIString*)(v))
+
+#define CMFmtArgs0() 0
+#define CMFmtArgs1(v1) 1, v1
+#define CMFmtArgs2(v1, v2) 2, v1, v2
+#define CMFmtArgs3(v1, v2, v3) 3, v1, v2, v3
+#define CMFmtArgs4(v1, v2, v3, v4) 4, v1, v2, v3, v4
+#define CMFmtArgs5(v1, v2, v3, v4, v5) 5, v1, v2, v3, v4, v5
+#define CMFmtArgs6(v1, v2, v3, v4, v5, v6) 6, v1, v2, v3, v4, v5, v6
+#define CMFmtArgs7(v1, v2, v3, v4, v5, v6, v7) 7, v1, v2, v3, v4, v5, v6, v7
+#define CMFmtArgs8(v1, v2, v3, v4, v5, v6, v7, v8) 8, v1, v2, v3, v4, v5, v6, v7, v8
+#define CMFmtArgs9(v1, v2, v3, v4, v5, v6, v7, v8, v9) 9, v1, v2, v3, v4, v5, v6, v7, v8, v9
+#define CMFmtArgs10(v1, v2, v3, v4, v5, v6, v7, v8, v9, v10) 10, v1, v2, v3, v4, v5, v6, v7, v8, v9, v10
 
 /* The broker's up-call table */
 
@@ -139,6 +174,51 @@
 #define CMReturnDone(r) ((r)->ft->returnDone((r)))
 #define CMReturnError(r, error) ((r)->ft->returnError((r), (error)))
 
+/* Error: what it says, and what a provider adds to it */
+
+#define CMGetErrorType(e, rc) ((e)->ft->getErrorType((e), (rc)))
+#define CMGetOtherErrorType(e, rc) ((e)->ft->getOtherErrorType((e), (rc)))
+#define CMGetOwningEntity(e, rc) ((e)->ft->getOwningEntity((e), (rc)))
+#define CMGetMessageID(e, rc) ((e)->ft->getMessageID((e), (rc)))
+#define CMGetErrorMessage(e, rc) ((e)->ft->getMessage((e), (rc)))
+#define CMGetPerceivedSeverity(e, rc) ((e)->ft->getPerceivedSeverity((e), (rc)))
+#define CMGetProbableCause(e, rc) ((e)->ft->getProbableCause((e), (rc)))
+#define CMGetProbableCauseDescription(e, rc) ((e)->ft->getProbableCauseDescription((e), (rc)))
+#define CMGetRecommendedActions(e, rc) ((e)->ft->getRecommendedActions((e), (rc)))
+#define CMGetErrorSource(e, rc) ((e)->ft->getErrorSource((e), (rc)))
+#define CMGetErrorSourceFormat(e, rc) ((e)->ft->getErrorSourceFormat((e), (rc)))
+#define CMGetOtherErrorSourceFormat(e, rc) ((e)->ft->getOtherErrorSourceFormat((e), (rc)))
+#define CMGetCIMStatusCode(e, rc) ((e)->ft->getCIMStatusCode((e), (rc)))
+#define CMGetCIMStatusCodeDescription(e, rc) ((e)->ft->getCIMStatusCodeDescription((e), (rc)))
+#define CMGetMessageArguments(e, rc) ((e)->ft->getMessageArguments((e), (rc)))
+#define CMSetErrorType(e, type) ((e)->ft->setErrorType((e), (type)))
+#define CMSetOtherErrorType(e, text) ((e)->ft->setOtherErrorType((e), (text)))
+#define CMSetProbableCauseDescription(e, text) ((e)->ft->setProbableCauseDescription((e), (text)))
+#define CMSetRecommendedActions(e, array) ((e)->ft->setRecommendedActions((e), (array)))
+#define CMSetErrorSource(e, text) ((e)->ft->setErrorSource((e), (text)))
+#define CMSetErrorSourceFormat(e, format) ((e)->ft->setErrorSourceFormat((e), (format)))
+#define CMSetOtherErrorSourceFormat(e, text) ((e)->ft->setOtherErrorSourceFormat((e), (text)))
+#define CMSetCIMStatusCodeDescription(e, text) ((e)->ft->setCIMStatusCodeDescription((e), (text)))
+#define CMSetMessageArguments(e, array) ((e)->ft->setMessageArguments((e), (array)))
+
+/* Select expression, its normal forms (disjunctive and conjunctive), their terms and the comparisons in those */
+
+#define CMEvaluateSelExp(s, inst, rc) ((s)->ft->evaluate((s), (inst), (rc)))
+#define CMEvaluateSelExpUsingAccessor(s, accessor, parameter, rc) \
+  ((s)->ft->evaluateUsingAccessor((s), (accessor), (parameter), (rc)))
+#define CMGetSelExpString(s, rc) ((s)->ft->getString((s), (rc)))
+#define CMGetDoc(s, rc) ((s)->ft->getDOC((s), (rc)))
+#define CMGetCod(s, rc) ((s)->ft->getCOD((s), (rc)))
+#define CMGetSubCondCountAndType(c, type, rc) ((c)->ft->getCountAndType((c), (type), (rc)))
+#define CMGetSubCondAt(c, index, rc) ((c)->ft->getSubCondAt((c), (index), (rc)))
+#define CMGetPredicateCount(s, rc) ((s)->ft->getCount((s), (rc)))
+#define CMGetPredicateAt(s, index, rc) ((s)->ft->getPredicateAt((s), (index), (rc)))
+#define CMGetPredicate(s, name, rc) ((s)->ft->getPredicate((s), (name), (rc)))
+#define CMGetPredicateData(p, type, operation, left, right) \
+  ((p)->ft->getData((p), (type), (operation), (left), (right)))
+#define CMEvaluatePredicateUsingAccessor(p, accessor, parameter, rc) \
+  ((p)->ft->evaluateUsingAccessor((p), (accessor), (parameter), (rc)))
+
 /* Statuses */
 
 /* Returns a status with a null message from the function. */
@@ -186,15 +266,11 @@
 
 #define CMNoHook
 
-#define CMInstanceMIStub(prefix, provider, brokerVariable, hook)                                             \
-  static CMPIInstanceMIFT instMIFT__ = {                                                                     \
-      CMPICurrentVersion,        CMPICurrentVersion,     "instance" #provider, prefix##Cleanup,              \
-      prefix##EnumInstanceNames, prefix##EnumInstances,  prefix##GetInstance,  prefix##CreateInstance,       \
-      prefix##ModifyInstance,    prefix##DeleteInstance, prefix##ExecQuery,                                  \
-  };                                                                                                         \
-  CMPI_EXTERN_C CMPIInstanceMI* provider##_Create_InstanceMI(const CMPIBroker* brkr, const CMPIContext* ctx, \
+/* What the factories have in common: KIND is Instance, Association, Method, Property or Indication. */
+#define CMPI_MI_FACTORY_(kind, provider, table, brokerVariable, hook)                                        \
+  CMPI_EXTERN_C CMPI##kind##MI* provider##_Create_##kind##MI(const CMPIBroker* brkr, const CMPIContext* ctx, \
                                                              CMPIStatus* rc) {                               \
-    static CMPIInstanceMI mi = {NULL, &instMIFT__};                                                          \
+    static CMPI##kind##MI mi = {NULL, &table};                                                               \
     (void)ctx;                                                                                               \
     (void)rc;                                                                                                \
     brokerVariable = brkr;                                                                                   \
@@ -202,19 +278,46 @@
     return &mi;                                                                                              \
   }
 
-#define CMAssociationMIStub(prefix, provider, brokerVariable, hook)                                                \
-  static CMPIAssociationMIFT assocMIFT__ = {                                                                       \
-      CMPICurrentVersion,  CMPICurrentVersion,      "association" #provider, prefix##AssociationCleanup,           \
-      prefix##Associators, prefix##AssociatorNames, prefix##References,      prefix##ReferenceNames,               \
-  };                                                                                                               \
-  CMPI_EXTERN_C CMPIAssociationMI* provider##_Create_AssociationMI(const CMPIBroker* brkr, const CMPIContext* ctx, \
-                                                                   CMPIStatus* rc) {                               \
-    static CMPIAssociationMI mi = {NULL, &assocMIFT__};                                                            \
-    (void)ctx;                                                                                                     \
-    (void)rc;                                                                                                      \
-    brokerVariable = brkr;                                                                                         \
-    hook;                                                                                                          \
-    return &mi;                                                                                                    \
-  }
+#define CMInstanceMIStub(prefix, provider, brokerVariable, hook)                                       \
+  static CMPIInstanceMIFT instMIFT__ = {                                                               \
+      CMPICurrentVersion,        CMPICurrentVersion,     "instance" #provider, prefix##Cleanup,        \
+      prefix##EnumInstanceNames, prefix##EnumInstances,  prefix##GetInstance,  prefix##CreateInstance, \
+      prefix##ModifyInstance,    prefix##DeleteInstance, prefix##ExecQuery,                            \
+  };                                                                                                   \
+  CMPI_MI_FACTORY_(Instance, provider, instMIFT__, brokerVariable, hook)
+
+#define CMAssociationMIStub(prefix, provider, brokerVariable, hook)                                      \
+  static CMPIAssociationMIFT assocMIFT__ = {                                                             \
+      CMPICurrentVersion,  CMPICurrentVersion,      "association" #provider, prefix##AssociationCleanup, \
+      prefix##Associators, prefix##AssociatorNames, prefix##References,      prefix##ReferenceNames,     \
+  };                                                                                                     \
+  CMPI_MI_FACTORY_(Association, provider, assocMIFT__, brokerVariable, hook)
+
+#define CMMethodMIStub(prefix, provider, brokerVariable, hook)                                                 \
+  static CMPIMethodMIFT methMIFT__ = {                                                                         \
+      CMPICurrentVersion, CMPICurrentVersion, "method" #provider, prefix##MethodCleanup, prefix##InvokeMethod, \
+  };                                                                                                           \
+  CMPI_MI_FACTORY_(Method, provider, methMIFT__, brokerVariable, hook)
+
+/* The slot for a property with its origin stays empty. */
+#define CMPropertyMIStub(prefix, provider, brokerVariable, hook) \
+  static CMPIPropertyMIFT propMIFT__ = {                         \
+      CMPICurrentVersion,                                        \
+      CMPICurrentVersion,                                        \
+      "property" #provider,                                      \
+      prefix##PropertyCleanup,                                   \
+      prefix##SetProperty,                                       \
+      prefix##GetProperty,                                       \
+      NULL,                                                      \
+  };                                                             \
+  CMPI_MI_FACTORY_(Property, provider, propMIFT__, brokerVariable, hook)
+
+#define CMIndicationMIStub(prefix, provider, brokerVariable, hook)                                              \
+  static CMPIIndicationMIFT indMIFT__ = {                                                                       \
+      CMPICurrentVersion,        CMPICurrentVersion,         "indication" #provider, prefix##IndicationCleanup, \
+      prefix##AuthorizeFilter,   prefix##MustPoll,           prefix##ActivateFilter, prefix##DeActivateFilter,  \
+      prefix##EnableIndications, prefix##DisableIndications,                                                    \
+  };                                                                                                            \
+  CMPI_MI_FACTORY_(Indication, provider, indMIFT__, brokerVariable, hook)
 
 #endif /* CMPIMACS_H_ */

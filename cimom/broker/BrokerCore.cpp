@@ -42,6 +42,12 @@ void BrokerCore::requireNamespace(std::string_view nameSpace) const {
   }
 }
 
+void logError(const BrokerCore& core, std::string_view text) {
+  if (core.log) {
+    core.log(CMPI_SEV_ERROR, "cimomd", text);
+  }
+}
+
 BrokerCore& coreOf(const CMPIBroker* broker) {
   if (!broker || !broker->hdl) {
     throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "CMPIBroker must not be null");

@@ -33,6 +33,9 @@ struct BrokerCore {
   CMPIBroker broker;
 };
 
+// Logs what the object manager itself has to say.
+void logError(const BrokerCore& core, std::string_view text);
+
 // Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the broker or its handle is null.
 BrokerCore& coreOf(const CMPIBroker* broker);
 

@@ -28,7 +28,7 @@ Value arrayFromCmpi(const CMPIArray* array, CMPIType stored) {
   }
   const Array& source = modelOf<Array>(array);
   if (source.elementType != elementTypeOf(stored)) {
-    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
+    throw StatusError(CMPI_RC_ERR_TYPE_MISMATCH,
                       "expected " + describeType(stored) + ", not " + describeType(arrayOf(source.elementType)));
   }
   return Value::array(source);

@@ -42,10 +42,11 @@ CMPIString* newString(const CMPIBroker* broker, const char* text, CMPIStatus* st
   return made(broker, status, [&] { return make(Text{required(text, "the text")}); });
 }
 
+// An array of no type has room for nulls alone.
 CMPIArray* newArray(const CMPIBroker* broker, CMPICount count, CMPIType type, CMPIStatus* status) {
   return made(broker, status, [&] {
     const Value element = fromCmpi(nullptr, type);
-    if (type == CMPI_null || isArray(type)) {
+    if (isArray(type)) {
       throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, "array elements cannot be of CMPI type " + std::to_string(type));
     }
     return make(Array{element.type(), std::vector<Value>(count, element)});
@@ -85,13 +86,51 @@ struct AnyObject {
   const void* ft;
 };
 
+// Appends to a text that is not to grow without end. Returns whether there was room.
+bool append(std::string& text, const std::string& more) {
+  constexpr std::size_t most = 4096;
+  const bool hasRoom = text.size() < most;
+  text += hasRoom ? more : "…";
+  return hasRoom;
+}
+
+// "{name=value,…}"
+std::string listed(const NamedValues& values) {
+  std::string list = "{";
+  for (const auto& [name, value] : values) {
+    if (!append(list, (list.size() > 1 ? "," : "") + name + "=" + value.toString())) {
+      break;
+    }
+  }
+  return list + "}";
+}
+
+std::string listed(const std::vector<Value>& values) {
+  std::string list = "{";
+  for (const Value& value : values) {
+    if (!append(list, (list.size() > 1 ? "," : "") + value.toString())) {
+      break;
+    }
+  }
+  return list + "}";
+}
+
+// The path, and the properties that have a value.
+std::string described(const Instance& instance) {
+  NamedValues properties;
+  for (std::size_t index = 0; index < instance.size(); ++index) {
+    if (!instance[index].isNull()) {
+      properties.set(instance.definition().properties[index].name, instance[index]);
+    }
+  }
+  return instance.path().toString() + " " + listed(properties);
+}
+
 struct ObjectType {
   const void* table;
   const char* name;
   std::string (*describe)(const void* object);
 };
-
-std::string bareName(const char* name) { return name; }
 
 template <typename Model>
 ObjectType typeRow(std::string (*describe)(const void* object)) {
@@ -108,13 +147,13 @@ const ObjectType& typeOf(const void* object) {
   static const ObjectType types[] = {
       typeRow<Text>([](const void* any) { return std::string(textOf(static_cast<const CMPIString*>(any))); }),
       typeRow<ObjectPath>([](const void* any) { return modelBehind<ObjectPath>(any).toString(); }),
-      typeRow<Instance>([](const void* any) { return Value::instance(modelBehind<Instance>(any)).toString(); }),
+      typeRow<Instance>([](const void* any) { return described(modelBehind<Instance>(any)); }),
       typeRow<Array>([](const void* any) { return Value::array(modelBehind<Array>(any)).toString(); }),
       typeRow<DateTime>([](const void* any) { return modelBehind<DateTime>(any).format(); }),
-      typeRow<Enumeration>([](const void*) { return bareName(Abi<Enumeration>::name); }),
-      typeRow<Args>([](const void*) { return bareName(Abi<Args>::name); }),
-      typeRow<Context>([](const void*) { return bareName(Abi<Context>::name); }),
-      typeRow<Result>([](const void*) { return bareName(Abi<Result>::name); }),
+      typeRow<Enumeration>([](const void* any) { return listed(modelBehind<Enumeration>(any).items); }),
+      typeRow<Args>([](const void* any) { return listed(modelBehind<Args>(any).arguments); }),
+      typeRow<Context>([](const void* any) { return listed(modelBehind<Context>(any).entries); }),
+      typeRow<Result>([](const void* any) { return listed(modelBehind<Result>(any).items); }),
       typeRow<Error>([](const void* any) { return modelBehind<Error>(any).message.value_or(""); }),
   };
   const auto* any = static_cast<const AnyObject*>(object);
@@ -203,7 +242,7 @@ std::string messageText(const std::string& message, CMPICount count, std::va_lis
   return result;
 }
 
-// There are no message files: the caller's text is the message, with its arguments put in.
+// No message file is there: the caller's text is the message, with its arguments put in.
 CMPIString* defaultMessage(const CMPIBroker* broker, const char* text, CMPIStatus* status, CMPICount count,
                            std::va_list arguments) {
   return made(broker, status,
@@ -228,18 +267,23 @@ CMPIString* getMessage2(const CMPIBroker* broker, const char*, const CMPIMsgFile
   return message;
 }
 
-CMPIStatus openMessageFile(const CMPIBroker* broker, const char*, CMPIMsgFileHandle* file) {
+// There are no message files, so that none is found; with the null handle that this leaves, a message is its default.
+CMPIStatus openMessageFile(const CMPIBroker* broker, const char* name, CMPIMsgFileHandle* file) {
   return guarded([&] {
     coreOf(broker);
     if (file) {
       *file = nullptr;
     }
-    throw StatusError(CMPI_RC_ERR_NOT_SUPPORTED, "message files are not supported");
+    throw StatusError(CMPI_RC_ERR_NOT_FOUND,
+                      std::string("no message file \"") + required(name, "the file's name") + "\"");
   });
 }
 
 CMPIStatus closeMessageFile(const CMPIBroker* broker, const CMPIMsgFileHandle) {
-  return openMessageFile(broker, nullptr, nullptr);
+  return guarded([&] {
+    coreOf(broker);
+    throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "not the handle of an open message file");
+  });
 }
 
 // The text of a message comes as characters or as a string; the characters win if both are there.

@@ -13,6 +13,7 @@
 #include <type_traits>
 
 #include "cimom/broker/BrokerCore.h"
+#include "cimom/broker/ProviderFrame.h"
 
 namespace Cimom {
 namespace {
@@ -50,7 +51,13 @@ int joinThread(CMPI_THREAD_TYPE thread, CMPI_THREAD_RETURN* result) {
   return thread ? pthread_join(threadOf(thread), result) : EINVAL;
 }
 
-int exitThread(CMPI_THREAD_RETURN result) { pthread_exit(result); }
+// A thread of the object manager's is not the provider's to end: on one, this ends the provider's call.
+int exitThread(CMPI_THREAD_RETURN result) {
+  if (ProviderFrame::isOnThisThread()) {
+    throw ThreadExit();
+  }
+  pthread_exit(result);
+}
 
 int cancelThread(CMPI_THREAD_TYPE thread) { return thread ? pthread_cancel(threadOf(thread)) : EINVAL; }
 

@@ -21,9 +21,11 @@ inline CMPIStatus makeStatus(CMPIrc code, const char* message) noexcept {
   return status;
 }
 
-// Runs what stands behind a slot of a function table: no exception passes the binary interface.
+// Runs what stands behind a slot of a function table: no exception passes the binary interface. What may pass is the
+// unwinding of a thread that a provider ends (ProviderFrame.h), which a noexcept here would turn into the process's
+// end.
 template <typename Operation>
-CMPIStatus guarded(Operation operation) noexcept {
+CMPIStatus guarded(Operation operation) {
   try {
     operation();
     return {CMPI_RC_OK, nullptr};
@@ -36,7 +38,7 @@ CMPIStatus guarded(Operation operation) noexcept {
 
 // The same for a slot that returns a result and reports through a status pointer, which may be null.
 template <typename Given, typename Operation>
-Given guarded(CMPIStatus* status, Given failure, Operation operation) noexcept {
+Given guarded(CMPIStatus* status, Given failure, Operation operation) {
   Given result = failure;
   const CMPIStatus outcome = guarded([&] { result = operation(); });
   if (status) {

@@ -4,8 +4,13 @@
 namespace Cimom {
 namespace {
 
-CMPIValueState stateOf(const PropertyDeclaration& property) {
-  return property.isKey() ? CMPI_keyValue : CMPI_goodValue;
+// A property's value as it is read; one that nobody set has the type that it would have.
+CMPIData dataOf(const PropertyDeclaration& property, const Value& value) {
+  CMPIData data = toCmpi(value, property.isKey() ? CMPI_keyValue : CMPI_goodValue);
+  if (value.isNull()) {
+    data.type = property.valueType();
+  }
+  return data;
 }
 
 CMPIData getProperty(const CMPIInstance* instance, const char* name, CMPIStatus* status) {
@@ -15,7 +20,7 @@ CMPIData getProperty(const CMPIInstance* instance, const char* name, CMPIStatus*
     if (!value) {
       throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, model.definition().name + " has no property \"" + name + "\"");
     }
-    return toCmpi(*value, stateOf(*model.definition().findProperty(name)));
+    return dataOf(*model.definition().findProperty(name), *value);
   });
 }
 
@@ -27,7 +32,7 @@ CMPIData getPropertyAt(const CMPIInstance* instance, CMPICount index, CMPIString
                         model.definition().name + " has no property at index " + std::to_string(index));
     }
     const PropertyDeclaration& property = model.definition().properties[index];
-    const CMPIData data = toCmpi(model[index], stateOf(property));
+    const CMPIData data = dataOf(property, model[index]);
     if (name) {
       *name = make(Text{property.name});
     }

@@ -8,6 +8,7 @@
 #include <string>
 #include <vector>
 
+#include "cimom/broker/RequestScope.h"
 #include "cimom/model/Value.h"
 
 namespace Cimom {
@@ -18,6 +19,7 @@ struct Text {
 
 struct Context {
   NamedValues entries;
+  Deadline deadline;  // of the request that it belongs to, for a thread that is attached with it
 };
 
 struct Args {

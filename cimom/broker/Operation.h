@@ -17,7 +17,8 @@ namespace Cimom {
 
 // One operation on its way to the providers: the object manager, the caller's context and the path that it is for.
 struct Operation {
-  // Throws StatusError for a null broker, context or path, an unknown namespace or an unknown class.
+  // Throws StatusError for a null broker, context or path, an unknown namespace or an unknown class,
+  //         and after the deadline of the request.
   Operation(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path);
 
   BrokerCore& core;
@@ -55,6 +56,10 @@ class OperationHandler {
   virtual std::vector<Value> references(const Operation& operation, const AssociationFilter& filter,
                                         const char** properties) = 0;
   virtual std::vector<Value> referenceNames(const Operation& operation, const AssociationFilter& filter) = 0;
+
+  // What a method of the operation's class returns; its output arguments are added to `out`.
+  virtual Value invokeMethod(const Operation& operation, const MethodDeclaration& method, const NamedValues& in,
+                             NamedValues& out) = 0;
 };
 
 }  // namespace Cimom

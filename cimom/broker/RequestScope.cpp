@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/broker/RequestScope.h"
 
+#include <algorithm>
+
 #include "cimom/broker/Handle.h"
 
 namespace Cimom {
@@ -8,12 +10,16 @@ namespace {
 
 thread_local RequestScope* innermost = nullptr;
 
+Deadline earlier(const Deadline& one, const Deadline& other) {
+  return one && other ? std::min(*one, *other) : one ? one : other;
+}
+
 }  // namespace
 
-RequestScope::RequestScope(const CMPIBroker* broker) : RequestScope(broker, false) {}
+RequestScope::RequestScope(const CMPIBroker* broker, Deadline deadline) : RequestScope(broker, deadline, false) {}
 
-RequestScope::RequestScope(const CMPIBroker* broker, bool opened)
-    : broker_(broker), outer_(innermost), opened_(opened) {
+RequestScope::RequestScope(const CMPIBroker* broker, Deadline deadline, bool opened)
+    : broker_(broker), outer_(innermost), deadline_(earlier(deadline, currentDeadline())), opened_(opened) {
   innermost = this;
 }
 
@@ -26,7 +32,7 @@ RequestScope::~RequestScope() {
 
 CMPIContext* RequestScope::context() {
   if (!context_) {
-    auto handle = std::make_unique<Handle<Context>>(Context{});
+    auto handle = std::make_unique<Handle<Context>>(Context{{}, deadline_});
     context_ = handle.get();
     adopt(std::move(handle));
   }
@@ -37,12 +43,16 @@ RequestScope* RequestScope::current() { return innermost; }
 
 const CMPIBroker* RequestScope::currentBroker() { return innermost ? innermost->broker_ : nullptr; }
 
+Deadline RequestScope::currentDeadline() { return innermost ? innermost->deadline_ : std::nullopt; }
+
 void RequestScope::adopt(std::unique_ptr<Object> object) {
   object->inScope = true;
   objects_.push_back(std::move(object));
 }
 
-RequestScope* RequestScope::open(const CMPIBroker* broker) { return new RequestScope(broker, true); }
+RequestScope* RequestScope::open(const CMPIBroker* broker, Deadline deadline) {
+  return new RequestScope(broker, deadline, true);
+}
 
 bool RequestScope::close(const RequestScope* opened) {
   const RequestScope* scope = innermost;

@@ -3,7 +3,9 @@
 
 #include <cmpift.h>
 
+#include <chrono>
 #include <memory>
+#include <optional>
 #include <vector>
 
 namespace Cimom {
@@ -20,12 +22,16 @@ class Object {
   bool inScope = false;
 };
 
+// The moment after which up-calls fail; none: they never do.
+using Deadline = std::optional<std::chrono::steady_clock::time_point>;
+
 // The memory of one request. Every CMPI object that is made on this thread while the scope is the innermost one dies
 // with it, and so does what the operations on such objects return. Scopes nest. Outside any scope an object belongs
-// to who made it and goes with its release; a clone always does.
+// to who made it and goes with its release; a clone always does. A request may have a deadline, which the scopes inside
+// it and the threads that its providers attach share.
 class RequestScope {
  public:
-  explicit RequestScope(const CMPIBroker* broker);
+  explicit RequestScope(const CMPIBroker* broker, Deadline deadline = {});
   ~RequestScope();
   RequestScope(const RequestScope&) = delete;
   RequestScope& operator=(const RequestScope&) = delete;
@@ -37,19 +43,22 @@ class RequestScope {
   static RequestScope* current();
   // The broker of the innermost scope of this thread, or null.
   static const CMPIBroker* currentBroker();
+  // The deadline of the innermost scope of this thread.
+  static Deadline currentDeadline();
 
   void adopt(std::unique_ptr<Object> object);
 
   // Opens a scope on this thread that a later call of `close`, or the end of an outer scope, ends.
-  static RequestScope* open(const CMPIBroker* broker);
+  static RequestScope* open(const CMPIBroker* broker, Deadline deadline = {});
   // Ends an opened scope and those inside it. Returns false if it is not an open scope of this thread.
   static bool close(const RequestScope* opened);
 
  private:
-  RequestScope(const CMPIBroker* broker, bool opened);
+  RequestScope(const CMPIBroker* broker, Deadline deadline, bool opened);
 
   const CMPIBroker* broker_;
   RequestScope* outer_;
+  Deadline deadline_;
   bool opened_;
   CMPIContext* context_ = nullptr;
   std::vector<std::unique_ptr<Object>> objects_;

@@ -105,14 +105,23 @@ CMPIEnumeration* referenceNames(const CMPIBroker* broker, const CMPIContext* con
   });
 }
 
-// Method providers are not served: what a class declares is there but cannot be called.
 CMPIData invokeMethod(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
-                      const char* method, const CMPIArgs*, CMPIArgs*, CMPIStatus* status) {
-  return guarded(status, noData, [&]() -> CMPIData {
+                      const char* method, const CMPIArgs* in, CMPIArgs* out, CMPIStatus* status) {
+  return guarded(status, noData, [&] {
     const Operation operation(broker, context, path);
-    const bool declared = operation.definition.findMethod(required(method, "the method's name"));
-    throw StatusError(declared ? CMPI_RC_ERR_METHOD_NOT_AVAILABLE : CMPI_RC_ERR_METHOD_NOT_FOUND,
-                      operation.definition.name + "." + method + (declared ? " has no provider" : " is not declared"));
+    const MethodDeclaration* declared = operation.definition.findMethod(required(method, "the method's name"));
+    if (!declared) {
+      throw StatusError(CMPI_RC_ERR_METHOD_NOT_FOUND, operation.definition.name + " has no method \"" + method + "\"");
+    }
+    NamedValues returned;
+    const NamedValues given = in ? modelOf<Args>(in).arguments : NamedValues();
+    const Value value = operation.core.operations->invokeMethod(operation, *declared, given, returned);
+    for (const auto& [name, argument] : returned) {
+      if (out) {
+        modelOf<Args>(out).arguments.set(name, argument);
+      }
+    }
+    return toCmpi(value);
   });
 }
 
@@ -165,11 +174,11 @@ thread_local RequestScope* attached = nullptr;
 CMPIStatus attachThread(const CMPIBroker* broker, const CMPIContext* context) {
   return guarded([&] {
     coreOf(broker);
-    modelOf<Context>(context);
+    const Deadline deadline = modelOf<Context>(context).deadline;
     if (attached) {
       throw StatusError(CMPI_RC_ERR_FAILED, "the thread is already attached");
     }
-    attached = RequestScope::open(broker);
+    attached = RequestScope::open(broker, deadline);
   });
 }
 
@@ -192,7 +201,12 @@ Operation::Operation(const CMPIBroker* broker, const CMPIContext* callerContext,
     : core(coreOf(broker)),
       context(modelOf<Context>(callerContext)),
       path(modelOf<ObjectPath>(requested)),
-      definition(classFor(core, path)) {}
+      definition(classFor(core, path)) {
+  const Deadline deadline = RequestScope::currentDeadline();
+  if (deadline && std::chrono::steady_clock::now() >= *deadline) {
+    throw StatusError(CMPI_RC_ERR_FAILED, "the time limit of the request is over, " + path.className + " is not asked");
+  }
+}
 
 CMPIBrokerFT upCallTable = {
     .brokerCapabilities = CMPI_MB_InstanceManipulation | CMPI_MB_AssociationTraversal | CMPI_MB_BasicQualifierSupport |

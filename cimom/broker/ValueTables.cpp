@@ -62,7 +62,7 @@ CMPIStatus setElementAt(CMPIArray* array, CMPICount index, const CMPIValue* valu
     if (element.isNull()) {
       element = Value::null(model.elementType);
     } else if (element.type() != model.elementType) {
-      throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE,
+      throw StatusError(CMPI_RC_ERR_TYPE_MISMATCH,
                         "expected " + describeType(model.elementType) + ", not " + describeType(element.type()));
     }
     model.elements[index] = std::move(element);

@@ -75,6 +75,13 @@ inline PropertyFilter filterOf(const std::optional<std::vector<std::string>>& na
   return names ? PropertyFilter(*names) : PropertyFilter();
 }
 
+// Tells providers who asks; nothing if nobody was asked.
+inline void addPrincipal(const CMPIContext* context, const std::string& user) {
+  if (!user.empty()) {
+    requireOk(CMAddContextEntry(context, CMPIPrincipal, user.c_str(), CMPI_chars));
+  }
+}
+
 // What the operations find that return many objects. Those that start from an instance take the name of the parameter
 // that names it, which is another one if the result is pulled.
 Found findInstances(Call& call);
@@ -118,5 +125,8 @@ void enumerateClasses(Call& call);
 void enumerateClassNames(Call& call);
 void getQualifier(Call& call);
 void enumerateQualifiers(Call& call);
+
+// A method of a class; writes RETURNVALUE, unless it returns null, and a PARAMVALUE for each output argument.
+void callMethod(const OperationContext& manager, const Request& request, XmlWriter& xml);
 
 }  // namespace Cimom::CimXml

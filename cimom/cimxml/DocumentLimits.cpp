@@ -80,7 +80,10 @@ class Scan {
     while (position_ < markup_.size()) {
       if (current() != '<') {
         advance();
-      } else if (markup_.has(position_, "<!--")) {
+        continue;
+      }
+      countNode();
+      if (markup_.has(position_, "<!--")) {
         skipTo("-->");
       } else if (markup_.has(position_, "<![CDATA[")) {
         skipTo("]]>");
@@ -146,15 +149,20 @@ class Scan {
       advance();
     }
     if (!isEnd) {
-      countElement(markup_.text(begin, position_));
+      countName(markup_.text(begin, position_));
     }
     readAttributes(markup_.has(begin, "!"));
   }
 
-  void countElement(const std::string& name) {
-    if (++elements_ > DocumentLimits::elements) {
-      refuse("request-not-valid", "more than " + std::to_string(DocumentLimits::elements) + " elements");
+  // Whatever begins with <, but the end of an element, becomes a node in the parser's memory.
+  void countNode() {
+    if (!markup_.has(position_, "</") && ++nodes_ > DocumentLimits::elements) {
+      refuse("request-not-valid",
+             "more than " + std::to_string(DocumentLimits::elements) + " elements, comments and the like");
     }
+  }
+
+  void countName(const std::string& name) {
     names_.insert(name);
     if (names_.size() > DocumentLimits::elementNames) {
       refuse("request-not-valid", "more than " + std::to_string(DocumentLimits::elementNames) + " different elements");
@@ -192,7 +200,7 @@ class Scan {
   const Markup markup_;
   std::size_t position_ = 0;
   std::size_t line_ = 1;
-  std::size_t elements_ = 0;
+  std::size_t nodes_ = 0;
   std::set<std::string> names_;
 };
 

@@ -9,7 +9,7 @@ namespace Cimom::CimXml {
 // What a request may consist of. No client comes near; beyond, the parser's and the reader's cost grows with the
 // square.
 struct DocumentLimits {
-  static constexpr std::size_t elements = 65536;
+  static constexpr std::size_t elements = 65536;   // comments, instructions and sections of character data included
   static constexpr std::size_t elementNames = 64;  // different ones
   static constexpr std::size_t attributes = 32;    // of one element
 };

@@ -16,8 +16,16 @@ namespace {
 // What RFC 9110 calls the methods that a server may know and not allow; any other method is not implemented.
 constexpr std::array<std::string_view, 6> otherMethods = {"GET", "HEAD", "PUT", "DELETE", "OPTIONS", "TRACE"};
 
-Http::Response plain(unsigned status, const std::string& text) {
-  Http::Response response{status, {}, text + "\n"};
+// What an answer quotes of a request may be as long as the request.
+constexpr std::size_t longestDescription = 4096;
+
+std::string shortened(std::string_view text) {
+  return text.size() <= longestDescription ? std::string(text)
+                                           : std::string(text.substr(0, longestDescription)) + " ...";
+}
+
+Http::Response plain(unsigned status, std::string_view text) {
+  Http::Response response{status, {}, shortened(text) + "\n"};
   response.headers.add("Content-Type", "text/plain; charset=\"utf-8\"");
   return response;
 }
@@ -50,7 +58,7 @@ std::string responseMessage(const Request& request, Content content) {
 std::string errorMessage(const Request& request, int code, const char* description) {
   return responseMessage(request, [&](XmlWriter& xml) {
     const auto error = xml.element("ERROR", "CODE", std::to_string(code));
-    xml.attribute("DESCRIPTION", description);
+    xml.attribute("DESCRIPTION", shortened(description));
   });
 }
 

@@ -123,52 +123,98 @@ ObjectBuilder::TypedValue ObjectBuilder::propertyValue(const ObjectName& owner, 
     throw OperationError(CMPI_RC_ERR_NO_SUCH_PROPERTY,
                          "class " + definition->name + " has no property " + property.name);
   }
-  return typed(property, declared->type);
+  return typed("property " + property.name, property, declared->valueType());
 }
 
-ObjectBuilder::TypedValue ObjectBuilder::typed(const Property& property, CMPIType type) const {
+ObjectBuilder::TypedValue ObjectBuilder::argument(const PropertyDeclaration& declared, const Parameter& given) const {
+  Property property{declared.name, given.type, false, {}};
+  std::visit(
+      [&property](const auto& value) {
+        if constexpr (std::is_constructible_v<Value, decltype(value)>) {
+          property.value = value;
+        }
+      },
+      given.value);
+  const bool isNull = std::holds_alternative<std::monostate>(property.value);
+  property.isArray =
+      isNull ? isArray(declared.type)
+             : std::holds_alternative<Texts>(property.value) || std::holds_alternative<ObjectNames>(property.value);
+  try {
+    return typed("parameter " + declared.name, property, declared.valueType());
+  } catch (const OperationError& error) {
+    throw OperationError(
+        error.code() == CMPI_RC_ERR_TYPE_MISMATCH ? static_cast<int>(CMPI_RC_ERR_INVALID_PARAMETER) : error.code(),
+        error.what());
+  }
+}
+
+ObjectBuilder::TypedValue ObjectBuilder::typed(const std::string& what, const Property& property, CMPIType type) const {
   const CMPIType elementType = elementTypeOf(type);
   const bool isArray = elementType != type;
-  const std::string declaredName = describeType(type);
+  const std::string mustBe = what + " must be of type " + describeType(type);
   TypedValue typed{{}, type, false};
   if (!property.type.empty() && (property.type != xmlTypeName(type) || property.isArray != isArray)) {
-    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "property " + property.name + " must be of type " + declaredName +
-                                                        ", not " + property.type + (property.isArray ? "[]" : ""));
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, mustBe + ", not " + property.type + (property.isArray ? "[]" : ""));
   }
-  if (const auto* text = std::get_if<std::string>(&property.value); text && !isArray && type != CMPI_ref) {
-    if (!scalar(type, *text, typed.value)) {
-      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "property " + property.name + " must be of type " + declaredName +
-                                                          ", not \"" + *text + "\"");
-    }
-  } else if (const auto* texts = std::get_if<Texts>(&property.value); texts && isArray) {
-    typed.value.array = array(property, *texts, elementType);
+  if (const auto* single = std::get_if<std::string>(&property.value); single && !isArray && type != CMPI_ref) {
+    text(what, *single, type, typed.value);
+  } else if (const auto* texts = std::get_if<Texts>(&property.value); texts && isArray && elementType != CMPI_ref) {
+    typed.value.array = array(*texts, elementType, [&](CMPICount index, const std::string& one, CMPIValue& value) {
+      text("element " + std::to_string(index) + " of " + what, one, elementType, value);
+    });
   } else if (const auto* name = std::get_if<ObjectName>(&property.value); name && type == CMPI_ref) {
     typed.value.ref = path(*name);
+  } else if (const auto* names = std::get_if<ObjectNames>(&property.value);
+             names && isArray && elementType == CMPI_ref) {
+    typed.value.array =
+        array(*names, elementType, [&](CMPICount, const ObjectName& one, CMPIValue& value) { value.ref = path(one); });
   } else if (std::holds_alternative<std::monostate>(property.value)) {
     typed.isNull = true;
   } else {
-    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "property " + property.name + " must be of type " + declaredName);
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, mustBe);
   }
   return typed;
 }
 
-CMPIArray* ObjectBuilder::array(const Property& property, const Texts& texts, CMPIType elementType) const {
+template <typename Elements, typename Read>
+CMPIArray* ObjectBuilder::array(const Elements& elements, CMPIType elementType, Read read) const {
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIArray* array = CMNewArray(broker_, static_cast<CMPICount>(texts.size()), elementType, &status);
+  CMPIArray* array = CMNewArray(broker_, static_cast<CMPICount>(elements.size()), elementType, &status);
   requireOk(status, array);
-  for (CMPICount i = 0; i < texts.size(); ++i) {
-    if (!texts[i]) {
+  for (CMPICount i = 0; i < elements.size(); ++i) {
+    if (!elements[i]) {
       continue;  // an element is null until it is set
     }
     CMPIValue value{};
-    if (!scalar(elementType, *texts[i], value)) {
-      throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, "element " + std::to_string(i) + " of property " + property.name +
-                                                          " must be of type " + describeType(elementType) + ", not \"" +
-                                                          *texts[i] + "\"");
-    }
+    read(i, *elements[i], value);
     requireOk(CMSetArrayElementAt(array, i, &value, elementType));
   }
   return array;
+}
+
+void ObjectBuilder::text(const std::string& what, const std::string& text, CMPIType type, CMPIValue& value) const {
+  if (type == CMPI_instance) {
+    value.inst = embedded(what, text);
+  } else if (!scalar(type, text, value)) {
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH,
+                         what + " must be of type " + describeType(type) + ", not \"" + text + "\"");
+  }
+}
+
+CMPIInstance* ObjectBuilder::embedded(const std::string& what, const std::string& text) const {
+  // Far more than any class has.
+  constexpr unsigned deepest = 16;
+  if (depth_ == deepest) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
+                         "instances are embedded more than " + std::to_string(deepest) + " levels deep");
+  }
+  ObjectBuilder within = *this;
+  ++within.depth_;
+  try {
+    return within.instance(readEmbeddedInstance(text));
+  } catch (const TransportError& error) {
+    throw OperationError(CMPI_RC_ERR_TYPE_MISMATCH, what + " must be the text of an INSTANCE: " + error.what());
+  }
 }
 
 bool ObjectBuilder::scalar(CMPIType type, const std::string& text, CMPIValue& value) const {

@@ -34,17 +34,24 @@ class ObjectBuilder {
   };
   TypedValue propertyValue(const ObjectName& owner, const Property& property) const;
 
+  // An argument of a method. One that does not fit its declaration is CIM_ERR_INVALID_PARAMETER.
+  TypedValue argument(const PropertyDeclaration& declared, const Parameter& given) const;
+
  private:
   const ClassDefinition* classOf(const ObjectName& name) const;
   void addKey(CMPIObjectPath* path, const ObjectName& name, const KeyBinding& key) const;
   TypedValue keyValue(const KeyBinding& key, CMPIType type) const;
-  TypedValue typed(const Property& property, CMPIType type) const;
-  CMPIArray* array(const Property& property, const Texts& texts, CMPIType elementType) const;
+  TypedValue typed(const std::string& what, const Property& property, CMPIType type) const;
+  template <typename Elements, typename Read>
+  CMPIArray* array(const Elements& elements, CMPIType elementType, Read read) const;
+  void text(const std::string& what, const std::string& text, CMPIType type, CMPIValue& value) const;
   bool scalar(CMPIType type, const std::string& text, CMPIValue& value) const;
+  CMPIInstance* embedded(const std::string& what, const std::string& text) const;
 
   const CMPIBroker* broker_;
   const ClassRepository& classes_;
   const std::string& nameSpace_;
+  unsigned depth_ = 0;  // of instances within instances
 };
 
 }  // namespace Cimom::CimXml

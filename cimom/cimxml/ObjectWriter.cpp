@@ -7,7 +7,6 @@
 
 #include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/ScalarText.h"
-#include "cimom/model/Names.h"
 #include "cimom/model/Types.h"
 
 namespace Cimom::CimXml {
@@ -36,11 +35,6 @@ const CMPIObjectPath* pathOf(const CMPIInstance* instance) {
 }
 
 }  // namespace
-
-bool PropertyFilter::includes(const char* name) const {
-  return !names_ || std::any_of(names_->begin(), names_->end(),
-                                [name](const std::string& candidate) { return sameName(candidate, name); });
-}
 
 void ObjectWriter::instanceName(const CMPIObjectPath* path) {
   const auto name = xml_.element("INSTANCENAME", "CLASSNAME", chars(CMGetClassName(path, nullptr)));
@@ -104,13 +98,21 @@ void ObjectWriter::property(const char* name, const CMPIData& data) {
     value(data);
     return;
   }
-  const char* type = xmlTypeName(data.type);
-  if (!type) {
+  if (!xmlTypeName(data.type)) {
     return;
   }
   const auto scope = xml_.element(CMIsArray(data) ? "PROPERTY.ARRAY" : "PROPERTY", "NAME", name);
-  xml_.attribute("TYPE", type);
+  type("TYPE", data.type);
   value(data);
+}
+
+void ObjectWriter::type(const char* attributeName, CMPIType type) {
+  if (const char* name = xmlTypeName(type)) {
+    xml_.attribute(attributeName, name);
+  }
+  if (elementTypeOf(type) == CMPI_instance) {
+    xml_.attribute("EmbeddedObject", "instance");
+  }
 }
 
 void ObjectWriter::namedInstance(const CMPIInstance* object) {
@@ -148,19 +150,22 @@ void ObjectWriter::reference(const CMPIObjectPath* path) {
 }
 
 void ObjectWriter::array(const CMPIData& data) {
-  const auto scope = xml_.element("VALUE.ARRAY");
+  const bool isReferences = elementTypeOf(data.type) == CMPI_ref;
+  const auto scope = xml_.element(isReferences ? "VALUE.REFARRAY" : "VALUE.ARRAY");
   const CMPICount count = CMGetArrayCount(data.value.array, nullptr);
   for (CMPICount i = 0; i < count; ++i) {
     const CMPIData element = CMGetArrayElementAt(data.value.array, i, nullptr);
     if (isNull(element)) {
       const auto null = xml_.element("VALUE.NULL");
+    } else if (isReferences) {
+      reference(element.value.ref);
     } else {
       xml_.textElement("VALUE", scalar(element.type, element.value));
     }
   }
 }
 
-// An embedded instance is the text of its own XML; the attribute that would say so makes older clients abort.
+// An embedded instance is the text of its own XML.
 std::string ObjectWriter::scalar(CMPIType type, const CMPIValue& value) const {
   if (type != CMPI_instance) {
     return formatScalar(type, value);

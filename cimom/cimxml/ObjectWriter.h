@@ -5,11 +5,14 @@
 #include <cmpidt.h>
 
 #include <optional>
+#include <set>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "cimom/cimxml/XmlWriter.h"
+#include "cimom/model/Names.h"
 
 namespace Cimom::CimXml {
 
@@ -17,12 +20,13 @@ namespace Cimom::CimXml {
 class PropertyFilter {
  public:
   PropertyFilter() = default;  // all of them
-  explicit PropertyFilter(std::vector<std::string> names) : names_(std::move(names)) {}
+  explicit PropertyFilter(const std::vector<std::string>& names) : names_(std::in_place, names.begin(), names.end()) {}
 
-  bool includes(const char* name) const;
+  bool includes(std::string_view name) const { return !names_ || names_->contains(name); }
 
  private:
-  std::optional<std::vector<std::string>> names_;
+  // Looked up for every property of every instance, and as long as a client likes.
+  std::optional<std::set<std::string, NameLess>> names_;
 };
 
 class ObjectWriter {
@@ -52,8 +56,12 @@ class ObjectWriter {
   // VALUE.INSTANCEWITHPATH, which is the same by another name.
   void instanceWithPath(const CMPIInstance* instance);
 
-  // VALUE, VALUE.ARRAY or VALUE.REFERENCE; nothing for a null value.
+  // VALUE, VALUE.ARRAY, VALUE.REFERENCE or VALUE.REFARRAY; nothing for a null value.
   void value(const CMPIData& data);
+
+  // The attributes of an element that say of which type its value is: TYPE, or by another name, and what a string
+  // embeds.
+  void type(const char* attributeName, CMPIType type);
 
  private:
   void keyBinding(const char* name, const CMPIData& data);

@@ -94,32 +94,14 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
                  (parameters.flag("IncludeQualifiers", false) ? CMPI_FLAG_IncludeQualifiers : 0) |
                  (parameters.flag("IncludeClassOrigin", false) ? CMPI_FLAG_IncludeClassOrigin : 0);
   requireOk(CMAddContextEntry(context, CMPIInvocationFlags, &flags, CMPI_uint32));
-  if (!manager.user.empty()) {
-    requireOk(CMAddContextEntry(context, CMPIPrincipal, manager.user.c_str(), CMPI_chars));
-  }
-}
-
-// Providers of methods are not taken, so a class's method is known at most.
-[[noreturn]] void refuseMethod(const OperationContext& manager, const Request& request) {
-  const std::string& className = request.target.className;
-  if (!manager.classes.hasNamespace(request.nameSpace)) {
-    throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
-  }
-  const ClassDefinition* definition = manager.classes.find(request.nameSpace, className);
-  if (!definition) {
-    throw OperationError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + className + "\"");
-  }
-  if (!definition->findMethod(request.method)) {
-    throw OperationError(CMPI_RC_ERR_METHOD_NOT_FOUND, "class " + className + " has no method " + request.method);
-  }
-  throw OperationError(CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "method " + request.method + " has no provider");
+  addPrincipal(context, manager.user);
 }
 
 }  // namespace
 
 void perform(const OperationContext& manager, const Request& request, XmlWriter& xml) {
   if (!request.isIntrinsic) {
-    refuseMethod(manager, request);
+    return callMethod(manager, request, xml);
   }
   const Operation& operation = findOperation(request.method);
   const Parameters parameters(request, operation.parameters);

@@ -21,7 +21,8 @@ struct OperationContext {
   const std::string& user;  // who has authenticated; empty if nobody was asked
 };
 
-// Performs a request's operation (DSP0200, 5.3) and writes what it returns as the content of IMETHODRESPONSE. All
+// Performs a request's operation (DSP0200, 5.3), or calls the method that it names, and writes what that returns as the
+// content of IMETHODRESPONSE or METHODRESPONSE. All
 // instances are the broker's: only class operations are answered from the class repository. Throws OperationError;
 // what was written is then of no use. An operation that is not offered is CIM_ERR_NOT_SUPPORTED.
 void perform(const OperationContext& context, const Request& request, XmlWriter& xml);

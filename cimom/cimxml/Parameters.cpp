@@ -12,6 +12,9 @@
 namespace Cimom::CimXml {
 namespace {
 
+// More than any class has. Providers go through the list for every instance.
+constexpr std::size_t mostProperties = 4096;
+
 [[noreturn]] void refuse(std::string_view name, const char* what) {
   throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter " + std::string(name) + " " + what);
 }
@@ -131,6 +134,9 @@ std::optional<std::vector<std::string>> Parameters::propertyList() const {
   const auto* texts = valueOf<Texts>(find("PropertyList"), "must be a list of names");
   if (!texts) {
     return std::nullopt;
+  }
+  if (texts->size() > mostProperties) {
+    refuse("PropertyList", "must not have more than 4096 names");
   }
   std::vector<std::string> names;
   for (const auto& text : *texts) {

@@ -138,18 +138,18 @@ Texts readArray(const Element& element) {
 }
 
 // VALUE.REFARRAY.
-References readReferences(const Element& element) {
-  References references;
+ObjectNames readReferences(const Element& element) {
+  ObjectNames names;
   for (auto child = element.first(); child; child = child->next()) {
     if (child->is("VALUE.REFERENCE")) {
-      references.emplace_back(readObjectName(child->only()));
+      names.emplace_back(readObjectName(child->only()));
     } else if (child->is("VALUE.NULL")) {
-      references.emplace_back(std::nullopt);
+      names.emplace_back(std::nullopt);
     } else {
-      child->refuse("is not an element of an array of references");
+      child->refuse("is not a reference");
     }
   }
-  return references;
+  return names;
 }
 
 Property readProperty(const Element& element) {
@@ -304,6 +304,15 @@ void readExtrinsicCall(const Element& call, Request& request) {
 ObjectName readNameElement(const Element& element) { return readObjectName(element); }
 
 Instance readInstanceElement(const Element& element) { return readInstance(element); }
+
+Instance readEmbeddedInstance(std::string_view xml) {
+  const Document document(xml);
+  const Element root = document.root();
+  if (!root.is("INSTANCE")) {
+    root.refuse("is not an instance");
+  }
+  return readPlainInstance(root);
+}
 
 Request readRequest(std::string_view xml) {
   const Document document(xml);

@@ -5,6 +5,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <variant>
 #include <vector>
 
@@ -38,8 +39,10 @@ struct KeyBinding {
 
 using Texts = std::vector<std::optional<std::string>>;  // an array's elements; one without a value is VALUE.NULL
 
-// No value, VALUE, VALUE.ARRAY, a reference.
-using Value = std::variant<std::monostate, std::string, Texts, ObjectName>;
+using ObjectNames = std::vector<std::optional<ObjectName>>;  // the same of an array of references
+
+// No value, VALUE, VALUE.ARRAY, a reference, VALUE.REFARRAY.
+using Value = std::variant<std::monostate, std::string, Texts, ObjectName, ObjectNames>;
 
 struct Property {
   std::string name;
@@ -54,8 +57,6 @@ struct Instance {
   std::vector<Property> properties;
 };
 
-using References = std::vector<std::optional<ObjectName>>;  // the same of VALUE.REFARRAY
-
 // CLASS or QUALIFIER.DECLARATION: no operation that takes one is offered, so only its name is kept.
 struct Declaration {
   std::string name;
@@ -64,7 +65,7 @@ struct Declaration {
 struct Parameter {
   std::string name;
   std::string type;  // the PARAMTYPE attribute; empty: none given
-  std::variant<std::monostate, std::string, Texts, ObjectName, References, Instance, Declaration> value;
+  std::variant<std::monostate, std::string, Texts, ObjectName, ObjectNames, Instance, Declaration> value;
 };
 
 struct Request {
@@ -85,5 +86,8 @@ Request readRequest(std::string_view xml);
 // "request-not-valid".
 ObjectName readNameElement(const Element& element);
 Instance readInstanceElement(const Element& element);
+
+// Takes the text of a value that embeds an INSTANCE. Throws TransportError as above.
+Instance readEmbeddedInstance(std::string_view xml);
 
 }  // namespace Cimom::CimXml

@@ -2,6 +2,7 @@
 #include "cimom/model/ClassDefinition.h"
 
 #include "cimom/model/Names.h"
+#include "cimom/model/Types.h"
 
 namespace Cimom {
 
@@ -12,6 +13,14 @@ const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view na
 bool isQualified(const Qualifiers& qualifiers, std::string_view name) {
   const Qualifier* qualifier = findQualifier(qualifiers, name);
   return qualifier && qualifier->value.isTrue();
+}
+
+CMPIType valueType(CMPIType type, const Qualifiers& qualifiers) {
+  if (elementTypeOf(type) != CMPI_string) {
+    return type;
+  }
+  const bool isEmbedded = findQualifier(qualifiers, "EmbeddedInstance") || isQualified(qualifiers, "EmbeddedObject");
+  return isEmbedded ? static_cast<CMPIType>(CMPI_instance | (type & CMPI_ARRAY)) : type;
 }
 
 const PropertyDeclaration* ClassDefinition::findProperty(std::string_view propertyName) const {

@@ -34,6 +34,10 @@ const Qualifier* findQualifier(const Qualifiers& qualifiers, std::string_view na
 // Whether a boolean qualifier is there and true.
 bool isQualified(const Qualifiers& qualifiers, std::string_view name);
 
+// The type of the values of what is declared with that type and those qualifiers: a string that embeds an instance or
+// object has instances as values.
+CMPIType valueType(CMPIType type, const Qualifiers& qualifiers);
+
 // A property of a class, or a parameter of a method.
 struct PropertyDeclaration {
   std::string name;
@@ -47,6 +51,7 @@ struct PropertyDeclaration {
 
   bool isKey() const { return isQualified(qualifiers, "Key"); }
   bool isReference() const { return !referenceClass.empty(); }
+  CMPIType valueType() const { return Cimom::valueType(type, qualifiers); }
 };
 
 struct MethodDeclaration {

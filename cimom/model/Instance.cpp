@@ -29,11 +29,11 @@ void Instance::set(std::string_view name, Value value) {
     return;
   }
   if (value.isNull()) {
-    value = Value::null(property->type);
-  } else if (value.type() != property->type) {
-    throw StatusError(CMPI_RC_ERR_INVALID_DATA_TYPE, definition_->name + "." + property->name + " must be of type " +
-                                                         describeType(property->type) + ", not " +
-                                                         describeType(value.type()));
+    value = Value::null(property->valueType());
+  } else if (value.type() != property->type && value.type() != property->valueType()) {
+    throw StatusError(CMPI_RC_ERR_TYPE_MISMATCH, definition_->name + "." + property->name + " must be of type " +
+                                                     describeType(property->type) + ", not " +
+                                                     describeType(value.type()));
   }
   if (filter_ && !filter_->contains(property->name) && !property->isKey()) {
     return;

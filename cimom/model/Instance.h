@@ -30,7 +30,7 @@ class Instance {
   const Value* find(std::string_view name) const;
 
   // Sets a property. A property that the class does not declare, or that the filter leaves out, is dropped.
-  // Throws StatusError CMPI_RC_ERR_INVALID_DATA_TYPE if the value's type is not the declared one.
+  // Throws StatusError CMPI_RC_ERR_TYPE_MISMATCH if the value's type is not the declared one.
   void set(std::string_view name, Value value);
 
   // From now on only the named properties and the keys take a value.

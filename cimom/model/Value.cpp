@@ -41,6 +41,13 @@ std::string quoted(std::string_view text) {
   return result + '"';
 }
 
+// The object of that type that a value shares, or null.
+template <typename T, typename Content>
+const T* shared(const Content& content) {
+  const auto* pointer = std::get_if<std::shared_ptr<const T>>(&content);
+  return pointer ? pointer->get() : nullptr;
+}
+
 // Every level of references within references would double the text of the innermost.
 std::string shortened(std::string text) {
   constexpr std::size_t most = 4096;
@@ -57,6 +64,10 @@ std::string shortened(std::string text) {
 
 }  // namespace
 
+Value::Value(CMPIType type, Content content) : type_(type), content_(std::move(content)) {
+  static_assert(copiesWithoutThrowing(static_cast<const Content*>(nullptr)));
+}
+
 Value Value::null(CMPIType type) { return Value(type, {}); }
 Value Value::boolean(bool value) { return Value(CMPI_boolean, scalarOf<CMPIBoolean>(value)); }
 Value Value::uint32(CMPIUint32 value) { return Value(CMPI_uint32, scalarOf(value)); }
@@ -65,7 +76,9 @@ Value Value::sint64(CMPISint64 value) { return Value(CMPI_sint64, scalarOf(value
 Value Value::real64(CMPIReal64 value) { return Value(CMPI_real64, scalarOf(value)); }
 Value Value::char16(CMPIChar16 value) { return Value(CMPI_char16, scalarOf(value)); }
 Value Value::scalar(CMPIType type, const CMPIValue& value) { return Value(type, value); }
-Value Value::string(std::string value) { return Value(CMPI_string, std::move(value)); }
+Value Value::string(std::string value) {
+  return Value(CMPI_string, std::make_shared<const std::string>(std::move(value)));
+}
 Value Value::dateTime(DateTime value) { return Value(CMPI_dateTime, value); }
 Value Value::reference(ObjectPath value) {
   return Value(CMPI_ref, std::make_shared<const ObjectPath>(std::move(value)));
@@ -83,20 +96,13 @@ bool Value::isTrue() const {
   return type_ == CMPI_boolean && content && content->boolean;
 }
 
-const ObjectPath* Value::path() const {
-  const auto* content = std::get_if<std::shared_ptr<const ObjectPath>>(&content_);
-  return content ? content->get() : nullptr;
-}
+const std::string* Value::text() const { return shared<std::string>(content_); }
 
-const Instance* Value::embedded() const {
-  const auto* content = std::get_if<std::shared_ptr<const Instance>>(&content_);
-  return content ? content->get() : nullptr;
-}
+const ObjectPath* Value::path() const { return shared<ObjectPath>(content_); }
 
-const Array* Value::elements() const {
-  const auto* content = std::get_if<std::shared_ptr<const Array>>(&content_);
-  return content ? content->get() : nullptr;
-}
+const Instance* Value::embedded() const { return shared<Instance>(content_); }
+
+const Array* Value::elements() const { return shared<Array>(content_); }
 
 std::optional<Value> Value::asInteger(CMPIType type) const {
   std::optional<Value> result;

@@ -8,6 +8,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <variant>
 #include <vector>
 
@@ -20,7 +21,8 @@ struct ObjectPath;
 class Instance;
 
 // A typed CIM value, possibly null: what properties, keys, arguments and array elements hold. Values of object types
-// are copies: nothing that happens to the object that they were taken from changes them.
+// are copies: nothing that happens to the object that they were taken from changes them. A copy shares what it holds,
+// so that copying never throws.
 class Value {
  public:
   // Null, of no type.
@@ -49,7 +51,7 @@ class Value {
   // A value of a type that CMPI passes by value, or null.
   const CMPIValue* scalar() const { return std::get_if<CMPIValue>(&content_); }
   // The text of a CMPI_string, or null.
-  const std::string* text() const { return std::get_if<std::string>(&content_); }
+  const std::string* text() const;
   // The time stamp or interval of a CMPI_dateTime, or null.
   const DateTime* time() const { return std::get_if<DateTime>(&content_); }
   // The path of a reference, or null.
@@ -68,10 +70,17 @@ class Value {
   std::string toString() const;
 
  private:
-  using Content = std::variant<std::monostate, CMPIValue, std::string, DateTime, std::shared_ptr<const ObjectPath>,
-                               std::shared_ptr<const Instance>, std::shared_ptr<const Array>>;
+  using Content =
+      std::variant<std::monostate, CMPIValue, DateTime, std::shared_ptr<const std::string>,
+                   std::shared_ptr<const ObjectPath>, std::shared_ptr<const Instance>, std::shared_ptr<const Array>>;
 
-  Value(CMPIType type, Content content) : type_(type), content_(std::move(content)) {}
+  // What a variant does whose copy throws is not to be relied on.
+  template <typename... Types>
+  static constexpr bool copiesWithoutThrowing(const std::variant<Types...>*) {
+    return (std::is_nothrow_copy_constructible_v<Types> && ...);
+  }
+
+  Value(CMPIType type, Content content);
 
   CMPIType type_ = CMPI_null;
   Content content_;

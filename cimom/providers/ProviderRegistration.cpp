@@ -116,8 +116,10 @@ class StanzaReader {
       current_.instance = true;
     } else if (type == "association") {
       current_.association = true;
+    } else if (type == "method") {
+      current_.method = true;
     } else {
-      fail("unknown type \"" + type + "\": must be instance or association");
+      fail("unknown type \"" + type + "\": must be instance, association or method");
     }
   }
 
@@ -132,7 +134,7 @@ class StanzaReader {
     };
     require(!current_.provider.empty(), "provider");
     require(!current_.location.empty(), "location");
-    require(current_.instance || current_.association, "type");
+    require(current_.instance || current_.association || current_.method, "type");
     require(!current_.namespaces.empty(), "namespace");
     done_.push_back(std::move(current_));
     stanza_ = false;

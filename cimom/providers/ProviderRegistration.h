@@ -6,6 +6,7 @@
 #include <filesystem>
 #include <functional>
 #include <string>
+#include <tuple>
 #include <vector>
 
 namespace Cimom {
@@ -19,18 +20,23 @@ struct ProviderRegistration {
   bool association = false;
   std::vector<std::string> namespaces;
   std::string registeredAt;  // "FILE:LINE", for messages
+  bool method = false;
 };
 
 // A provider's factory functions, as CMPI defines them.
-using InstanceFactory = std::function<CMPIInstanceMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
-using AssociationFactory = std::function<CMPIAssociationMI*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
+template <typename Mi>
+using ProviderFactory = std::function<Mi*(const CMPIBroker*, const CMPIContext*, CMPIStatus*)>;
+using InstanceFactory = ProviderFactory<CMPIInstanceMI>;
+using AssociationFactory = ProviderFactory<CMPIAssociationMI>;
+using MethodFactory = ProviderFactory<CMPIMethodMI>;
+using ProviderFactories = std::tuple<InstanceFactory, AssociationFactory, MethodFactory>;
 
 // Reads a registration file, or every *.reg of a directory: one stanza per class,
 //
 //     [ClassName]
 //        provider: ProviderName
 //        location: library
-//        type: instance association
+//        type: instance association method
 //        namespace: root/cimv2
 //     #
 //

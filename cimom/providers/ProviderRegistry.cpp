@@ -3,6 +3,7 @@
 
 #include <algorithm>
 
+#include "cimom/broker/BrokerCore.h"
 #include "cimom/model/Errors.h"
 #include "cimom/model/Names.h"
 
@@ -14,8 +15,11 @@ bool ProviderRegistry::Entry::serves(std::string_view nameSpace) const {
   });
 }
 
-ProviderRegistry::~ProviderRegistry() {
-  std::for_each(providers_.rbegin(), providers_.rend(), [&](const auto& provider) { provider->cleanUp(broker_); });
+bool ProviderRegistry::cleanUp() {
+  bool allEnded = true;
+  std::for_each(providers_.rbegin(), providers_.rend(),
+                [&](const auto& provider) { allEnded = provider->cleanUp(broker_, limit_) && allEnded; });
+  return allEnded;
 }
 
 void ProviderRegistry::add(const ProviderRegistration& registration) {
@@ -31,17 +35,15 @@ void ProviderRegistry::add(const ProviderRegistration& registration) {
   providers_.push_back(std::move(provider));
 }
 
-void ProviderRegistry::add(const ProviderRegistration& registration, InstanceFactory instanceFactory,
-                           AssociationFactory associationFactory) {
+void ProviderRegistry::add(const ProviderRegistration& registration, ProviderFactories factories) {
   const auto known = std::ranges::find_if(providers_, [&](const auto& provider) {
     return provider->isLinked() && provider->name() == registration.provider;
   });
   if (known != providers_.end()) {
-    (*known)->complete(std::move(instanceFactory), std::move(associationFactory));
+    (*known)->complete(std::move(factories));
     return addEntry(registration, known->get());
   }
-  auto provider =
-      std::make_unique<Provider>(registration.provider, std::move(instanceFactory), std::move(associationFactory));
+  auto provider = std::make_unique<Provider>(registration.provider, std::move(factories));
   addEntry(registration, provider.get());
   providers_.push_back(std::move(provider));
 }
@@ -65,18 +67,33 @@ void ProviderRegistry::addEntry(const ProviderRegistration& registration, Provid
 }
 
 void ProviderRegistry::load() const {
-  for (const auto& [registration, provider] : entries_) {
-    try {
-      if (registration.instance) {
-        provider->instanceMi(broker_);
-      }
-      if (registration.association) {
-        provider->associationMi(broker_);
-      }
-    } catch (const StatusError& error) {
-      throw ConfigurationError((registration.registeredAt.empty() ? "" : registration.registeredAt + ": ") +
-                               "provider " + registration.provider + ": " + error.what());
+  std::vector<std::string> failures;  // one of a kind for each provider
+  std::size_t made = 0;
+  const auto make = [&](const Entry& entry, bool isRegistered, auto interface) {
+    if (!isRegistered) {
+      return;
     }
+    try {
+      (entry.provider->*interface)(broker_, limit_);
+      ++made;
+    } catch (const StatusError& error) {
+      const std::string& place = entry.registration.registeredAt;
+      const std::string what = "provider " + entry.registration.provider + ": " + error.what();
+      if (std::ranges::none_of(failures, [&](const std::string& one) { return one.ends_with(what); })) {
+        failures.push_back((place.empty() ? "" : place + ": ") + what);
+      }
+    }
+  };
+  for (const Entry& entry : entries_) {
+    make(entry, entry.registration.instance, &Provider::interface<CMPIInstanceMI>);
+    make(entry, entry.registration.association, &Provider::interface<CMPIAssociationMI>);
+    make(entry, entry.registration.method, &Provider::interface<CMPIMethodMI>);
+  }
+  if (made == 0 && !failures.empty()) {
+    throw ConfigurationError(failures.front());
+  }
+  for (const std::string& failure : failures) {
+    logError(coreOf(broker_), failure + "; its classes fail until it can be had");
   }
 }
 

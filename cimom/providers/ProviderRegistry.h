@@ -22,7 +22,6 @@ class ProviderRegistry {
   };
 
   explicit ProviderRegistry(const CMPIBroker* broker) : broker_(broker) {}
-  ~ProviderRegistry();
   ProviderRegistry(const ProviderRegistry&) = delete;
   ProviderRegistry& operator=(const ProviderRegistry&) = delete;
 
@@ -30,20 +29,26 @@ class ProviderRegistry {
 
   // Throws ConfigurationError if the class has a provider in that namespace already.
   void add(const ProviderRegistration& registration);
-  void add(const ProviderRegistration& registration, InstanceFactory instanceFactory,
-           AssociationFactory associationFactory);
+  void add(const ProviderRegistration& registration, ProviderFactories factories);
 
   // Every registered class, in the order of registration.
   const std::vector<Entry>& entries() const { return entries_; }
 
-  // Makes every management interface now.
-  // Throws ConfigurationError for the first one that cannot be had.
+  // How long a factory or a clean-up may take.
+  void setLimit(Provider::Limit limit) { limit_ = limit; }
+
+  // Makes every management interface now, and logs those that cannot be had.
+  // Throws ConfigurationError for the first of them if there is no other.
   void load() const;
+
+  // Cleans all providers up, the last one first. Returns false if one of them does not end.
+  bool cleanUp();
 
  private:
   void addEntry(const ProviderRegistration& registration, Provider* provider);
 
   const CMPIBroker* broker_;
+  Provider::Limit limit_ = Provider::defaultLimit;
   std::vector<std::filesystem::path> directories_;
   std::vector<std::unique_ptr<Provider>> providers_;
   std::vector<Entry> entries_;

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <algorithm>
 #include <iterator>
+#include <optional>
 
 #include "cimom/routing/ProviderCall.h"
 #include "cimom/routing/Router.h"
@@ -32,18 +33,32 @@ Provider& writingProviderOf(const ProviderRegistry& providers, const Operation& 
                     "class " + operation.definition.name + " has no provider in " + operation.path.nameSpace);
 }
 
-// Calls `call` with the provider and the path of every class at or below the operation's that has a provider.
+// Calls `call` with the provider and the path of every class at or below the operation's that has a provider. That one
+// for a subclass does not support the operation is not the others' affair, unless there are none.
 template <typename Call>
 std::vector<Value> forEachClass(const ProviderRegistry& providers, const Operation& operation, Call call) {
   std::vector<Value> all;
+  std::optional<StatusError> unsupported;
+  bool isAnswered = false;
   for (const Entry& entry : providers.entries()) {
     const ClassDefinition* served = operation.core.classes.find(operation.path.nameSpace, entry.registration.className);
     if (!served || !servesInstances(entry, operation) || !served->isA(operation.definition.name)) {
       continue;
     }
     const auto path = lend(ObjectPath{operation.path.host, operation.path.nameSpace, served->name, {}});
-    std::vector<Value> some = call(*entry.provider, entry.provider->instanceMi(&operation.core.broker), &path);
-    std::ranges::move(some, std::back_inserter(all));
+    try {
+      std::vector<Value> some = call(*entry.provider, entry.provider->instanceMi(&operation.core.broker), &path);
+      std::ranges::move(some, std::back_inserter(all));
+      isAnswered = true;
+    } catch (const StatusError& error) {
+      if (error.code() != CMPI_RC_ERR_NOT_SUPPORTED || served == &operation.definition) {
+        throw;
+      }
+      unsupported = error;
+    }
+  }
+  if (unsupported && !isAnswered) {
+    throw StatusError(*unsupported);
   }
   return all;
 }

@@ -92,8 +92,8 @@ TEST_F(InstanceTest, DropsAnUndeclaredPropertyAndRefusesToReadIt) {
 TEST_F(InstanceTest, RefusesAValueOfTheWrongTypeAndKeepsTheOldOne) {
   CMPIInstance* instance = system("one");
   const CMPIUint32 wide = 3;
-  EXPECT_EQ(CMSetProperty(instance, "EnabledState", &wide, CMPI_uint32).rc, CMPI_RC_ERR_INVALID_DATA_TYPE);
-  EXPECT_EQ(CMSetProperty(instance, "Caption", &wide, CMPI_uint32).rc, CMPI_RC_ERR_INVALID_DATA_TYPE);
+  EXPECT_EQ(CMSetProperty(instance, "EnabledState", &wide, CMPI_uint32).rc, CMPI_RC_ERR_TYPE_MISMATCH);
+  EXPECT_EQ(CMSetProperty(instance, "Caption", &wide, CMPI_uint32).rc, CMPI_RC_ERR_TYPE_MISMATCH);
   EXPECT_EQ(CMSetProperty(instance, "Caption", &wide, 0x7777).rc, CMPI_RC_ERR_INVALID_DATA_TYPE);
   EXPECT_EQ(caption(instance), "none");
 }

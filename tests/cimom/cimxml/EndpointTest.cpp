@@ -11,6 +11,7 @@
 
 CMPI_EXTERN_C CMPIInstanceMI* ProbeProvider_Create_InstanceMI(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 CMPI_EXTERN_C CMPIAssociationMI* ProbeProvider_Create_AssociationMI(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
+CMPI_EXTERN_C CMPIMethodMI* ProbeProvider_Create_MethodMI(const CMPIBroker*, const CMPIContext*, CMPIStatus*);
 
 namespace Testing {
 
@@ -20,7 +21,8 @@ EndpointTest::EndpointTest() : endpoint_(manager_.broker(), manager_.classes(), 
   std::ifstream mof(SOURCE_DIR "/tests/support/probe/Probe.mof");
   manager_.loadSchemaText(std::string{std::istreambuf_iterator<char>(mof), {}}, "root/test", "Probe.mof");
   for (ProviderRegistration registration : readRegistration(SOURCE_DIR "/tests/support/probe/Probe.reg")) {
-    manager_.addProvider(registration, &ProbeProvider_Create_InstanceMI, &ProbeProvider_Create_AssociationMI);
+    manager_.addProvider(registration, &ProbeProvider_Create_InstanceMI, &ProbeProvider_Create_AssociationMI,
+                         &ProbeProvider_Create_MethodMI);
   }
 }
 
@@ -42,7 +44,9 @@ std::string EndpointTest::contentOf(const Http::Response& response, const std::s
   EXPECT_NO_THROW(CimXml::Document(response.body)) << response.body;
   const std::string begin = "METHODRESPONSE NAME=\"" + method + "\">";
   const auto start = response.body.find(begin);
-  const auto end = response.body.find("</IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>");
+  const bool isIntrinsic = response.body.find("<IMETHODRESPONSE ") != std::string::npos;
+  const auto end =
+      response.body.find(std::string(isIntrinsic ? "</I" : "</") + "METHODRESPONSE></SIMPLERSP></MESSAGE></CIM>");
   if (start == std::string::npos || end == std::string::npos) {
     ADD_FAILURE() << "no response to " << method << ": " << response.body;
     return {};

@@ -363,4 +363,12 @@ TEST_F(OperationsTest, MethodsOfAClassHaveStatusesOfTheirOwn) {
   EXPECT_THAT(call("Nothing", "TEST_Part", "test", others), HasSubstr("<ERROR CODE=\"17\""));
 }
 
+TEST_F(OperationsTest, AnErrorQuotesOnlyTheBeginningOfALongName) {
+  const std::string name = instanceName(
+      "TEST_Thing", keyBinding("Name", std::string(100'000, 'x')) + keyBinding("Number", "1", "VALUETYPE=\"numeric\""));
+  const std::string description = failed("GetInstance", parameter("InstanceName", name));
+  EXPECT_THAT(description, AllOf(StartsWith("6: "), HasSubstr("xxxx"), testing::EndsWith("x ...")));
+  EXPECT_LT(description.size(), 4200U);
+}
+
 }  // namespace

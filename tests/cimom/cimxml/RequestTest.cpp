@@ -120,9 +120,9 @@ TEST(RequestTest, ReadsEveryKindOfPath) {
 
 TEST(RequestTest, ReadsAnArrayOfReferencesWithItsNulls) {
   const auto references =
-      valueOf<References>("<VALUE.REFARRAY><VALUE.REFERENCE>" + instanceName("C", keyBinding("K", "1")) +
-                          "</VALUE.REFERENCE><VALUE.NULL/><VALUE.REFERENCE><CLASSNAME NAME=\"D\"/></VALUE.REFERENCE>"
-                          "</VALUE.REFARRAY>");
+      valueOf<ObjectNames>("<VALUE.REFARRAY><VALUE.REFERENCE>" + instanceName("C", keyBinding("K", "1")) +
+                           "</VALUE.REFERENCE><VALUE.NULL/><VALUE.REFERENCE><CLASSNAME NAME=\"D\"/></VALUE.REFERENCE>"
+                           "</VALUE.REFARRAY>");
   ASSERT_EQ(references.size(), 3u);
   EXPECT_EQ(references[0]->keys.size(), 1u);
   EXPECT_FALSE(references[1]);
@@ -282,6 +282,11 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"AttributesInUtf16", wide(replaced(withAttributes(33), "utf-8", "utf-16")), 400, notValid,
                 "more than 32 attributes"},
         Refusal{"Elements", withValues(70'000), 400, notValid, "more than 65536 elements"},
+        Refusal{"Comments", intrinsicCall("M", repeated("<!---->", 66'000)), 400, notValid,
+                "more than 65536 elements, comments and the like"},
+        Refusal{"Instructions", intrinsicCall("M", repeated("<?a?>", 66'000)), 400, notValid, "more than 65536"},
+        Refusal{"CharacterData", intrinsicCall("M", repeated("<![CDATA[]]>", 66'000)), 400, notValid,
+                "more than 65536"},
         Refusal{"ElementNames",
                 [] {
                   std::string elements;
@@ -374,7 +379,7 @@ INSTANTIATE_TEST_SUITE_P(
             intrinsicCall("M", parameter("P", "<QUALIFIER.DECLARATION NAME=\"C\"><METHOD/></QUALIFIER.DECLARATION>")),
             400, notValid, "METHOD is not allowed in QUALIFIER.DECLARATION"},
         Refusal{"StrangeInReferences", intrinsicCall("M", parameter("P", "<VALUE.REFARRAY><VALUE/></VALUE.REFARRAY>")),
-                400, notValid, "VALUE is not an element of an array of references"},
+                400, notValid, "VALUE is not a reference"},
         Refusal{"HalfAPath", intrinsicCall("M", parameter("P", "<INSTANCEPATH><CLASSNAME NAME=\"C\"/></INSTANCEPATH>")),
                 400, notValid, "INSTANCEPATH"},
         Refusal{"HostlessPath",

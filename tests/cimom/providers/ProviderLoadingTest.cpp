@@ -84,6 +84,31 @@ TEST_F(ProviderLoadingTest, AFactoryOfTheOtherTypeDoesNotDo) {
   EXPECT_THROW(manager.checkProviders(), ConfigurationError);
 }
 
+TEST_F(ProviderLoadingTest, ALibraryThatDoesNotLoadLeavesTheOthersServed) {
+  std::vector<std::string> log;
+  manager.setLog([&](int, std::string_view, std::string_view text) { log.emplace_back(text); });
+  manager.loadSchema(SOURCE_DIR "/tests/support/probe/Probe.mof");
+  manager.loadRegistration(directory.write(
+      "two.reg",
+      "[TST_Processor]\nprovider: Broken\nlocation: garbage\ntype: instance association\nnamespace: root/test\n"
+      "[TEST_Thing]\nprovider: ProbeProvider\nlocation: cimomprobe\ntype: instance\nnamespace: root/test\n"));
+  manager.checkProviders();
+  EXPECT_THAT(log, ElementsAre(AllOf(HasSubstr("two.reg:1: provider Broken: cannot load "),
+                                     HasSubstr("libgarbage.so: "), HasSubstr("; its classes fail until"))))
+      << "once, whatever it is registered for";
+  const RequestScope scope(manager.broker());
+  CMPIContext* context = RequestScope::current()->context();
+  CMPIStatus status = ok;
+  EXPECT_THAT(pathsOf(CBEnumInstances(manager.broker(), context,
+                                      CMNewObjectPath(manager.broker(), testNamespace, "TEST_Thing", nullptr), nullptr,
+                                      nullptr)),
+              testing::SizeIs(2));
+  CBEnumInstances(manager.broker(), context, CMNewObjectPath(manager.broker(), testNamespace, "TST_Processor", nullptr),
+                  nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_FAILED);
+  EXPECT_THAT(shownText(status.msg), HasSubstr("libgarbage.so"));
+}
+
 TEST_F(ProviderLoadingTest, AClassThatTheSchemaLacksIsFoundByTheCheck) {
   registerProvider("InstanceOnly", "instanceonly", "TST_Nothing");
   try {

@@ -37,7 +37,7 @@ TEST_F(RegistrationTest, AStanzaNamesAClassAndItsProvider) {
   const auto all = read(
       "# the first\n[CIM_One]\n   provider: OneProvider\n   location: onelib\n   type: instance association\n"
       "   namespace: root/cimv2 root/other\n#\n\n[ CIM_Two ]\nprovider:TwoProvider # who\n  location:\ttwolib\r\n"
-      "  group: ours\n  type: association\n  namespace: root/cimv2\n  namespace: root/third");
+      "  group: ours\n  type: association method\n  namespace: root/cimv2\n  namespace: root/third");
   ASSERT_THAT(all, SizeIs(2));
   EXPECT_EQ(all[0].className, "CIM_One");
   EXPECT_EQ(all[0].provider, "OneProvider");
@@ -49,8 +49,10 @@ TEST_F(RegistrationTest, AStanzaNamesAClassAndItsProvider) {
   EXPECT_EQ(all[1].className, "CIM_Two");
   EXPECT_EQ(all[1].provider, "TwoProvider");
   EXPECT_EQ(all[1].location, "twolib");
+  EXPECT_FALSE(all[0].method);
   EXPECT_FALSE(all[1].instance);
   EXPECT_TRUE(all[1].association);
+  EXPECT_TRUE(all[1].method);
   EXPECT_THAT(all[1].namespaces, ElementsAre("root/cimv2", "root/third"));
 }
 
@@ -86,7 +88,8 @@ TEST_F(RegistrationTest, WhatIsWrongIsNamedWithItsLine) {
       {"[C]\ncolour: red\n", "test.reg:2: unknown key \"colour\""},
       {"[C]\nprovider:\n", "test.reg:2: \"provider\" has no value"},
       {"[C]\nprovider: a\nprovider: b\n", "test.reg:3: duplicate \"provider\""},
-      {"[C]\ntype: instance method\n", "test.reg:2: unknown type \"method\""},
+      {"[C]\ntype: instance indication\n",
+       "test.reg:2: unknown type \"indication\": must be instance, association or method"},
       {"\n[C]\nlocation: l\ntype: instance\nnamespace: n\n", "test.reg:2: [C]: \"provider\" is missing"},
       {"[C]\nprovider: P\ntype: instance\nnamespace: n\n", "test.reg:1: [C]: \"location\" is missing"},
       {"[C]\nprovider: P\nlocation: l\nnamespace: n\n" + stanza, "test.reg:1: [C]: \"type\" is missing"},

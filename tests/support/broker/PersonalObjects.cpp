@@ -237,7 +237,7 @@ CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMP
     return {CMPI_RC_OK, nullptr};
   }
   const CMPIStatus status = Abi<Instance>::table.setProperty(instance, name, kept.get(), type);
-  if (status.rc == CMPI_RC_ERR_INVALID_DATA_TYPE) {
+  if (status.rc == CMPI_RC_ERR_TYPE_MISMATCH) {
     return {personality().wrongTypeCode, nullptr};
   }
   if (extrasOf(instance)) {

@@ -27,8 +27,7 @@ struct RecordingProvider::Slots {
   }
 
   static CMPIStatus cleanup(CMPIInstanceMI* mi, const CMPIContext*, CMPIBoolean) {
-    ++static_cast<RecordingProvider*>(const_cast<void*>(mi->hdl))->cleanups;
-    return ok;
+    return static_cast<RecordingProvider*>(const_cast<void*>(mi->hdl))->cleaned();
   }
   static CMPIStatus enumerateInstanceNames(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
                                            const CMPIObjectPath* path) {
@@ -56,8 +55,7 @@ struct RecordingProvider::Slots {
   }
 
   static CMPIStatus associationCleanup(CMPIAssociationMI* mi, const CMPIContext*, CMPIBoolean) {
-    ++static_cast<RecordingProvider*>(mi->hdl)->cleanups;
-    return ok;
+    return static_cast<RecordingProvider*>(mi->hdl)->cleaned();
   }
   static CMPIStatus associators(CMPIAssociationMI* mi, const CMPIContext* context, const CMPIResult* result,
                                 const CMPIObjectPath* path, const char* association, const char* resultClass,
@@ -96,6 +94,11 @@ struct RecordingProvider::Slots {
 
 RecordingProvider::RecordingProvider()
     : instanceMi_{this, &Slots::instanceTable}, associationMi_{this, &Slots::associationTable} {}
+
+CMPIStatus RecordingProvider::cleaned() {
+  ++cleanups;
+  return cleanUp ? cleanUp() : ok;
+}
 
 void RecordingProvider::serve(ObjectManager& manager, const std::string& className, const std::string& nameSpace,
                               bool association) {

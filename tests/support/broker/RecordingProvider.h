@@ -41,14 +41,20 @@ class RecordingProvider : public std::enable_shared_from_this<RecordingProvider>
   void serve(Cimom::ObjectManager& manager, const std::string& className, const std::string& nameSpace,
              bool association = false);
 
+  // What a factory of the test's own returns.
+  CMPIInstanceMI* instanceMi() { return &instanceMi_; }
+
   const CMPIBroker* broker = nullptr;  // what the factory was given
   Answer answer;                       // by default OK, and nothing returned
   std::vector<Call> calls;
+  std::function<CMPIStatus()> cleanUp;  // by default OK
   int factoryCalls = 0;
   int cleanups = 0;
 
  private:
   struct Slots;
+
+  CMPIStatus cleaned();
 
   CMPIInstanceMI instanceMi_;
   CMPIAssociationMI associationMi_;

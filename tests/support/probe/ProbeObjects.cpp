@@ -90,6 +90,18 @@ CMPIInstance* numbered(const CMPIBroker* broker, const char* nameSpace) {
   return instance;
 }
 
+// With an instance in a property, and two in an array.
+CMPIInstance* machine(const CMPIBroker* broker, const char* nameSpace) {
+  CMPIInstance* instance = CMNewInstance(broker, CMNewObjectPath(broker, nameSpace, "TEST_Machine", nullptr), nullptr);
+  CMPIInstance* inner = numbered(broker, nameSpace);
+  CMPIArray* inners = CMNewArray(broker, 2, CMPI_instance, nullptr);
+  CMSetArrayElementAt(inners, 0, &inner, CMPI_instance);
+  CMSetProperty(instance, "Name", "machine", CMPI_chars);
+  CMSetProperty(instance, "Inner", &inner, CMPI_instance);
+  CMSetProperty(instance, "Inners", &inners, CMPI_instanceA);
+  return instance;
+}
+
 bool sameValue(const CMPIData& one, const CMPIData& other) {
   if (one.type != other.type) {
     return false;
@@ -144,6 +156,9 @@ std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjec
   }
   if (is("TEST_Numbered")) {
     return {numbered(broker, nameSpace.c_str())};
+  }
+  if (is("TEST_Machine")) {
+    return {machine(broker, nameSpace.c_str())};
   }
   return {};
 }

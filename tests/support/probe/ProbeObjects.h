@@ -13,7 +13,7 @@ std::string text();
 void setText(const std::string& text);
 
 // The instances of a class in the path's namespace: two things, one part, one link from the first thing to the part,
-// one numbered; none of any other class.
+// one numbered, one machine; none of any other class.
 std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjectPath* path);
 
 CMPIObjectPath* thingPath(const CMPIBroker* broker, const char* nameSpace, const char* className, CMPIUint16 number);

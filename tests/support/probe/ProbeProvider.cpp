@@ -6,9 +6,11 @@
 #include <strings.h>
 
 #include <chrono>
+#include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <string>
 #include <thread>
 
 #include "tests/support/probe/ProbeObjects.h"
@@ -170,7 +172,54 @@ CMPIStatus ProbeReferenceNames(CMPIAssociationMI*, const CMPIContext*, const CMP
   return CMReturnDone(result);
 }
 
+CMPIStatus ProbeMethodCleanup(CMPIMethodMI*, const CMPIContext*, CMPIBoolean) { CMReturn(CMPI_RC_OK); }
+
+// Adds every argument to the output arguments as it came. Returns their names and types, in their order.
+CMPIStatus echo(const CMPIResult* result, const CMPIArgs* in, CMPIArgs* out) {
+  std::string arrived;
+  const CMPICount count = CMGetArgCount(in, nullptr);
+  for (CMPICount i = 0; i < count; ++i) {
+    CMPIString* name = nullptr;
+    const CMPIData data = CMGetArgAt(in, i, &name, nullptr);
+    char type[16];
+    std::snprintf(type, sizeof type, ":%x ", data.type);
+    arrived += CMGetCharsPtr(name, nullptr) + std::string(type);
+    CMAddArg(out, CMGetCharsPtr(name, nullptr), CMIsNullValue(data) ? nullptr : &data.value, data.type);
+  }
+  return CMReturnData(result, arrived.c_str(), CMPI_chars);
+}
+
+CMPIStatus odd(const CMPIResult* result, CMPIArgs* out) {
+  const CMPIUint32 number = 7;
+  CMAddArg(out, "wide", &number, CMPI_uint32);
+  CMAddArg(out, "undeclared", &number, CMPI_uint32);
+  return CMReturnData(result, &number, CMPI_uint32);
+}
+
+CMPIStatus ProbeInvokeMethod(CMPIMethodMI*, const CMPIContext* context, const CMPIResult* result, const CMPIObjectPath*,
+                             const char* method, const CMPIArgs* in, CMPIArgs* out) {
+  const std::string name = method;
+  if (name == "Echo") {
+    return echo(result, in, out);
+  }
+  if (name == "Caller") {
+    const CMPIData caller = CMGetContextEntry(context, CMPIPrincipal, nullptr);
+    return CMReturnData(result, &caller.value.string, CMPI_string);
+  }
+  if (name == "Odd") {
+    return odd(result, out);
+  }
+  if (name == "Wrong") {
+    return CMReturnData(result, "text", CMPI_chars);
+  }
+  if (name == "Silent") {
+    return CMReturnDone(result);
+  }
+  CMReturnWithChars(broker, CMPI_RC_ERR_METHOD_NOT_AVAILABLE, "not today");
+}
+
 }  // namespace
 
 CMInstanceMIStub(Probe, ProbeProvider, broker, CMNoHook)
 CMAssociationMIStub(Probe, ProbeProvider, broker, CMNoHook)
+CMMethodMIStub(Probe, ProbeProvider, broker, CMNoHook)
