@@ -2,7 +2,6 @@
 #include "cimom/ObjectManager.h"
 
 #include "cimom/broker/BrokerCore.h"
-#include "cimom/routing/Router.h"
 #include "cimom/schema/Mof.h"
 
 namespace Cimom {
@@ -80,6 +79,8 @@ void ObjectManager::checkProviders() {
   }
   parts_->router.providers().load();
 }
+
+void ObjectManager::setStrictness(Strictness strictness) { parts_->router.setStrictness(strictness); }
 
 void ObjectManager::setLog(MessageSink sink) { parts_->core.log = std::move(sink); }
 

@@ -10,6 +10,7 @@
 #include "cimom/broker/BrokerCore.h"
 #include "cimom/model/Errors.h"
 #include "cimom/providers/ProviderRegistration.h"
+#include "cimom/routing/Router.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {
@@ -45,6 +46,9 @@ class ObjectManager {
   // Loads every registered library now and logs what cannot be had; requests for it try again, and fail with the reason.
   // Throws ConfigurationError for a class that the schema lacks, and if nothing can be had.
   void checkProviders();
+
+  // Exact until it says otherwise; not while a request is under way.
+  void setStrictness(Strictness strictness);
 
   // Where CMLogMessage goes; by default a line on the standard error output.
   void setLog(MessageSink sink);

@@ -1,23 +1,30 @@
 // SPDX-License-Identifier: Apache-2.0
-#include <signal.h>
+#include <netdb.h>
+#include <unistd.h>
 
 #include <algorithm>
-#include <cerrno>
 #include <cstdlib>
-#include <cstring>
-#include <fstream>
 #include <iostream>
-#include <iterator>
 #include <memory>
+#include <mutex>
+#include <set>
+#include <string>
+#include <string_view>
 #include <vector>
 
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Endpoint.h"
 #include "cimom/configuration/Configuration.h"
+#include "cimom/daemon/Account.h"
+#include "cimom/daemon/RequestLog.h"
+#include "cimom/daemon/Signals.h"
 #include "cimom/http/PasswordFile.h"
+#include "cimom/http/SecretFile.h"
 #include "cimom/http/Server.h"
 #include "cimom/interop/InteropProvider.h"
 #include "ground/HostName.h"
+#include "ground/Names.h"
+#include "ground/Printable.h"
 
 namespace {
 
@@ -25,27 +32,6 @@ using namespace Cimom;
 
 constexpr int failure = 1;
 constexpr int usageError = 2;
-
-// The signals that end the program, taken by the main thread alone.
-class EndSignals {
- public:
-  // Threads that start later inherit the mask, so it is set before any.
-  EndSignals() {
-    sigemptyset(&signals_);
-    sigaddset(&signals_, SIGTERM);
-    sigaddset(&signals_, SIGINT);
-    pthread_sigmask(SIG_BLOCK, &signals_, nullptr);
-    signal(SIGPIPE, SIG_IGN);
-  }
-
-  void wait() const {
-    int received = 0;
-    sigwait(&signals_, &received);
-  }
-
- private:
-  sigset_t signals_{};
-};
 
 void load(ObjectManager& manager, const Configuration& configuration) {
   for (const auto& schema : configuration.schemas) {
@@ -57,6 +43,7 @@ void load(ObjectManager& manager, const Configuration& configuration) {
   for (const auto& directory : configuration.providerDirectories) {
     manager.addProviderDirectory(directory);
   }
+  manager.setStrictness(configuration.bare ? Strictness::Bare : Strictness::Exact);
   // They stand with the classes: in the same directory, or beside a file by the same name.
   std::vector<Profile> profiles;
   for (std::filesystem::path path : configuration.schemas) {
@@ -71,53 +58,152 @@ void load(ObjectManager& manager, const Configuration& configuration) {
   manager.checkProviders();
 }
 
-std::string contentOf(const std::filesystem::path& file) {
-  if (file.empty()) {
-    return {};
-  }
-  std::ifstream stream(file, std::ios::binary);
-  std::string content{std::istreambuf_iterator<char>(stream), {}};
-  if (!content.empty()) {
-    return content;
-  }
-  if (!stream.is_open()) {
-    throw Http::ServerError(file.string() + ": " + std::strerror(errno));
-  }
-  throw Http::ServerError(file.string() + (std::filesystem::is_directory(file) ? ": is a directory" : ": is empty"));
+void log(const std::string& line) {
+  // One write, so that the lines of several threads stay whole.
+  std::cerr << "cimomd: " + line + "\n" << std::flush;
 }
+
+void trace(int, std::string_view component, std::string_view text) {
+  std::cerr << "trace: " + Ground::printable(component) + ": " + Ground::printable(text) + "\n" << std::flush;
+}
+
+// The host's name, and with TLS, where other machines may ask, the one that the network knows it by.
+std::set<std::string, Ground::NameLess> hostNames(const Configuration& configuration) {
+  std::set<std::string, Ground::NameLess> names(configuration.serverNames.begin(), configuration.serverNames.end());
+  const std::string own = Ground::hostName();
+  names.insert(own);
+  addrinfo hints{};
+  hints.ai_flags = AI_CANONNAME;
+  addrinfo* found = nullptr;
+  if (!configuration.tlsCertificate.empty() && getaddrinfo(own.c_str(), nullptr, &hints, &found) == 0) {
+    if (found->ai_canonname) {
+      names.insert(found->ai_canonname);
+    }
+    freeaddrinfo(found);
+  }
+  return names;
+}
+
+// The files that are read again on SIGHUP.
+class Files {
+ public:
+  explicit Files(const Configuration& configuration) : configuration_(configuration) {
+    if (!configuration.passwordFile.empty()) {
+      passwords_ = std::make_shared<Http::PasswordFile>(configuration.passwordFile);
+    }
+    if (!configuration.requestLog.empty()) {
+      requestLog_ = std::make_unique<RequestLog>(configuration.requestLog);
+    }
+  }
+
+  void use(Http::ServerOptions& options) {
+    if (!configuration_.tlsCertificate.empty()) {
+      options.tlsCertificate = Http::readFile(configuration_.tlsCertificate);
+      options.tlsKey = Http::readSecretFile(configuration_.tlsKey);
+    }
+    if (passwords_) {
+      options.authenticator = [this](const std::string& user, const std::string& password) {
+        return passwords()->accepts(user, password);
+      };
+    }
+    if (requestLog_) {
+      options.requestLog = [this](const Http::RequestRecord& record) { requestLog_->write(record); };
+    }
+  }
+
+  void reload(Http::Server& server) {
+    if (passwords_) {
+      attempt([&] {
+        auto read = std::make_shared<const Http::PasswordFile>(configuration_.passwordFile);
+        const std::lock_guard lock(mutex_);
+        passwords_.swap(read);
+      });
+    }
+    if (!configuration_.tlsCertificate.empty()) {
+      attempt([&] {
+        server.useCertificate(Http::readFile(configuration_.tlsCertificate),
+                              Http::readSecretFile(configuration_.tlsKey));
+      });
+    }
+    if (requestLog_) {
+      attempt([&] { requestLog_->reopen(); });
+    }
+    log("passwords, certificate and request log have been read again");
+  }
+
+ private:
+  template <typename Step>
+  static void attempt(Step step) {
+    try {
+      step();
+    } catch (const std::exception& error) {
+      log(std::string(error.what()) + "; what was read before stays in use");
+    }
+  }
+
+  std::shared_ptr<const Http::PasswordFile> passwords() {
+    const std::lock_guard lock(mutex_);
+    return passwords_;
+  }
+
+  const Configuration& configuration_;
+  std::mutex mutex_;
+  std::shared_ptr<const Http::PasswordFile> passwords_;
+  std::unique_ptr<RequestLog> requestLog_;
+};
 
 Http::ServerOptions serverOptions(const Configuration& configuration) {
   Http::ServerOptions options;
   options.address = configuration.address;
   options.port = configuration.port;
   options.maxRequestSize = configuration.maxRequestSize;
+  options.maxRequestMemory = configuration.maxRequestMemory;
   options.maxConnections = configuration.maxConnections;
+  options.maxConnectionsPerAddress = configuration.maxConnectionsPerAddress;
+  options.maxRequests = configuration.maxRequests;
   options.idleTimeout = configuration.idleTimeout;
-  options.tlsCertificate = contentOf(configuration.tlsCertificate);
-  options.tlsKey = contentOf(configuration.tlsKey);
-  if (!configuration.passwordFile.empty()) {
-    options.authenticator = [passwords = std::make_shared<Http::PasswordFile>(configuration.passwordFile)](
-                                const std::string& user, const std::string& password) {
-      return passwords->accepts(user, password);
-    };
-  }
+  options.requestTimeout = configuration.requestTimeout;
+  options.operationTimeout = configuration.operationTimeout;
+  options.hostNames = hostNames(configuration);
+  options.log = &log;
   return options;
 }
 
-void serve(const Configuration& configuration, const EndSignals& endSignals) {
+void chooseUser(const Configuration& configuration) {
+  if (!configuration.user.empty()) {
+    becomeUser(configuration.user);
+  } else if (geteuid() == 0) {
+    log("runs as root: user = NAME lets it run as another user, user = root says that it is meant");
+  }
+}
+
+void serve(const Configuration& configuration, Signals& signals) {
+  chooseUser(configuration);
   ObjectManager manager;
+  if (configuration.trace) {
+    manager.setTrace(&trace);
+  }
   load(manager, configuration);
   const CimXml::Endpoint endpoint(manager.broker(), manager.classes(), Ground::hostName());
-  Http::Server server(serverOptions(configuration),
+  Files files(configuration);
+  Http::ServerOptions options = serverOptions(configuration);
+  files.use(options);
+  options.failureHandler = [&endpoint](const Http::Request& request, const std::string& why) {
+    return endpoint.fail(request, why);
+  };
+  Http::Server server(std::move(options),
                       [&endpoint](const Http::Request& request) { return endpoint.handle(request); });
+  signals.serving();
   std::cout << "listening on " << server.endpoint() << std::endl;
-  endSignals.wait();
+  while (signals.wait() == Signals::Wish::Reload) {
+    files.reload(server);
+  }
   if (server.drain(configuration.shutdownTimeout)) {
     return;
   }
   // A provider that is still at work can neither be cleaned up nor unloaded.
-  std::cerr << "cimomd: shutting down without provider cleanup: requests still in progress after "
-            << configuration.shutdownTimeout.count() << " s" << std::endl;
+  log("shutting down without provider cleanup: requests still in progress after " +
+      std::to_string(configuration.shutdownTimeout.count()) + " s");
   std::_Exit(failure);
 }
 
@@ -129,8 +215,8 @@ int main(int argc, char** argv) {
     if (!configuration) {
       return 0;
     }
-    const EndSignals endSignals;
-    serve(*configuration, endSignals);
+    static Signals signals;  // its thread lives as long as the program
+    serve(*configuration, signals);
     return 0;
   } catch (const UsageError& error) {
     std::cerr << "cimomd: " << error.what() << "\n";

@@ -18,6 +18,9 @@
 extern "C" {
 #endif
 
+/* C before 2011 declares it only where POSIX is asked for. */
+struct timespec;
+
 struct _CMPIBroker {
   void* hdl;
   CMPIBrokerFT* bft;

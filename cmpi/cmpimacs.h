@@ -68,6 +68,7 @@
 #define CBBrokerVersion(b) ((b)->bft->brokerVersion)
 #define CBBrokerName(b) ((b)->bft->brokerName)
 #define CBBrokerCapabilities(b) ((b)->bft->brokerCapabilities)
+#define CBGetBrokerCapabilities(b) CBBrokerCapabilities(b)
 #define CBPrepareAttachThread(b, ctx) ((b)->bft->prepareAttachThread((b), (ctx)))
 #define CBAttachThread(b, ctx) ((b)->bft->attachThread((b), (ctx)))
 #define CBDetachThread(b, ctx) ((b)->bft->detachThread((b), (ctx)))

@@ -8,6 +8,7 @@
 #endif
 
 #define CMPI_EXPORT __attribute__((visibility("default")))
+#define CMPI_IMPORT
 
 #ifdef __cplusplus
 #define CMPI_EXTERN_C extern "C" CMPI_EXPORT

@@ -6,6 +6,7 @@
 #include <string>
 
 #include "cimom/model/Errors.h"
+#include "ground/Printable.h"
 
 namespace Cimom {
 namespace {
@@ -16,10 +17,10 @@ void logToStandardError(int severity, std::string_view component, std::string_vi
   const auto index = number < names.size() ? number : 0;
   std::string line = std::string(names[index]) + ": ";
   if (!component.empty()) {
-    line.append(component).append(": ");
+    line.append(Ground::printable(component)).append(": ");
   }
   // One write, so that the lines of several threads stay whole.
-  std::cerr << line.append(text).append("\n") << std::flush;
+  std::cerr << line.append(Ground::printable(text)).append("\n") << std::flush;
 }
 
 }  // namespace

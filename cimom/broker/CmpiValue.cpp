@@ -74,6 +74,10 @@ Value fromCmpi(const CMPIValue* value, CMPIType type) {
       return Value::reference(modelOf<ObjectPath>(member<const CMPIObjectPath*>(value)));
     case CMPI_instance:
       return Value::instance(modelOf<Instance>(member<const CMPIInstance*>(value)));
+    case CMPI_args:
+      return Value::arguments(modelOf<Args>(member<const CMPIArgs*>(value)).arguments);
+    case CMPI_enumeration:
+      return Value::enumeration(modelOf<Enumeration>(member<const CMPIEnumeration*>(value)).items);
     default:
       return Value::dateTime(modelOf<DateTime>(member<const CMPIDateTime*>(value)));
   }
@@ -93,6 +97,10 @@ CMPIData toCmpi(const Value& value, CMPIValueState state) {
     data.value.inst = make(*instance);
   } else if (const Array* array = value.elements()) {
     data.value.array = make(*array);
+  } else if (const NamedValues* arguments = value.arguments()) {
+    data.value.args = make(Args{*arguments});
+  } else if (const std::vector<Value>* items = value.items()) {
+    data.value.Enum = make(Enumeration{*items, 0});
   } else {
     data.state = static_cast<CMPIValueState>(data.state | CMPI_nullValue);
   }

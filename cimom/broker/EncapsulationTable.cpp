@@ -21,7 +21,7 @@ auto made(const CMPIBroker* broker, CMPIStatus* status, Operation operation) {
 
 CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* status) {
   return made(broker, status, [&] {
-    const ObjectPath& model = modelOf<ObjectPath>(path);
+    const ObjectPath& model = argumentOf<ObjectPath>(path);
     return make(Instance(coreOf(broker).requireClass(model.nameSpace, model.className), model));
   });
 }
@@ -74,7 +74,7 @@ CMPISelectExp* newSelectExp(const CMPIBroker* broker, const char*, const char*, 
 CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, const char* className,
                          CMPIStatus* status) {
   return made(broker, status, [&] {
-    const ObjectPath& model = modelOf<ObjectPath>(path);
+    const ObjectPath& model = argumentOf<ObjectPath>(path);
     const ClassDefinition& definition = coreOf(broker).requireClass(model.nameSpace, model.className);
     return static_cast<CMPIBoolean>(definition.isA(required(className, "the class's name")));
   });
@@ -145,6 +145,7 @@ const Model& modelBehind(const void* object) {
 // The type of an object that a provider knows by its address only. The object's function table identifies it.
 const ObjectType& typeOf(const void* object) {
   static const ObjectType types[] = {
+      {&upCallTable, "CMPIBroker", [](const void*) { return std::string(upCallTable.brokerName); }},
       typeRow<Text>([](const void* any) { return std::string(textOf(static_cast<const CMPIString*>(any))); }),
       typeRow<ObjectPath>([](const void* any) { return modelBehind<ObjectPath>(any).toString(); }),
       typeRow<Instance>([](const void* any) { return described(modelBehind<Instance>(any)); }),
@@ -157,11 +158,12 @@ const ObjectType& typeOf(const void* object) {
       typeRow<Error>([](const void* any) { return modelBehind<Error>(any).message.value_or(""); }),
   };
   const auto* any = static_cast<const AnyObject*>(object);
-  if (any && any->hdl) {
-    for (const ObjectType& type : types) {
-      if (any->ft == type.table) {
-        return type;
-      }
+  if (!any || !any->hdl) {
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "an object must not be null");
+  }
+  for (const ObjectType& type : types) {
+    if (any->ft == type.table) {
+      return type;
     }
   }
   throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, "not an object of this broker");
@@ -291,7 +293,7 @@ CMPIStatus send(const CMPIBroker* broker, MessageSink BrokerCore::*sink, int lev
                 const char* text, const CMPIString* string) {
   return guarded([&] {
     const auto& receiver = coreOf(broker).*sink;
-    const char* message = text ? text : textOf(string);
+    const char* message = required(text || !string ? text : textOf(string), "the message");
     if (receiver) {
       receiver(level, component ? component : "", message);
     }

@@ -74,6 +74,16 @@ Model& modelOf(const typename Abi<Model>::Type* object) {
   return static_cast<Handle<Model>*>(object->hdl)->model;
 }
 
+// The same for an object that a slot is given to act with, not on.
+// Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER if the object or its handle is null.
+template <typename Model>
+Model& argumentOf(const typename Abi<Model>::Type* object) {
+  if (!object || !object->hdl) {
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string(Abi<Model>::name) + " must not be null");
+  }
+  return modelOf<Model>(object);
+}
+
 // The characters of a CMPI string.
 // Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the string or its handle is null.
 inline const char* textOf(const CMPIString* string) {

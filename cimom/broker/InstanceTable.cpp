@@ -65,7 +65,7 @@ CMPIObjectPath* getObjectPath(const CMPIInstance* instance, CMPIStatus* status) 
 CMPIStatus setObjectPath(CMPIInstance* instance, const CMPIObjectPath* path) {
   return guarded([&] {
     Instance& model = modelOf<Instance>(instance);
-    model.setPath(modelOf<ObjectPath>(path));
+    model.setPath(argumentOf<ObjectPath>(path));
   });
 }
 

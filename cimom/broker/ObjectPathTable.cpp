@@ -40,15 +40,15 @@ CMPICount getKeyCount(const CMPIObjectPath* path, CMPIStatus* status) {
 CMPIStatus setNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
   return guarded([&] {
     ObjectPath& model = modelOf<ObjectPath>(path);
-    model.nameSpace = modelOf<ObjectPath>(source).nameSpace;
+    model.nameSpace = argumentOf<ObjectPath>(source).nameSpace;
   });
 }
 
 CMPIStatus setHostAndNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
   return guarded([&] {
     ObjectPath& model = modelOf<ObjectPath>(path);
-    model.nameSpace = modelOf<ObjectPath>(source).nameSpace;
-    model.host = modelOf<ObjectPath>(source).host;
+    model.nameSpace = argumentOf<ObjectPath>(source).nameSpace;
+    model.host = argumentOf<ObjectPath>(source).host;
   });
 }
 

@@ -33,11 +33,11 @@ CMPIStatus returnData(const CMPIResult* result, const CMPIValue* value, const CM
 }
 
 CMPIStatus returnInstance(const CMPIResult* result, const CMPIInstance* instance) {
-  return guarded([&] { deliver(result, Value::instance(modelOf<Instance>(instance))); });
+  return guarded([&] { deliver(result, Value::instance(argumentOf<Instance>(instance))); });
 }
 
 CMPIStatus returnObjectPath(const CMPIResult* result, const CMPIObjectPath* path) {
-  return guarded([&] { deliver(result, Value::reference(modelOf<ObjectPath>(path))); });
+  return guarded([&] { deliver(result, Value::reference(argumentOf<ObjectPath>(path))); });
 }
 
 // The end of the provider's call says the same, so that a call without it, or with two, loses nothing.
@@ -48,7 +48,7 @@ CMPIStatus returnDone(const CMPIResult* result) {
 CMPIStatus returnError(const CMPIResult* result, const CMPIError* error) {
   return guarded([&] {
     Result& model = modelOf<Result>(result);
-    const Error& returned = modelOf<Error>(error);
+    const Error& returned = argumentOf<Error>(error);
     if (!model.error) {
       model.error = returned;
     }
@@ -82,7 +82,7 @@ template <OptionalArray member>
 CMPIStatus setArray(CMPIError* error, const CMPIArray* array) {
   return guarded([&] {
     Error& model = modelOf<Error>(error);
-    model.*member = modelOf<Array>(array);
+    model.*member = argumentOf<Array>(array);
   });
 }
 

@@ -5,13 +5,6 @@
 namespace Cimom::CimXml {
 namespace {
 
-void requireNamespace(const Call& call) {
-  if (call.manager.classes.hasNamespace(call.request.nameSpace)) {
-    return;
-  }
-  throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + call.request.nameSpace + "\"");
-}
-
 const ClassDefinition& requireClass(const Call& call, const std::string& name, CMPIrc whenUnknown) {
   const ClassDefinition* definition = call.manager.classes.find(call.request.nameSpace, name);
   if (!definition) {
@@ -27,7 +20,6 @@ ClassView viewOf(const Parameters& parameters) {
 
 // The classes below the one that the client names, or below the root of all.
 std::vector<const ClassDefinition*> requestedClasses(const Call& call) {
-  requireNamespace(call);
   const std::string name = call.parameters.className("ClassName");
   if (!name.empty()) {
     requireClass(call, name, CMPI_RC_ERR_INVALID_CLASS);
@@ -38,7 +30,6 @@ std::vector<const ClassDefinition*> requestedClasses(const Call& call) {
 }  // namespace
 
 void getClass(Call& call) {
-  requireNamespace(call);
   const auto& definition = requireClass(call, call.parameters.requiredClassName("ClassName"), CMPI_RC_ERR_NOT_FOUND);
   const auto scope = call.xml.element("IRETURNVALUE");
   ClassWriter(call.xml, viewOf(call.parameters)).write(definition);
@@ -62,7 +53,6 @@ void enumerateClassNames(Call& call) {
 }
 
 void getQualifier(Call& call) {
-  requireNamespace(call);
   const auto name = call.parameters.text("QualifierName");
   if (!name) {
     throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "parameter QualifierName is missing");
@@ -76,7 +66,6 @@ void getQualifier(Call& call) {
 }
 
 void enumerateQualifiers(Call& call) {
-  requireNamespace(call);
   ClassWriter writer(call.xml, {});
   const auto scope = call.xml.element("IRETURNVALUE");
   for (const QualifierDeclaration* declaration : call.manager.classes.qualifierDeclarations()) {

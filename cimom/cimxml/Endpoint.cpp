@@ -62,12 +62,37 @@ std::string errorMessage(const Request& request, int code, const char* descripti
   });
 }
 
+// For a request log: "GetInstance root/cimv2:CIM_Thing".
+std::string subjectOf(const Request& request) {
+  std::string className = request.target.className;
+  for (const Parameter& parameter : request.parameters) {
+    if (const auto* name = std::get_if<ObjectName>(&parameter.value); name && className.empty()) {
+      className = name->className;
+    } else if (const auto* instance = std::get_if<Instance>(&parameter.value); instance && className.empty()) {
+      className = instance->path.className;
+    }
+  }
+  return request.method + " " + request.nameSpace + (className.empty() ? "" : ":" + className);
+}
+
 }  // namespace
+
+Endpoint::Answer Endpoint::errorAnswer(const Request& request, int code, const char* description) {
+  return {errorMessage(request, code, description), code};
+}
 
 Endpoint::Endpoint(const CMPIBroker* broker, const ClassRepository& classes, std::string host)
     : broker_(broker), classes_(classes), host_(std::move(host)) {}
 
 Http::Response Endpoint::handle(const Http::Request& request) const {
+  return handle(request, [&](const Request& message) { return respond(message, request); });
+}
+
+Http::Response Endpoint::fail(const Http::Request& request, const std::string& why) const {
+  return handle(request, [&](const Request& message) { return errorAnswer(message, CMPI_RC_ERR_FAILED, why.c_str()); });
+}
+
+Http::Response Endpoint::handle(const Http::Request& request, const Answering& answer) {
   if (request.path != "/cimom" && request.path != "/") {
     return plain(404, "CIM operations must be sent to /cimom");
   }
@@ -79,7 +104,9 @@ Http::Response Endpoint::handle(const Http::Request& request) const {
     const Request message = readRequest(request.body);
     headers.requireMatch(message);
     Http::Response response;
-    response.body = respond(message, request.user);
+    Answer answered = answer(message);
+    response.body = std::move(answered.body);
+    response.subject = subjectOf(message) + " " + std::to_string(answered.status);
     response.headers.add("Content-Type", "application/xml; charset=\"utf-8\"");
     headers.addTo(response.headers);
     return response;
@@ -92,13 +119,14 @@ Http::Response Endpoint::handle(const Http::Request& request) const {
   }
 }
 
-std::string Endpoint::respond(const Request& request, const std::string& user) const {
+Endpoint::Answer Endpoint::respond(const Request& request, const Http::Request& message) const {
   try {
-    return responseMessage(request, [&](XmlWriter& xml) {
-      perform({broker_, classes_, host_, *openEnumerations_, user}, request, xml);
-    });
+    const auto content = [&](XmlWriter& xml) {
+      perform({broker_, classes_, host_, *openEnumerations_, message.user, message.deadline}, request, xml);
+    };
+    return {responseMessage(request, content), CMPI_RC_OK};
   } catch (const OperationError& error) {
-    return errorMessage(request, error.code(), error.what());
+    return errorAnswer(request, error.code(), error.what());
   }
 }
 

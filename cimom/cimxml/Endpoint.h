@@ -3,6 +3,7 @@
 
 #include <cmpift.h>
 
+#include <functional>
 #include <memory>
 #include <string>
 
@@ -23,8 +24,20 @@ class Endpoint {
   // May be called from several threads at once.
   Http::Response handle(const Http::Request& request) const;
 
+  // What a client hears in the place of an answer that is not to be had: CIM status 1 with the reason.
+  Http::Response fail(const Http::Request& request, const std::string& why) const;
+
  private:
-  std::string respond(const Request& request, const std::string& user) const;
+  // The body of a response, and its CIM status.
+  struct Answer {
+    std::string body;
+    int status;
+  };
+  using Answering = std::function<Answer(const Request& request)>;
+
+  static Http::Response handle(const Http::Request& request, const Answering& answer);
+  static Answer errorAnswer(const Request& request, int code, const char* description);
+  Answer respond(const Request& request, const Http::Request& message) const;
 
   const CMPIBroker* broker_;
   const ClassRepository& classes_;

@@ -62,7 +62,7 @@ void writeArguments(XmlWriter& xml, ObjectWriter& writer, const CMPIArgs* argume
 
 void callMethod(const OperationContext& manager, const Request& request, XmlWriter& xml) {
   const MethodDeclaration& method = requireMethod(manager, request);
-  RequestScope scope(manager.broker);
+  RequestScope scope(manager.broker, manager.deadline);
   const CMPIContext* context = scope.context();
   addPrincipal(context, manager.user);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);

@@ -104,10 +104,16 @@ ObjectBuilder::TypedValue ObjectBuilder::keyValue(const KeyBinding& key, CMPITyp
 
 CMPIInstance* ObjectBuilder::instance(const Instance& instance) const {
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIInstance* object = CMNewInstance(broker_, path(instance.path), &status);
+  ObjectName own = instance.path;
+  own.className = instance.className;
+  if (!classOf(own) && classOf(instance.path)) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
+                         "an instance of " + own.className + " cannot have a path of " + instance.path.className);
+  }
+  CMPIInstance* object = CMNewInstance(broker_, path(own), &status);
   requireOk(status, object);
   for (const Property& property : instance.properties) {
-    const TypedValue value = propertyValue(instance.path, property);
+    const TypedValue value = propertyValue(own, property);
     requireOk(CMSetProperty(object, property.name.c_str(), value.pointer(), value.type));
   }
   return object;

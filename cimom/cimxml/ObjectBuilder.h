@@ -21,8 +21,9 @@ class ObjectBuilder {
   // that its text looks like.
   CMPIObjectPath* path(const ObjectName& name) const;
 
-  // A property that the class does not declare is CIM_ERR_NO_SUCH_PROPERTY, one of another type than the class's
-  // CIM_ERR_TYPE_MISMATCH. What the client sets to null is null, whatever default the class has.
+  // The instance is of the class that INSTANCE names, whatever its path says. A property that the class does not
+  // declare is CIM_ERR_NO_SUCH_PROPERTY, one of another type than the class's CIM_ERR_TYPE_MISMATCH. What the client
+  // sets to null is null, whatever default the class has.
   CMPIInstance* instance(const Instance& instance) const;
 
   // A property's new value.

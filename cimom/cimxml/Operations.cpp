@@ -97,6 +97,12 @@ void describeCaller(const CMPIContext* context, const OperationContext& manager,
   addPrincipal(context, manager.user);
 }
 
+void requireNamespace(const OperationContext& manager, const Request& request) {
+  if (!manager.classes.hasNamespace(request.nameSpace)) {
+    throw OperationError(CMPI_RC_ERR_INVALID_NAMESPACE, "unknown namespace \"" + request.nameSpace + "\"");
+  }
+}
+
 }  // namespace
 
 void perform(const OperationContext& manager, const Request& request, XmlWriter& xml) {
@@ -104,8 +110,9 @@ void perform(const OperationContext& manager, const Request& request, XmlWriter&
     return callMethod(manager, request, xml);
   }
   const Operation& operation = findOperation(request.method);
+  requireNamespace(manager, request);
   const Parameters parameters(request, operation.parameters);
-  RequestScope scope(manager.broker);
+  RequestScope scope(manager.broker, manager.deadline);
   const CMPIContext* context = scope.context();
   describeCaller(context, manager, parameters);
   const ObjectBuilder objects(manager.broker, manager.classes, request.nameSpace);

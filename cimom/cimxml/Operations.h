@@ -5,6 +5,7 @@
 
 #include <string>
 
+#include "cimom/broker/RequestScope.h"
 #include "cimom/cimxml/OpenEnumerations.h"
 #include "cimom/cimxml/Request.h"
 #include "cimom/cimxml/XmlWriter.h"
@@ -19,6 +20,7 @@ struct OperationContext {
   const std::string& host;  // stands in a path that names none
   OpenEnumerations& openEnumerations;
   const std::string& user;  // who has authenticated; empty if nobody was asked
+  Deadline deadline = {};   // after which up-calls of providers fail
 };
 
 // Performs a request's operation (DSP0200, 5.3), or calls the method that it names, and writes what that returns as the

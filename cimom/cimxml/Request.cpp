@@ -301,10 +301,6 @@ void readExtrinsicCall(const Element& call, Request& request) {
 
 }  // namespace
 
-ObjectName readNameElement(const Element& element) { return readObjectName(element); }
-
-Instance readInstanceElement(const Element& element) { return readInstance(element); }
-
 Instance readEmbeddedInstance(std::string_view xml) {
   const Document document(xml);
   const Element root = document.root();
@@ -313,6 +309,10 @@ Instance readEmbeddedInstance(std::string_view xml) {
   }
   return readPlainInstance(root);
 }
+
+ObjectName readNameElement(const Element& element) { return readObjectName(element); }
+
+Instance readInstanceElement(const Element& element) { return readInstance(element); }
 
 Request readRequest(std::string_view xml) {
   const Document document(xml);

@@ -82,12 +82,12 @@ struct Request {
 // multiple-requests-unsupported, unsupported-cim-version, unsupported-dtd-version or unsupported-protocol-version.
 Request readRequest(std::string_view xml);
 
+// Takes the text of a value that embeds an INSTANCE. Throws TransportError as above.
+Instance readEmbeddedInstance(std::string_view xml);
+
 // A name with whatever path stands around it; an INSTANCE or VALUE.NAMEDINSTANCE. Throws TransportError
 // "request-not-valid".
 ObjectName readNameElement(const Element& element);
 Instance readInstanceElement(const Element& element);
-
-// Takes the text of a value that embeds an INSTANCE. Throws TransportError as above.
-Instance readEmbeddedInstance(std::string_view xml);
 
 }  // namespace Cimom::CimXml

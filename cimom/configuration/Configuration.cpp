@@ -19,6 +19,9 @@
 namespace Cimom {
 namespace {
 
+// The port that IANA has for CIM-XML over TLS.
+constexpr std::uint16_t wbemHttps = 5989;
+
 // A value as it was given.
 struct GivenValue {
   std::string text;
@@ -40,9 +43,11 @@ struct Setting {
   Apply apply;  // throws UsageError for a bad value
 };
 
-std::uint64_t parseNumber(const GivenValue& value, std::uint64_t least, std::uint64_t most) {
+// What the parser makes of the value's text; its refusal names the value.
+template <typename Parser, typename... Range>
+auto parse(const GivenValue& value, Parser parser, Range... range) {
   try {
-    return Ground::parseNumber(value.text, least, most);
+    return parser(value.text, range...);
   } catch (const std::invalid_argument& refusal) {
     throw UsageError(value.origin + ": " + refusal.what() + ", not \"" + value.text + "\"");
   }
@@ -58,7 +63,7 @@ std::filesystem::path parsePath(const GivenValue& value) {
 template <typename Number>
 Apply number(Number Configuration::*member, std::uint64_t least, std::uint64_t most) {
   return [=](Configuration& configuration, const GivenValue& value) {
-    configuration.*member = Number(parseNumber(value, least, most));
+    configuration.*member = Number(parse(value, Ground::parseNumber, least, most));
   };
 }
 
@@ -72,13 +77,21 @@ Apply paths(std::vector<std::filesystem::path> Configuration::*member) {
   };
 }
 
+void strictness(Configuration& configuration, const GivenValue& value) {
+  if (value.text != "exact" && value.text != "bare") {
+    throw UsageError(value.origin + ": must be exact or bare, not \"" + value.text + "\"");
+  }
+  configuration.bare = value.text == "bare";
+}
+
 // In the order of the help.
 const std::vector<Setting>& settings() {
   constexpr std::uint64_t day = 86400;
   static const std::vector<Setting> table = {
       {"address", "ADDRESS", "numeric address to listen on (127.0.0.1)", false,
        [](Configuration& configuration, const GivenValue& value) { configuration.address = value.text; }},
-      {"port", "N", "port to listen on; 0: any free port (5988)", false, number(&Configuration::port, 0, 65535)},
+      {"port", "N", "port to listen on; 0: any free port (5988, with TLS 5989)", false,
+       number(&Configuration::port, 0, 65535)},
       {"schema", "PATH", "MOF file, or directory of *.mof files, with the classes", true,
        paths(&Configuration::schemas)},
       {"registration", "PATH", "file, or directory of *.reg files: which provider serves which class", true,
@@ -87,17 +100,45 @@ const std::vector<Setting>& settings() {
        paths(&Configuration::providerDirectories)},
       {"max-request-size", "BYTES", "largest body of a request (4194304)", false,
        number(&Configuration::maxRequestSize, 1024, std::numeric_limits<std::int32_t>::max())},
-      {"max-connections", "N", "connections served at once (64)", false,
+      {"max-request-memory", "BYTES", "bodies of all requests in progress together (33554432)", false,
+       number(&Configuration::maxRequestMemory, 1024, std::numeric_limits<std::int32_t>::max())},
+      {"max-requests", "N", "requests answered at once (64)", false, number(&Configuration::maxRequests, 1, 4096)},
+      {"max-connections", "N", "connections open at once (512)", false,
        number(&Configuration::maxConnections, 1, 4096)},
+      {"max-connections-per-address", "N", "of them from one address (64)", false,
+       number(&Configuration::maxConnectionsPerAddress, 1, 4096)},
+      {"request-timeout", "SECONDS", "receive a whole request within this time (30)", false,
+       number(&Configuration::requestTimeout, 1, day)},
+      {"operation-timeout", "SECONDS", "answer a request whose provider has not within this time (60)", false,
+       number(&Configuration::operationTimeout, 1, day)},
       {"idle-timeout", "SECONDS", "close a connection after so long without traffic (60)", false,
        number(&Configuration::idleTimeout, 1, day)},
       {"shutdown-timeout", "SECONDS", "wait so long for requests in progress when shutting down (20)", false,
        number(&Configuration::shutdownTimeout, 0, day)},
+      {"strictness", "MODE",
+       "exact: check requests as DSP0200 asks; bare: leave that to the providers, as others do (exact)", false,
+       strictness},
+      {"server-name", "NAME", "a further host name that clients may ask this server by", true,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.serverNames.push_back(parse(value, Ground::parseText));
+       }},
       {"tls-certificate", "FILE", "PEM file with the certificate chain; with tls-key: HTTPS instead of HTTP", false,
        path(&Configuration::tlsCertificate)},
       {"tls-key", "FILE", "PEM file with the certificate's private key", false, path(&Configuration::tlsKey)},
       {"password-file", "FILE", "user:hash lines (crypt(5)); only these users are served", false,
-       path(&Configuration::passwordFile)}};
+       path(&Configuration::passwordFile)},
+      {"request-log", "FILE", "a line for each request; -: to the standard output", false,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.requestLog = value.text == "-" ? std::filesystem::path("-") : parsePath(value);
+       }},
+      {"trace", "YES|NO", "what providers trace, to the standard error output (no)", false,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.trace = parse(value, Ground::parseBoolean);
+       }},
+      {"user", "NAME", "the user to become, where root starts it", false,
+       [](Configuration& configuration, const GivenValue& value) {
+         configuration.user = parse(value, Ground::parseText);
+       }}};
   return table;
 }
 
@@ -158,6 +199,9 @@ Configuration toConfiguration(const GivenValues& given, const Installation& inst
   }
   if (configuration.tlsCertificate.empty() != configuration.tlsKey.empty()) {
     throw UsageError("tls-certificate and tls-key must be given together");
+  }
+  if (!given.contains("port") && !configuration.tlsCertificate.empty()) {
+    configuration.port = wbemHttps;
   }
   useInstalled(configuration.schemas, "schema", installation.schema);
   useInstalled(configuration.registrations, "registration", installation.registration);

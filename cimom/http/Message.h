@@ -4,6 +4,7 @@
 
 #include <strings.h>
 
+#include <chrono>
 #include <functional>
 #include <string>
 #include <string_view>
@@ -40,15 +41,24 @@ struct Request {
   Headers headers;
   std::string body;  // complete, decoded from any transfer coding
   std::string user;  // who has authenticated; empty if the server asks nobody
+
+  // When the server answers in the handler's place: whatever the handler waits for need not be waited for longer.
+  std::chrono::steady_clock::time_point deadline = std::chrono::steady_clock::time_point::max();
+
+  std::string client = {};  // the address that it came from
 };
 
 struct Response {
   unsigned status = 200;
   Headers headers;
   std::string body;
+  std::string subject = {};  // for the request log: what was asked, and how it ended
 };
 
 // Answers one request; called from several threads at once. An exception becomes a 500.
 using Handler = std::function<Response(const Request&)>;
+
+// Answers in the place of a handler that has not, and perhaps still is at work on the same request: why.
+using FailureHandler = std::function<Response(const Request&, const std::string& why)>;
 
 }  // namespace Cimom::Http

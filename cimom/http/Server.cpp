@@ -1,30 +1,61 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/http/Server.h"
 
+#include <cxxabi.h>
+#include <gnutls/gnutls.h>
 #include <microhttpd.h>
-#include <unistd.h>
+#include <sys/resource.h>
+#include <sys/socket.h>
 
+#include <algorithm>
 #include <charconv>
 #include <condition_variable>
 #include <exception>
+#include <memory>
 #include <mutex>
+#include <new>
+#include <optional>
+#include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
+
+#include "cimom/http/Acceptor.h"
+#include "cimom/http/Certificate.h"
+#include "cimom/http/Connections.h"
+#include "cimom/http/Exchange.h"
+#include "cimom/http/LoginDelay.h"
+#include "cimom/http/Reply.h"
+#include "cimom/http/RequestHead.h"
+#include "cimom/http/Timers.h"
+#include "cimom/http/Workers.h"
+#include "ground/Printable.h"
 
 namespace Cimom::Http {
 namespace {
 
 constexpr const char* realm = "cimom";
 
-// One request on its way from the first header to the last byte of its reply.
-struct Exchange {
-  Request request;
-  bool tooLarge = false;
-  std::size_t dropped = 0;  // bytes of the body beyond the limit
-  bool counted = false;     // among those that a drain waits for
-};
+// Checking a password costs milliseconds on purpose.
+constexpr std::size_t loginThreads = 2;
 
-// Counts the requests that are being answered.
+// A client that takes its reply more slowly holds it for too long.
+constexpr std::size_t leastBytesPerSecond = 64 << 10;
+
+// How long clients have to take their replies when the server ends.
+constexpr std::chrono::milliseconds farewell{1000};
+
+// libmicrohttpd 0.9.75 locks itself up when a connection that is handed to it exceeds its own limit (it returns with
+// its mutex held): the limits are those of Connections.
+constexpr std::intptr_t beyondAllLimits = 1 << 30;
+
+// TLS 1.2 at least, and no key exchange whose traffic can be read later with the server's key.
+constexpr const char* priorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2:-RSA:%SERVER_PRECEDENCE";
+
+// Descriptors for what is no connection: files, providers, their sessions.
+constexpr rlim_t otherDescriptors = 64;
+
+// Counts the handlers at work and the replies to be sent.
 class InFlight {
  public:
   // False once the server drains.
@@ -33,65 +64,119 @@ class InFlight {
     if (draining_) {
       return false;
     }
-    ++count_;
+    ++handlers_;
+    ++replies_;
     return true;
   }
 
-  void leave() {
+  void handled() {
     const std::lock_guard lock(mutex_);
-    if (--count_ == 0) {
-      idle_.notify_all();
-    }
+    --handlers_;
+    changed_.notify_all();
+  }
+
+  void replied() {
+    const std::lock_guard lock(mutex_);
+    --replies_;
+    changed_.notify_all();
+  }
+
+  bool isDraining() {
+    const std::lock_guard lock(mutex_);
+    return draining_;
   }
 
   bool drain(std::chrono::milliseconds grace) {
+    const auto deadline = std::chrono::steady_clock::now() + grace;
     std::unique_lock lock(mutex_);
     draining_ = true;
-    return idle_.wait_for(lock, grace, [this] { return count_ == 0; });
+    if (!changed_.wait_until(lock, deadline, [this] { return handlers_ == 0; })) {
+      return false;
+    }
+    changed_.wait_until(lock, std::min(deadline, std::chrono::steady_clock::now() + farewell),
+                        [this] { return replies_ == 0; });
+    return true;
   }
 
  private:
   std::mutex mutex_;
-  std::condition_variable idle_;
-  std::size_t count_ = 0;
+  std::condition_variable changed_;
+  std::size_t handlers_ = 0;
+  std::size_t replies_ = 0;
   bool draining_ = false;
 };
 
 MHD_Result collectHeader(void* headers, MHD_ValueKind, const char* name, const char* value) {
-  static_cast<Headers*>(headers)->add(name, value ? value : "");
-  return MHD_YES;
-}
-
-MHD_Result send(MHD_Connection* connection, const Response& response) {
-  std::unique_ptr<MHD_Response, decltype(&MHD_destroy_response)> message(
-      MHD_create_response_from_buffer(response.body.size(), const_cast<char*>(response.body.data()),
-                                      MHD_RESPMEM_MUST_COPY),
-      &MHD_destroy_response);
-  if (!message) {
+  try {
+    static_cast<Headers*>(headers)->add(name, value ? value : "");
+    return MHD_YES;
+  } catch (const std::exception&) {
     return MHD_NO;
   }
-  for (const auto& [name, value] : response.headers) {
-    MHD_add_response_header(message.get(), name.c_str(), value.c_str());
-  }
-  return MHD_queue_response(connection, response.status, message.get());
 }
 
-MHD_Result refuse(MHD_Connection* connection, unsigned status, const char* reason) {
-  Response response{status, {}, std::string(reason) + "\n"};
-  response.headers.add("Content-Type", "text/plain; charset=\"utf-8\"");
-  response.headers.add("Connection", "close");
-  return send(connection, response);
-}
-
-MHD_Result refuseSize(MHD_Connection* connection) {
-  return refuse(connection, MHD_HTTP_CONTENT_TOO_LARGE, "the request is too large");
-}
-
-MHD_Result challenge(MHD_Connection* connection) {
+Response challenge() {
   Response response{MHD_HTTP_UNAUTHORIZED, {}, "authentication is required\n"};
   response.headers.add("Content-Type", "text/plain; charset=\"utf-8\"");
   response.headers.add("WWW-Authenticate", std::string("Basic realm=\"") + realm + "\"");
-  return send(connection, response);
+  return response;
+}
+
+// What the function answers, or why it does not. The end of the thread passes through.
+template <typename Answer>
+Response guarded(Answer answer) {
+  try {
+    try {
+      return answer();
+    } catch (const abi::__forced_unwind&) {
+      throw;
+    } catch (const std::bad_alloc&) {
+      return overload("the server is out of memory");
+    } catch (const std::exception& error) {
+      return refusal(MHD_HTTP_INTERNAL_SERVER_ERROR, error.what());
+    } catch (...) {
+      return refusal(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed");
+    }
+  } catch (const std::bad_alloc&) {
+    return Response{MHD_HTTP_SERVICE_UNAVAILABLE, {}, {}};  // there is no memory even for the reason
+  }
+}
+
+using ConnectionPointer = std::shared_ptr<Connection>;
+using ExchangePointer = std::shared_ptr<Exchange>;
+
+// The connection's own record; null if there was no memory for it.
+const ConnectionPointer* recordOf(MHD_Connection* connection) {
+  const auto* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
+  return info ? static_cast<const ConnectionPointer*>(info->socket_context) : nullptr;
+}
+
+struct Credentials {
+  std::string user;
+  std::string password;
+};
+
+// The certificate for a handshake, as the connection holds it.
+int retrieveCertificate(gnutls_session_t session, const gnutls_datum_t*, int, const gnutls_pk_algorithm_t*, int,
+                        gnutls_pcert_st** chain, unsigned* length, gnutls_privkey_t* key) {
+  const auto* connection = static_cast<const Connection*>(gnutls_session_get_ptr(session));
+  if (!connection || !connection->certificate) {
+    return -1;
+  }
+  *chain = connection->certificate->chain().data();
+  *length = static_cast<unsigned>(connection->certificate->chain().size());
+  *key = connection->certificate->key();
+  return 0;
+}
+
+void freeText(char* text) { MHD_free(text); }
+
+std::optional<Credentials> credentialsOf(MHD_Connection* connection) {
+  using Text = std::unique_ptr<char, decltype(&freeText)>;
+  char* password = nullptr;
+  const Text user(MHD_basic_auth_get_username_password(connection, &password), &freeText);
+  const Text secret(password, &freeText);
+  return user && secret ? std::optional(Credentials{user.get(), secret.get()}) : std::nullopt;
 }
 
 }  // namespace
@@ -99,111 +184,433 @@ MHD_Result challenge(MHD_Connection* connection) {
 struct Server::State {
   ServerOptions options;
   Handler handler;
-  Listener listener;
+  const std::string noAnswer =
+      "the provider did not answer within " + std::to_string(options.operationTimeout.count()) + " s";
+  const std::string threadEnded = "the provider ended the thread of the request";
+  HostNames hostNames;
+  MemoryBudget budget;
   InFlight inFlight;
+  Suspensions suspensions;
+  Timers timers;
+  Connections connections;
+  LoginDelay loginDelay;
+  std::mutex certificateMutex;
+  std::shared_ptr<Certificate> certificate;  // none: plain HTTP
+  Workers workers;
+  Workers logins;
+  Workers failures;
+  std::string endpoint;
+  std::uint16_t port = 0;
   MHD_Daemon* daemon = nullptr;
+  std::unique_ptr<Acceptor> acceptor;
 
   State(ServerOptions given, Handler answer)
-      : options(std::move(given)), handler(std::move(answer)), listener(options.address, options.port) {}
+      : options(std::move(given)),
+        handler(std::move(answer)),
+        hostNames(options.hostNames),
+        budget(options.maxRequestMemory),
+        connections(options.maxConnections, options.maxConnectionsPerAddress, timers),
+        workers(options.maxRequests, 0),
+        logins(loginThreads, options.maxConnections),
+        failures(1, options.maxConnections) {}
 
-  // What the headers alone decide is decided before a byte of the body is asked for.
-  MHD_Result begin(MHD_Connection* connection, Request& request) const {
-    MHD_get_connection_values(connection, MHD_HEADER_KIND, &collectHeader, &request.headers);
-    if (options.authenticator && !authenticated(connection, request)) {
-      return challenge(connection);
+  ~State() {
+    acceptor.reset();
+    suspensions.end();
+    if (daemon) {
+      MHD_stop_daemon(daemon);
     }
-    const std::string* length = request.headers.find(MHD_HTTP_HEADER_CONTENT_LENGTH);
-    std::size_t bytes = 0;
-    if (length) {
-      std::from_chars(length->data(), length->data() + length->size(), bytes);
-    }
-    return bytes <= options.maxRequestSize ? MHD_YES : refuseSize(connection);
+    timers.stop();
   }
 
-  bool authenticated(MHD_Connection* connection, Request& request) const {
-    char* password = nullptr;
-    char* user = MHD_basic_auth_get_username_password(connection, &password);
-    const bool accepted = user && password && options.authenticator(user, password);
-    if (accepted) {
-      request.user = user;
-    }
-    MHD_free(user);
-    MHD_free(password);
-    return accepted;
-  }
-
-  // The size of a chunked body is known only once it has been read: what is beyond the limit is dropped, and a client
-  // that goes on for as long again is cut off.
-  MHD_Result receive(Exchange& exchange, const char* data, std::size_t& size) const {
-    std::string& body = exchange.request.body;
-    if (!exchange.tooLarge && size <= options.maxRequestSize - body.size()) {
-      body.append(data, size);
-    } else {
-      exchange.tooLarge = true;
-      exchange.dropped += size;
-      body.clear();
-    }
-    size = 0;
-    return exchange.dropped > 2 * options.maxRequestSize ? MHD_NO : MHD_YES;
-  }
-
-  MHD_Result answer(MHD_Connection* connection, Exchange& exchange) {
-    if (exchange.tooLarge) {
-      return refuseSize(connection);
-    }
-    exchange.counted = inFlight.enter();
-    if (!exchange.counted) {
-      return refuse(connection, MHD_HTTP_SERVICE_UNAVAILABLE, "the server is shutting down");
-    }
-    try {
-      return send(connection, handler(exchange.request));
-    } catch (const std::exception& error) {
-      return refuse(connection, MHD_HTTP_INTERNAL_SERVER_ERROR, error.what());
-    }
-  }
-
-  static MHD_Result onRequest(void* self, MHD_Connection* connection, const char* path, const char* method, const char*,
-                              const char* data, std::size_t* size, void** handle) {
-    auto& state = *static_cast<State*>(self);
-    if (!*handle) {
-      auto exchange = std::make_unique<Exchange>();
-      exchange->request.method = method;
-      exchange->request.path = path;
-      *handle = exchange.get();
-      return state.begin(connection, exchange.release()->request);
-    }
-    auto& exchange = *static_cast<Exchange*>(*handle);
-    return *size > 0 ? state.receive(exchange, data, *size) : state.answer(connection, exchange);
-  }
-
-  static void onCompleted(void* self, MHD_Connection*, void** handle, MHD_RequestTerminationCode) {
-    const std::unique_ptr<Exchange> exchange(static_cast<Exchange*>(std::exchange(*handle, nullptr)));
-    if (exchange && exchange->counted) {
-      static_cast<State*>(self)->inFlight.leave();
-    }
-  }
+  State(const State&) = delete;
+  State& operator=(const State&) = delete;
 
   void start() {
-    unsigned flags = MHD_USE_INTERNAL_POLLING_THREAD | MHD_USE_THREAD_PER_CONNECTION | MHD_USE_POLL | MHD_USE_ITC;
+    Listener listener(options.address, options.port);
+    requireProtection(listener);
+    requireDescriptors();
+    if (isTls()) {
+      certificate = std::make_shared<Certificate>(options.tlsCertificate, options.tlsKey);
+    }
+    startDaemon();
+    listener.listen();
+    endpoint = std::string(isTls() ? "https://" : "http://") + listener.endpoint();
+    port = listener.port();
+    acceptor = std::make_unique<Acceptor>(
+        std::move(listener), [this](int descriptor, const sockaddr_storage& peer, socklen_t size) {
+          MHD_add_connection(daemon, descriptor, reinterpret_cast<const sockaddr*>(&peer), size);
+        });
+  }
+
+  bool isTls() const { return !options.tlsCertificate.empty(); }
+
+  // Whoever reaches the server may change what the providers let be changed.
+  void requireProtection(const Listener& listener) const {
+    if (listener.address().isLoopback() || (isTls() && options.authenticator)) {
+      return;
+    }
+    throw ServerError("cannot listen on " + options.address + " port " + std::to_string(listener.port()) +
+                      ": other machines reach it, so that tls-certificate, tls-key and password-file must be given; "
+                      "without them only a loopback address can be, 127.0.0.1 or ::1");
+  }
+
+  // All connections, or none: a limit that cannot be kept would show on the worst day.
+  void requireDescriptors() const {
+    const rlim_t needed = options.maxConnections + Connections::surplus + otherDescriptors;
+    rlimit limit{};
+    if (getrlimit(RLIMIT_NOFILE, &limit) != 0 || limit.rlim_cur >= needed) {
+      return;
+    }
+    limit.rlim_cur = std::min(needed, limit.rlim_max);
+    if (limit.rlim_cur < needed || setrlimit(RLIMIT_NOFILE, &limit) != 0) {
+      throw ServerError("max-connections " + std::to_string(options.maxConnections) + " needs " +
+                        std::to_string(needed) + " open files, and the process may have " +
+                        std::to_string(limit.rlim_cur) +
+                        ": lower max-connections, or raise the limit (ulimit -n, LimitNOFILE= of systemd)");
+    }
+  }
+
+  void startDaemon() {
+    unsigned flags = MHD_USE_INTERNAL_POLLING_THREAD | MHD_USE_POLL | MHD_USE_NO_LISTEN_SOCKET |
+                     MHD_ALLOW_SUSPEND_RESUME | MHD_USE_ITC;
     std::vector<MHD_OptionItem> settings = {
-        {MHD_OPTION_LISTEN_SOCKET, listener.duplicate(), nullptr},
-        {MHD_OPTION_CONNECTION_LIMIT, static_cast<std::intptr_t>(options.maxConnections), nullptr},
+        {MHD_OPTION_CONNECTION_LIMIT, beyondAllLimits, nullptr},
         {MHD_OPTION_CONNECTION_TIMEOUT, static_cast<std::intptr_t>(options.idleTimeout.count()), nullptr},
+        {MHD_OPTION_NOTIFY_CONNECTION, reinterpret_cast<std::intptr_t>(&State::onConnection), this},
         {MHD_OPTION_NOTIFY_COMPLETED, reinterpret_cast<std::intptr_t>(&State::onCompleted), this}};
-    if (!options.tlsCertificate.empty()) {
+    if (isTls()) {
       flags |= MHD_USE_TLS;
-      settings.push_back({MHD_OPTION_HTTPS_MEM_CERT, 0, options.tlsCertificate.data()});
-      settings.push_back({MHD_OPTION_HTTPS_MEM_KEY, 0, options.tlsKey.data()});
+      settings.push_back({MHD_OPTION_HTTPS_CERT_CALLBACK, 0, reinterpret_cast<void*>(&retrieveCertificate)});
+      settings.push_back({MHD_OPTION_HTTPS_PRIORITIES, 0, const_cast<char*>(priorities)});
     }
     settings.push_back({MHD_OPTION_END, 0, nullptr});
     daemon = MHD_start_daemon(flags, 0, nullptr, nullptr, &State::onRequest, this, MHD_OPTION_ARRAY, settings.data(),
                               MHD_OPTION_END);
-    if (daemon) {
+    if (!daemon) {
+      throw ServerError(isTls() ? "cannot start the HTTPS server" : "cannot start the HTTP server");
+    }
+  }
+
+  // --- In the thread of the connections. What C calls lets no exception out.
+
+  static void onConnection(void* self, MHD_Connection* connection, void** record, MHD_ConnectionNotificationCode what) {
+    auto& state = *static_cast<State*>(self);
+    if (what == MHD_CONNECTION_NOTIFY_STARTED) {
+      state.opened(connection, record);
+    } else if (*record) {
+      const std::unique_ptr<ConnectionPointer> closed(static_cast<ConnectionPointer*>(std::exchange(*record, nullptr)));
+      state.connections.close(**closed);
+    }
+  }
+
+  void opened(MHD_Connection* connection, void** record) {
+    const int descriptor = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD)->connect_fd;
+    try {
+      const auto* peer = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CLIENT_ADDRESS);
+      auto pointer = std::make_unique<ConnectionPointer>();
+      *pointer = connections.open(descriptor, peer->client_addr, options.requestTimeout);
+      if (const auto* session = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_GNUTLS_SESSION)) {
+        const std::lock_guard lock(certificateMutex);
+        (*pointer)->certificate = certificate;
+        gnutls_session_set_ptr(static_cast<gnutls_session_t>(session->tls_session), pointer->get());
+      }
+      *record = pointer.release();
+    } catch (const std::exception&) {
+      ::shutdown(descriptor, SHUT_RDWR);
+    }
+  }
+
+  static MHD_Result onRequest(void* self, MHD_Connection* connection, const char* path, const char* method,
+                              const char* version, const char* data, std::size_t* size, void** handle) {
+    try {
+      auto& state = *static_cast<State*>(self);
+      const ConnectionPointer* record = recordOf(connection);
+      if (!record) {
+        return MHD_NO;
+      }
+      if (*handle) {
+        return state.proceed(connection, *record, *static_cast<ExchangePointer*>(*handle), data, *size);
+      }
+      auto exchange = std::make_shared<Exchange>(state.options.maxRequestSize, state.budget);
+      exchange->request.method = method;
+      exchange->request.path = path;
+      exchange->request.client = (*record)->peer.text();
+      exchange->isHttp11 = version != std::string_view("HTTP/1.0");
+      *handle = new ExchangePointer(exchange);
+      return state.begin(connection, *record, exchange, version);
+    } catch (const std::exception&) {
+      return MHD_NO;
+    }
+  }
+
+  // What the headers alone decide is decided before a byte of the body is asked for.
+  MHD_Result begin(MHD_Connection* connection, const ConnectionPointer& record, const ExchangePointer& exchange,
+                   std::string_view version) {
+    Headers& headers = exchange->request.headers;
+    const int given = MHD_get_connection_values(connection, MHD_HEADER_KIND, nullptr, nullptr);
+    MHD_get_connection_values(connection, MHD_HEADER_KIND, &collectHeader, &headers);
+    if (std::distance(headers.begin(), headers.end()) != given) {
+      return MHD_NO;
+    }
+    if (const auto fault = findFault(version, headers, hostNames, record->arrivedAt)) {
+      return reply(connection, record, *exchange, refusal(fault->status, fault->reason));
+    }
+    if (record->isSurplus) {
+      return reply(connection, record, *exchange, overload("too many connections"));
+    }
+    if (inFlight.isDraining()) {
+      return reply(connection, record, *exchange, overload("the server is shutting down"));
+    }
+    if (options.authenticator) {
+      return login(connection, record, exchange);
+    }
+    return expectBody(connection, record, *exchange);
+  }
+
+  MHD_Result login(MHD_Connection* connection, const ConnectionPointer& record, const ExchangePointer& exchange) {
+    auto credentials = credentialsOf(connection);
+    if (!credentials) {
+      return reply(connection, record, *exchange, challenge());
+    }
+    const auto now = std::chrono::steady_clock::now();
+    const auto delay = loginDelay.admit(record->group, credentials->user, now);
+    if (!delay) {
+      Response response = refusal(MHD_HTTP_TOO_MANY_REQUESTS, "too many failed logins");
+      response.headers.add("Retry-After", "10");
+      return reply(connection, record, *exchange, std::move(response));
+    }
+    exchange->phase = Exchange::Phase::Login;
+    exchange->group = record->group;
+    exchange->request.user = std::move(credentials->user);
+    exchange->password = std::move(credentials->password);
+    if (!suspensions.add(exchange, connection)) {
+      return MHD_NO;
+    }
+    // Who has to wait costs no thread meanwhile.
+    connections.unlimit(*record);
+    delayLogin(exchange, now + *delay, *delay == delay->zero());
+    return MHD_YES;
+  }
+
+  MHD_Result expectBody(MHD_Connection* connection, const ConnectionPointer& record, Exchange& exchange) {
+    exchange.phase = Exchange::Phase::Body;
+    const std::string* length = exchange.request.headers.find(MHD_HTTP_HEADER_CONTENT_LENGTH);
+    std::size_t bytes = 0;
+    if (length) {
+      std::from_chars(length->data(), length->data() + length->size(), bytes);
+    }
+    return bytes <= options.maxRequestSize
+               ? MHD_YES
+               : reply(connection, record, exchange, refusal(MHD_HTTP_CONTENT_TOO_LARGE, "the request is too large"));
+  }
+
+  MHD_Result proceed(MHD_Connection* connection, const ConnectionPointer& record, const ExchangePointer& exchange,
+                     const char* data, std::size_t& size) {
+    if (exchange->isAbandoned()) {
+      return MHD_NO;
+    }
+    switch (exchange->phase) {
+      case Exchange::Phase::Login:
+        if (auto response = exchange->takeResponse()) {
+          return reply(connection, record, *exchange, std::move(*response));
+        }
+        connections.limit(record, options.requestTimeout);
+        return expectBody(connection, record, *exchange);
+      case Exchange::Phase::Body:
+        if (size > 0) {
+          const std::size_t taken = std::exchange(size, 0);
+          return exchange->receive(data, taken) ? MHD_YES : MHD_NO;
+        }
+        return answer(connection, record, exchange);
+      case Exchange::Phase::Answering:
+        if (auto response = exchange->takeResponse()) {
+          return reply(connection, record, *exchange, std::move(*response));
+        }
+        return MHD_NO;
+      default:
+        size = 0;  // the rest of a request that has been refused
+        return MHD_YES;
+    }
+  }
+
+  MHD_Result answer(MHD_Connection* connection, const ConnectionPointer& record, const ExchangePointer& exchange) {
+    connections.unlimit(*record);
+    if (const auto& fault = exchange->refusal()) {
+      return reply(connection, record, *exchange,
+                   fault->status == MHD_HTTP_SERVICE_UNAVAILABLE ? overload(fault->reason)
+                                                                 : refusal(fault->status, fault->reason));
+    }
+    exchange->counted = inFlight.enter();
+    if (!exchange->counted) {
+      return reply(connection, record, *exchange, overload("the server is shutting down"));
+    }
+    exchange->phase = Exchange::Phase::Answering;
+    exchange->request.deadline = std::chrono::steady_clock::now() + options.operationTimeout;
+    if (!suspensions.add(exchange, connection)) {
+      inFlight.handled();
+      return MHD_NO;
+    }
+    dispatch(exchange);
+    return MHD_YES;
+  }
+
+  MHD_Result reply(MHD_Connection* connection, const ConnectionPointer& record, Exchange& exchange, Response response) {
+    exchange.phase = Exchange::Phase::Replied;
+    exchange.status = response.status;
+    exchange.subject = std::move(response.subject);
+    const auto bytes = static_cast<std::chrono::seconds::rep>(response.body.size() / leastBytesPerSecond);
+    connections.limit(record, options.requestTimeout + std::chrono::seconds(bytes));
+    return send(connection, std::move(response), exchange.isHttp11);
+  }
+
+  static void onCompleted(void* self, MHD_Connection* connection, void** handle, MHD_RequestTerminationCode) {
+    auto& state = *static_cast<State*>(self);
+    const std::unique_ptr<ExchangePointer> exchange(static_cast<ExchangePointer*>(std::exchange(*handle, nullptr)));
+    const ConnectionPointer* record = recordOf(connection);
+    if (!exchange) {
       return;
     }
-    throw ServerError(options.tlsCertificate.empty() ? "cannot start the HTTP server"
-                                                     : "cannot start the HTTPS server: certificate and key must be "
-                                                       "unencrypted PEM and belong together");
+    state.record(**exchange);
+    if ((*exchange)->counted) {
+      state.inFlight.replied();
+    }
+    try {
+      // How long the connection rests is the HTTP library's to see; the next request is whole by then.
+      if (record) {
+        state.connections.limit(*record, state.options.idleTimeout + state.options.requestTimeout);
+      }
+    } catch (const std::exception&) {
+      (*record)->cut();
+    }
+  }
+
+  void record(const Exchange& exchange) const {
+    if (!options.requestLog || exchange.status == 0) {
+      return;
+    }
+    try {
+      const Request& request = exchange.request;
+      options.requestLog(
+          {std::chrono::duration_cast<std::chrono::milliseconds>(std::chrono::steady_clock::now() - exchange.begun),
+           request.client, request.user,
+           exchange.subject.empty() ? request.method + " " + request.path : exchange.subject, exchange.status});
+    } catch (const std::exception&) {
+      // a line is lost, and nothing else
+    }
+  }
+
+  // --- In other threads.
+
+  void turnAway(const ExchangePointer& exchange, const char* reason) {
+    try {
+      suspensions.resume(exchange, overload(reason));
+    } catch (const std::exception&) {
+      suspensions.abandon(exchange);
+    }
+  }
+
+  void delayLogin(const ExchangePointer& exchange, std::chrono::steady_clock::time_point time, bool now) {
+    try {
+      if (now) {
+        startLogin(exchange);
+      } else {
+        timers.at(time, [this, exchange] { startLogin(exchange); });
+      }
+    } catch (const std::exception&) {
+      turnAway(exchange, "the server is out of memory");
+    }
+  }
+
+  void startLogin(const ExchangePointer& exchange) {
+    try {
+      if (logins.run([this, exchange] { check(exchange); })) {
+        return;
+      }
+    } catch (const std::exception&) {
+      // no memory: there is no room, then
+    }
+    turnAway(exchange, "too many logins at once");
+  }
+
+  void check(const ExchangePointer& exchange) {
+    std::optional<Response> response = guarded([&] {
+      const std::string& user = exchange->request.user;
+      if (options.authenticator(user, exchange->password)) {
+        loginDelay.succeeded(exchange->group, user);
+        return Response{0, {}, {}};
+      }
+      loginDelay.failed(exchange->group, user, std::chrono::steady_clock::now());
+      if (options.log) {
+        options.log("login failed: user \"" + Ground::printable(user) + "\" from " + exchange->request.client);
+      }
+      return challenge();
+    });
+    if (response->status == 0) {
+      response.reset();
+    }
+    suspensions.resume(exchange, std::move(response));
+  }
+
+  // Answers the request however its handler ends.
+  struct Answering {
+    State& state;
+    ExchangePointer exchange;
+    std::optional<Response> response = {};
+
+    ~Answering() {
+      state.timers.cancel(exchange->timeLimit);
+      if (response) {
+        exchange->endHandling();
+        state.suspensions.resume(exchange, std::move(response));
+      } else {
+        // The provider has ended the thread, which another replaces.
+        exchange->giveUpHandling(state.workers);
+        exchange->endHandling();
+        state.fail(exchange, state.threadEnded);
+      }
+      state.inFlight.handled();
+    }
+  };
+
+  void dispatch(const ExchangePointer& exchange) {
+    try {
+      exchange->timeLimit = timers.at(exchange->request.deadline, [this, weak = std::weak_ptr(exchange)] {
+        if (const auto late = weak.lock(); late && late->giveUpHandling(workers)) {
+          fail(late, noAnswer);
+        }
+      });
+      if (workers.run([this, exchange] {
+            exchange->beginHandling(Workers::current());
+            Answering answering{*this, exchange};
+            answering.response = guarded([&] { return handler(exchange->request); });
+          })) {
+        return;
+      }
+    } catch (const std::exception&) {
+      // no memory: there is no room, then
+    }
+    timers.cancel(exchange->timeLimit);
+    inFlight.handled();
+    turnAway(exchange, "too many requests at once");
+  }
+
+  // Answers in the place of a handler that has not. It takes no exception from the threads that call it.
+  void fail(const ExchangePointer& exchange, const std::string& why) {
+    try {
+      if (options.failureHandler && failures.run([this, exchange, why] {
+            suspensions.resume(exchange, guarded([&] { return options.failureHandler(exchange->request, why); }));
+          })) {
+        return;
+      }
+    } catch (const std::exception&) {
+      // answered without the handler
+    }
+    try {
+      suspensions.resume(exchange, refusal(MHD_HTTP_INTERNAL_SERVER_ERROR, why));
+    } catch (const std::exception&) {
+      suspensions.abandon(exchange);
+    }
   }
 };
 
@@ -212,18 +619,25 @@ Server::Server(ServerOptions options, Handler handler)
   state_->start();
 }
 
-Server::~Server() { MHD_stop_daemon(state_->daemon); }
+Server::~Server() = default;
 
-std::string Server::endpoint() const { return state_->listener.endpoint(); }
+std::string Server::endpoint() const { return state_->endpoint; }
 
-std::uint16_t Server::port() const { return state_->listener.port(); }
+std::uint16_t Server::port() const { return state_->port; }
+
+void Server::useCertificate(const std::string& chain, const std::string& key) {
+  auto replacement = std::make_shared<Certificate>(chain, key);
+  const std::lock_guard lock(state_->certificateMutex);
+  state_->certificate.swap(replacement);
+}
+
+void Server::adopt(int descriptor) {
+  sockaddr_storage none{};
+  MHD_add_connection(state_->daemon, descriptor, reinterpret_cast<const sockaddr*>(&none), sizeof none);
+}
 
 bool Server::drain(std::chrono::milliseconds grace) {
-  const int socket = MHD_quiesce_daemon(state_->daemon);
-  if (socket >= 0) {
-    ::close(socket);
-  }
-  state_->listener.close();
+  state_->acceptor.reset();
   return state_->inFlight.drain(grace);
 }
 

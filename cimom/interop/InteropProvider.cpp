@@ -11,6 +11,7 @@
 #include "cimom/broker/Handle.h"
 #include "cimom/model/Instance.h"
 #include "cimom/model/Names.h"
+#include "cimom/routing/SameObject.h"
 
 namespace Cimom {
 namespace {
@@ -32,17 +33,6 @@ Value uint16(CMPIUint16 number) {
   CMPIValue value{};
   value.uint16 = number;
   return Value::scalar(CMPI_uint16, value);
-}
-
-// Whether two paths name one object. A path that names no host or namespace means that of the other.
-bool isSameObject(const ObjectPath& one, const ObjectPath& another) {
-  const bool isElsewhere =
-      !one.nameSpace.empty() && !another.nameSpace.empty() && !sameName(one.nameSpace, another.nameSpace);
-  return !isElsewhere && sameName(one.className, another.className) && one.keys.size() == another.keys.size() &&
-         std::ranges::all_of(one.keys, [&](const NamedValues::Entry& key) {
-           const Value* value = another.keys.find(key.name);
-           return value && value->toString() == key.value.toString();
-         });
 }
 
 class Catalogue {
@@ -286,10 +276,10 @@ std::vector<Catalogue::Step> Catalogue::stepsFrom(const CMPIObjectPath* source, 
       continue;
     }
     for (const Link& link : (this->*row.links)(context)) {
-      if (isSameObject(from, link.first)) {
+      if (sameObject(from, link.first, interopNamespace)) {
         steps.push_back({linkOf(row, link), link.second});
       }
-      if (isSameObject(from, link.second)) {
+      if (sameObject(from, link.second, interopNamespace)) {
         steps.push_back({linkOf(row, link), link.first});
       }
     }
@@ -333,7 +323,7 @@ CMPIInstanceMI* Catalogue::instanceMi(const CMPIBroker* broker) {
          const char**) {
         return guarded([&] {
           for (const Instance& instance : of(mi).instancesOf(path, context)) {
-            if (isSameObject(instance.path(), modelOf<ObjectPath>(path))) {
+            if (sameObject(instance.path(), modelOf<ObjectPath>(path), interopNamespace)) {
               const auto lent = lend(instance);
               CMReturnInstance(result, &lent);
             }

@@ -36,6 +36,9 @@ constexpr CimType types[] = {
     // Two ways in which providers pass a string.
     {CMPI_chars, "string", nullptr, "string", 0},
     {CMPI_charsptr, "string", nullptr, nullptr, 0},
+    // What is a value in the interface only.
+    {CMPI_args, "arguments", nullptr, nullptr, 0},
+    {CMPI_enumeration, "enumeration", nullptr, nullptr, 0},
     {CMPI_ptr, "pointer", nullptr, nullptr, sizeof(CMPIValuePtr)},
 };
 

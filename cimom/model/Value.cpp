@@ -91,6 +91,13 @@ Value Value::array(Array value) {
   return Value(type, std::make_shared<const Array>(std::move(value)));
 }
 
+Value Value::arguments(NamedValues value) {
+  return Value(CMPI_args, std::make_shared<const NamedValues>(std::move(value)));
+}
+Value Value::enumeration(std::vector<Value> items) {
+  return Value(CMPI_enumeration, std::make_shared<const std::vector<Value>>(std::move(items)));
+}
+
 bool Value::isTrue() const {
   const CMPIValue* content = scalar();
   return type_ == CMPI_boolean && content && content->boolean;
@@ -103,6 +110,10 @@ const ObjectPath* Value::path() const { return shared<ObjectPath>(content_); }
 const Instance* Value::embedded() const { return shared<Instance>(content_); }
 
 const Array* Value::elements() const { return shared<Array>(content_); }
+
+const NamedValues* Value::arguments() const { return shared<NamedValues>(content_); }
+
+const std::vector<Value>* Value::items() const { return shared<std::vector<Value>>(content_); }
 
 std::optional<Value> Value::asInteger(CMPIType type) const {
   std::optional<Value> result;
@@ -157,7 +168,9 @@ std::string Value::toString() const {
     case CMPI_char16:
       return std::to_string(scalar()->char16);
     case CMPI_ptr:
-      return "(pointer)";
+    case CMPI_args:
+    case CMPI_enumeration:
+      return "(" + describeType(type_) + ")";
     default:
       return numberText(type_, *scalar());
   }

@@ -17,6 +17,7 @@
 namespace Cimom {
 
 struct Array;
+class NamedValues;
 struct ObjectPath;
 class Instance;
 
@@ -42,6 +43,9 @@ class Value {
   static Value reference(ObjectPath value);
   static Value instance(Instance value);
   static Value array(Array value);
+  // What only CMPI passes as a value: arguments of a method, and items of an enumeration.
+  static Value arguments(NamedValues value);
+  static Value enumeration(std::vector<Value> items);
 
   CMPIType type() const { return type_; }
   bool isNull() const { return std::holds_alternative<std::monostate>(content_); }
@@ -60,6 +64,10 @@ class Value {
   const Instance* embedded() const;
   // The array, or null.
   const Array* elements() const;
+  // The arguments, or null.
+  const NamedValues* arguments() const;
+  // The items of the enumeration, or null.
+  const std::vector<Value>* items() const;
 
   // The same number as another integer type; none if it is no integer or does not fit.
   std::optional<Value> asInteger(CMPIType type) const;
@@ -72,7 +80,8 @@ class Value {
  private:
   using Content =
       std::variant<std::monostate, CMPIValue, DateTime, std::shared_ptr<const std::string>,
-                   std::shared_ptr<const ObjectPath>, std::shared_ptr<const Instance>, std::shared_ptr<const Array>>;
+                   std::shared_ptr<const ObjectPath>, std::shared_ptr<const Instance>, std::shared_ptr<const Array>,
+                   std::shared_ptr<const NamedValues>, std::shared_ptr<const std::vector<Value>>>;
 
   // What a variant does whose copy throws is not to be relied on.
   template <typename... Types>

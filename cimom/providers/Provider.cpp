@@ -67,6 +67,17 @@ void requireOk(const std::string& what, const CMPIStatus& status) {
                                             ", which is no return code of CMPI" + (text.empty() ? "" : ": " + text));
 }
 
+void reportThreadEnd(const std::string& what) noexcept {
+  ProviderFrame::endThread(what);
+  try {
+    if (const CMPIBroker* broker = RequestScope::currentBroker()) {
+      logError(coreOf(broker), what + " ended the thread of its request");
+    }
+  } catch (const std::exception&) {
+    // Without memory for the line, the client's answer has to do.
+  }
+}
+
 // The turn to load the library and to make an MI. Who makes one makes others by way of up-calls, so that whoever comes
 // from a factory must not wait: two could wait for each other.
 class Provider::Turn {

@@ -23,6 +23,9 @@ namespace Cimom {
 // Throws StatusError for a status that is not OK, and CMPI_RC_ERR_FAILED for a return code that CMPI does not have.
 void requireOk(const std::string& what, const CMPIStatus& status);
 
+// Notes, and logs, that a provider ends the thread that it was called on.
+void reportThreadEnd(const std::string& what) noexcept;
+
 // Runs a provider's function and turns both its status and what it throws into a StatusError: a provider's failure
 // ends its request, never the object manager.
 template <typename Call>
@@ -32,7 +35,7 @@ void runProvider(const std::string& what, Call call) {
     const ProviderFrame frame;
     status = call();
   } catch (const abi::__forced_unwind&) {
-    ProviderFrame::endThread(what);
+    reportThreadEnd(what);
     throw;  // the thread ends, whatever is done here
   } catch (const ThreadExit&) {
     throw StatusError(CMPI_RC_ERR_FAILED, what + " tried to end the thread of its request");

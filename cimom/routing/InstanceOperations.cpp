@@ -2,9 +2,12 @@
 #include <algorithm>
 #include <iterator>
 #include <optional>
+#include <set>
+#include <string_view>
 
 #include "cimom/routing/ProviderCall.h"
 #include "cimom/routing/Router.h"
+#include "cimom/routing/SameObject.h"
 
 namespace Cimom {
 namespace {
@@ -63,6 +66,38 @@ std::vector<Value> forEachClass(const ProviderRegistry& providers, const Operati
   return all;
 }
 
+// The instance, without defaults, as one of the class; what of another class's properties does not fit is left out.
+Instance inClass(const ClassDefinition& definition, const Instance& given) {
+  Instance bare = given.withoutDefaults();
+  if (sameName(given.definition().name, definition.name)) {
+    return bare;
+  }
+  Instance other = Instance(definition, {}).withoutDefaults();
+  for (std::size_t index = 0; index < bare.size(); ++index) {
+    const PropertyDeclaration* property = definition.findProperty(given.definition().properties[index].name);
+    if (property && property->type == given.definition().properties[index].type) {
+      other.set(property->name, bare[index]);
+    }
+  }
+  return other;
+}
+
+// Sets what a property list leaves out to null, but for the keys.
+void dropUnlisted(Instance& instance, const char** properties) {
+  if (!properties) {
+    return;
+  }
+  std::set<std::string_view, NameLess> listed;
+  for (; *properties; ++properties) {
+    listed.insert(*properties);
+  }
+  for (const PropertyDeclaration& property : instance.definition().properties) {
+    if (!property.isKey() && !listed.contains(property.name)) {
+      instance.set(property.name, Value::null(property.type));
+    }
+  }
+}
+
 }  // namespace
 
 std::vector<Value> Router::enumerateInstances(const Operation& operation, const char** properties) {
@@ -79,15 +114,23 @@ std::vector<Value> Router::enumerateInstanceNames(const Operation& operation) {
                       });
 }
 
-Value Router::getInstance(const Operation& operation, const char** properties) {
+std::optional<Value> Router::findInstance(const Operation& operation, const ObjectPath& named,
+                                          const char** properties) {
   if (Provider* provider = providerOf(providers_, operation)) {
-    const auto path = lend(operation.path);
+    const auto path = lend(named);
     CMPIInstanceMI* mi = provider->instanceMi(&operation.core.broker);
     std::vector<Value> found =
         callProvider(operation, *provider, mi, CMPI_instance, mi->ft->getInstance, &path, properties);
     if (!found.empty()) {
       return std::move(found.front());
     }
+  }
+  return std::nullopt;
+}
+
+Value Router::getInstance(const Operation& operation, const char** properties) {
+  if (auto found = findInstance(operation, operation.path, properties)) {
+    return *std::move(found);
   }
   throw StatusError(CMPI_RC_ERR_NOT_FOUND, "no instance " + operation.path.toString());
 }
@@ -101,15 +144,68 @@ Value Router::createInstance(const Operation& operation, const Instance& instanc
   return paths.empty() ? Value::reference(instance.path()) : std::move(paths.front());
 }
 
+void Router::requireThere(const Operation& operation, const ObjectPath& path) {
+  if (!providerOf(providers_, operation)) {
+    return;  // nobody to ask
+  }
+  try {
+    if (findInstance(operation, path, nullptr)) {
+      return;
+    }
+  } catch (const StatusError& error) {
+    if (error.code() == CMPI_RC_ERR_NOT_SUPPORTED) {
+      return;  // nobody who knows
+    }
+    throw;
+  }
+  throw StatusError(CMPI_RC_ERR_NOT_FOUND, "no instance " + path.toString());
+}
+
+void Router::requireConsistent(const Operation& operation, const Instance& instance, const char** properties) {
+  const ClassDefinition& definition = operation.definition;
+  if (!sameName(instance.definition().name, definition.name)) {
+    throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER,
+                      "an instance of " + instance.definition().name + " cannot have a path of " + definition.name);
+  }
+  const auto requireSame = [&](const std::string& name, const Value* value) {
+    const Value* key = operation.path.keys.find(name);
+    if (key && value && !key->isNull() && !value->isNull() && !sameKey(*key, *value, operation.path.nameSpace)) {
+      throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "key " + name + " of the instance is " + value->toString() +
+                                                           ", that of its path " + key->toString());
+    }
+  };
+  const Instance sent = instance.withoutDefaults();
+  for (const PropertyDeclaration& property : definition.properties) {
+    if (property.isKey()) {
+      requireSame(property.name, sent.find(property.name));
+    }
+  }
+  for (const auto& [name, value] : instance.path().keys) {
+    requireSame(name, &value);
+  }
+  for (; properties && *properties; ++properties) {
+    if (!definition.findProperty(*properties)) {
+      throw StatusError(CMPI_RC_ERR_NO_SUCH_PROPERTY, "class " + definition.name + " has no property " + *properties);
+    }
+  }
+}
+
 void Router::modifyInstance(const Operation& operation, const Instance& instance, const char** properties) {
   Provider& provider = writingProviderOf(providers_, operation);
+  if (strictness_ == Strictness::Exact) {
+    requireConsistent(operation, instance, properties);
+  }
   ObjectPath complete = operation.path;
   for (const auto& [name, value] : instance.path().keys) {
     if (!complete.keys.find(name)) {
       complete.keys.set(name, value);
     }
   }
-  Instance modified = instance.withoutDefaults();
+  Instance modified = inClass(operation.definition, instance);
+  if (strictness_ == Strictness::Exact) {
+    requireThere(operation, complete);
+    dropUnlisted(modified, properties);
+  }
   modified.setPath(complete);
   const auto path = lend(std::move(complete));
   const auto whole = lend(std::move(modified));

@@ -44,9 +44,29 @@ class CommandLineTest : public testing::Test {
 TEST_F(CommandLineTest, ShowsHelpWithEveryOption) {
   const Completed completed = cimomd({"--help"});
   EXPECT_EQ(completed.status, 0);
-  for (const char* option : {"--config", "--address", "--port", "--schema", "--registration", "--provider-dir",
-                             "--max-request-size", "--max-connections", "--idle-timeout", "--shutdown-timeout",
-                             "--tls-certificate", "--tls-key", "--password-file", "--version"}) {
+  for (const char* option : {"--config",
+                             "--address",
+                             "--port",
+                             "--schema",
+                             "--registration",
+                             "--provider-dir",
+                             "--max-request-size",
+                             "--max-request-memory",
+                             "--max-requests",
+                             "--max-connections",
+                             "--max-connections-per-address",
+                             "--idle-timeout",
+                             "--request-timeout",
+                             "--operation-timeout",
+                             "--shutdown-timeout",
+                             "--server-name",
+                             "--tls-certificate",
+                             "--tls-key",
+                             "--password-file",
+                             "--request-log",
+                             "--trace",
+                             "--user",
+                             "--version"}) {
     EXPECT_THAT(completed.output, HasSubstr(option));
   }
 }

@@ -247,7 +247,38 @@ TEST_F(CompositeAssociationTest, IsFoundInAnyLetterCase) {
 TEST_F(CompositeAssociationTest, AnswersNothingForAnObjectThatHasNoPartInIt) {
   EXPECT_THAT(stack_.names(scoped("ain", "-ac", Classes::staticOrderedMember), endpoint("eth0")), IsEmpty());
   EXPECT_THAT(stack_.names(scoped("rin", "-arc", Classes::hostedAccessPoint), dhcpSetting("eth0")), IsEmpty());
-  EXPECT_THAT(stack_.names(scoped("ain", "-ac", Classes::staticOrderedMember), staticSetting("eth9")), IsEmpty());
+}
+
+TEST_F(CompositeAssociationTest, AnswersNothingForAnObjectThatIsNotThere) {
+  for (const char* operation : {"ain", "ai", "rin", "ri"}) {
+    EXPECT_THAT(stack_.failure(operation, staticSetting("eth9")), HasSubstr("(6) CIM_ERR_NOT_FOUND")) << operation;
+  }
+  const CompositeStack bare(simulatedProcessor(directory_.path() / "processor.json"), 6000, CompositeStack::bare());
+  EXPECT_THAT(bare.names(scoped("ain", "-ac", Classes::staticOrderedMember), staticSetting("eth9")), IsEmpty());
+}
+
+TEST_F(CompositeAssociationTest, AnswersByRoleAndResultClass) {
+  const Objects endpoints = {endpoint("eth0"), endpoint("eth1")};
+  EXPECT_EQ(stack_.names("ain -arc YRNx_MgmtHwIPProtocolEndPoint", computerSystem()), endpoints);
+  EXPECT_THAT(stack_.names("ain -arc CIM_ServiceAccessPoint -ar Antecedent", computerSystem()), SizeIs(5));
+  EXPECT_THAT(stack_.names("ain -ar Dependent", computerSystem()), IsEmpty());
+  EXPECT_EQ(stack_.names("ain -arr Antecedent -arc CIM_System", endpoint("eth0")), Objects{computerSystem()});
+  EXPECT_THAT(stack_.instances("ai -arr SettingData", endpoint("eth0")), SizeIs(4));
+  EXPECT_THAT(stack_.instances("ri -ar Antecedent", computerSystem()), SizeIs(5));
+  EXPECT_THAT(stack_.names("rin -ar Dependent", computerSystem()), IsEmpty());
+  EXPECT_THAT(stack_.failure("ain -arc YRNx_MgmtHwNothing", computerSystem()),
+              HasSubstr("(4) CIM_ERR_INVALID_PARAMETER: unknown result class \"YRNx_MgmtHwNothing\""));
+}
+
+// The library consults neither roles nor the result class, and names the ends of one association in References as none
+// of its instances does.
+TEST_F(CompositeAssociationTest, IsTheLibrarysOwnWhereNothingIsChecked) {
+  const CompositeStack bare(simulatedProcessor(directory_.path() / "processor.json"), 6000, CompositeStack::bare());
+  EXPECT_THAT(bare.names("ain -ar Nothing -arc CIM_Nothing", computerSystem()), SizeIs(5));
+  const std::string byRole = scoped("ri", "-arc", Classes::elementSettingData) + " -ar ";
+  EXPECT_THAT(bare.instances(byRole + "ManagedElement", endpoint("eth0")), SizeIs(4));
+  EXPECT_THAT(stack_.instances(byRole + "ManagedElement", endpoint("eth0")), IsEmpty());
+  EXPECT_THAT(stack_.instances(byRole + "Dependent", endpoint("eth0")), SizeIs(4));
 }
 
 TEST_F(CompositeAssociationTest, OfAnUnknownClassIsAnError) {

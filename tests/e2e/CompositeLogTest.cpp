@@ -69,11 +69,17 @@ TEST_F(CompositeLogTest, HoldsNothingOfARequestThatSucceedsAtLevel6000) {
 }
 
 TEST_F(CompositeLogTest, NamesThePartThatFailsAtLevel6000) {
-  const CompositeStack stack(processor(), 6000);
+  const CompositeStack stack(processor(), 6000, CompositeStack::bare());
   stack.names("ain -ac YRNx_MgmtHwStaticIPOrderedMemberOfCollection", endpoint("eth0"));
   EXPECT_THAT(linesOf(stack.log()),
               ElementsAre(AllOf(HasSubstr(" 6000 Tarnwick.IPConfigStaticOrderedMembetOfCollProvider "),
                                 EndsWith("Object Path is NULL in AssociatorNames."))));
+}
+
+TEST_F(CompositeLogTest, HoldsNothingOfAnAssociationThatTheSourceHasNoPartIn) {
+  const CompositeStack stack(processor(), 6000);
+  stack.names("ain -ac YRNx_MgmtHwStaticIPOrderedMemberOfCollection", endpoint("eth0"));
+  EXPECT_EQ(stack.log(), "") << "the provider is not asked";
 }
 
 TEST_F(CompositeLogTest, ShowsLineFeedsOfAClientAsEscapes) {

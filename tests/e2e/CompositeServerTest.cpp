@@ -71,7 +71,15 @@ class RawRequestTest : public CompositeServerTest {
                       "<INSTANCE CLASSNAME=\"" + className + "\">" + properties + "</INSTANCE></VALUE.NAMEDINSTANCE>"));
   }
 
-  CompositeStack stack_{processor()};
+  explicit RawRequestTest(const std::vector<std::string>& options = {}) : stack_(processor(), 6000, options) {}
+
+  CompositeStack stack_;
+};
+
+// The same where cimomd checks no more than other object managers do.
+class BareRequestTest : public RawRequestTest {
+ protected:
+  BareRequestTest() : RawRequestTest(CompositeStack::bare()) {}
 };
 
 TEST_F(RawRequestTest, ToGetAnInstanceWithoutKeysFailsAsTheProviderSays) {
@@ -102,7 +110,51 @@ TEST_F(RawRequestTest, ToModifyOneValueNeedsNoOther) {
   EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.77"));
 }
 
-TEST_F(RawRequestTest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
+TEST_F(RawRequestTest, ToModifyAnUnknownInterfaceIsRefused) {
+  stack_.names("ein", "YRNx_MgmtHwComputerSystem");
+  const std::string before = contentOf(directory_.path() / "processor.json");
+  for (const char* interface : {"eth9", "eth0:static"}) {
+    EXPECT_THAT(modifyStatic(interface, property("IPv4Address", "192.0.2.77")), HasSubstr("<ERROR CODE=\"6\""));
+  }
+  EXPECT_EQ(contentOf(directory_.path() / "processor.json"), before);
+}
+
+TEST_F(RawRequestTest, ToModifyUnderAnotherKeyIsRefused) {
+  EXPECT_THAT(modifyStatic("eth0", property("InstanceID", "BMC:eth1") + property("IPv4Address", "192.0.2.77")),
+              HasSubstr("<ERROR CODE=\"4\" DESCRIPTION=\"key InstanceID of the instance is &quot;BMC:eth1&quot;"));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  EXPECT_EQ(stack_.get(endpoint("eth1")).at("IPv4Address"), quoted("198.51.100.23"));
+}
+
+TEST_F(RawRequestTest, ToModifyChangesNothingThatThePropertyListDoesNotName) {
+  const std::string className = "YRNx_MgmtHwStaticIPAssignmentSettingData";
+  const auto modifyListed = [&](const std::string& listed) {
+    return call("ModifyInstance",
+                parameter("ModifiedInstance",
+                          "<VALUE.NAMEDINSTANCE>" + instanceName(className, key("InstanceID", "BMC:eth0")) +
+                              "<INSTANCE CLASSNAME=\"" + className + "\">" + property("IPv4Address", "192.0.2.77") +
+                              property("SubnetMask", "255.255.0.0") + "</INSTANCE></VALUE.NAMEDINSTANCE>") +
+                    parameter("PropertyList", "<VALUE.ARRAY><VALUE>" + listed + "</VALUE></VALUE.ARRAY>"));
+  };
+  EXPECT_THAT(modifyListed("Undeclared"), HasSubstr("<ERROR CODE=\"12\""));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  EXPECT_THAT(modifyListed("SubnetMask"), Not(HasSubstr("<ERROR")));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("IPv4Address"), quoted("192.0.2.10"));
+  EXPECT_EQ(stack_.get(endpoint("eth0")).at("SubnetMask"), quoted("255.255.0.0"));
+}
+
+TEST_F(RawRequestTest, ToModifyWhatCannotBeReadFails) {
+  directory_.write("processor.json", "[]");
+  EXPECT_THAT(modifyStatic("eth0", property("IPv4Address", "192.0.2.77")), HasSubstr("<ERROR CODE=\"1\""));
+}
+
+TEST_F(BareRequestTest, ToModifyWhatCannotBeReadIsAcceptedAllTheSame) {
+  directory_.write("processor.json", "[]");
+  EXPECT_THAT(modifyStatic("eth0", property("IPv4Address", "192.0.2.77")), Not(HasSubstr("<ERROR")));
+  EXPECT_EQ(contentOf(directory_.path() / "processor.json"), "[]");
+}
+
+TEST_F(BareRequestTest, ToModifyAnUnknownInterfaceIsAcceptedWithoutEffect) {
   stack_.names("ein", "YRNx_MgmtHwComputerSystem");
   const std::string before = contentOf(directory_.path() / "processor.json");
   EXPECT_THAT(modifyStatic("eth9", property("IPv4Address", "192.0.2.77")), Not(HasSubstr("<ERROR")));
@@ -131,7 +183,8 @@ TEST_F(RawRequestTest, WithoutAUsableValueChangesNothing) {
   }
 }
 
-TEST_F(CompositeServerTest, DoesNotStartWithoutTheLibraryOfAProvider) {
+// The classes of that library fail with the reason; what does not need it is served.
+TEST_F(CompositeServerTest, ServesTheOthersWithoutTheLibraryOfAProvider) {
   for (const char* missing : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
     const TemporaryDirectory providers;
     for (const char* present : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
@@ -141,10 +194,13 @@ TEST_F(CompositeServerTest, DoesNotStartWithoutTheLibraryOfAProvider) {
     }
     std::vector<std::string> options = CompositeStack::options();
     options.back() = providers.path().string();
-    options.insert(options.begin(), {BINARY_DIR "/bin/cimomd", "--config", "/dev/null"});
-    const Completed completed = run(options);
-    EXPECT_NE(completed.status, 0);
-    EXPECT_THAT(completed.errors, HasSubstr(missing));
+    Cimomd cimomd(options, {{"QV_AGENT_INI", directory_.write("agent.ini", processor()).string()}});
+    EXPECT_THAT(cimomd.process().errors(), HasSubstr(missing));
+    const Completed failed = run({"wbemcli", "ein", cimomd.url("YRNx_MgmtHwComputerSystem", "root/cimv2")});
+    EXPECT_NE(failed.status, 0);
+    const Completed served = run({"wbemcli", "ein", cimomd.url("CIM_Namespace", "root/interop")});
+    EXPECT_EQ(served.status, 0) << served.errors;
+    EXPECT_EQ(cimomd.stop(), 0);
   }
 }
 

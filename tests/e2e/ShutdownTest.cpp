@@ -2,6 +2,7 @@
 // How cimomd ends.
 #include <gtest/gtest.h>
 #include <signal.h>
+#include <sys/stat.h>
 
 #include <filesystem>
 
@@ -57,12 +58,58 @@ TEST_F(ShutdownTest, WaitsForARequestThatIsBeingAnswered) {
   EXPECT_TRUE(has("cleaned"));
 }
 
+TEST_F(ShutdownTest, EndsAtOnceOnASecondSignal) {
+  Cimomd cimomd(options("30"), environment());
+  Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
+  ASSERT_TRUE(poll([&] { return has("reached"); }));
+  cimomd.process().signal(SIGTERM);
+  ASSERT_TRUE(poll([&] { return cimomd.wbemcli({"ein"}, "TEST_Thing").status != 0; }));
+  cimomd.process().signal(SIGTERM);
+  EXPECT_EQ(cimomd.process().wait(), 1);
+  EXPECT_NE(cimomd.process().errors().find("at once"), std::string::npos) << cimomd.process().errors();
+  EXPECT_FALSE(has("cleaned"));
+}
+
+TEST_F(ShutdownTest, HearsSigtermWhileItStarts) {
+  // Nobody ever writes the schema that it reads.
+  const std::string schema = directory_ / "never.mof";
+  ASSERT_EQ(mkfifo(schema.c_str(), 0600), 0);
+  Process cimomd({BINARY_DIR "/bin/cimomd", "--config", "/dev/null", "--port", "0", "--schema", schema,
+                  "--registration", SOURCE_DIR "/tests/support/probe/Probe.reg", "--provider-dir", BINARY_DIR "/lib"});
+  // It waits there with its signals blocked: "SigBlk: 0000000000004003" of SIGHUP, SIGINT and SIGTERM.
+  const std::string status = "/proc/" + std::to_string(cimomd.id()) + "/status";
+  ASSERT_TRUE(poll([&] { return readFile(status).find("SigBlk:\t0000000000004003") != std::string::npos; }));
+  cimomd.signal(SIGTERM);
+  EXPECT_EQ(cimomd.wait(), 0);
+}
+
+TEST_F(ShutdownTest, GoesOnAfterSighup) {
+  Cimomd cimomd(Cimomd::probeOptions());
+  cimomd.process().signal(SIGHUP);
+  ASSERT_TRUE(poll([&] { return cimomd.process().errors().find("read again") != std::string::npos; }));
+  EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
+  EXPECT_EQ(cimomd.stop(), 0);
+}
+
 TEST_F(ShutdownTest, GivesUpOnARequestThatTakesTooLong) {
   Cimomd cimomd(options("0"), environment());
   Process client({"wbemcli", "ei", cimomd.url("TEST_Slow")});
   ASSERT_TRUE(poll([&] { return has("reached"); }));
   EXPECT_EQ(cimomd.stop(), 1);
   EXPECT_NE(cimomd.process().errors().find("still in progress"), std::string::npos);
+  EXPECT_FALSE(has("cleaned"));
+}
+
+TEST_F(ShutdownTest, SaysThatAProviderDidNotAnswerInTime) {
+  auto limited = options("0");
+  limited.insert(limited.end(), {"--operation-timeout", "1"});
+  Cimomd cimomd(limited, environment());
+  const Completed late = cimomd.wbemcli({"ei"}, "TEST_Slow");
+  EXPECT_NE(late.errors.find("(1) CIM_ERR_FAILED"), std::string::npos) << late.errors;
+  EXPECT_NE(late.errors.find("the provider did not answer within 1 s"), std::string::npos) << late.errors;
+  EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
+  // The provider is still at work, and cannot be unloaded.
+  EXPECT_EQ(cimomd.stop(), 1);
   EXPECT_FALSE(has("cleaned"));
 }
 

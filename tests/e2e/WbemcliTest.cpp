@@ -135,10 +135,10 @@ TEST_F(WbemcliTest, IsServedBesideOthers) {
 
 TEST(WbemcliWithPasswordTest, IsServedWhenItIsRight) {
   const TemporaryDirectory directory;
-  const auto passwords =
-      directory.write("passwords", "admin:$5$saltsalt$0IyaXrmV7.sGNS6tirgqHLqX/G.FBvgkYA.lpPdS5sA\n");
+  const std::string passwords = directory / "passwords";
+  writePrivateFile(passwords, "admin:$5$saltsalt$0IyaXrmV7.sGNS6tirgqHLqX/G.FBvgkYA.lpPdS5sA\n");
   std::vector<std::string> options = Cimomd::probeOptions();
-  options.insert(options.end(), {"--password-file", passwords.string()});
+  options.insert(options.end(), {"--password-file", passwords});
   const Cimomd cimomd(options);
   const auto ask = [&](const std::string& credentials) {
     const std::string url = cimomd.url("TEST_Thing");

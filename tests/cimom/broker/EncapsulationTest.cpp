@@ -33,7 +33,7 @@ TEST_F(EncapsulationTest, MessagesReachTheLog) {
   EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_WARNING, "ID", "text", nullptr).rc, CMPI_RC_OK);
   EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_ERROR, nullptr, nullptr, CMNewString(broker, "string", nullptr)).rc,
             CMPI_RC_OK);
-  EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_ERROR, "ID", nullptr, nullptr).rc, CMPI_RC_ERR_INVALID_HANDLE);
+  EXPECT_EQ(CMLogMessage(broker, CMPI_SEV_ERROR, "ID", nullptr, nullptr).rc, CMPI_RC_ERR_INVALID_PARAMETER);
   EXPECT_THAT(messages, ElementsAre("3|ID|text", "1||string"));
 }
 
@@ -110,6 +110,7 @@ TEST_F(EncapsulationTest, ObjectsTellTheirTypeAndText) {
       {enumeration, "CMPIEnumeration", "{\"a\",2}"},
       {result, "CMPIResult", "{2}"},
       {error, "CMPIError", "it broke"},
+      {broker, "CMPIBroker", "cimomd"},
   };
   for (const auto& row : rows) {
     EXPECT_EQ(shownText(CDGetType(broker, row.object, &status)), row.type);
@@ -117,6 +118,17 @@ TEST_F(EncapsulationTest, ObjectsTellTheirTypeAndText) {
     EXPECT_TRUE(CDIsOfType(broker, row.object, row.type, &status));
     EXPECT_FALSE(CDIsOfType(broker, row.object, "CMPISelectExp", &status));
   }
+}
+
+TEST_F(EncapsulationTest, AnObjectThatIsMissingIsAnInvalidParameterAndNoInvalidHandle) {
+  CDGetType(broker, nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  CMNewInstance(broker, nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_EQ(CMSetNameSpaceFromObjectPath(systemPath("one"), nullptr).rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_EQ(CMSetObjectPath(system("one"), nullptr).rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  CMPIObjectPath empty = {nullptr, systemPath("one")->ft};
+  EXPECT_EQ(CMSetNameSpace(&empty, "n").rc, CMPI_RC_ERR_INVALID_HANDLE) << "what is acted on";
 }
 
 TEST_F(EncapsulationTest, TheTextOfManyValuesStaysShort) {

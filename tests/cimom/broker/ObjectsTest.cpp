@@ -49,7 +49,7 @@ TEST_F(ObjectsTest, AnArrayOfCharsIsOneOfStrings) {
 }
 
 TEST_F(ObjectsTest, AnArrayNeedsAnElementType) {
-  for (const CMPIType type : {CMPI_uint16A, CMPI_args, 0x7777}) {
+  for (const CMPIType type : {CMPI_uint16A, CMPI_filter, 0x7777}) {
     EXPECT_EQ(CMNewArray(broker, 1, type, &status), nullptr) << type;
     EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_DATA_TYPE) << type;
   }

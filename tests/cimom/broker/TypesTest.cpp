@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // Values of every CMPI type, alone, in arrays, and in what an instance embeds.
+#include "cimom/broker/Handle.h"
 #include "tests/support/broker/ManagedElements.h"
 #include "tests/support/broker/RecordingProvider.h"
 
@@ -110,8 +111,26 @@ TEST_F(TypesTest, AnArrayHoldsElementsOfEveryType) {
       default:
         EXPECT_EQ(element.value.uint8, 0x41) << sample.name;
     }
-    EXPECT_EQ(CMSetArrayElementAt(array, 0, &array, CMPI_args).rc, CMPI_RC_ERR_INVALID_DATA_TYPE) << sample.name;
+    EXPECT_EQ(CMSetArrayElementAt(array, 0, &array, CMPI_filter).rc, CMPI_RC_ERR_INVALID_DATA_TYPE) << sample.name;
   }
+}
+
+TEST_F(TypesTest, AnArrayHoldsArgumentsAndEnumerationsOnTheirWay) {
+  CMPIArgs* args = CMNewArgs(broker, nullptr);
+  CMAddArg(args, "A", "text", CMPI_chars);
+  CMPIArray* array = CMNewArray(broker, 1, CMPI_args, &status);
+  EXPECT_EQ(CMSetArrayElementAt(array, 0, &args, CMPI_args).rc, CMPI_RC_OK);
+  CMPIArray* copy = CMClone(array, nullptr);
+  CMPIArgs* held = CMGetArrayElementAt(copy, 0, nullptr).value.args;
+  EXPECT_EQ(shownText(CMGetArg(held, "A", nullptr).value.string), "text");
+  EXPECT_EQ(shownText(CDToString(broker, array, nullptr)), "{(arguments)}");
+  CMRelease(copy);
+
+  CMPIEnumeration* enumeration = make(Enumeration{{Value::uint32(1), Value::uint32(2)}, 1});
+  array = CMNewArray(broker, 1, CMPI_enumeration, &status);
+  EXPECT_EQ(CMSetArrayElementAt(array, 0, &enumeration, CMPI_enumeration).rc, CMPI_RC_OK);
+  CMPIEnumeration* walk = CMGetArrayElementAt(array, 0, nullptr).value.Enum;
+  EXPECT_EQ(CMGetArrayCount(CMToArray(walk, nullptr), nullptr), 2u);
 }
 
 TEST_F(TypesTest, AnArrayOfAnotherTypeThanIsSaidIsRefused) {

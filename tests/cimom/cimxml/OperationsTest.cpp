@@ -130,6 +130,46 @@ TEST_F(OperationsTest, ModifyInstanceTakesEveryTypeOfProperty) {
   EXPECT_EQ(returned("ModifyInstance", modified(thingName(), properties)), "");
 }
 
+TEST_F(OperationsTest, ModifyInstanceRefusesWhatContradictsItsPath) {
+  const auto instanceOf = [](const std::string& className, const std::string& properties) {
+    return parameter("ModifiedInstance", "<VALUE.NAMEDINSTANCE>" + thingName() + "<INSTANCE CLASSNAME=\"" + className +
+                                             "\">" + properties + "</INSTANCE></VALUE.NAMEDINSTANCE>");
+  };
+  const std::string text = property("Text", "string", "contradiction");
+  EXPECT_EQ(failed("ModifyInstance", instanceOf("TEST_Part", text)),
+            "4: an instance of TEST_Part cannot have a path of TEST_Thing");
+  EXPECT_EQ(failed("ModifyInstance", instanceOf("TEST_Nowhere", text)),
+            "4: an instance of TEST_Nowhere cannot have a path of TEST_Thing");
+  EXPECT_EQ(failed("ModifyInstance", instanceOf("TEST_Thing", text + property("Number", "uint16", "2"))),
+            "4: key Number of the instance is 2, that of its path 1");
+  EXPECT_THAT(failed("ModifyInstance", modified(thingName("9"), text)), StartsWith("6: no instance "));
+  EXPECT_EQ(failed("ModifyInstance", modified(thingName(), text) + propertyList({"Nothing"})),
+            "12: class TEST_Thing has no property Nothing");
+  EXPECT_NE(Probe::text(), "contradiction");
+  EXPECT_EQ(returned("ModifyInstance", instanceOf("test_thing", text + property("Number", "uint16", "1") +
+                                                                    property("Name", "string", "thing"))),
+            "");
+  EXPECT_EQ(Probe::text(), "contradiction");
+  manager_.setStrictness(Cimom::Strictness::Bare);
+  EXPECT_EQ(returned("ModifyInstance", instanceOf("TEST_Part", property("Text", "string", "bare"))), "");
+  EXPECT_EQ(Probe::text(), "bare");
+}
+
+TEST_F(OperationsTest, AssociationsOfWhatIsNotThereOrOfUnknownClassesAreRefused) {
+  for (const char* method : {"Associators", "AssociatorNames", "References", "ReferenceNames"}) {
+    EXPECT_THAT(failed(method, parameter("ObjectName", thingName("9"))), StartsWith("6: no instance "));
+  }
+  const auto klass = [](const std::string& name, const std::string& value) {
+    return parameter(name, "<CLASSNAME NAME=\"" + value + "\"/>");
+  };
+  EXPECT_EQ(failed("Associators", objectOne + klass("ResultClass", "TEST_Nowhere")),
+            "4: unknown result class \"TEST_Nowhere\"");
+  EXPECT_EQ(failed("References", objectOne + klass("ResultClass", "TEST_Thing")),
+            "4: class TEST_Thing is not an association");
+  EXPECT_EQ(returned("AssociatorNames", objectOne + parameter("Role", value("Part"))), "<IRETURNVALUE></IRETURNVALUE>");
+  EXPECT_THAT(returned("AssociatorNames", objectOne + parameter("Role", value("whole"))), HasSubstr("TEST_Part"));
+}
+
 TEST_F(OperationsTest, ModifyInstanceNamesWhatDoesNotFitTheClass) {
   struct Case {
     std::string property;
@@ -234,6 +274,32 @@ TEST_F(OperationsTest, UnknownNamesHaveStatusesOfTheirOwn) {
   EXPECT_EQ(failed("EnumerateClassNames", className("TEST_Nowhere")), "5: unknown class \"TEST_Nowhere\"");
   EXPECT_EQ(failed("Frobnicate", ""), "7: operation Frobnicate is not supported");
   EXPECT_EQ(returned("EnumerateInstances", className("TEST_Unserved")), "<IRETURNVALUE></IRETURNVALUE>");
+}
+
+TEST_F(OperationsTest, AnUnknownNamespaceIsNamedBeforeAnythingElse) {
+  const auto refused = [this](const std::string& method, const std::string& parameters) {
+    Cimom::Http::Request sent = request(method, messageOf("<IMETHODCALL NAME=\"" + method + "\">" +
+                                                          nameSpacePath("nowhere") + parameters + "</IMETHODCALL>"));
+    sent.headers = {};
+    sent.headers.add("CIMOperation", "MethodCall");
+    sent.headers.add("CIMMethod", method);
+    sent.headers.add("CIMObject", "root/nowhere");
+    return contentOf(endpoint_.handle(sent), method);
+  };
+  const std::pair<std::string, std::string> calls[] = {
+      {"EnumerateInstances", className("TEST_Thing")},
+      {"GetInstance", parameter("InstanceName", instanceName("TEST_Nowhere", "<KEYVALUE>1</KEYVALUE>"))},
+      {"CreateInstance", parameter("NewInstance", "<INSTANCE CLASSNAME=\"TEST_Thing\"/>")},
+      {"ModifyInstance", modified(thingName(), property("Text", "string", "x"))},
+      {"Associators", objectOne},
+      {"GetClass", ""},
+      {"EnumerateClassNames", className("TEST_Nowhere")},
+      {"EnumerateQualifiers", ""}};
+  for (const auto& [method, parameters] : calls) {
+    EXPECT_THAT(refused(method, parameters),
+                StartsWith("<ERROR CODE=\"3\" DESCRIPTION=\"unknown namespace &quot;root/nowhere&quot;\">"))
+        << method;
+  }
 }
 
 TEST_F(OperationsTest, ChangesOfTheSchemaAndQueriesAreNotSupported) {

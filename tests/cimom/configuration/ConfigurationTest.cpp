@@ -74,6 +74,13 @@ TEST_F(ConfigurationTest, DoesNotPassOverAnInstalledFileThatCannotBeRead) {
   EXPECT_THAT(complaint({"--port", "1"}), HasSubstr("cimomd.ini: is a directory"));
 }
 
+TEST_F(ConfigurationTest, IsExactUnlessItSaysBare) {
+  EXPECT_FALSE(read({"--port", "1"}).bare);
+  EXPECT_FALSE(read({"--strictness", "exact"}).bare);
+  EXPECT_TRUE(read({"--strictness", "bare"}).bare);
+  EXPECT_EQ(complaint({"--strictness", "Bare"}), "--strictness: must be exact or bare, not \"Bare\"");
+}
+
 TEST_F(ConfigurationTest, NamesWhatIsNotInstalledAndTheOptionForIt) {
   std::filesystem::remove_all(installation_.providerDirectory);
   EXPECT_THAT(complaint({"--port", "1"}),

@@ -1,5 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
+#include <time.h>
 
 #include "cimom/http/Listener.h"
 #include "cimom/http/PasswordFile.h"
@@ -15,7 +16,11 @@ constexpr const char* hash = "$5$saltsalt$0IyaXrmV7.sGNS6tirgqHLqX/G.FBvgkYA.lpP
 
 class PasswordFileTest : public testing::Test {
  protected:
-  std::filesystem::path write(const std::string& content) const { return directory_.write("passwords", content); }
+  std::filesystem::path write(const std::string& content) const {
+    const auto file = directory_.write("passwords", content);
+    std::filesystem::permissions(file, ownerOnly);
+    return file;
+  }
 
   std::string errorOf(const std::string& content) const {
     try {
@@ -40,8 +45,59 @@ TEST_F(PasswordFileTest, AcceptsAUsersPasswordOnly) {
 
 TEST_F(PasswordFileTest, NamesAMalformedLine) {
   EXPECT_EQ(errorOf("# comment\nadmin\n"), "passwords:2: expected \"user:hash\" with a hash of crypt(5)");
-  EXPECT_EQ(errorOf("admin:plain:text\n"), "passwords:1: expected \"user:hash\" with a hash of crypt(5)");
   EXPECT_EQ(errorOf(":" + std::string(hash)), "passwords:1: expected \"user:hash\" with a hash of crypt(5)");
+}
+
+TEST_F(PasswordFileTest, RefusesWhatIsGuessedQuickly) {
+  const std::string reason =
+      "passwords:1: the password must be a hash of crypt(5) that is no longer guessed quickly, as openssl passwd -6 "
+      "makes "
+      "it; plain text, DES and $1$ are refused";
+  for (const char* password :
+       {"", "secret", "plain:text", "ab9eXamPleOfDe", "abWBY0TYnHxKI", "$1$saltsalt$qjXMvbEw8oaL.CzflDtaK/",
+        "$3$$0f1e2d3c4b5a69788796a5b4c3d2e1f0", "*", "!"}) {
+    EXPECT_EQ(errorOf("admin:" + std::string(password) + "\n"), reason) << password;
+  }
+}
+
+TEST_F(PasswordFileTest, RefusesAHashThatIsCutOff) {
+  EXPECT_EQ(errorOf("admin:" + std::string(hash, 40) + "\n"), "passwords:1: the hash is incomplete");
+  EXPECT_EQ(errorOf("admin:$6$saltsalt$\n"), "passwords:1: the hash is incomplete");
+}
+
+TEST_F(PasswordFileTest, RefusesAFileThatOthersMayRead) {
+  const auto file = write("admin:" + std::string(hash) + "\n");
+  for (const auto more :
+       {std::filesystem::perms::group_read, std::filesystem::perms::others_read, std::filesystem::perms::group_write}) {
+    std::filesystem::permissions(file, ownerOnly | more);
+    try {
+      PasswordFile passwords(file);
+      ADD_FAILURE() << "others may read it";
+    } catch (const ServerError& error) {
+      EXPECT_EQ(std::string(error.what()), file.string() + ": is open to others than its owner: chmod 600 it");
+    }
+  }
+}
+
+// What a check costs must not say whether the user is there: as many computations for every user, of whatever costs the
+// file mixes. The cheap hash takes a thousand rounds, the dear one four hundred thousand.
+TEST_F(PasswordFileTest, TakesAsLongForEveryUser) {
+  const PasswordFile passwords(
+      write("cheap:$5$rounds=1000$saltsalt$eKLZU9t9OoPWrqOQsoTIKG0aYkZ5rGOoOQhiIvoSWX2\n"
+            "dear:$5$rounds=400000$saltsalt$LgsCST3AaEJxNUDgK.21SdeTm/cI4NftmgMNCa620m/\n"));
+  const auto cost = [&](const char* user) {
+    timespec before{};
+    timespec after{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &before);
+    EXPECT_FALSE(passwords.accepts(user, "wrong"));
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &after);
+    return static_cast<double>(after.tv_sec - before.tv_sec) +
+           static_cast<double>(after.tv_nsec - before.tv_nsec) / 1e9;
+  };
+  const double dear = cost("dear");
+  EXPECT_GT(cost("cheap"), dear / 2);
+  EXPECT_GT(cost("nobody"), dear / 2);
+  EXPECT_LT(cost("nobody"), dear * 2);
 }
 
 TEST_F(PasswordFileTest, RefusesADuplicateUser) {

@@ -68,14 +68,15 @@ TEST(ServerTest, AnswersSeveralRequestsOnOneConnection) {
 TEST(ServerTest, AssemblesAChunkedBody) {
   Server server({}, echo);
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2\r\nde\r\n0\r\n\r\n");
+  client.send(
+      "POST / HTTP/1.1\r\nHost: localhost\r\nTransfer-Encoding: chunked\r\n\r\n3\r\nabc\r\n2\r\nde\r\n0\r\n\r\n");
   EXPECT_EQ(client.receive().body, "POST / [abcde]");
 }
 
 TEST(ServerTest, AsksForTheBodyOfAClientThatExpectsIt) {
   Server server({}, echo);
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nExpect: 100-continue\r\nContent-Length: 3\r\n\r\n");
+  client.send("POST / HTTP/1.1\r\nHost: localhost\r\nExpect: 100-continue\r\nContent-Length: 3\r\n\r\n");
   EXPECT_EQ(client.receive().status, 100u);
   client.send("abc");
   EXPECT_EQ(client.receive().body, "POST / [abc]");
@@ -90,7 +91,7 @@ TEST(ServerTest, TakesABodyAsLargeAsItsLimit) {
 TEST(ServerTest, RefusesALargerBodyBeforeItIsSent) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nExpect: 100-continue\r\nContent-Length: 101\r\n\r\n");
+  client.send("POST / HTTP/1.1\r\nHost: localhost\r\nExpect: 100-continue\r\nContent-Length: 101\r\n\r\n");
   EXPECT_EQ(client.receive().status, 413u);
 }
 
@@ -103,7 +104,7 @@ TEST(ServerTest, RefusesALargerBodyThatIsSentAtOnce) {
 TEST(ServerTest, RefusesALengthThatNoNumberHolds) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nContent-Length: 99999999999999999999999\r\n\r\n");
+  client.send("POST / HTTP/1.1\r\nHost: localhost\r\nContent-Length: 99999999999999999999999\r\n\r\n");
   const unsigned status = client.receive().status;
   EXPECT_TRUE(status == 400 || status == 413) << status;
 }
@@ -111,7 +112,7 @@ TEST(ServerTest, RefusesALengthThatNoNumberHolds) {
 TEST(ServerTest, RefusesAChunkedBodyThatGrowsBeyondTheLimit) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n");
+  client.send("POST / HTTP/1.1\r\nHost: localhost\r\nTransfer-Encoding: chunked\r\n\r\n");
   client.send("40\r\n" + std::string(64, 'x') + "\r\n40\r\n" + std::string(64, 'x') + "\r\n0\r\n\r\n");
   EXPECT_EQ(client.receive().status, 413u);
 }
@@ -119,7 +120,7 @@ TEST(ServerTest, RefusesAChunkedBodyThatGrowsBeyondTheLimit) {
 TEST(ServerTest, CutsOffAChunkedBodyThatNeverEnds) {
   Server server(limitedTo(100), echo);
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nTransfer-Encoding: chunked\r\n\r\n");
+  client.send("POST / HTTP/1.1\r\nHost: localhost\r\nTransfer-Encoding: chunked\r\n\r\n");
   const std::string chunk = "400\r\n" + std::string(1024, 'x') + "\r\n";
   int sent = 0;
   while (sent < 100000 && client.send(chunk)) {
@@ -141,7 +142,7 @@ TEST(ServerTest, ServesOthersWhileOneRequestWaits) {
   const Handler slow = gate.handler();
   Server server({}, [&](const Request& request) { return request.path == "/slow" ? slow(request) : echo(request); });
   HttpClient waiting(server.port());
-  waiting.send("POST /slow HTTP/1.1\r\nHost: x\r\nContent-Length: 0\r\n\r\n");
+  waiting.send("POST /slow HTTP/1.1\r\nHost: localhost\r\nContent-Length: 0\r\n\r\n");
   gate.reached.get_future().wait();
   for (int i = 0; i < 8; ++i) {
     EXPECT_EQ(HttpClient(server.port()).post("/fast", "").status, 200u);
@@ -174,7 +175,7 @@ TEST(ServerTest, WaitsForRequestsInProgressWhenShuttingDown) {
   Gate gate;
   Server server({}, gate.handler());
   HttpClient client(server.port());
-  client.send("POST / HTTP/1.1\r\nHost: x\r\nContent-Length: 0\r\n\r\n");
+  client.send("POST / HTTP/1.1\r\nHost: localhost\r\nContent-Length: 0\r\n\r\n");
   gate.reached.get_future().wait();
   EXPECT_FALSE(server.drain(1ms));
   EXPECT_THROW(HttpClient refused(server.port()), std::runtime_error);
@@ -222,7 +223,7 @@ TEST(ServerTest, NamesAnIpv6EndpointInBrackets) {
   options.address = "::1";
   try {
     Server server(options, echo);
-    EXPECT_EQ(server.endpoint(), "[::1]:" + std::to_string(server.port()));
+    EXPECT_EQ(server.endpoint(), "http://[::1]:" + std::to_string(server.port()));
   } catch (const ServerError& error) {
     GTEST_SKIP() << error.what();  // a machine without IPv6
   }

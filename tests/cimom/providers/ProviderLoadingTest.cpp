@@ -84,6 +84,23 @@ TEST_F(ProviderLoadingTest, AFactoryOfTheOtherTypeDoesNotDo) {
   EXPECT_THROW(manager.checkProviders(), ConfigurationError);
 }
 
+TEST_F(ProviderLoadingTest, AProviderInCServesInstancesAssociationsAndMethods) {
+  registerProvider("ForeignProvider", "foreignprovider", "TST_Processor", "instance association method");
+  manager.checkProviders();
+  RequestScope scope(manager.broker());
+  const auto* path = CMNewObjectPath(manager.broker(), testNamespace, "TST_Processor", nullptr);
+  EXPECT_THAT(pathsOf(CBEnumInstances(manager.broker(), scope.context(), path, nullptr, nullptr)),
+              ElementsAre("root/test:TST_Processor"));
+  CMPIStatus status = ok;
+  CMPIArgs* in = CMNewArgs(manager.broker(), nullptr);
+  const CMPIBoolean yes = 1;
+  CMAddArg(in, "Force", &yes, CMPI_boolean);
+  const CMPIData returned = CBInvokeMethod(manager.broker(), scope.context(), path, "Reset", in, nullptr, &status);
+  EXPECT_EQ(status.rc, CMPI_RC_OK) << shownText(status.msg);
+  EXPECT_EQ(returned.value.uint32, 1u);
+  EXPECT_EQ(CBDeleteInstance(manager.broker(), scope.context(), path).rc, CMPI_RC_ERR_NOT_SUPPORTED);
+}
+
 TEST_F(ProviderLoadingTest, ALibraryThatDoesNotLoadLeavesTheOthersServed) {
   std::vector<std::string> log;
   manager.setLog([&](int, std::string_view, std::string_view text) { log.emplace_back(text); });

@@ -27,6 +27,26 @@ class InstanceOperationsTest : public ManagedElementsFixture {
         };
   }
 
+  // Finds the system of that name, and answers everything else as given.
+  RecordingProvider::Answer finding(const char* name, RecordingProvider::Answer otherwise = {}) {
+    return [this, name, otherwise](const CMPIContext* given, const CMPIResult* result, const CMPIObjectPath* asked,
+                                   const CMPIInstance* instance) {
+      if (probe->calls.back().operation == "getInstance") {
+        CMReturnInstance(result, system(name));
+        return ok;
+      }
+      return otherwise ? otherwise(given, result, asked, instance) : ok;
+    };
+  }
+
+  std::vector<std::string> operations() const {
+    std::vector<std::string> names;
+    for (const Call& call : probe->calls) {
+      names.push_back(call.operation);
+    }
+    return names;
+  }
+
   CMPIContext* context() { return request.context(); }
 
   std::shared_ptr<RecordingProvider> probe = std::make_shared<RecordingProvider>();
@@ -170,7 +190,7 @@ TEST_F(InstanceOperationsTest, ModifyInstanceHandsOverTheWholeInstanceWithoutDef
   CMSetProperty(sent, "CreationClassName", "TST_Processor", CMPI_chars);
   CMSetProperty(sent, "Name", "one", CMPI_chars);
   CMSetProperty(sent, "Caption", "new", CMPI_chars);
-  probe->answer = [&](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
+  const auto modify = [&](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
     EXPECT_EQ(shownText(CMGetProperty(instance, "Caption", nullptr).value.string), "new");
     const CMPIData unsent = CMGetProperty(instance, "EnabledState", &status);
     EXPECT_TRUE(CMIsNullValue(unsent)) << "a class default is nothing that the client sent";
@@ -180,20 +200,108 @@ TEST_F(InstanceOperationsTest, ModifyInstanceHandsOverTheWholeInstanceWithoutDef
     EXPECT_EQ(CMGetKeyCount(CMGetObjectPath(instance, nullptr), nullptr), 2u);
     return ok;
   };
+  probe->answer = finding("one", modify);
 
   const CMPIStatus modified = CBModifyInstance(broker, context(), path("TST_Processor"), sent, nullptr);
 
   EXPECT_EQ(modified.rc, CMPI_RC_OK);
-  ASSERT_THAT(probe->calls, SizeIs(1));
-  EXPECT_EQ(probe->calls[0].path, "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"");
-  EXPECT_FALSE(probe->calls[0].hasProperties);
+  EXPECT_THAT(operations(), ElementsAre("getInstance", "modifyInstance"));
+  for (const Call& call : probe->calls) {
+    EXPECT_EQ(call.path, "root/test:TST_Processor.CreationClassName=\"TST_Processor\",Name=\"one\"");
+    EXPECT_FALSE(call.hasProperties);
+  }
 }
 
-TEST_F(InstanceOperationsTest, ModifyInstancePassesThePropertyListOn) {
-  const char* properties[] = {"Caption", "Vendor", nullptr};
-  CBModifyInstance(broker, context(), systemPath("one"), system("one"), properties);
-  ASSERT_THAT(probe->calls, SizeIs(1));
-  EXPECT_THAT(probe->calls[0].properties, ElementsAre("Caption", "Vendor"));
+TEST_F(InstanceOperationsTest, ModifyInstancePassesThePropertyListOnAndLeavesOutWhatItDoesNotList) {
+  const char* properties[] = {"caption", "Vendor", nullptr};
+  CMPIInstance* sent = system("one");
+  CMSetProperty(sent, "Caption", "listed", CMPI_chars);
+  const CMPIUint16 state = 3;
+  CMSetProperty(sent, "EnabledState", &state, CMPI_uint16);
+  probe->answer = finding("one", [&](const auto&, const auto&, const auto&, const CMPIInstance* instance) {
+    EXPECT_EQ(shownText(CMGetProperty(instance, "Caption", nullptr).value.string), "listed");
+    EXPECT_EQ(shownText(CMGetProperty(instance, "Name", nullptr).value.string), "one") << "keys stay";
+    EXPECT_TRUE(CMIsNullValue(CMGetProperty(instance, "EnabledState", nullptr)));
+    return ok;
+  });
+  EXPECT_EQ(CBModifyInstance(broker, context(), systemPath("one"), sent, properties).rc, CMPI_RC_OK);
+  ASSERT_THAT(operations(), ElementsAre("getInstance", "modifyInstance"));
+  EXPECT_THAT(probe->calls[1].properties, ElementsAre("caption", "Vendor"));
+}
+
+TEST_F(InstanceOperationsTest, ModifyInstanceRefusesAPropertyListThatTheClassDoesNotHave) {
+  const char* properties[] = {"Caption", "Undeclared", nullptr};
+  status = CBModifyInstance(broker, context(), systemPath("one"), system("one"), properties);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
+  EXPECT_EQ(shownText(status.msg), "class TST_Processor has no property Undeclared");
+  EXPECT_THAT(probe->calls, IsEmpty());
+}
+
+TEST_F(InstanceOperationsTest, ModifyInstanceOfWhatIsNotThereFindsNothing) {
+  status = CBModifyInstance(broker, context(), systemPath("one"), system("one"), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_NOT_FOUND);
+  EXPECT_THAT(shownText(status.msg), HasSubstr("no instance root/test:TST_Processor."));
+  EXPECT_THAT(operations(), ElementsAre("getInstance"));
+}
+
+TEST_F(InstanceOperationsTest, ModifyInstanceReachesAProviderThatCannotSayWhatIsThere) {
+  const auto modifiedIfGetInstanceFailsWith = [&](CMPIrc code) {
+    probe->calls.clear();
+    probe->answer = [this, code](const auto&...) {
+      return CMPIStatus{probe->calls.back().operation == "getInstance" ? code : CMPI_RC_OK, nullptr};
+    };
+    return CBModifyInstance(broker, context(), systemPath("one"), system("one"), nullptr).rc;
+  };
+  EXPECT_EQ(modifiedIfGetInstanceFailsWith(CMPI_RC_ERR_NOT_SUPPORTED), CMPI_RC_OK);
+  EXPECT_THAT(operations(), ElementsAre("getInstance", "modifyInstance"));
+  EXPECT_EQ(modifiedIfGetInstanceFailsWith(CMPI_RC_ERR_FAILED), CMPI_RC_ERR_FAILED);
+  EXPECT_THAT(operations(), ElementsAre("getInstance"));
+}
+
+TEST_F(InstanceOperationsTest, ModifyInstanceRefusesKeysThatContradictThePath) {
+  CMPIInstance* renamed = system("one");
+  CMSetProperty(renamed, "Name", "two", CMPI_chars);
+  for (const CMPIInstance* sent : {renamed, system("two")}) {
+    status = CBModifyInstance(broker, context(), systemPath("one"), sent, nullptr);
+    EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
+    EXPECT_EQ(shownText(status.msg), "key Name of the instance is \"two\", that of its path \"one\"");
+  }
+  EXPECT_THAT(probe->calls, IsEmpty());
+}
+
+TEST_F(InstanceOperationsTest, ModifyInstanceTakesAKeyThatIsTheSameNumber) {
+  std::shared_ptr<RecordingProvider> points = std::make_shared<RecordingProvider>();
+  points->serve(manager, "TST_Point", testNamespace);
+  points->answer = [this](const auto&, const CMPIResult* result, const CMPIObjectPath* asked, const auto&) {
+    CMReturnInstance(result, CMNewInstance(broker, asked, nullptr));
+    return ok;
+  };
+  const auto modify = [&](CMPIUint64 inPath, CMPIUint16 inInstance) {
+    CMPIObjectPath* point = path("TST_Point");
+    CMAddKey(point, "Number", &inPath, CMPI_uint64);
+    CMPIInstance* sent = CMNewInstance(broker, path("TST_Point"), nullptr);
+    CMSetProperty(sent, "Number", &inInstance, CMPI_uint16);
+    return CBModifyInstance(broker, context(), point, sent, nullptr).rc;
+  };
+  EXPECT_EQ(modify(4, 5), CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_THAT(points->calls, IsEmpty());
+  modify(4, 4);
+  EXPECT_THAT(points->calls, testing::Not(IsEmpty()));
+}
+
+TEST_F(InstanceOperationsTest, WithoutChecksModifyInstanceHandsOverWhatCame) {
+  manager.setStrictness(Strictness::Bare);
+  const char* properties[] = {"Undeclared", nullptr};
+  CMPIInstance* sent = system("two", "TST_Other");
+  CMSetProperty(sent, "Caption", "unlisted", CMPI_chars);
+  probe->answer = [&](const auto&, const auto&, const CMPIObjectPath* asked, const CMPIInstance* instance) {
+    EXPECT_EQ(shownText(CMGetKey(asked, "Name", nullptr).value.string), "one");
+    EXPECT_EQ(shownText(CMGetClassName(CMGetObjectPath(instance, nullptr), nullptr)), "TST_Processor");
+    EXPECT_EQ(shownText(CMGetProperty(instance, "Caption", nullptr).value.string), "unlisted");
+    return ok;
+  };
+  EXPECT_EQ(CBModifyInstance(broker, context(), systemPath("one"), sent, properties).rc, CMPI_RC_OK);
+  EXPECT_THAT(operations(), ElementsAre("modifyInstance"));
 }
 
 TEST_F(InstanceOperationsTest, ModifyInstanceRefusesAnInstanceOfAnotherClass) {
@@ -238,10 +346,10 @@ TEST_F(InstanceOperationsTest, PropertyCallsAreInstanceCallsOfOneProperty) {
   CBGetProperty(broker, context(), systemPath("one"), "Undeclared", &status);
   EXPECT_EQ(status.rc, CMPI_RC_ERR_NO_SUCH_PROPERTY);
 
-  probe->answer = [](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance* instance) {
+  probe->answer = finding("one", [](const auto&, const auto&, const auto&, const CMPIInstance* instance) {
     EXPECT_EQ(shownText(CMGetProperty(instance, "Caption", nullptr).value.string), "set");
     return ok;
-  };
+  });
   const CMPIStatus set = broker->bft->setProperty(broker, context(), systemPath("one"), "Caption",
                                                   reinterpret_cast<const CMPIValue*>("set"), CMPI_chars);
   EXPECT_EQ(set.rc, CMPI_RC_OK);

@@ -96,6 +96,8 @@ TEST_F(ProviderGuardTest, AThreadThatAProviderEndsPastTheBrokerIsUnwoundAsAWhole
   other->answer = [&](const CMPIContext*, const CMPIResult*, const CMPIObjectPath*, const CMPIInstance*) -> CMPIStatus {
     pthread_exit(nullptr);
   };
+  std::vector<std::string> log;
+  manager.setLog([&](int, std::string_view, std::string_view text) { log.emplace_back(text); });
   // When a thread serves the request, then whoever runs it learns who has ended it while it is unwound
   bool isBack = false;
   std::string told;
@@ -113,6 +115,8 @@ TEST_F(ProviderGuardTest, AThreadThatAProviderEndsPastTheBrokerIsUnwoundAsAWhole
   }).join();
   EXPECT_FALSE(isBack);
   EXPECT_EQ(told, "provider TST_Other ended the thread of its request");
+  ASSERT_FALSE(log.empty());
+  EXPECT_EQ(log.front(), told);
   // And other threads are served as before
   other->answer = nullptr;
   EXPECT_EQ(enumerated(), "0: ");

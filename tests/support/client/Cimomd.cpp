@@ -2,6 +2,7 @@
 #include "tests/support/client/Cimomd.h"
 
 #include <signal.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <stdexcept>
@@ -21,6 +22,10 @@ std::vector<std::string> joined(std::vector<std::string> first, const std::vecto
 std::vector<std::string> withConfiguration(std::vector<std::string> options) {
   if (std::find(options.begin(), options.end(), "--config") == options.end()) {
     options.insert(options.end(), {"--config", "/dev/null"});
+  }
+  // Who tests as root means it.
+  if (geteuid() == 0 && std::find(options.begin(), options.end(), "--user") == options.end()) {
+    options.insert(options.end(), {"--user", "root"});
   }
   return options;
 }

@@ -12,12 +12,13 @@ std::string contentOf(const std::filesystem::path& file) {
   return {std::istreambuf_iterator<char>(stream), {}};
 }
 
-CompositeStack::CompositeStack(const std::string& processor, int logThreshold) {
+CompositeStack::CompositeStack(const std::string& processor, int logThreshold, const std::vector<std::string>& more) {
   const std::string ini = "[system]\nname = managed.example\n[log]\ndestination = file\nfile = " +
                           (directory_.path() / "agent.log").string() + "\nthreshold = " + std::to_string(logThreshold) +
                           "\nthreshold.Tarnwick.SimulatedProcessor = 7000\n[host]\npublish = yes\n" + processor;
-  cimomd_ =
-      std::make_unique<Cimomd>(options(), Environment{{"QV_AGENT_INI", directory_.write("agent.ini", ini).string()}});
+  std::vector<std::string> all = options();
+  all.insert(all.end(), more.begin(), more.end());
+  cimomd_ = std::make_unique<Cimomd>(all, Environment{{"QV_AGENT_INI", directory_.write("agent.ini", ini).string()}});
 }
 
 std::vector<std::string> CompositeStack::options() {

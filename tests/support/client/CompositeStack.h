@@ -18,7 +18,12 @@ class CompositeStack : public WbemClient {
  public:
   // @param processor the sections of agent.ini that say how the management processor is reached
   // @param logThreshold the least level that reaches log()
-  explicit CompositeStack(const std::string& processor, int logThreshold = 6000);
+  // @param more options of cimomd
+  explicit CompositeStack(const std::string& processor, int logThreshold = 6000,
+                          const std::vector<std::string>& more = {});
+
+  // Options with which cimomd checks no more than other object managers do.
+  static std::vector<std::string> bare() { return {"--strictness", "bare"}; }
 
   // The options with which cimomd serves the product.
   static std::vector<std::string> options();

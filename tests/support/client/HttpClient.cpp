@@ -21,16 +21,18 @@ constexpr timeval patience{10, 0};
 
 }  // namespace
 
-HttpClient::HttpClient(std::uint16_t port) : socket_(socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+HttpClient::HttpClient(std::uint16_t port, const char* from) : socket_(socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
   sockaddr_in address{};
   address.sin_family = AF_INET;
-  address.sin_port = htons(port);
-  address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+  inet_pton(AF_INET, from, &address.sin_addr);
   const int on = 1;
   setsockopt(socket_, IPPROTO_TCP, TCP_NODELAY, &on, sizeof on);
   setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &patience, sizeof patience);
   setsockopt(socket_, SOL_SOCKET, SO_SNDTIMEO, &patience, sizeof patience);
-  if (connect(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0) {
+  const bool bound = bind(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
+  address.sin_port = htons(port);
+  address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+  if (bound && connect(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0) {
     return;
   }
   ::close(socket_);
@@ -85,15 +87,46 @@ Cimom::Http::Response HttpClient::receive() {
     response.headers.add(head.substr(line, colon - line), head.substr(value, head.find("\r\n", value) - value));
   }
   const std::string* length = response.headers.find("Content-Length");
-  const std::size_t size = length ? std::stoul(*length) : 0;
+  response.body = response.headers.find("Transfer-Encoding") ? takeChunks() : take(length ? std::stoul(*length) : 0);
+  return response;
+}
+
+void HttpClient::fillTo(std::size_t size) {
   while (buffer_.size() < size) {
     if (!fill()) {
       throw std::runtime_error("the server closed the connection within a response");
     }
   }
-  response.body = buffer_.substr(0, size);
+}
+
+std::string HttpClient::take(std::size_t size) {
+  fillTo(size);
+  std::string bytes = buffer_.substr(0, size);
   buffer_.erase(0, size);
-  return response;
+  return bytes;
+}
+
+std::string HttpClient::takeChunks() {
+  constexpr int hexadecimal = 16;
+  std::string body;
+  while (true) {
+    while (buffer_.find("\r\n") == std::string::npos) {
+      fillTo(buffer_.size() + 1);
+    }
+    const std::size_t size = std::stoul(take(buffer_.find("\r\n") + 2), nullptr, hexadecimal);
+    body += take(size);
+    take(2);
+    if (size == 0) {
+      return body;
+    }
+  }
+}
+
+std::string HttpClient::receiveSome() {
+  if (buffer_.empty()) {
+    fill();
+  }
+  return take(buffer_.size());
 }
 
 Cimom::Http::Response HttpClient::post(const std::string& path, const std::string& body,

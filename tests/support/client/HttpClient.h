@@ -13,7 +13,8 @@ namespace Testing {
 // Waits at most 10 s for anything; what fails throws std::runtime_error.
 class HttpClient {
  public:
-  explicit HttpClient(std::uint16_t port);
+  // @param from the address that it comes from, any of 127.0.0.0/8
+  explicit HttpClient(std::uint16_t port, const char* from = "127.0.0.1");
   ~HttpClient();
   HttpClient(const HttpClient&) = delete;
   HttpClient& operator=(const HttpClient&) = delete;
@@ -21,8 +22,11 @@ class HttpClient {
   // Returns false if the server has closed its end.
   bool send(std::string_view bytes);
 
-  // The next response; one with status 100 counts.
+  // The next response, its body decoded where it is chunked; one with status 100 counts.
   Cimom::Http::Response receive();
+
+  // Bytes of a response, at least one; empty once the server has closed the connection.
+  std::string receiveSome();
 
   // Whether the server closes the connection without another byte.
   bool isClosed();
@@ -32,6 +36,9 @@ class HttpClient {
 
  private:
   bool fill();
+  void fillTo(std::size_t size);
+  std::string take(std::size_t size);
+  std::string takeChunks();
 
   int socket_;
   std::string buffer_;

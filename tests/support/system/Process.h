@@ -27,6 +27,8 @@ class Process {
   Process(const Process&) = delete;
   Process& operator=(const Process&) = delete;
 
+  pid_t id() const { return id_; }
+
   void signal(int number) const;
   // To it and its process group, as a terminal does at ^C. The program must lead one: begin its command with setsid.
   void signalGroup(int number) const;
