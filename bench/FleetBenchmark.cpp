@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 // A thousand servers asked by one bmcip, and by a loop over wbemcli that asks each the same three questions. One object
-// manager with the product's providers stands behind 900 loopback addresses; of the other hundred a third each hang,
+// manager with the product's providers listens at 900 loopback addresses; of the other hundred a third each hang,
 // refuse the connection and break off, which the loop is spared. Fails where bmcip loses a server, is not ten times as
 // fast, or takes 64 MB.
 #include <sys/resource.h>
@@ -11,6 +11,7 @@
 #include <fstream>
 #include <iostream>
 #include <memory>
+#include <vector>
 
 #include "Paths.h"
 #include "cimom/ObjectManager.h"
@@ -66,12 +67,11 @@ Answer askFleet(const TemporaryDirectory& directory) {
 }
 
 // Servers a second.
-double askInALoop(std::uint16_t port) {
+double askInALoop(const std::vector<std::string>& urls) {
   const auto begin = Clock::now();
   for (int server = 0; server < loopServers; ++server) {
     for (const char* name : classes) {
-      const std::string url =
-          "http://" + addressOf(server) + ":" + std::to_string(port) + "/root/cimv2:YRNx_MgmtHw" + name;
+      const std::string url = urls[static_cast<std::size_t>(server)] + "/root/cimv2:YRNx_MgmtHw" + name;
       if (run({"wbemcli", "ei", url}).status != 0) {
         throw std::runtime_error("wbemcli failed at " + url);
       }
@@ -80,7 +80,16 @@ double askInALoop(std::uint16_t port) {
   return loopServers / secondsSince(begin);
 }
 
+// Every listener takes some descriptors.
+void allowDescriptors() {
+  rlimit limit{};
+  getrlimit(RLIMIT_NOFILE, &limit);
+  limit.rlim_cur = limit.rlim_max;
+  setrlimit(RLIMIT_NOFILE, &limit);
+}
+
 int measure() {
+  allowDescriptors();
   const TemporaryDirectory directory;
   const std::string ini = directory.write(
       "agent.ini", "[processor]\nbackend = simulated\n[simulated]\nstate = " + (directory / "processor.json") + "\n");
@@ -92,23 +101,28 @@ int measure() {
   manager.addProviderDirectory(BINARY_DIR "/lib");
   manager.checkProviders();
   const Cimom::CimXml::Endpoint endpoint(manager.broker(), manager.classes(), "fleet.example");
-  Cimom::Http::ServerOptions options;
-  options.address = "0.0.0.0";
-  options.maxConnections = servers;
-  Cimom::Http::Server server(options, [&](const Cimom::Http::Request& request) { return endpoint.handle(request); });
+  std::vector<std::unique_ptr<Cimom::Http::Server>> listening;
+  std::vector<std::string> urls;
+  for (int i = 0; i < servers * 9 / 10; ++i) {
+    Cimom::Http::ServerOptions options;
+    options.address = addressOf(i);
+    listening.push_back(std::make_unique<Cimom::Http::Server>(
+        options, [&](const Cimom::Http::Request& request) { return endpoint.handle(request); }));
+    urls.push_back("http://" + addressOf(i) + ":" + std::to_string(listening.back()->port()));
+  }
 
   const RawServer hanging(RawServer::Manner::Hang);
   const RawServer breaking(RawServer::Manner::BreakOff);
   const std::string faulty[] = {hanging.url(), breaking.url(), "http://127.0.0.1:1"};
   std::ofstream hosts(directory / "hosts");
+  auto answering = urls.begin();
   for (int i = 0; i < servers; ++i) {
-    hosts << (i % 10 == 7 ? faulty[i / 10 % 3] : "http://" + addressOf(i) + ":" + std::to_string(server.port()))
-          << '\n';
+    hosts << (i % 10 == 7 ? faulty[i / 10 % 3] : *answering++) << '\n';
   }
   hosts.close();
 
   const Answer answer = askFleet(directory);
-  const double loop = askInALoop(server.port());
+  const double loop = askInALoop(urls);
   const double fleet = servers / answer.seconds;
   std::cout << "bmcip:   " << servers << " servers in " << answer.seconds << " s, " << fleet << " a second; "
             << answer.answered << " answered, " << answer.failed << " failed; " << answer.memory / 1024.0 << " MB\n"
