@@ -108,9 +108,10 @@ Failure transferFailure(const Exchange& exchange, CURLcode code, const Access& a
     case CURLE_GOT_NOTHING:
     case CURLE_RECV_ERROR:
     case CURLE_SEND_ERROR:
-    case CURLE_PARTIAL_FILE:
       return {FailureKind::Unreachable,
               "the server broke the connection off: " + detail + "; does it expect https on this port?"};
+    case CURLE_PARTIAL_FILE:
+      return {FailureKind::Unreachable, "the server broke the connection off in the middle of its reply: " + detail};
     default:
       return {FailureKind::Malformed, "the reply cannot be read: " + detail};
   }
