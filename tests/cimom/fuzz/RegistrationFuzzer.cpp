@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
-// Feeds the readers of registrations and of profiles any bytes: each returns what it read or throws a ConfigurationError,
-// and nothing else.
+// Feeds the readers of registrations and of profiles any bytes: each returns what it read or throws a
+// ConfigurationError, and nothing else.
 #include <sys/mman.h>
 #include <unistd.h>
 
