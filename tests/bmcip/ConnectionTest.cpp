@@ -74,11 +74,12 @@ class BmcipLoginTest : public BmcipConnectionTest {
                                 "-addext", "subjectAltName=DNS:localhost", "-keyout", directory_ / "key.pem", "-out",
                                 directory_ / "certificate.pem"});
     EXPECT_EQ(made.status, 0) << made.errors;
+    std::filesystem::permissions(directory_ / "key.pem", ownerOnly);
+    writePrivateFile(directory_ / "passwords", "admin:" + hash);
     directory_.write("agent.ini", simulatedProcessor(directory_ / "processor.json"));
     std::vector<std::string> options = CompositeStack::options();
-    options.insert(options.end(),
-                   {"--tls-certificate", directory_ / "certificate.pem", "--tls-key", directory_ / "key.pem",
-                    "--password-file", directory_.write("passwords", "admin:" + hash).string()});
+    options.insert(options.end(), {"--tls-certificate", directory_ / "certificate.pem", "--tls-key",
+                                   directory_ / "key.pem", "--password-file", directory_ / "passwords"});
     cimomd_ = std::make_unique<Cimomd>(options, Environment{{"QV_AGENT_INI", directory_ / "agent.ini"}});
     environment_["BMCIP_URL"] = "https://localhost:" + std::to_string(cimomd_->port());
   }

@@ -142,7 +142,7 @@ TEST_F(RegisterAsRootTest, HasCimomdServeTheClassesInANamespaceOfChoice) {
       enter("register -t cimomd -n root/other\nregister -t cimomd\nexport QV_AGENT_INI=" + (tree_ / "agent.ini") +
             "\n" + programs().string() + "/cimomd --config $ini --port 0 > output &\n" +
             "until grep -q listening output; do kill -0 $! || exit 1; sleep 0.05; done\n"
-            "wbemcli ein http://$(sed 's/.* //' output)/root/other:YRNx_MgmtHwIPProtocolEndPoint");
+            "wbemcli ein $(sed 's/.* //' output)/root/other:YRNx_MgmtHwIPProtocolEndPoint");
   EXPECT_EQ(completed.status, 0) << completed.errors;
   EXPECT_THAT(completed.output, HasSubstr("/root/other:YRNx_MgmtHwIPProtocolEndPoint.Name=\"eth1\""));
 }
