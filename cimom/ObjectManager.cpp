@@ -57,8 +57,8 @@ void ObjectManager::addProviderDirectory(const std::filesystem::path& directory)
 
 void ObjectManager::addProvider(const ProviderRegistration& registration, InstanceFactory instanceFactory,
                                 AssociationFactory associationFactory, MethodFactory methodFactory) {
-  parts_->router.providers().add(
-      registration, {std::move(instanceFactory), std::move(associationFactory), std::move(methodFactory)});
+  parts_->router.providers().add(registration,
+                                 {std::move(instanceFactory), std::move(associationFactory), std::move(methodFactory)});
   parts_->showClass(registration);
 }
 

@@ -43,8 +43,8 @@ class ObjectManager {
                    AssociationFactory associationFactory, MethodFactory methodFactory = nullptr);
   // How long a provider's factory or clean-up may take before nobody waits for it any more.
   void setProviderLimit(std::chrono::milliseconds limit);
-  // Loads every registered library now and logs what cannot be had; requests for it try again, and fail with the reason.
-  // Throws ConfigurationError for a class that the schema lacks, and if nothing can be had.
+  // Loads every registered library now and logs what cannot be had; requests for it try again, and fail with the
+  // reason. Throws ConfigurationError for a class that the schema lacks, and if nothing can be had.
   void checkProviders();
 
   // Exact until it says otherwise; not while a request is under way.

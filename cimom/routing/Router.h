@@ -59,8 +59,8 @@ class Router final : public OperationHandler {
                                 const char** properties) override;
   std::vector<Value> referenceNames(const Operation& operation, const AssociationFilter& filter) override;
 
-  // The class's own provider of methods is called, or that of the nearest superclass which has one; what it returns gets
-  // the declared type, and what it adds to the output arguments without a declaration is dropped.
+  // The class's own provider of methods is called, or that of the nearest superclass which has one; what it returns
+  // gets the declared type, and what it adds to the output arguments without a declaration is dropped.
   // CMPI_RC_ERR_METHOD_NOT_AVAILABLE without a provider.
   Value invokeMethod(const Operation& operation, const MethodDeclaration& method, const NamedValues& in,
                      NamedValues& out) override;
