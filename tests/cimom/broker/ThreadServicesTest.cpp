@@ -47,7 +47,7 @@ TEST_F(ThreadServicesTest, AThreadMayEndEarly) {
 }
 
 TEST_F(ThreadServicesTest, AThreadCanBeCancelled) {
-#ifdef __SANITIZE_ADDRESS__
+#ifdef SANITIZED
   GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a cancelled thread";
 #endif
   static const CMPIBrokerExtFT* services;

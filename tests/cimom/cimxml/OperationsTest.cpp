@@ -332,8 +332,9 @@ TEST_F(OperationsTest, AnErrorWithoutATextHasTheMeaningOfItsCode) {
   EXPECT_EQ(describe({CMPI_RC_ERR_FAILED, nullptr}), "1: the operation failed for a reason that is not known");
   EXPECT_EQ(describe({CMPI_RC_ERR_METHOD_NOT_FOUND, nullptr}), "17: the method does not exist");
   EXPECT_EQ(describe({CMPI_RC_ERROR_SYSTEM, nullptr}), "1: the operation failed with return code 100");
-  EXPECT_EQ(describe({CMPI_RC_ERR_NOT_FOUND, CMNewString(manager_.broker(), "", nullptr)}),
-            "6: the object does not exist");
+  CMPIString* empty = CMNewString(manager_.broker(), "", nullptr);
+  EXPECT_EQ(describe({CMPI_RC_ERR_NOT_FOUND, empty}), "6: the object does not exist");
+  CMRelease(empty);
 }
 
 // A provider may name its system in some paths and leave it to the object manager in others.
@@ -345,9 +346,9 @@ TEST_F(OperationsTest, OneSystemHasOneNameInAnAnswer) {
       "root/test");
   provider->serve(manager_, "TEST_Pair", "root/test");
   const auto answerWith = [&](std::vector<std::string> hosts, const char* nameSpace) {
-    provider->answer = [=](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* asked,
-                           const CMPIInstance*) {
-      const CMPIBroker* broker = provider->broker;
+    provider->answer = [broker = manager_.broker(), hosts, nameSpace](const CMPIContext*, const CMPIResult* result,
+                                                                      const CMPIObjectPath* asked,
+                                                                      const CMPIInstance*) {
       CMPIInstance* pair = CMNewInstance(broker, asked, nullptr);
       for (std::size_t i = 0; i < hosts.size(); ++i) {
         CMPIObjectPath* end = CMNewObjectPath(broker, nameSpace, "TEST_Host", nullptr);

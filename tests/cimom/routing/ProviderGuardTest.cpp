@@ -83,7 +83,7 @@ TEST_F(ProviderGuardTest, ExitThreadOfALowerProviderFailsTheUpCallOnly) {
 }
 
 TEST_F(ProviderGuardTest, AThreadThatAProviderEndsPastTheBrokerIsUnwoundAsAWhole) {
-#ifdef __SANITIZE_ADDRESS__
+#ifdef SANITIZED
   GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
 #endif
   // Given a provider whose lower provider ends the thread, two up-calls below the request
@@ -292,7 +292,7 @@ TEST_F(CleanUpTest, AProviderThatMustStayLoadedIsNoFailure) {
 }
 
 TEST_F(CleanUpTest, AThreadThatItEndsIsLogged) {
-#ifdef __SANITIZE_ADDRESS__
+#ifdef SANITIZED
   GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
 #endif
   EXPECT_THAT(cleanedUp([]() -> CMPIStatus { pthread_exit(nullptr); }),
@@ -300,6 +300,9 @@ TEST_F(CleanUpTest, AThreadThatItEndsIsLogged) {
 }
 
 TEST_F(CleanUpTest, NobodyWaitsLongForWhatHangsAndItMayStillUseTheBroker) {
+#ifdef SANITIZED
+  GTEST_SKIP() << "what is left to a clean-up that hangs is a leak";
+#endif
   // Given a clean-up that goes on until it is let go, and uses the broker then
   static std::atomic<bool> go;
   static std::atomic<CMPIrc> later;
