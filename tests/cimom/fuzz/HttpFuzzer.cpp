@@ -43,19 +43,21 @@ struct Target {
   Http::Server server{options(), [this](const Http::Request& request) { return endpoint.handle(request); }};
 };
 
-// What the server sends until it closes the connection, which it does at the end of what it is sent.
-std::size_t exchange(Http::Server& server, const std::uint8_t* data, std::size_t size) {
-  std::array<int, 2> ends{};
-  if (socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, ends.data()) != 0) {
+// How much the server sends until it closes the connection: of itself, or at the end of what it is sent.
+std::size_t exchange(Http::Server& server, const std::uint8_t* data, std::size_t size, bool ends) {
+  std::array<int, 2> sockets{};
+  if (socketpair(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0, sockets.data()) != 0) {
     std::abort();
   }
-  const Ground::Descriptor client(ends[0]);
-  server.adopt(ends[1]);
+  const Ground::Descriptor client(sockets[0]);
+  server.adopt(sockets[1]);
   // The socket takes what the fuzzer makes at once, 4 kB by default.
   if (size > 0 && send(client.number(), data, size, MSG_NOSIGNAL) < 0) {
     return 0;
   }
-  shutdown(client.number(), SHUT_WR);
+  if (ends) {
+    shutdown(client.number(), SHUT_WR);
+  }
   std::array<char, 4096> buffer{};
   std::size_t received = 0;
   ssize_t count = 0;
@@ -69,9 +71,9 @@ std::size_t exchange(Http::Server& server, const std::uint8_t* data, std::size_t
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   static Target target;
-  exchange(target.server, data, size);
+  exchange(target.server, data, size, true);
   constexpr char next[] = "GET / HTTP/1.0\r\n\r\n";
-  if (exchange(target.server, reinterpret_cast<const std::uint8_t*>(next), sizeof next - 1) == 0) {
+  if (exchange(target.server, reinterpret_cast<const std::uint8_t*>(next), sizeof next - 1, false) == 0) {
     std::abort();
   }
   return 0;
