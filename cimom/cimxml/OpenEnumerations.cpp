@@ -37,8 +37,9 @@ std::string newContext() {
 }  // namespace
 
 std::size_t OpenEnumeration::bytes() const {
-  return std::accumulate(items.begin() + static_cast<std::ptrdiff_t>(next), items.end(), std::size_t{0},
-                         [](std::size_t sum, const std::string& text) { return sum + sizeof(text) + text.capacity(); });
+  return std::accumulate(
+      items.begin() + static_cast<std::ptrdiff_t>(next), items.end(), std::size_t{0},
+      [](std::size_t sum, const std::string& text) { return sum + sizeof(std::string) + text.capacity(); });
 }
 
 std::string OpenEnumerations::add(OpenEnumeration enumeration) {
