@@ -25,7 +25,7 @@ Provider& methodProviderOf(const ProviderRegistry& providers, const Operation& o
 }
 
 // What the provider delivers, with the type that is declared for it.
-Value declared(Value value, CMPIType type, const Operation& operation, const std::string& what) {
+Value declared(const Value& value, CMPIType type, const Operation& operation, const std::string& what) {
   std::optional<Value> typed = value.as(type);
   if (!typed) {
     throw StatusError(CMPI_RC_ERR_TYPE_MISMATCH, "the provider returned " + describeType(value.type()) + " as " + what +
@@ -53,7 +53,7 @@ Value Router::invokeMethod(const Operation& operation, const MethodDeclaration& 
     }
   }
   const CMPIType type = valueType(method.returnType, method.qualifiers);
-  return results.empty() ? Value::null(type) : declared(std::move(results.front()), type, operation, name);
+  return results.empty() ? Value::null(type) : declared(results.front(), type, operation, name);
 }
 
 }  // namespace Cimom
