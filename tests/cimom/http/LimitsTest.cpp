@@ -66,6 +66,15 @@ class LimitsTest : public testing::Test {
 
   Server& start(Handler handler = echo) { return *(server_ = std::make_unique<Server>(options_, std::move(handler))); }
 
+  // Whether the server answers a new client now.
+  bool answers() {
+    try {
+      return HttpClient(server_->port()).post("/", "").status == 200;
+    } catch (const std::runtime_error&) {
+      return false;
+    }
+  }
+
   // Clients that send the beginning of a request, and no more.
   void connectSlowClients(int count, const char* from) {
     for (int i = 0; i < count; ++i) {
@@ -105,13 +114,7 @@ TEST_F(LimitsTest, OutlivesMoreConnectionsThanItTellsThatThereIsNoRoom) {
   start();
   connectSlowClients(100, "127.0.0.1");
   slow_.clear();
-  EXPECT_TRUE(poll([&] {
-    try {
-      return HttpClient(server_->port()).post("/", "").status == 200;
-    } catch (const std::runtime_error&) {
-      return false;
-    }
-  }));
+  EXPECT_TRUE(poll([this] { return answers(); }));
 }
 
 TEST_F(LimitsTest, CutsAClientThatSendsItsRequestTooSlowly) {
@@ -314,13 +317,7 @@ TEST_F(DescriptorLimitTest, ShedsClientsWithoutSpinningWhereThereAreNoDescriptor
   clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &after);
   EXPECT_LT((after.tv_sec - before.tv_sec) * 1000 + (after.tv_nsec - before.tv_nsec) / 1000000, 100);
   slow_.clear();
-  EXPECT_TRUE(poll([&] {
-    try {
-      return HttpClient(server_->port()).post("/", "").status == 200;
-    } catch (const std::runtime_error&) {
-      return false;
-    }
-  }));
+  EXPECT_TRUE(poll([this] { return answers(); }));
 }
 
 TEST_F(DescriptorLimitTest, RefusesConnectionsThatItsDescriptorsDoNotAllow) {
