@@ -38,8 +38,6 @@ class MethodCallTest : public EndpointTest {
   }
 };
 
-std::string value(const std::string& text) { return "<VALUE>" + text + "</VALUE>"; }
-
 std::string argument(const std::string& name, const std::string& type, const std::string& content) {
   return "<PARAMVALUE NAME=\"" + name + "\"" + (type.empty() ? "" : " PARAMTYPE=\"" + type + "\"") + ">" + content +
          "</PARAMVALUE>";
