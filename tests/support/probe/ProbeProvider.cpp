@@ -3,6 +3,7 @@
 // provider tells there by files what it does: "reached" once a request for TEST_Slow waits, which it does until there
 // is a file "go", and "cleaned" once it has been cleaned up.
 #include <cmpimacs.h>
+#include <pthread.h>
 #include <strings.h>
 
 #include <chrono>
@@ -211,6 +212,9 @@ CMPIStatus ProbeInvokeMethod(CMPIMethodMI*, const CMPIContext* context, const CM
   }
   if (name == "Wrong") {
     return CMReturnData(result, "text", CMPI_chars);
+  }
+  if (name == "Exit") {
+    pthread_exit(nullptr);
   }
   if (name == "Silent") {
     return CMReturnDone(result);
