@@ -190,6 +190,13 @@ CMPIStatus echo(const CMPIResult* result, const CMPIArgs* in, CMPIArgs* out) {
   return CMReturnData(result, arrived.c_str(), CMPI_chars);
 }
 
+// Returns the one argument, and adds it to the output arguments.
+CMPIStatus copy(const CMPIResult* result, const CMPIArgs* in, CMPIArgs* out) {
+  const CMPIData object = CMGetArg(in, "Object", nullptr);
+  CMAddArg(out, "Object", &object.value, object.type);
+  return CMReturnData(result, &object.value, object.type);
+}
+
 CMPIStatus odd(const CMPIResult* result, CMPIArgs* out) {
   const CMPIUint32 number = 7;
   CMAddArg(out, "wide", &number, CMPI_uint32);
@@ -206,6 +213,9 @@ CMPIStatus ProbeInvokeMethod(CMPIMethodMI*, const CMPIContext* context, const CM
   if (name == "Caller") {
     const CMPIData caller = CMGetContextEntry(context, CMPIPrincipal, nullptr);
     return CMReturnData(result, &caller.value.string, CMPI_string);
+  }
+  if (name == "Copy") {
+    return copy(result, in, out);
   }
   if (name == "Odd") {
     return odd(result, out);
