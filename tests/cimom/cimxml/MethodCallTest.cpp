@@ -210,6 +210,16 @@ TEST_F(MethodCallTest, AnInstanceShowsWhatItEmbeds) {
   EXPECT_THAT(result, HasSubstr("</VALUE><VALUE.NULL></VALUE.NULL></VALUE.ARRAY>"));
 }
 
+// DSP0201: the attribute follows the qualifier of the declaration, not the value.
+TEST_F(MethodCallTest, WhatMayEmbedAnyObjectSaysSo) {
+  const std::string result =
+      called("Copy", argument("Object", "string\" EmbeddedObject=\"object", value(escaped(numbered))));
+  EXPECT_THAT(result, StartsWith("<RETURNVALUE PARAMTYPE=\"string\" EmbeddedObject=\"object\"><VALUE>&lt;INSTANCE "));
+  EXPECT_THAT(result, HasSubstr("<PARAMVALUE NAME=\"Object\" PARAMTYPE=\"string\" EmbeddedObject=\"object\">"));
+  EXPECT_THAT(returned("EnumerateInstances", className("TEST_Machine")),
+              HasSubstr("<PROPERTY NAME=\"Anything\" TYPE=\"string\" EmbeddedObject=\"object\"><VALUE>&lt;INSTANCE "));
+}
+
 TEST_F(MethodCallTest, AnInstanceThatIsEmbeddedIsTaken) {
   const std::string given = "<INSTANCE CLASSNAME=\"TEST_Machine\"><PROPERTY NAME=\"Name\" TYPE=\"string\">" +
                             value("machine") +
