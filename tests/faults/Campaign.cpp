@@ -37,7 +37,9 @@ struct Progress {
 // before crashed.
 class Worker {
  public:
-  Worker(const std::vector<Point>& points, std::size_t first, std::size_t step) {
+  Worker(const std::vector<Point>& points, std::size_t first, std::size_t step,
+         const std::function<Finding(const Point&)>& carryOutOne)
+      : carryOutOne_(carryOutOne) {
     for (std::size_t i = first; i < points.size(); i += step) {
       points_.push_back(&points[i]);
     }
@@ -118,11 +120,12 @@ class Worker {
     }
   }
 
-  [[noreturn]] void work() {
+  // What escapes a point ends the process; it must not unwind into who forked it.
+  [[noreturn]] void work() noexcept {
     for (; progress_->next < points_.size(); ++progress_->next) {
       ::alarm(secondsForAPoint);
       const Point& point = *points_[progress_->next];
-      count(point, check(point));
+      count(point, carryOutOne_(point));
     }
     ::alarm(0);
     if (sanitizerFindsLeaks()) {
@@ -131,6 +134,7 @@ class Worker {
     ::_exit(0);
   }
 
+  const std::function<Finding(const Point&)>& carryOutOne_;
   std::vector<const Point*> points_;
   Progress* progress_;
   std::FILE* failures_;
@@ -261,11 +265,12 @@ std::ostream& operator<<(std::ostream& stream, const Report& report) {
   return stream << '\n';
 }
 
-Report carryOut(const std::vector<Point>& points, unsigned processes) {
+Report carryOut(const std::vector<Point>& points, unsigned processes,
+                const std::function<Finding(const Point&)>& carryOutOne) {
   std::vector<std::unique_ptr<Worker>> workers;
   unsigned running = 0;
   for (unsigned i = 0; i < processes; ++i) {
-    workers.push_back(std::make_unique<Worker>(points, i, processes));
+    workers.push_back(std::make_unique<Worker>(points, i, processes, carryOutOne));
     running += workers.back()->start() ? 1 : 0;
   }
   while (running > 0) {

@@ -23,6 +23,7 @@ enum class Fault {
   Reference,
   Instance,
   Array,
+  Characters,   // a text as bare characters
   OtherNumber,  // of calls that count or answer yes or no: too many, the opposite
   // Of calls that do something.
   FailsUndone,
@@ -40,7 +41,5 @@ inline constexpr int faultCount = static_cast<int>(Fault::ForeignException) + 1;
 
 // As a point's name shows it.
 std::string nameOf(Fault fault);
-// Throws std::invalid_argument for a name that none bears.
-Fault faultOf(const std::string& name);
 
 }  // namespace Testing

@@ -19,6 +19,22 @@ constexpr std::size_t shareOfPoints = 293;
 constexpr std::size_t shareOfPoints = 29;
 #endif
 
+// Of all tests that ran, printed at their end.
+class Sum : public ::testing::Environment {
+ public:
+  static Report& report() {
+    static Report sum;
+    return sum;
+  }
+  void TearDown() override {
+    if (report().tried() > 0) {
+      std::cout << report();
+    }
+  }
+};
+
+const ::testing::Environment* const sum = ::testing::AddGlobalTestEnvironment(new Sum);
+
 class FaultsTest : public ::testing::TestWithParam<Unit> {
  protected:
   std::vector<const Request*> ownRequests() const {
@@ -58,7 +74,7 @@ TEST_P(FaultsTest, TheModelMakesTheSameCalls) {
 
 TEST_P(FaultsTest, HoldsWhateverCallFails) {
   const Report report = carryOut(share(points(GetParam().file + '/'), shareOfPoints), 1);
-  std::cout << report;
+  Sum::report().add(report);
   constexpr std::size_t shown = 10;
   for (std::size_t i = 0; i < std::min(report.failures.size(), shown); ++i) {
     ADD_FAILURE() << report.failures[i];

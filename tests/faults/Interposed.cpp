@@ -78,7 +78,8 @@ void adoptValue(const CMPIData& data, const Call& call) {
 
 // Which faults a value can have that the call really answered.
 Faults faultsOf(const CMPIData& data, bool tellsStatus) {
-  Faults faults = {Fault::NullWithError, Fault::NullState, Fault::BadState, Fault::NotFound, Fault::Number};
+  Faults faults = {Fault::NullWithError, Fault::NullState, Fault::BadState,
+                   Fault::NotFound,      Fault::Number,    Fault::Characters};
   if (tellsStatus) {
     faults.insert(faults.end(), {Fault::NullSilently, Fault::GoodWithError});
   }
@@ -170,6 +171,14 @@ CMPIData spoiled(CMPIData data, CMPIStatus* status, const Call& call) {
       }();
       data = {CMPI_instance, CMPI_goodValue, {}};
       data.value.inst = another(Cimom::Instance(definition, {"", "root/yrnse", definition.name, {}}), call);
+      return data;
+    }
+    case Fault::Characters: {
+      static char characters[] = "BMC:characters";
+      const bool isText = data.type == CMPI_string && !CMIsNullValue(data);
+      const char* own = isText ? static_cast<const char*>(data.value.string->hdl) : characters;
+      data = {CMPI_chars, CMPI_goodValue, {}};
+      data.value.chars = const_cast<char*>(own);
       return data;
     }
     case Fault::Array:

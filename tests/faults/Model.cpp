@@ -33,10 +33,13 @@ std::string charactersOf(const CMPIString* string, CMPIStatus* status) {
 
 bool flaggedNull(const CMPIData& data) { return (data.state & 0x100) != 0; }
 
-// A text, of a value that is not flagged null and is one.
+// A text, of a value that is not flagged null and is one, as a string or as bare characters.
 std::string textIn(const CMPIData& data, CMPIStatus* status) {
   if (flaggedNull(data)) {
     return "";
+  }
+  if (data.type == CMPI_chars) {
+    return data.value.chars ? data.value.chars : "";
   }
   return data.type == CMPI_string ? charactersOf(data.value.string, status) : "";
 }
