@@ -46,11 +46,14 @@ IpmiResponse setParameter(IpmiTransport& transport, std::uint8_t channel, LanPar
   return transport.send({NetworkFunction::Transport, setLanConfigurationParameters, request}, repetition);
 }
 
+IpmiError noLanChannel(std::uint8_t channel) {
+  return IpmiError("the BMC has no LAN channel " + std::to_string(channel) + ": check channels");
+}
+
 std::string describe(LanParameter parameter) {
   static const std::map<LanParameter, std::string> names = {{LanParameter::SetInProgress, "set-in-progress state"},
                                                             {LanParameter::IpAddress, "IP address"},
                                                             {LanParameter::AddressSource, "IP address source"},
-                                                            {LanParameter::MacAddress, "MAC address"},
                                                             {LanParameter::SubnetMask, "subnet mask"},
                                                             {LanParameter::DefaultGateway, "default gateway"},
                                                             {LanParameter::Ipv6StaticAddress, "static IPv6 address"},
