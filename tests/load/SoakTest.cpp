@@ -196,7 +196,6 @@ TEST(SoakTest, EveryKindOfRequestIsAnsweredInTheSameMemory) {
                                    SOURCE_DIR "/tests/support/probe/Probe.reg"};
   CompositeStack stack(simulatedProcessor(directory.path() / "processor.json"), 7000, more);
   Cimomd& cimomd = stack.cimomd();
-  Mixture(cimomd.port()).request(0);
   const auto before = descriptorsOf(cimomd.process().id());
 
   std::atomic<std::size_t> next = 0;
