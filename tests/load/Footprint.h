@@ -13,6 +13,14 @@ namespace Testing {
 // What it has in memory, in KiB.
 long residentKib(pid_t process);
 
+// How much more it may have at the end: an allocator grows in steps, and the sanitizers keep for a while what has been
+// freed.
+#ifdef SANITIZED
+inline constexpr long toleratedKib = 32 << 10;
+#else
+inline constexpr long toleratedKib = 2 << 10;
+#endif
+
 // What its descriptors lead to, sorted: "socket", "/var/log/agent.log" and the like.
 std::vector<std::string> descriptorsOf(pid_t process);
 

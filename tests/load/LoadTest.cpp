@@ -14,8 +14,8 @@
 
 #include "tests/cimom/cimxml/Messages.h"
 #include "tests/load/CimClient.h"
+#include "tests/load/Endpoints.h"
 #include "tests/load/Footprint.h"
-#include "tests/support/Classes.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/system/Poll.h"
 #ifdef SIMULATED_BMC
@@ -29,16 +29,9 @@ using namespace std::chrono_literals;
 using Clock = std::chrono::steady_clock;
 
 constexpr std::size_t managers = 2;
-constexpr std::size_t clients = 8;  // the first two write
-constexpr std::size_t shortRun = 5;
-constexpr auto warmUp = 2s;
-
-// An allocator grows in steps, and AddressSanitizer keeps for a while what has been freed.
-#ifdef SANITIZED
-constexpr long toleratedKib = 64 << 10;
-#else
-constexpr long toleratedKib = 2 << 10;
-#endif
+constexpr std::size_t loadClients = 8;  // the first two write
+constexpr std::size_t shortLoad = 5;
+constexpr auto loadWarmUp = 2s;
 
 struct Pair {
   std::string address;
@@ -56,12 +49,6 @@ const std::vector<Pair>& knownPairs() {
 }
 
 constexpr std::size_t firstWritten = 2;
-
-std::string endpointName(const std::string& interface) {
-  return instanceName(Classes::endpoint,
-                      keyBinding("SystemCreationClassName", Classes::computerSystem) + keyBinding("SystemName", "BMC") +
-                          keyBinding("CreationClassName", Classes::endpoint) + keyBinding("Name", interface));
-}
 
 std::string valueAfter(const std::string& xml, const std::string& property, std::size_t from) {
   const auto at = xml.find("<PROPERTY NAME=\"" + property + "\" TYPE=\"string\"><VALUE>", from);
@@ -86,7 +73,7 @@ std::vector<Pair> pairsIn(const std::string& xml) {
 }
 
 // What there is to ask and to change.
-struct Ground {
+struct Scene {
   std::string section;                  // of both agents' configuration
   std::vector<std::string> interfaces;  // of the two writers
   bool readsBack;                       // whether a writer finds its own change: nobody else writes its interface
@@ -94,20 +81,20 @@ struct Ground {
 
 class LoadTest : public testing::Test {
  protected:
-  void run(const Ground& ground) {
+  void run(const Scene& scene) {
     for (std::size_t number = 0; number < managers; ++number) {
-      stacks_.push_back(std::make_unique<CompositeStack>(ground.section));
+      stacks_.push_back(std::make_unique<CompositeStack>(scene.section));
     }
     const auto before = descriptors();
-    const auto duration = std::chrono::seconds(configured("LOAD_SECONDS", shortRun));
+    const auto duration = std::chrono::seconds(configured("LOAD_SECONDS", shortLoad));
     const auto begin = Clock::now();
     end_ = begin + duration;
     std::vector<std::thread> threads;
-    for (std::size_t number = 0; number < clients; ++number) {
-      threads.emplace_back([&, number] { number < managers ? write(ground, number) : read(ground, number); });
+    for (std::size_t number = 0; number < loadClients; ++number) {
+      threads.emplace_back([&, number] { number < managers ? write(scene, number) : read(scene, number); });
     }
     // Once every thread that will be there has started.
-    std::this_thread::sleep_until(begin + std::max<Clock::duration>(duration / 10, warmUp));
+    std::this_thread::sleep_until(begin + std::max<Clock::duration>(duration / 10, loadWarmUp));
     const std::vector<long> early = resident();
     std::this_thread::sleep_until(end_);
     const std::vector<long> late = resident();
@@ -116,16 +103,16 @@ class LoadTest : public testing::Test {
     }
     std::cout << duration.count() << " s: " << tally_.summary() << "; changes: " << changes_
               << "; pairs seen: " << pairsSeen_ << '\n';
-    EXPECT_GT(pairsSeen_, clients);
+    EXPECT_GT(pairsSeen_, loadClients);
     EXPECT_GT(changes_, managers);
     EXPECT_THAT(tally_.untold(), testing::IsEmpty());
     EXPECT_THAT(wrong_, testing::IsEmpty());
     for (std::size_t number = 0; number < managers; ++number) {
       std::cout << "manager " << number + 1 << ": " << early[number] << " KiB at a tenth, " << late[number]
-                << " KiB at the end\n";
+                << " KiB at the end" << std::endl;
       EXPECT_LE(late[number] - early[number], toleratedKib);
     }
-    expectWorking(ground);
+    expectWorking(scene);
     // A connection is closed a moment after its client has gone, a session with a BMC when it has rested.
     poll([&] { return descriptors() == before; });
     EXPECT_EQ(descriptors(), before);
@@ -137,10 +124,10 @@ class LoadTest : public testing::Test {
   }
 
  private:
-  void write(const Ground& ground, std::size_t number) {
+  void write(const Scene& scene, std::size_t number) {
     CimClient client(stacks_[number]->port());
     CimClient other(stacks_[1 - number]->port());
-    const std::string& interface = ground.interfaces[number];
+    const std::string& interface = scene.interfaces[number];
     std::size_t logged = 0;
     Tally tally;
     for (std::size_t round = number; Clock::now() < end_; ++round) {
@@ -149,7 +136,7 @@ class LoadTest : public testing::Test {
       tally.add("ModifyInstance", answer);
       changes_ += answer.kind == Answer::Kind::Fine ? 1 : 0;
       // Such a client is told of success whatever came of it; the log has what did not.
-      if (ground.readsBack && shown(other, interface) != std::vector{pair}) {
+      if (scene.readsBack && shown(other, interface) != std::vector{pair}) {
         const std::string log = stacks_[number]->log();
         expect(log.size() > logged, "a change to " + pair.address + " is neither shown nor in the log");
         logged = log.size();
@@ -158,9 +145,9 @@ class LoadTest : public testing::Test {
     merge(tally);
   }
 
-  void read(const Ground& ground, std::size_t number) {
+  void read(const Scene& scene, std::size_t number) {
     CimClient client(stacks_[number % managers]->port());
-    const std::string name = endpointName(ground.interfaces[number / managers % managers]);
+    const std::string name = endpointName(scene.interfaces[number / managers % managers]);
     const std::vector<std::pair<std::string, std::string>> requests = {
         {"GetInstance", parameter("InstanceName", name)},
         {"EnumerateInstances", className(Classes::endpoint)},
@@ -202,13 +189,13 @@ class LoadTest : public testing::Test {
   }
 
   // What remains is one pair that both show, and each changes what the other shows.
-  void expectWorking(const Ground& ground) const {
+  void expectWorking(const Scene& scene) const {
     for (std::size_t number = 0; number < managers; ++number) {
       const Pair& pair = knownPairs()[firstWritten + number];
       CimClient changes(stacks_[number]->port());
       CimClient looks(stacks_[1 - number]->port());
-      EXPECT_EQ(change(changes, ground.interfaces[0], pair).kind, Answer::Kind::Fine);
-      EXPECT_TRUE(shown(looks, ground.interfaces[0]) == std::vector{pair}) << pair.address;
+      EXPECT_EQ(change(changes, scene.interfaces[0], pair).kind, Answer::Kind::Fine);
+      EXPECT_TRUE(shown(looks, scene.interfaces[0]) == std::vector{pair}) << pair.address;
     }
   }
 
