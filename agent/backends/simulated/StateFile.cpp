@@ -112,7 +112,7 @@ void replace(const fs::path& target, std::string_view text) {
   }
   const Ground::Descriptor directory(target.parent_path(), O_RDONLY | O_DIRECTORY);
   if (!directory.isOpen() || ::fsync(directory.number()) != 0) {
-    fail(target, "cannot be brought to the disk");
+    fail(target, "is replaced, but a power cut may bring the earlier one back: its name cannot be brought to the disk");
   }
 }
 

@@ -67,11 +67,14 @@ AddressSettings AddressChanger::readBack(const std::vector<ParameterWrite>& writ
                                          const std::string& loss) try {
   for (const Deadline deadline(patience_);;) {
     AddressSettings present = wanted;
-    for (const ParameterWrite& write : written) {
-      readInto(present, transport_, channel_, write.parameter);
-    }
-    if (present == wanted) {
-      return present;
+    try {
+      for (const ParameterWrite& write : written) {
+        readInto(present, transport_, channel_, write.parameter);
+      }
+      if (present == wanted) {
+        return present;
+      }
+    } catch (const Refused&) {  // it may be busy
     }
     if (deadline.passed()) {
       return readAddressSettings(transport_, channel_);

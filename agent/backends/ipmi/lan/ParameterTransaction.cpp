@@ -51,7 +51,8 @@ IpmiResponse insistOnLock(IpmiTransport& transport, std::uint8_t channel, std::c
 
 void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::chrono::milliseconds patience) {
   try {
-    if (held.at(channel) == LockHolder::PerhapsAnother) {
+    const bool surelyOurs = held.at(channel) == LockHolder::Us;
+    if (!surelyOurs) {
       insistOnLock(transport, channel, patience);
     }
     IpmiResponse response;
@@ -60,7 +61,7 @@ void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held
         std::this_thread::sleep_for(betweenRequests);
       }
       response = setProgress(transport, channel, SetProgress::Complete, Repetition::Allowed);
-      if (response.completionCode == CompletionCode::done || meansNoLock(response.completionCode)) {
+      if (response.completionCode == CompletionCode::done || (!surelyOurs && meansNoLock(response.completionCode))) {
         held.erase(channel);
         return;
       }
@@ -90,6 +91,10 @@ void ParameterTransaction::take() {
   IpmiResponse response;
   try {
     response = askForLock(transport_, channel_);
+    // What is written without a lock to a processor that has one waits for the next client's commit: better sure.
+    if (meansNoLock(response.completionCode)) {
+      response = askForLock(transport_, channel_);
+    }
   } catch (const ConnectionLost&) {
     held_[channel_] = LockHolder::PerhapsAnother;
     throw;
