@@ -66,8 +66,8 @@ TEST(CampaignTest, CountsWhatIsWrongAndWhatLeaksByTheKindOfFault) {
 }
 
 TEST(CampaignTest, AnEscapingExceptionIsACrash) {
-  const Report report = carryOut(somePoints(), 1, [](const Point&) -> Finding { throw 42; });
-  EXPECT_EQ(counted(report, Verdict::Crashed), 20u);
+  const Report report = carryOut({somePoints().front()}, 1, [](const Point&) -> Finding { throw 42; });
+  EXPECT_EQ(counted(report, Verdict::Crashed), 1u);
 }
 
 TEST(CampaignTest, FindsAPointByItsName) {

@@ -11,11 +11,6 @@ using Cimom::ObjectPath;
 using Cimom::Value;
 using Keys = std::vector<std::pair<const char*, std::string>>;
 
-constexpr const char* names[] = {"EnumInstanceNames", "EnumInstances",   "GetInstance", "ModifyInstance",
-                                 "CreateInstance",    "DeleteInstance",  "ExecQuery",   "Cleanup",
-                                 "Associators",       "AssociatorNames", "References",  "ReferenceNames",
-                                 "AssociationCleanup"};
-
 ObjectPath pathOf(const std::string& className, const Keys& keys = {}) {
   ObjectPath path{"client.example", "root/cimv2", className, {}};
   for (const auto& [name, value] : keys) {
@@ -245,8 +240,6 @@ std::vector<Request> catalogue() {
 }
 
 }  // namespace
-
-std::string nameOf(Operation operation) { return names[static_cast<int>(operation)]; }
 
 const std::vector<Request>& requests() {
   static const std::vector<Request> all = catalogue();

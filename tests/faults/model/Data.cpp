@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
-#include "tests/faults/ModelData.h"
+#include "tests/faults/model/Data.h"
 
 #include <stdexcept>
 
