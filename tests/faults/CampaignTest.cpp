@@ -87,7 +87,7 @@ TEST(CampaignTest, AShareHasEveryKindOfFault) {
   for (const Point& point : every) {
     all.insert(point.fault);
   }
-  for (const Point& point : share(every, 29)) {
+  for (const Point& point : share(every, 53)) {
     shared.insert(point.fault);
   }
   EXPECT_EQ(shared, all);
