@@ -5,7 +5,7 @@
 #include <cstdlib>
 #include <new>
 
-#ifdef SANITIZED
+#ifdef LEAK_SANITIZER
 #include <sanitizer/lsan_interface.h>
 #endif
 
@@ -13,25 +13,27 @@ namespace Testing {
 
 namespace {
 
-bool counted_ = false;
+bool counting = false;
 long blocks = 0;
 
 }  // namespace
 
-CountedAllocations::CountedAllocations(bool counted) : outer_(counted_) { counted_ = counted; }
-CountedAllocations::~CountedAllocations() { counted_ = outer_; }
+CountedAllocations::CountedAllocations(bool counted) : outer_(counting) { counting = counted; }
+CountedAllocations::~CountedAllocations() { counting = outer_; }
 
 long libraryBlocks() { return blocks; }
 
-#ifdef SANITIZED
-
+#ifdef LEAK_SANITIZER
 bool sanitizerFindsLeaks() { return __lsan_do_recoverable_leak_check() != 0; }
+#else
+bool sanitizerFindsLeaks() { return false; }
+#endif
 
 }  // namespace Testing
 
-#else
+#ifndef SANITIZED
 
-bool sanitizerFindsLeaks() { return false; }
+namespace Testing {
 
 namespace {
 
@@ -53,8 +55,8 @@ void* allocate(std::size_t size) {
   if (!block) {
     throw std::bad_alloc();
   }
-  reinterpret_cast<Header*>(block)->owner = counted_ ? library : other;
-  blocks += counted_ ? 1 : 0;
+  reinterpret_cast<Header*>(block)->owner = counting ? library : other;
+  blocks += counting ? 1 : 0;
   return block + headerSize;
 }
 

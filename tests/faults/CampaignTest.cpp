@@ -66,8 +66,8 @@ TEST(CampaignTest, CountsWhatIsWrongAndWhatLeaksByTheKindOfFault) {
 }
 
 TEST(CampaignTest, AnEscapingExceptionIsACrash) {
-  const Report report = carryOut(somePoints(), 1, [](const Point&) -> Finding { throw 42; });
-  EXPECT_EQ(counted(report, Verdict::Crashed), 20u);
+  const Report report = carryOut({somePoints().front()}, 1, [](const Point&) -> Finding { throw 42; });
+  EXPECT_EQ(counted(report, Verdict::Crashed), 1u);
 }
 
 TEST(CampaignTest, FindsAPointByItsName) {
@@ -87,7 +87,7 @@ TEST(CampaignTest, AShareHasEveryKindOfFault) {
   for (const Point& point : every) {
     all.insert(point.fault);
   }
-  for (const Point& point : share(every, 29)) {
+  for (const Point& point : share(every, 53)) {
     shared.insert(point.fault);
   }
   EXPECT_EQ(shared, all);

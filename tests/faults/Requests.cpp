@@ -11,11 +11,6 @@ using Cimom::ObjectPath;
 using Cimom::Value;
 using Keys = std::vector<std::pair<const char*, std::string>>;
 
-constexpr const char* names[] = {"EnumInstanceNames", "EnumInstances",   "GetInstance", "ModifyInstance",
-                                 "CreateInstance",    "DeleteInstance",  "ExecQuery",   "Cleanup",
-                                 "Associators",       "AssociatorNames", "References",  "ReferenceNames",
-                                 "AssociationCleanup"};
-
 ObjectPath pathOf(const std::string& className, const Keys& keys = {}) {
   ObjectPath path{"client.example", "root/cimv2", className, {}};
   for (const auto& [name, value] : keys) {
@@ -24,8 +19,7 @@ ObjectPath pathOf(const std::string& className, const Keys& keys = {}) {
   return path;
 }
 
-Keys accessPointKeys(const std::string& className, const std::string& creationClass, const std::string& name) {
-  (void)className;
+Keys accessPointKeys(const std::string& creationClass, const std::string& name) {
   return {{"SystemCreationClassName", Classes::computerSystem},
           {"SystemName", "sp1"},
           {"CreationClassName", creationClass},
@@ -38,10 +32,10 @@ ObjectPath existing(const std::string& className, bool second = false) {
     return pathOf(className, {{"CreationClassName", className}, {"Name", second ? "sp2" : "sp1"}});
   }
   if (className == Classes::endpoint) {
-    return pathOf(className, accessPointKeys(className, className, second ? "eth1" : "eth0"));
+    return pathOf(className, accessPointKeys(className, second ? "eth1" : "eth0"));
   }
   if (className == Classes::remoteAccessPoint) {
-    return pathOf(className, accessPointKeys(className, "YRNx_RemoteAccessPoint", second ? "DNS:1" : "Gateway:eth0"));
+    return pathOf(className, accessPointKeys("YRNx_RemoteAccessPoint", second ? "DNS:1" : "Gateway:eth0"));
   }
   if (className == Classes::sequence) {
     return pathOf(className, {{"InstanceID", second ? "BMC:eth0:dhcp" : "BMC:eth0:static"}});
@@ -86,6 +80,9 @@ ObjectPath existingAssociation(const std::string& className, bool there) {
   return path;
 }
 
+constexpr Operation navigations[] = {Operation::Associators, Operation::AssociatorNames, Operation::References,
+                                     Operation::ReferenceNames};
+
 class Catalogue {
  public:
   std::vector<Request> requests;
@@ -114,12 +111,6 @@ class Catalogue {
     add(navigation(unit, Operation::Associators, "from-an-unknown-class", pathOf("CIM_ManagedElement")));
     add(navigation(unit, Operation::ReferenceNames, "from-an-unknown-class", pathOf("CIM_ManagedElement")));
     for (const Operation operation : {Operation::Associators, Operation::AssociatorNames}) {
-      Request filtered = navigation(unit, operation, "with-filters", existing(ends.secondClass));
-      filtered.resultClass = ends.firstClass;
-      filtered.role = ends.second;
-      filtered.resultRole = ends.first;
-      filtered.properties = list("Name");
-      add(filtered);
       Request foreign = navigation(unit, operation, "over-another-association", existing(ends.firstClass));
       foreign.associationClass = "CIM_Dependency";
       add(foreign);
@@ -127,13 +118,8 @@ class Catalogue {
       foreign.associationClass = nullptr;
       add(foreign);
     }
-    for (const Operation operation : {Operation::References, Operation::ReferenceNames}) {
-      Request filtered = navigation(unit, operation, "with-filters", existing(ends.secondClass));
-      filtered.resultClass = "CIM_Dependency";
-      filtered.role = ends.second;
-      filtered.properties = list(ends.first);
-      add(filtered);
-    }
+    addFiltered(unit, "with-filters-from-one-end", ends.firstClass, ends.first, ends.secondClass, ends.second);
+    addFiltered(unit, "with-filters-from-the-other-end", ends.secondClass, ends.second, ends.firstClass, ends.first);
   }
 
   // What no unit carries out, and cleaning up.
@@ -223,9 +209,20 @@ class Catalogue {
     return request;
   }
 
+  void addFiltered(const Unit& unit, const std::string& shape, const char* sourceClass, const char* role,
+                   const char* farClass, const char* farRole) {
+    for (const Operation operation : navigations) {
+      Request filtered = navigation(unit, operation, shape, existing(sourceClass));
+      filtered.resultClass = filtered.associationClass ? farClass : "CIM_Dependency";
+      filtered.role = role;
+      filtered.resultRole = farRole;
+      filtered.properties = list("Name");
+      add(filtered);
+    }
+  }
+
   void addNavigation(const Unit& unit, const std::string& shape, const ObjectPath& source) {
-    for (const Operation operation :
-         {Operation::Associators, Operation::AssociatorNames, Operation::References, Operation::ReferenceNames}) {
+    for (const Operation operation : navigations) {
       add(navigation(unit, operation, shape, source));
     }
   }
@@ -245,8 +242,6 @@ std::vector<Request> catalogue() {
 }
 
 }  // namespace
-
-std::string nameOf(Operation operation) { return names[static_cast<int>(operation)]; }
 
 const std::vector<Request>& requests() {
   static const std::vector<Request> all = catalogue();

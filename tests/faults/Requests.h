@@ -7,27 +7,12 @@
 #include <vector>
 
 #include "cimom/model/ObjectPath.h"
+#include "tests/faults/model/Model.h"
 #include "tests/support/composite/Units.h"
 
 namespace Testing {
 
-enum class Operation {
-  EnumInstanceNames,
-  EnumInstances,
-  GetInstance,
-  ModifyInstance,
-  CreateInstance,
-  DeleteInstance,
-  ExecQuery,
-  Cleanup,
-  Associators,
-  AssociatorNames,
-  References,
-  ReferenceNames,
-  AssociationCleanup,
-};
-
-std::string nameOf(Operation operation);
+using Model::Operation;
 
 struct Request {
   const Unit* unit;

@@ -46,28 +46,34 @@ struct Reaction {
 
 struct Association {
   const char* name;
-  // References: which property holds which end.
+
+  // What References answers: which property holds which end.
   const char* propertyA;
   const char* endA;
   const char* propertyB;
   const char* endB;
 
+  // What the builder makes: two properties in the order in which they are set, of an end that is read once and one that
+  // is read for each of its instances.
   const char* builder;
-  int entryLine;
-  int exitLine;
-  // The builder: two properties in the order in which they are set, and the end that each holds.
+  int entryLine = 0;  // any where 0
+  int exitLine = 0;
   const char* first;
   const char* second;
   const char* outer;
   const char* inner;
-  bool firstHoldsOuter;
-  bool ordered;      // goes by identifiers
-  const char* word;  // "static", "dhcp"
-  const char* wordOfReferenceNames;
-  bool keysOnPath;
-  bool flags;
+  bool firstHoldsOuter = false;
+  bool ordered = false;  // goes by identifiers, and by a word in those of the sequences
+  const char* word = "";
+  const char* wordOfReferenceNames = "";
+  bool keysOnPath = false;
+  bool flags = false;  // "IsDefault" and so on
 
-  Reaction outerFails, outerUnusable, innerFails, innerUnusable, pathUnmade;
+  Reaction outerFails;
+  Reaction outerUnusable;
+  Reaction innerFails;
+  Reaction innerUnusable;
+  Reaction pathUnmade;
   bool appendsUnmade;
 };
 
