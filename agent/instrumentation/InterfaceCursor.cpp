@@ -83,10 +83,11 @@ bool InterfaceCursor::get(NodeLexicon::Properties property, std::string& value) 
       held = property == NodeLexicon::Ipv4Address ? textOf(interface->ipv4Address) : textOf(interface->ipv4SubnetMask);
     }
   }
-  if (held) {
-    value = *std::move(held);
+  if (!held) {
+    return false;
   }
-  return held.has_value();
+  value = *std::move(held);
+  return true;
 }
 
 bool InterfaceCursor::set(NodeLexicon::Properties property, const std::string& value) {

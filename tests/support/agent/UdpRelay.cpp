@@ -60,6 +60,32 @@ bool UdpRelay::undisturb() {
   return disturbed_;
 }
 
+void UdpRelay::stallAtRequest(unsigned number) {
+  const std::lock_guard lock(mutex_);
+  untilStalled_ = number;
+}
+
+void UdpRelay::join() {
+  passing_ = unlimited;
+  const std::lock_guard lock(mutex_);
+  untilStalled_ = 0;
+  for (const auto& datagram : std::exchange(stalled_, {})) {
+    ::send(bmc_, datagram.data(), datagram.size(), 0);
+  }
+}
+
+bool UdpRelay::stalls(std::size_t size) {
+  const std::lock_guard lock(mutex_);
+  if (untilStalled_ > 1) {
+    --untilStalled_;
+    return false;
+  }
+  if (untilStalled_ == 1) {
+    stalled_.emplace_back(datagram_.data(), datagram_.data() + size);
+  }
+  return untilStalled_ == 1;
+}
+
 void UdpRelay::sendRequest(std::size_t size) const { ::send(bmc_, datagram_.data(), size, 0); }
 
 void UdpRelay::sendAnswer(const std::vector<char>& answer) const {
@@ -87,7 +113,7 @@ void UdpRelay::takeRequest() {
     return;
   }
   const auto size = static_cast<std::size_t>(received);
-  if (disturbance == Disturbance::RequestLost) {
+  if (disturbance == Disturbance::RequestLost || stalls(size)) {
     return;
   }
   sendRequest(disturbance == Disturbance::RequestCut ? size / 2 : size);

@@ -42,7 +42,11 @@ class UdpRelay {
   // From the client's datagram of that number on, counted from now, nothing passes to the client; the datagram itself
   // still reaches the BMC. Until joined again.
   void cutAtRequest(unsigned number) { passing_ = number; }
-  void join() { passing_ = unlimited; }
+
+  // From the client's datagram of that number on, counted from now, the BMC gets none until joined again, and then all.
+  void stallAtRequest(unsigned number);
+
+  void join();
 
   // Once, to the client's datagram of that number, counted from now.
   void disturbRequest(unsigned number, Disturbance disturbance);
@@ -55,6 +59,7 @@ class UdpRelay {
   void relay();
   void takeRequest();
   void takeAnswer();
+  bool stalls(std::size_t size);
   void sendRequest(std::size_t size) const;
   void sendAnswer(const std::vector<char>& answer) const;
 
@@ -69,6 +74,8 @@ class UdpRelay {
   unsigned untilDisturbed_ = 0;  // 0: nothing is to be disturbed
   Disturbance disturbance_ = Disturbance::RequestLost;
   bool disturbed_ = false;
+  unsigned untilStalled_ = 0;  // 0: nothing stalls
+  std::vector<std::vector<char>> stalled_;
 
   // The relay's thread alone.
   std::array<char, 2048> datagram_{};

@@ -114,7 +114,7 @@ std::vector<std::string> stepsOf(const std::vector<SystemCall>& calls) {
       steps.push_back(step->second + open[call.arguments[0]]);
     }
   }
-  steps.erase(std::ranges::unique(steps).begin(), steps.end());
+  steps.erase(std::unique(steps.begin(), steps.end()), steps.end());
   return steps;
 }
 
