@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "tests/load/CimClient.h"
 
+#include <chrono>
 #include <stdexcept>
 
 #include "tests/cimom/cimxml/Messages.h"
@@ -9,6 +10,9 @@ namespace Testing {
 namespace {
 
 constexpr unsigned httpOk = 200;
+
+// The object manager gives up on a provider before.
+constexpr std::chrono::seconds patience{90};
 
 // The value of an attribute of the first element of that name; empty if there is none.
 std::string attributeOf(const std::string& xml, const std::string& element, const std::string& name) {
@@ -49,7 +53,7 @@ Answer CimClient::ask(const std::string& method, const std::string& parameters, 
 Answer CimClient::send(const std::string& method, const std::string& object, const std::string& body) {
   try {
     if (!connection_) {
-      connection_.emplace(port_);
+      connection_.emplace(port_, "127.0.0.1", patience);
     }
     auto response = connection_->post("/cimom", body,
                                       "Content-Type: application/xml; charset=\"utf-8\"\r\n"

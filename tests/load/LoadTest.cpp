@@ -194,7 +194,8 @@ class LoadTest : public testing::Test {
       const Pair& pair = knownPairs()[firstWritten + number];
       CimClient changes(stacks_[number]->port());
       CimClient looks(stacks_[1 - number]->port());
-      EXPECT_EQ(change(changes, scene.interfaces[0], pair).kind, Answer::Kind::Fine);
+      const Answer answer = change(changes, scene.interfaces[0], pair);
+      EXPECT_EQ(answer.kind, Answer::Kind::Fine) << answer.body;
       EXPECT_TRUE(shown(looks, scene.interfaces[0]) == std::vector{pair}) << pair.address;
     }
   }
@@ -247,7 +248,7 @@ TEST_F(LoadTest, TwoManagersAndEightClientsShareAStateFile) {
 #ifdef SIMULATED_BMC
 TEST_F(LoadTest, TwoManagersAndEightClientsShareABmc) {
   const SimulatedBmc bmc;
-  std::string section = "[processor]\nbackend = ipmi\n[ipmi]\noperation_timeout = 8\n";
+  std::string section = "[processor]\nbackend = ipmi\n[ipmi]\noperation_timeout = 20\n";
   for (const auto& [key, value] : bmc.settings()) {
     section += key + " = " + value + '\n';
   }

@@ -3,11 +3,11 @@
 
 #include <algorithm>
 #include <exception>
+#include <thread>
 #include <utility>
 
 #include "agent/backends/ipmi/lan/AddressChanger.h"
 #include "agent/backends/ipmi/lan/ChannelDiscovery.h"
-#include "agent/backends/ipmi/lan/InterfaceReader.h"
 #include "agent/backends/ipmi/session/IpmiLog.h"
 
 namespace QV::Ipmi {
@@ -22,6 +22,8 @@ std::chrono::milliseconds patience(const IpmiSettings& settings) {
 // The channel that a session runs on is another one where the processor fails over from one port to the other: seldom,
 // and to be seen in the end. A channel's name stays its own, so that no change goes astray meanwhile.
 constexpr std::chrono::minutes channelsHold{10};
+
+constexpr std::chrono::milliseconds betweenLooks{20};
 
 }  // namespace
 
@@ -102,13 +104,15 @@ std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
   return channels_;
 }
 
-// Another client may commit a change between the round trips of a look, which then has the old address with the new
-// mask. A pair that was not known before is one if the address is still the same afterwards; else it is looked at anew.
+// A processor shows what another client writes, one value after the other or all at once, and that may come between two
+// round trips of a look. An address and mask that were not known to belong together do if they stay and nobody is at
+// work on them. Who has left a lock behind is waited for once, and not for long.
 NetworkInterface IpmiProcessor::look(Channel& channel) {
-  while (true) {
+  for (const Deadline end(settings_.operationTimeout / 2);; std::this_thread::sleep_for(betweenLooks)) {
     NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
-    const std::pair pair(interface.ipv4Address, interface.ipv4SubnetMask);
-    if (channel.known == pair || readAddress(connection_, channel.number) == interface.ipv4Address) {
+    const AddressPair pair(interface.ipv4Address, interface.ipv4SubnetMask);
+    if (channel.known == pair || end.passed() ||
+        (!isBeingSet(connection_, channel.number) && readAddressPair(connection_, channel.number) == pair)) {
       channel.known = pair;
       return interface;
     }

@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "agent/backends/ChangeGeneration.h"
+#include "agent/backends/ipmi/lan/InterfaceReader.h"
 #include "agent/backends/ipmi/lan/ParameterTransaction.h"
 #include "agent/backends/ipmi/session/IpmiConnection.h"
 #include "agent/backends/ipmi/settings/IpmiSettings.h"
@@ -61,7 +62,7 @@ class IpmiProcessor {
   struct Channel {
     std::uint8_t number;
     Ipv6Choice ipv6;
-    std::optional<std::pair<std::optional<Ipv4Address>, std::optional<SubnetMask>>> known = {};
+    std::optional<AddressPair> known = {};
   };
 
   void startOperation(Deadline deadline);

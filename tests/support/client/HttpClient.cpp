@@ -15,20 +15,20 @@
 namespace Testing {
 namespace {
 
-constexpr timeval patience{10, 0};
-
 [[noreturn]] void fail(const char* what) { throw std::runtime_error(std::string(what) + ": " + std::strerror(errno)); }
 
 }  // namespace
 
-HttpClient::HttpClient(std::uint16_t port, const char* from) : socket_(socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
+HttpClient::HttpClient(std::uint16_t port, const char* from, std::chrono::seconds patience)
+    : socket_(socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0)) {
   sockaddr_in address{};
   address.sin_family = AF_INET;
   inet_pton(AF_INET, from, &address.sin_addr);
   const int on = 1;
   setsockopt(socket_, IPPROTO_TCP, TCP_NODELAY, &on, sizeof on);
-  setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &patience, sizeof patience);
-  setsockopt(socket_, SOL_SOCKET, SO_SNDTIMEO, &patience, sizeof patience);
+  const timeval limit{patience.count(), 0};
+  setsockopt(socket_, SOL_SOCKET, SO_RCVTIMEO, &limit, sizeof limit);
+  setsockopt(socket_, SOL_SOCKET, SO_SNDTIMEO, &limit, sizeof limit);
   const bool bound = bind(socket_, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
   address.sin_port = htons(port);
   address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <string>
 #include <string_view>
@@ -10,11 +11,12 @@
 namespace Testing {
 
 // A client's end of a connection to 127.0.0.1, byte by byte, so that a test can send what no decent client would.
-// Waits at most 10 s for anything; what fails throws std::runtime_error.
+// What fails, or takes longer than its patience, throws std::runtime_error.
 class HttpClient {
  public:
   // @param from the address that it comes from, any of 127.0.0.0/8
-  explicit HttpClient(std::uint16_t port, const char* from = "127.0.0.1");
+  explicit HttpClient(std::uint16_t port, const char* from = "127.0.0.1",
+                      std::chrono::seconds patience = std::chrono::seconds(10));
   ~HttpClient();
   HttpClient(const HttpClient&) = delete;
   HttpClient& operator=(const HttpClient&) = delete;

@@ -83,8 +83,17 @@ NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, I
   return interface;
 }
 
-std::optional<Ipv4Address> readAddress(IpmiTransport& transport, std::uint8_t channel) {
-  return addressIn<Ipv4Address>(getParameter(transport, channel, LanParameter::IpAddress));
+AddressPair readAddressPair(IpmiTransport& transport, std::uint8_t channel) {
+  const auto address = getParameter(transport, channel, LanParameter::IpAddress);
+  const auto mask = getParameter(transport, channel, LanParameter::SubnetMask);
+  return {addressIn<Ipv4Address>(address), addressIn<SubnetMask>(mask)};
+}
+
+bool isBeingSet(IpmiTransport& transport, std::uint8_t channel) try {
+  const auto data = getParameter(transport, channel, LanParameter::SetInProgress);
+  return data && !data->empty() && (data->front() & 0x03) != static_cast<std::uint8_t>(SetProgress::Complete);
+} catch (const Refused&) {
+  return false;
 }
 
 std::string interfaceName(std::uint8_t channel) { return std::string(namePrefix) + std::to_string(channel); }

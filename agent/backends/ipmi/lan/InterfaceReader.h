@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <utility>
 
 #include "agent/backends/ipmi/session/IpmiTransport.h"
 #include "agent/backends/ipmi/settings/IpmiSettings.h"
@@ -18,8 +19,12 @@ namespace QV::Ipmi {
 // IpmiError if the exchange fails or the channel reports nothing at all, which means that it is no LAN channel.
 NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, Ipv6Choice& ipv6);
 
-// The channel's address alone, absent where it is zero: one round trip.
-std::optional<Ipv4Address> readAddress(IpmiTransport& transport, std::uint8_t channel);
+// Address and mask alone, absent where they are zero: two round trips.
+using AddressPair = std::pair<std::optional<Ipv4Address>, std::optional<SubnetMask>>;
+AddressPair readAddressPair(IpmiTransport& transport, std::uint8_t channel);
+
+// Whether a client holds the channel's set-in-progress lock, as far as the processor says.
+bool isBeingSet(IpmiTransport& transport, std::uint8_t channel);
 
 // The node name of a channel, "lan1", and the channel of a node name; nothing if the name is none.
 std::string interfaceName(std::uint8_t channel);
