@@ -40,23 +40,23 @@ std::string shown(const CMPIInstance* instance) {
 }
 
 CMPIStatus returnInstance(const CMPIResult*, const CMPIInstance* instance) {
-  recording().outcome->answered.push_back(shown(instance));
+  recording().outcome.answered.push_back(shown(instance));
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnObjectPath(const CMPIResult*, const CMPIObjectPath* path) {
-  recording().outcome->answered.push_back(textOf(path));
+  recording().outcome.answered.push_back(textOf(path));
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnDone(const CMPIResult*) {
-  recording().outcome->answered.push_back("done");
+  recording().outcome.answered.push_back("done");
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnData(const CMPIResult*, const CMPIValue*, const CMPIType) {
-  recording().outcome->answered.push_back("data");
+  recording().outcome.answered.push_back("data");
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnError(const CMPIResult*, const CMPIError*) {
-  recording().outcome->answered.push_back("error");
+  recording().outcome.answered.push_back("error");
   return {CMPI_RC_OK, nullptr};
 }
 

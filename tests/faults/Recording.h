@@ -13,8 +13,8 @@ namespace Testing {
 
 // Of the run that is under way.
 struct Recording {
-  Outcome* outcome = nullptr;
-  std::map<const CMPIInstance*, std::string> filters = {};  // that were set
+  Outcome outcome;
+  std::map<const CMPIInstance*, std::string> filters;  // that were set
 };
 
 Recording& recording();

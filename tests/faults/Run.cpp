@@ -2,6 +2,7 @@
 #include "tests/faults/Run.h"
 
 #include <exception>
+#include <utility>
 
 #include "cimom/broker/Handle.h"
 #include "cimom/broker/RequestScope.h"
@@ -97,17 +98,19 @@ std::string shown(const CMPIStatus& status) {
 
 RunResult carryOut(Who who, const Request& request) {
   RunResult result;
-  recording() = {&result.outcome};
-  agent() = {request.nodes, &result.outcome};
+  recording() = {};
+  nodeNames() = request.nodes;
   Objects objects(request);
   const long before = libraryBlocks();
+  std::string& status = recording().outcome.status;
   try {
-    result.outcome.status = shown(call(who, request, objects));
+    status = shown(call(who, request, objects));
   } catch (const std::exception& exception) {
-    result.outcome.status = std::string("throws ") + exception.what();
+    status = std::string("throws ") + exception.what();
   } catch (int) {
-    result.outcome.status = "throws an int";
+    status = "throws an int";
   }
+  result.outcome = std::move(recording().outcome);
   result.leaked = libraryBlocks() - before;
   result.fired = calls().fired();
   result.violations = calls().violations();

@@ -48,8 +48,8 @@ World::World()
     manager_.loadSchemaText(everyClassIn(nameSpace), nameSpace);
   }
   manager_.setTrace([](int level, std::string_view component, std::string_view text) {
-    recording().outcome->brokerTrace.push_back(std::to_string(level) + ' ' + std::string(component) + ": " +
-                                               std::string(text));
+    recording().outcome.brokerTrace.push_back(std::to_string(level) + ' ' + std::string(component) + ": " +
+                                              std::string(text));
   });
   interpose(result_);
   addSystems();
@@ -87,7 +87,8 @@ Instance World::instanceOf(const char* className, const Texts& properties) const
 }
 
 void World::add(Instance instance) {
-  underlying_[instance.definition().name].push_back(Value::instance(std::move(instance)));
+  std::vector<Value>& ofClass = underlying_[instance.definition().name];
+  ofClass.push_back(Value::instance(std::move(instance)));
 }
 
 void World::addSystems() {
@@ -156,7 +157,7 @@ void World::addAccessPoints() {
 CMPIEnumeration* World::enumerateInstances(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath* path,
                                            const char** properties, CMPIStatus* status) {
   return Cimom::guarded(status, static_cast<CMPIEnumeration*>(nullptr), [&] {
-    recording().outcome->upCalls.push_back(textOf(path) + (properties ? " with properties" : ""));
+    recording().outcome.upCalls.push_back(textOf(path) + (properties ? " with properties" : ""));
     const auto& given = Cimom::argumentOf<ObjectPath>(path);
     const auto found = world().underlying_.find(given.className);
     if (given.nameSpace != underlyingNameSpace || found == world().underlying_.end()) {
