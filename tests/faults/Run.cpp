@@ -12,6 +12,7 @@
 #include "tests/faults/Recording.h"
 #include "tests/faults/World.h"
 #include "tests/faults/model/Model.h"
+#include "tests/support/broker/PersonalObjects.h"
 
 namespace Testing {
 
@@ -26,8 +27,7 @@ struct Objects {
   std::vector<const char*> properties;
 
   explicit Objects(const Request& request)
-      : path(Cimom::make(request.path)), properties(request.properties.value_or(std::vector<const char*>{})) {
-    interpose(path);
+      : path(world().path(request)), properties(request.properties.value_or(std::vector<const char*>{})) {
     interpose(context);
     calls().know(path, "the request's path");
     calls().know(context, "the context");
@@ -99,6 +99,7 @@ std::string shown(const CMPIStatus& status) {
 RunResult carryOut(Who who, const Request& request) {
   RunResult result;
   recording() = {};
+  forgetInstances();
   nodeNames() = request.nodes;
   Objects objects(request);
   const long before = libraryBlocks();
@@ -125,13 +126,10 @@ RunResult run(Who who, const Request& request, CallKey key, Fault fault) {
   return carryOut(who, request);
 }
 
-std::vector<RecordedCall> record(Who who, const Request& request, RunResult* result) {
+std::vector<RecordedCall> record(Who who, const Request& request) {
   world();
   calls().beginRecording();
-  RunResult made = carryOut(who, request);
-  if (result) {
-    *result = std::move(made);
-  }
+  carryOut(who, request);
   return calls().recorded();
 }
 
