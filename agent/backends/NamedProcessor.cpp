@@ -19,6 +19,8 @@ ManagementProcessor NamedProcessor::read() {
   return processor;
 }
 
+InterfaceNames NamedProcessor::interfaceNames() { return processor_->interfaceNames(); }
+
 void NamedProcessor::change(const std::string& interfaceName, const AddressChange& change) {
   processor_->change(interfaceName, change);
 }

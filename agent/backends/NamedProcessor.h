@@ -15,6 +15,7 @@ class NamedProcessor : public BackEnd {
   NamedProcessor(std::shared_ptr<BackEnd> processor, std::string name, std::string description);
 
   ManagementProcessor read() override;
+  InterfaceNames interfaceNames() override;
   void change(const std::string& interfaceName, const AddressChange& change) override;
 
  private:

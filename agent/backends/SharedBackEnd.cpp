@@ -5,7 +5,6 @@
 
 #include <exception>
 #include <filesystem>
-#include <mutex>
 #include <stdexcept>
 #include <string>
 
@@ -91,6 +90,9 @@ std::shared_ptr<BackEnd> createBackEnd() {
                              "backend = ipmi for a BMC, or backend = simulated for made-up values");
   }
   const std::string& description = configuration.processorDescription;
+  // With this the log is there before the back end is, and outlives it: that may have something to say when it ends.
+  TWLog::trace("Tarnwick.Instrumentation", TWLog::progressLevel,
+               "the management processor is reached by the back end " + choice);
   return std::make_shared<NamedProcessor>(openBackEnd(configuration), configuration.processorName,
                                           choice == "simulated" ? describedAsSimulated(description) : description);
 }
@@ -98,12 +100,7 @@ std::shared_ptr<BackEnd> createBackEnd() {
 }  // namespace
 
 std::shared_ptr<BackEnd> sharedBackEnd() {
-  static std::mutex mutex;
-  static std::shared_ptr<BackEnd> backEnd;
-  const std::lock_guard lock(mutex);
-  if (!backEnd) {
-    backEnd = createBackEnd();
-  }
+  static const std::shared_ptr<BackEnd> backEnd = createBackEnd();
   return backEnd;
 }
 

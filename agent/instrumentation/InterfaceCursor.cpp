@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "agent/instrumentation/InterfaceCursor.h"
 
+#include <algorithm>
 #include <stdexcept>
 #include <utility>
 
@@ -14,24 +15,13 @@ std::optional<std::string> textOf(const std::optional<Address>& address) {
   return address ? std::optional(address->text()) : std::nullopt;
 }
 
-// Nothing too for a property that an interface does not have.
-std::optional<std::string> textOf(const NetworkInterface& interface, NodeLexicon::Properties property) {
-  switch (property) {
-    case NodeLexicon::Ipv4Address:
-      return textOf(interface.ipv4Address);
-    case NodeLexicon::Ipv4SubnetMask:
-      return textOf(interface.ipv4SubnetMask);
-    case NodeLexicon::NodeName:
-      return interface.name;
-  }
-  return std::nullopt;
+bool isAddressProperty(NodeLexicon::Properties property) {
+  return property == NodeLexicon::Ipv4Address || property == NodeLexicon::Ipv4SubnetMask;
 }
 
-// The interface as it will be. An address or mask that it has now and that no host can have (a DHCP client without a
-// lease shows 0.0.0.0) says nothing about the new value beside it.
-void requireConsistent(const NetworkInterface& current, const AddressChange& change) {
-  const auto& address = change.ipv4Address ? change.ipv4Address : current.ipv4Address;
-  const auto& mask = change.ipv4SubnetMask ? change.ipv4SubnetMask : current.ipv4SubnetMask;
+// What a change leaves as it is. An address or mask that no host can have (a DHCP client without a lease shows 0.0.0.0)
+// says nothing about the new value beside it.
+void requireConsistent(const std::optional<Ipv4Address>& address, const std::optional<SubnetMask>& mask) {
   if (address && mask && !address->unusable() && !mask->unusable()) {
     requireHostOfSubnet(*address, *mask);
   }
@@ -39,11 +29,11 @@ void requireConsistent(const NetworkInterface& current, const AddressChange& cha
 
 // Runs the check of a change, and names the interface where it refuses.
 template <typename Check>
-auto checked(const NetworkInterface& interface, const Check& check) {
+auto checked(const std::string& interfaceName, const Check& check) {
   try {
     return check();
   } catch (const std::invalid_argument& refusal) {
-    throw std::invalid_argument("interface " + *interface.name + ": " + refusal.what() + "; nothing was changed");
+    throw std::invalid_argument("interface " + interfaceName + ": " + refusal.what() + "; nothing was changed");
   }
 }
 
@@ -52,10 +42,23 @@ auto checked(const NetworkInterface& interface, const Check& check) {
 void InterfaceCursor::select(NodeLexicon::NodeType type) {
   flush();
   position_ = 0;
-  interfaces_.clear();
+  names_.clear();
+  interfaces_.reset();
   if (type == NodeLexicon::IpInterfaceNode) {
+    names_ = backEnd_->interfaceNames();
+  }
+}
+
+const NetworkInterface* InterfaceCursor::current() {
+  if (!interfaces_) {
     interfaces_ = backEnd_->read().interfaces;
   }
+  const auto& name = names_[position_];
+  if (position_ < interfaces_->size() && (*interfaces_)[position_].name == name) {
+    return &(*interfaces_)[position_];
+  }
+  const auto found = std::ranges::find(*interfaces_, name, &NetworkInterface::name);
+  return name && found != interfaces_->end() ? &*found : nullptr;
 }
 
 void InterfaceCursor::advance() {
@@ -69,11 +72,18 @@ bool InterfaceCursor::get(NodeLexicon::Properties property, std::string& value) 
   if (!onNode()) {
     return false;
   }
-  auto held = textOf(interfaces_[position_], property);
-  if (!held) {
-    if (property == NodeLexicon::NodeName) {
+  std::optional<std::string> held;
+  if (property == NodeLexicon::NodeName) {
+    held = names_[position_];
+    if (!held) {
       advance();
     }
+  } else if (isAddressProperty(property)) {
+    if (const NetworkInterface* interface = current()) {
+      held = property == NodeLexicon::Ipv4Address ? textOf(interface->ipv4Address) : textOf(interface->ipv4SubnetMask);
+    }
+  }
+  if (!held) {
     return false;
   }
   value = *std::move(held);
@@ -81,17 +91,16 @@ bool InterfaceCursor::get(NodeLexicon::Properties property, std::string& value) 
 }
 
 bool InterfaceCursor::set(NodeLexicon::Properties property, const std::string& value) {
-  const bool settable = property == NodeLexicon::Ipv4Address || property == NodeLexicon::Ipv4SubnetMask;
-  if (!onNode() || !settable || !interfaces_[position_].name) {
+  if (!onNode() || !isAddressProperty(property) || !names_[position_]) {
     return false;
   }
-  const NetworkInterface& interface = interfaces_[position_];
+  const std::string& name = *names_[position_];
   // Refused or not, the value takes the place of what was staged before it.
   auto address = std::exchange(stagedAddress_, {});
   if (property == NodeLexicon::Ipv4Address) {
-    stagedAddress_ = checked(interface, [&] { return Ipv4Address::requireHost(value); });
+    stagedAddress_ = checked(name, [&] { return Ipv4Address::requireHost(value); });
   } else {
-    send({address, checked(interface, [&] { return SubnetMask::requireUsable(value); })});
+    send({address, checked(name, [&] { return SubnetMask::requireUsable(value); })});
   }
   return true;
 }
@@ -102,17 +111,17 @@ void InterfaceCursor::flush() {
   }
 }
 
+// The value that does not change is looked at only where the other comes alone.
 void InterfaceCursor::send(const AddressChange& change) {
-  NetworkInterface& interface = interfaces_[position_];
-  checked(interface, [&] { requireConsistent(interface, change); });
-  backEnd_->change(*interface.name, change);
-  if (change.ipv4Address) {
-    interface.ipv4Address = change.ipv4Address;
-  }
-  if (change.ipv4SubnetMask) {
-    interface.ipv4SubnetMask = change.ipv4SubnetMask;
-  }
-  interface.ipv4Origin = AddressOrigin::Static;
+  const std::string& name = *names_[position_];
+  const bool whole = change.ipv4Address && change.ipv4SubnetMask;
+  const NetworkInterface* const present = whole ? nullptr : current();
+  checked(name, [&] {
+    requireConsistent(change.ipv4Address || !present ? change.ipv4Address : present->ipv4Address,
+                      change.ipv4SubnetMask || !present ? change.ipv4SubnetMask : present->ipv4SubnetMask);
+  });
+  backEnd_->change(name, change);
+  interfaces_.reset();
 }
 
 }  // namespace QV

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "agent/log/Channel.h"
 
+#include <pthread.h>
 #include <syslog.h>
 #include <unistd.h>
 
@@ -43,6 +44,13 @@ void sendToSyslog(const Message& message) {
   ::syslog(LOG_DAEMON | priority(message.level), "%s", describe(message).c_str());
 }
 
+// Asked of the kernel once in a process.
+int processId() {
+  static std::atomic<int> id = ::getpid();
+  static const bool followsForks = ::pthread_atfork(nullptr, nullptr, [] { id = ::getpid(); }) == 0;
+  return followsForks ? id.load() : ::getpid();
+}
+
 }  // namespace
 
 Channel::Channel(QV::ChannelSettings settings)
@@ -73,7 +81,7 @@ void Channel::send(const Message& message) {
 }
 
 void Channel::sendToFile(const Message& message) {
-  const int error = file_.append(fileLine(std::chrono::system_clock::now(), ::getpid(), message));
+  const int error = file_.append(fileLine(std::chrono::system_clock::now(), processId(), message));
   if (error == 0) {
     fileFailed_ = false;
     return;

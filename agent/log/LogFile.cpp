@@ -5,8 +5,19 @@
 #include <unistd.h>
 
 #include <cerrno>
+#include <ctime>
 
 namespace TWLog {
+namespace {
+
+// A clock that costs no system call, to a few milliseconds.
+std::chrono::nanoseconds now() {
+  timespec time{};
+  ::clock_gettime(CLOCK_MONOTONIC_COARSE, &time);
+  return std::chrono::seconds(time.tv_sec) + std::chrono::nanoseconds(time.tv_nsec);
+}
+
+}  // namespace
 
 int LogFile::append(std::string_view line) {
   const std::lock_guard lock(mutex_);
@@ -26,17 +37,29 @@ int LogFile::append(std::string_view line) {
   return 0;
 }
 
-int LogFile::openIfNeeded() {
-  struct stat opened {};
+bool LogFile::isCurrent() const {
   struct stat named {};
-  const bool current = file_.isOpen() && ::fstat(file_.number(), &opened) == 0 && ::stat(path_.c_str(), &named) == 0 &&
-                       opened.st_dev == named.st_dev && opened.st_ino == named.st_ino;
-  if (current) {
+  return file_.isOpen() && ::stat(path_.c_str(), &named) == 0 && named.st_dev == device_ && named.st_ino == inode_;
+}
+
+int LogFile::openIfNeeded() {
+  const auto present = now();
+  if (file_.isOpen() && present - lookedAt_ < lookInterval) {
+    return 0;
+  }
+  lookedAt_ = present;
+  if (isCurrent()) {
     return 0;
   }
   // A FIFO without a reader would otherwise hold the object manager up for ever.
   file_ = Ground::Descriptor(path_, O_WRONLY | O_APPEND | O_CREAT | O_NOCTTY | O_NONBLOCK, 0640);
-  return file_.isOpen() ? 0 : errno;
+  struct stat opened {};
+  if (!file_.isOpen() || ::fstat(file_.number(), &opened) != 0) {
+    return errno;
+  }
+  device_ = opened.st_dev;
+  inode_ = opened.st_ino;
+  return 0;
 }
 
 }  // namespace TWLog

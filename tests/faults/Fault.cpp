@@ -5,7 +5,7 @@ namespace Testing {
 
 namespace {
 
-constexpr const char* names[faultCount] = {
+constexpr const char* faultNames[faultCount] = {
     "none",         "null-with-error",   "null-silently", "without-handle",  "good-with-error",
     "null-state",   "bad-state",         "not-found",     "null-pointer",    "number",
     "text",         "reference",         "instance",      "array",           "characters",
@@ -15,6 +15,6 @@ constexpr const char* names[faultCount] = {
 
 }  // namespace
 
-std::string nameOf(Fault fault) { return names[static_cast<int>(fault)]; }
+std::string nameOf(Fault fault) { return faultNames[static_cast<int>(fault)]; }
 
 }  // namespace Testing

@@ -47,18 +47,28 @@ IpmiBackEnd::IpmiBackEnd(const IpmiSettings& settings)
       processor_(std::make_shared<IpmiProcessor>(settings)),
       thread_(IpmiSession::longestIdle(settings), [processor = processor_] { processor->close(); }) {}
 
-ManagementProcessor IpmiBackEnd::read() {
+template <typename Look>
+auto IpmiBackEnd::look(const std::string& what, Look look) {
   const Deadline deadline(settings_.operationTimeout);
-  const std::string what = "reading " + nameOf(settings_);
   try {
-    return thread_.run(deadline, [processor = processor_, deadline, what] {
-      return logged(what, [&] { return processor->read(deadline); });
+    return thread_.run(deadline, [processor = processor_, deadline, what, look] {
+      return logged(what, [&] { return look(*processor, deadline); });
     });
   } catch (const Overdue&) {
     const std::string text = what + ": no answer within operation_timeout";
     logFailure(text);
     throw std::runtime_error(text);
   }
+}
+
+ManagementProcessor IpmiBackEnd::read() {
+  return look("reading " + nameOf(settings_),
+              [](IpmiProcessor& processor, Deadline deadline) { return processor.read(deadline); });
+}
+
+InterfaceNames IpmiBackEnd::interfaceNames() {
+  return look("finding the interfaces of " + nameOf(settings_),
+              [](IpmiProcessor& processor, Deadline deadline) { return processor.interfaceNames(deadline); });
 }
 
 void IpmiBackEnd::change(const std::string& interfaceName, const AddressChange& change) {

@@ -19,9 +19,14 @@ class IpmiBackEnd : public BackEnd {
   explicit IpmiBackEnd(const IpmiSettings& settings);
 
   ManagementProcessor read() override;
+  InterfaceNames interfaceNames() override;
   void change(const std::string& interfaceName, const AddressChange& change) override;
 
  private:
+  // Runs an operation that changes nothing on the thread, within the operation time-out.
+  template <typename Look>
+  auto look(const std::string& what, Look look);
+
   const IpmiSettings settings_;
   const std::shared_ptr<IpmiProcessor> processor_;  // the thread's alone
   OperationThread thread_;

@@ -13,7 +13,15 @@
 namespace QV::Ipmi {
 namespace {
 
-constexpr std::chrono::milliseconds readBackPatience{1000};
+// How long a processor may take to show a change, and another client to end one, where that has to be waited for.
+// Within an operation there must be time for it and for what follows, in its cleanup too.
+std::chrono::milliseconds patience(const IpmiSettings& settings) {
+  return std::min({std::chrono::milliseconds(1000), settings.operationTimeout / 5, settings.sessionTimeout / 3});
+}
+
+// The channel that a session runs on is another one where the processor fails over from one port to the other: seldom,
+// and to be seen in the end. A channel's name stays its own, so that no change goes astray meanwhile.
+constexpr std::chrono::minutes channelsHold{10};
 
 }  // namespace
 
@@ -23,11 +31,22 @@ void IpmiProcessor::startOperation(Deadline deadline) {
     return;
   }
   connection_.open();
-  for (const std::uint8_t channel : HeldLocks(heldLocks_)) {
-    releaseLock(connection_, channel, heldLocks_);
+  for (const auto& [channel, holder] : HeldLocks(heldLocks_)) {
+    releaseLock(connection_, channel, heldLocks_, patience(settings_));
   }
   // With its lock a processor applies or drops what an earlier change has left there.
   announceChange();
+}
+
+void IpmiProcessor::close() {
+  if (!heldLocks_.empty()) {
+    try {
+      startOperation(Deadline(settings_.sessionTimeout));
+    } catch (const std::exception& error) {
+      logFailure(std::string("a set-in-progress lock that may be ours cannot be given back: ") + error.what());
+    }
+  }
+  connection_.close();
 }
 
 bool IpmiProcessor::snapshotHolds(Clock::time_point now) {
@@ -70,12 +89,30 @@ void IpmiProcessor::reportGenerationFailure(const std::string& reason) {
              "generation_file");
 }
 
-const std::vector<std::uint8_t>& IpmiProcessor::channels() {
-  if (connection_.session() == 0 || channelsOfSession_ != connection_.session()) {
-    channels_ = discoverChannels(connection_, settings_.channels);
-    channelsOfSession_ = connection_.session();
+std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
+  const auto now = Clock::now();
+  if (channels_.empty() || now - channelsFoundAt_ >= channelsHold || breaksWhenFound_ != connection_.breaks()) {
+    channels_.clear();
+    for (const std::uint8_t number : discoverChannels(connection_, settings_.channels)) {
+      channels_.push_back({number, settings_.ipv6});
+    }
+    channelsFoundAt_ = now;
+    breaksWhenFound_ = connection_.breaks();
   }
   return channels_;
+}
+
+// Another client may commit a change between the round trips of a look, which then has the old address with the new
+// mask. A pair that was not known before is one if the address is still the same afterwards; else it is looked at anew.
+NetworkInterface IpmiProcessor::look(Channel& channel) {
+  while (true) {
+    NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
+    const std::pair pair(interface.ipv4Address, interface.ipv4SubnetMask);
+    if (channel.known == pair || readAddress(connection_, channel.number) == interface.ipv4Address) {
+      channel.known = pair;
+      return interface;
+    }
+  }
 }
 
 ManagementProcessor IpmiProcessor::read(Deadline deadline) {
@@ -87,8 +124,8 @@ ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   startOperation(deadline);
   const auto generationBefore = generation();
   ManagementProcessor processor{"BMC", "Management processor reached over IPMI", {}, {}};
-  for (const std::uint8_t channel : channels()) {
-    processor.interfaces.push_back(readInterface(connection_, channel, settings_.ipv6));
+  for (Channel& channel : channels()) {
+    processor.interfaces.push_back(look(channel));
   }
   trace("read " + std::to_string(processor.interfaces.size()) + " interfaces in " +
         std::to_string(connection_.roundTrips()) + " round trips");
@@ -98,13 +135,22 @@ ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   return processor;
 }
 
+InterfaceNames IpmiProcessor::interfaceNames(Deadline deadline) {
+  startOperation(deadline);
+  InterfaceNames names;
+  for (const Channel& channel : channels()) {
+    names.emplace_back(interfaceName(channel.number));
+  }
+  return names;
+}
+
 void IpmiProcessor::change(Deadline deadline, const std::string& name, const AddressChange& change,
                            std::atomic<bool>& begun) {
   snapshot_.reset();
   startOperation(deadline);
   const auto channel = channelOf(name);
   const auto& known = channels();
-  if (!channel || std::find(known.begin(), known.end(), *channel) == known.end()) {
+  if (!channel || std::ranges::find(known, *channel, &Channel::number) == known.end()) {
     throw IpmiError("there is no interface '" + name + '\'');
   }
   const auto onBegin = [&] {
@@ -114,7 +160,7 @@ void IpmiProcessor::change(Deadline deadline, const std::string& name, const Add
   // A look that was begun while the change was under way, or by whom the first announcement has not reached, is not
   // true any more when it is over, however it ended.
   try {
-    AddressChanger(connection_, *channel, heldLocks_, onBegin, readBackPatience).apply(change);
+    AddressChanger(connection_, *channel, heldLocks_, onBegin, patience(settings_)).apply(change);
   } catch (...) {
     if (begun) {
       announceChange();

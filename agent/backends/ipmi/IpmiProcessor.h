@@ -13,7 +13,7 @@
 #include "agent/backends/ipmi/lan/ParameterTransaction.h"
 #include "agent/backends/ipmi/session/IpmiConnection.h"
 #include "agent/backends/ipmi/settings/IpmiSettings.h"
-#include "agent/processor/ManagementProcessor.h"
+#include "agent/processor/BackEnd.h"
 
 namespace QV::Ipmi {
 
@@ -28,13 +28,17 @@ class IpmiProcessor {
   // since.
   ManagementProcessor read(Deadline deadline);
 
+  // The names of its interfaces: no round trip where the channels are known.
+  InterfaceNames interfaceNames(Deadline deadline);
+
   // `begun` becomes true before the first request that may change the configuration, for whoever no longer waits for
   // the outcome.
   void change(Deadline deadline, const std::string& interfaceName, const AddressChange& change,
               std::atomic<bool>& begun);
 
-  // Gives the processor its session back; the next operation opens another.
-  void close() { connection_.close(); }
+  // Gives the processor its session back, and before that a lock that a change had to leave; the next operation opens
+  // another session.
+  void close();
 
  private:
   using Clock = std::chrono::steady_clock;
@@ -52,13 +56,23 @@ class IpmiProcessor {
   void announceChange();
   void reportGenerationFailure(const std::string& reason);
 
+  // A LAN channel, which IPv6 address is read of it, none once the processor is known to have no such parameter, and
+  // the address and mask that it was last known to have together.
+  struct Channel {
+    std::uint8_t number;
+    Ipv6Choice ipv6;
+    std::optional<std::pair<std::optional<Ipv4Address>, std::optional<SubnetMask>>> known = {};
+  };
+
   void startOperation(Deadline deadline);
-  const std::vector<std::uint8_t>& channels();
+  std::vector<Channel>& channels();
+  NetworkInterface look(Channel& channel);
 
   const IpmiSettings settings_;
   IpmiConnection connection_;
-  std::vector<std::uint8_t> channels_;
-  unsigned channelsOfSession_ = 0;
+  std::vector<Channel> channels_;
+  Clock::time_point channelsFoundAt_;
+  unsigned breaksWhenFound_ = 0;
   HeldLocks heldLocks_;
   std::optional<Snapshot> snapshot_;
   const ChangeGeneration generation_;

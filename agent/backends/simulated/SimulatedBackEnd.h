@@ -2,6 +2,8 @@
 // The management processor of a machine that has none: a state file that several processes may share.
 #pragma once
 
+#include <mutex>
+#include <optional>
 #include <string>
 
 #include "agent/backends/simulated/StateFile.h"
@@ -15,8 +17,8 @@ class SimulatedBackEnd : public BackEnd {
   // there is no file. Throws std::runtime_error with what to do if the file could not be changed later.
   explicit SimulatedBackEnd(const std::string& stateFile);
 
-  // The file is read anew each time, since other processes change it. A damaged file is an error that names the field,
-  // and no change overwrites it.
+  // The file is looked at each time, since other processes change it, and read anew where it is another than before. A
+  // damaged file is an error that names the field, and no change overwrites it.
   ManagementProcessor read() override;
   void change(const std::string& interfaceName, const AddressChange& change) override;
 
@@ -24,7 +26,15 @@ class SimulatedBackEnd : public BackEnd {
   ManagementProcessor readState();
   ManagementProcessor parse(const std::string& text) const;
 
+  // What a version of the file was read as.
+  struct Known {
+    StateFile::Version version;
+    ManagementProcessor processor;
+  };
+
   const StateFile file_;
+  std::mutex mutex_;
+  std::optional<Known> known_;
 };
 
 // The state file that the section [simulated] names, or the usual one. Throws Ground::RefusedSetting.

@@ -8,6 +8,7 @@
 #include <cerrno>
 #include <chrono>
 #include <cstring>
+#include <ctime>
 #include <stdexcept>
 #include <string_view>
 #include <tuple>
@@ -112,7 +113,7 @@ void replace(const fs::path& target, std::string_view text) {
   }
   const Ground::Descriptor directory(target.parent_path(), O_RDONLY | O_DIRECTORY);
   if (!directory.isOpen() || ::fsync(directory.number()) != 0) {
-    fail(target, "cannot be brought to the disk");
+    fail(target, "is replaced, but a power cut may bring the earlier one back: its name cannot be brought to the disk");
   }
 }
 
@@ -149,6 +150,20 @@ void StateFile::requireWritable() const {
 }
 
 std::optional<std::string> StateFile::read() const { return readAll(followLinks(path_)); }
+
+std::optional<StateFile::Version> StateFile::version() const {
+  constexpr std::chrono::milliseconds coarse{50};
+  const auto duration = [](const timespec& time) {
+    return std::chrono::seconds(time.tv_sec) + std::chrono::nanoseconds(time.tv_nsec);
+  };
+  struct stat status {};
+  timespec now{};
+  if (::stat(path_.c_str(), &status) != 0 || ::clock_gettime(CLOCK_REALTIME_COARSE, &now) != 0) {
+    return std::nullopt;
+  }
+  const Version version{status.st_dev, status.st_ino, status.st_size, duration(status.st_ctim)};
+  return duration(now) - version.changedAt > coarse ? std::optional(version) : std::nullopt;
+}
 
 void StateFile::update(const std::function<std::string(const std::optional<std::string>&)>& edit) const {
   const fs::path target = followLinks(path_);

@@ -40,8 +40,9 @@ class Instrumentation {
   // Whether the cursor stands on a node.
   operator bool();
 
-  // Reads a property of the current node; false if it cannot be read. A node whose NodeName cannot be read is passed
-  // over: the call returns false and the cursor has moved to the next node.
+  // Reads a property of the current node; false if it cannot be read. Names are those that the nodes had when
+  // selectNode was called, values those that they had when the first of them was asked for after that. A node whose
+  // NodeName cannot be read is passed over: the call returns false and the cursor has moved to the next node.
   bool getProperty(NodeLexicon::Properties property, std::string& value);
 
   // Moves the cursor to the next node of the selected type.

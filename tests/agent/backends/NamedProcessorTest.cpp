@@ -26,6 +26,13 @@ TEST(NamedProcessorTest, KeepsItsOwnNamesWhereNoneIsGiven) {
   EXPECT_EQ(processor.read(), factoryConfiguration());
 }
 
+TEST(NamedProcessorTest, AsksForInterfaceNamesAlone) {
+  const TemporaryDirectory directory;
+  const auto inner = std::make_shared<RecordingBackEnd>(directory / "state");
+  EXPECT_THAT(NamedProcessor(inner, "a", "b").interfaceNames(), testing::ElementsAre("eth0", "eth1"));
+  EXPECT_EQ(inner->reads, 0u);
+}
+
 TEST(NamedProcessorTest, PassesChangesOn) {
   const TemporaryDirectory directory;
   const auto inner = std::make_shared<RecordingBackEnd>(directory / "state");

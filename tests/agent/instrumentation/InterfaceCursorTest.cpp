@@ -121,6 +121,38 @@ TEST_F(InterfaceCursorTest, SendsAddressAndMaskAsOneChange) {
   EXPECT_THAT(backEnd_->changes, testing::SizeIs(1));
 }
 
+TEST_F(InterfaceCursorTest, ReadsNoValuesToFindAnInterfaceAndToChangeBoth) {
+  EXPECT_EQ(get(NodeName), "eth0");
+  cursor_.advance();
+  EXPECT_EQ(get(NodeName), "eth1");
+  cursor_.set(Ipv4Address, "198.51.100.7");
+  cursor_.set(Ipv4SubnetMask, "255.255.0.0");
+  EXPECT_EQ(backEnd_->reads, 0u);
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth1 198.51.100.7 255.255.0.0"));
+}
+
+TEST_F(InterfaceCursorTest, ReadsTheValuesOnceForAllThatAreAskedFor) {
+  get(Ipv4Address);
+  get(Ipv4SubnetMask);
+  cursor_.advance();
+  get(Ipv4Address);
+  EXPECT_EQ(backEnd_->reads, 1u);
+}
+
+TEST_F(InterfaceCursorTest, FindsTheInterfaceByItsNameWhereOthersCameOrWent) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces.insert(processor.interfaces.begin(), NetworkInterface{});
+  writeFile(state_, writeState(processor));
+  EXPECT_EQ(get(Ipv4Address), "192.0.2.10");
+
+  cursor_.select(IpInterfaceNode);
+  cursor_.advance();
+  processor.interfaces = {processor.interfaces[2]};
+  writeFile(state_, writeState(processor));
+  EXPECT_EQ(get(NodeName), "eth0");
+  EXPECT_EQ(get(Ipv4Address), "unreadable");
+}
+
 TEST_F(InterfaceCursorTest, SendsAnAddressAloneWhenItMovesOn) {
   cursor_.set(Ipv4Address, "192.0.2.99");
   cursor_.advance();

@@ -14,6 +14,18 @@ class RecordingBackEnd : public SimulatedBackEnd {
  public:
   using SimulatedBackEnd::SimulatedBackEnd;
 
+  ManagementProcessor read() override {
+    ++reads;
+    return SimulatedBackEnd::read();
+  }
+
+  // Counts as no read: this is what a processor does whose values cost more than their names.
+  InterfaceNames interfaceNames() override {
+    InterfaceNames names = SimulatedBackEnd::interfaceNames();
+    --reads;
+    return names;
+  }
+
   void change(const std::string& interfaceName, const AddressChange& change) override {
     changes.push_back(interfaceName + " " + textOf(change.ipv4Address) + " " + textOf(change.ipv4SubnetMask));
     if (unreachable) {
@@ -28,6 +40,7 @@ class RecordingBackEnd : public SimulatedBackEnd {
   }
 
   std::vector<std::string> changes;  // "INTERFACE ADDRESS MASK", an absent value as "-"
+  unsigned reads = 0;                // of the values
   bool unreachable = false;
 };
 

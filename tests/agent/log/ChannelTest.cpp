@@ -1,7 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <sys/wait.h>
 #include <syslog.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <array>
@@ -14,6 +16,7 @@
 
 #include "agent/log/Channel.h"
 #include "tests/support/system/AllocationCount.h"
+#include "tests/support/system/Poll.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
@@ -79,6 +82,23 @@ TEST(ChannelTest, WritesALineToItsFile) {
   EXPECT_THAT(readFile(directory / "log"), testing::EndsWith(" 6000 C f (F:1): one\\ntwo\n"));
 }
 
+TEST(ChannelTest, NamesTheProcessThatAForkMade) {
+  const TemporaryDirectory directory;
+  Channel channel({Destination::File, directory / "log", 0, {}});
+  const std::string component = "C";
+  const std::string text = "x";
+  channel.send({"f", "F", 1, component, 6000, text});
+  const pid_t child = ::fork();
+  if (child == 0) {
+    channel.send({"f", "F", 1, component, 6000, text});
+    ::_exit(0);
+  }
+  ::waitpid(child, nullptr, 0);
+  const auto of = [](pid_t process) { return " [" + std::to_string(process) + "] "; };
+  EXPECT_THAT(readFile(directory / "log"),
+              testing::AllOf(testing::HasSubstr(of(::getpid())), testing::HasSubstr(of(child))));
+}
+
 TEST(ChannelTest, WritesALineToStderr) {
   Channel channel({Destination::Stderr, "", 0, {}});
   const std::string component = "C";
@@ -115,7 +135,11 @@ TEST(ChannelTest, SaysAgainThatItsFileCannotBeWrittenAfterItCouldBe) {
   std::filesystem::create_directory(directory / "later");
   channel.send(message);
   std::filesystem::remove_all(directory / "later");
-  channel.send(message);
+  sentToSyslog.clear();
+  EXPECT_TRUE(poll([&] {
+    channel.send(message);
+    return !sentToSyslog.empty();
+  }));
   const std::string notices = testing::internal::GetCapturedStderr();
   EXPECT_EQ(std::count(notices.begin(), notices.end(), '\n'), 2);
 }

@@ -3,12 +3,15 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
+#include <algorithm>
 #include <cerrno>
+#include <chrono>
 #include <sstream>
 #include <thread>
 #include <vector>
 
 #include "agent/log/LogFile.h"
+#include "tests/support/system/Poll.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
@@ -38,7 +41,32 @@ TEST(LogFileTest, FollowsARotationThatRenamesIt) {
   LogFile file(directory / "log");
   file.append("old\n");
   std::filesystem::rename(directory / "log", directory / "log.1");
+
+  int appended = 1;
+  const auto start = std::chrono::steady_clock::now();
+  EXPECT_TRUE(poll([&] {
+    file.append("new\n");
+    ++appended;
+    return std::filesystem::exists(directory / "log");
+  }));
+  EXPECT_LT(std::chrono::steady_clock::now() - start, LogFile::lookInterval + std::chrono::seconds(1));
+
+  const std::string lines = readFile(directory / "log.1") + readFile(directory / "log");
+  EXPECT_EQ(std::ranges::count(lines, '\n'), appended) << "no line is lost";
+  EXPECT_TRUE(lines.starts_with("old\nnew\n"));
+  EXPECT_EQ(readFile(directory / "log"), "new\n");
+}
+
+TEST(LogFileTest, IsLookedForWithTheFirstLineAfterAPause) {
+  const TemporaryDirectory directory;
+  LogFile file(directory / "log");
+  file.append("old\n");
+  std::filesystem::rename(directory / "log", directory / "log.1");
+  const auto end = std::chrono::steady_clock::now() + 2 * LogFile::lookInterval;
+  poll([&] { return std::chrono::steady_clock::now() > end; });
+
   file.append("new\n");
+
   EXPECT_EQ(readFile(directory / "log.1"), "old\n");
   EXPECT_EQ(readFile(directory / "log"), "new\n");
 }

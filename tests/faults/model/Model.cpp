@@ -7,14 +7,14 @@ namespace Testing::Model {
 
 namespace {
 
-constexpr const char* names[] = {"EnumInstanceNames", "EnumInstances",   "GetInstance", "ModifyInstance",
-                                 "CreateInstance",    "DeleteInstance",  "ExecQuery",   "Cleanup",
-                                 "Associators",       "AssociatorNames", "References",  "ReferenceNames",
-                                 "AssociationCleanup"};
+constexpr const char* operationNames[] = {"EnumInstanceNames", "EnumInstances",   "GetInstance", "ModifyInstance",
+                                          "CreateInstance",    "DeleteInstance",  "ExecQuery",   "Cleanup",
+                                          "Associators",       "AssociatorNames", "References",  "ReferenceNames",
+                                          "AssociationCleanup"};
 
 }  // namespace
 
-std::string nameOf(Operation operation) { return names[static_cast<int>(operation)]; }
+std::string nameOf(Operation operation) { return operationNames[static_cast<int>(operation)]; }
 
 CMPIStatus answer(const Request& request) {
   constexpr CMPIStatus ok = {CMPI_RC_OK, nullptr};

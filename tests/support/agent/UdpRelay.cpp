@@ -2,14 +2,13 @@
 #include "tests/support/agent/UdpRelay.h"
 
 #include <arpa/inet.h>
-#include <netinet/in.h>
 #include <poll.h>
 #include <sys/eventfd.h>
 #include <sys/socket.h>
 #include <unistd.h>
 
-#include <array>
 #include <stdexcept>
+#include <utility>
 
 namespace Testing {
 namespace {
@@ -48,31 +47,115 @@ UdpRelay::~UdpRelay() {
   }
 }
 
+void UdpRelay::disturbRequest(unsigned number, Disturbance disturbance) {
+  const std::lock_guard lock(mutex_);
+  untilDisturbed_ = number;
+  disturbance_ = disturbance;
+  disturbed_ = false;
+}
+
+bool UdpRelay::undisturb() {
+  const std::lock_guard lock(mutex_);
+  untilDisturbed_ = 0;
+  return disturbed_;
+}
+
+void UdpRelay::stallAtRequest(unsigned number) {
+  const std::lock_guard lock(mutex_);
+  untilStalled_ = number;
+}
+
+void UdpRelay::join() {
+  passing_ = unlimited;
+  const std::lock_guard lock(mutex_);
+  untilStalled_ = 0;
+  for (const auto& datagram : std::exchange(stalled_, {})) {
+    ::send(bmc_, datagram.data(), datagram.size(), 0);
+  }
+}
+
+bool UdpRelay::stalls(std::size_t size) {
+  const std::lock_guard lock(mutex_);
+  if (untilStalled_ > 1) {
+    --untilStalled_;
+    return false;
+  }
+  if (untilStalled_ == 1) {
+    stalled_.emplace_back(datagram_.data(), datagram_.data() + size);
+  }
+  return untilStalled_ == 1;
+}
+
+void UdpRelay::sendRequest(std::size_t size) const { ::send(bmc_, datagram_.data(), size, 0); }
+
+void UdpRelay::sendAnswer(const std::vector<char>& answer) const {
+  ::sendto(client_, answer.data(), answer.size(), 0, reinterpret_cast<const sockaddr*>(&peer_), sizeof peer_);
+}
+
+void UdpRelay::takeRequest() {
+  socklen_t length = sizeof peer_;
+  const ssize_t received =
+      ::recvfrom(client_, datagram_.data(), datagram_.size(), 0, reinterpret_cast<sockaddr*>(&peer_), &length);
+  ++requests_;
+  std::optional<Disturbance> disturbance;
+  {
+    const std::lock_guard lock(mutex_);
+    if (untilDisturbed_ > 0 && --untilDisturbed_ == 0) {
+      disturbed_ = true;
+      disturbance = answers_ = disturbance_;
+    }
+  }
+  const bool passes = passing_ > 0;
+  if (passes && passing_ != unlimited) {
+    --passing_;
+  }
+  if (!passes || received <= 0) {
+    return;
+  }
+  const auto size = static_cast<std::size_t>(received);
+  if (disturbance == Disturbance::RequestLost || stalls(size)) {
+    return;
+  }
+  sendRequest(disturbance == Disturbance::RequestCut ? size / 2 : size);
+  if (disturbance == Disturbance::RequestDoubled) {
+    sendRequest(size);
+  }
+  if (!late_.empty()) {
+    sendAnswer(std::exchange(late_, {}));
+  }
+}
+
+void UdpRelay::takeAnswer() {
+  const ssize_t size = ::recv(bmc_, datagram_.data(), datagram_.size(), 0);
+  if (passing_ == 0 || size <= 0) {
+    return;
+  }
+  std::vector<char> answer(datagram_.data(), datagram_.data() + size);
+  const auto disturbance = std::exchange(answers_, std::nullopt);
+  if (disturbance == Disturbance::AnswerLost) {
+    return;
+  }
+  if (disturbance == Disturbance::AnswerLate) {
+    late_ = std::move(answer);
+    return;
+  }
+  if (disturbance == Disturbance::AnswerCut) {
+    answer.resize(answer.size() / 2);
+  }
+  sendAnswer(answer);
+  if (disturbance == Disturbance::AnswerDoubled) {
+    sendAnswer(answer);
+  }
+}
+
 void UdpRelay::relay() {
-  std::array<char, 2048> datagram;
-  sockaddr_in peer{};
-  socklen_t length = sizeof peer;
   std::array<pollfd, 3> sources = {{{client_, POLLIN, 0}, {bmc_, POLLIN, 0}, {stop_, POLLIN, 0}}};
   while (::poll(sources.data(), sources.size(), -1) > 0 && sources[2].revents == 0) {
     if (sources[0].revents != 0) {
-      length = sizeof peer;
-      const ssize_t size =
-          ::recvfrom(client_, datagram.data(), datagram.size(), 0, reinterpret_cast<sockaddr*>(&peer), &length);
-      ++requests_;
-      const bool passes = passing_ > 0;
-      if (passes && passing_ != unlimited) {
-        --passing_;
-      }
-      if (passes && size > 0) {
-        ::send(bmc_, datagram.data(), static_cast<std::size_t>(size), 0);
-      }
+      takeRequest();
     }
     if (sources[1].revents != 0) {
-      const ssize_t size = ::recv(bmc_, datagram.data(), datagram.size(), 0);
-      if (passing_ > 0 && size > 0) {
-        ::sendto(client_, datagram.data(), static_cast<std::size_t>(size), 0, reinterpret_cast<sockaddr*>(&peer),
-                 length);
-      }
+      takeAnswer();
     }
   }
 }

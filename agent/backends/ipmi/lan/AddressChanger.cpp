@@ -23,8 +23,12 @@ bool isAnothers(const AddressSettings& present, const AddressSettings& earlier, 
 
 void AddressChanger::apply(const AddressChange& change) {
   const AddressSettings earlier = readAddressSettings(transport_, channel_);
+  if (earlier == AddressSettings{}) {
+    throw noLanChannel(channel_);
+  }
   const AddressSettings wanted = withChange(earlier, change);
-  if (planWrites(earlier, wanted).empty()) {
+  const auto writes = planWrites(earlier, wanted);
+  if (writes.empty()) {
     logProgress(interfaceName(channel_) + " has these values already: nothing is written");
     return;
   }
@@ -37,7 +41,7 @@ void AddressChanger::apply(const AddressChange& change) {
     }
     loss = lost.what();
   }
-  const AddressSettings present = readBack(wanted, loss);
+  const AddressSettings present = readBack(writes, wanted, loss);
   const std::string difference = describeDifference(present, wanted);
   if (difference.empty()) {
     return;
@@ -51,21 +55,32 @@ void AddressChanger::apply(const AddressChange& change) {
 }
 
 void AddressChanger::write(const AddressSettings& from, const AddressSettings& to) {
-  ParameterTransaction transaction(transport_, channel_, held_);
+  ParameterTransaction transaction(transport_, channel_, held_, patience_);
   if (!std::exchange(begun_, true)) {
     onBegin_();
   }
   transaction.write(planWrites(from, to));
 }
 
-AddressSettings AddressChanger::readBack(const AddressSettings& wanted, const std::string& loss) try {
-  const Deadline deadline(patience_);
-  AddressSettings present = readAddressSettings(transport_, channel_);
-  while (!describeDifference(present, wanted).empty() && !deadline.passed()) {
+// What was written is what must show. The rest is looked at only where that fails and has to be mended.
+AddressSettings AddressChanger::readBack(const std::vector<ParameterWrite>& written, const AddressSettings& wanted,
+                                         const std::string& loss) try {
+  for (const Deadline deadline(patience_);;) {
+    AddressSettings present = wanted;
+    try {
+      for (const ParameterWrite& write : written) {
+        readInto(present, transport_, channel_, write.parameter);
+      }
+      if (present == wanted) {
+        return present;
+      }
+    } catch (const Refused&) {  // it may be busy
+    }
+    if (deadline.passed()) {
+      return readAddressSettings(transport_, channel_);
+    }
     std::this_thread::sleep_for(betweenLooks);
-    present = readAddressSettings(transport_, channel_);
   }
-  return present;
 } catch (const IpmiError& error) {
   throw IpmiError("the outcome of the change of " + interfaceName(channel_) +
                   " is unknown: it was sent, but the BMC can no longer be asked (" +

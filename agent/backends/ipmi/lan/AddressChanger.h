@@ -7,6 +7,7 @@
 #include <functional>
 #include <string>
 #include <utility>
+#include <vector>
 
 #include "agent/backends/ipmi/lan/AddressPlan.h"
 #include "agent/backends/ipmi/lan/ParameterTransaction.h"
@@ -18,7 +19,7 @@ namespace QV::Ipmi {
 class AddressChanger {
  public:
   // `onBegin` is called before the first request that may change the configuration, once. Processors may take a moment
-  // to apply a change: `patience` is how long it is read back.
+  // to apply a change: `patience` is how long it is read back, and see ParameterTransaction.
   AddressChanger(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::function<void()> onBegin,
                  std::chrono::milliseconds patience)
       : transport_(transport), channel_(channel), held_(held), onBegin_(std::move(onBegin)), patience_(patience) {}
@@ -28,7 +29,8 @@ class AddressChanger {
   void apply(const AddressChange& change);
 
  private:
-  AddressSettings readBack(const AddressSettings& wanted, const std::string& loss);
+  AddressSettings readBack(const std::vector<ParameterWrite>& written, const AddressSettings& wanted,
+                           const std::string& loss);
   std::string putBack(const AddressSettings& present, const AddressSettings& earlier);
   void write(const AddressSettings& from, const AddressSettings& to);
 

@@ -55,13 +55,25 @@ void requireSet(const std::optional<Address>& address, const std::string& what) 
 
 }  // namespace
 
+void readInto(AddressSettings& settings, IpmiTransport& transport, std::uint8_t channel, LanParameter parameter) {
+  const auto value = getParameter(transport, channel, parameter);
+  if (parameter == LanParameter::IpAddress) {
+    settings.address = toAddress<Ipv4Address>(value);
+  } else if (parameter == LanParameter::SubnetMask) {
+    settings.mask = toAddress<SubnetMask>(value);
+  } else if (value && !value->empty()) {
+    settings.source = static_cast<AddressSource>(value->front() & 0x0F);
+  } else {
+    settings.source.reset();
+  }
+}
+
 AddressSettings readAddressSettings(IpmiTransport& transport, std::uint8_t channel) {
   AddressSettings settings;
-  if (const auto source = getParameter(transport, channel, LanParameter::AddressSource); source && !source->empty()) {
-    settings.source = static_cast<AddressSource>(source->front() & 0x0F);
+  for (const LanParameter parameter :
+       {LanParameter::AddressSource, LanParameter::IpAddress, LanParameter::SubnetMask}) {
+    readInto(settings, transport, channel, parameter);
   }
-  settings.address = toAddress<Ipv4Address>(getParameter(transport, channel, LanParameter::IpAddress));
-  settings.mask = toAddress<SubnetMask>(getParameter(transport, channel, LanParameter::SubnetMask));
   return settings;
 }
 

@@ -24,6 +24,9 @@ struct AddressSettings {
 // Reads them in three round trips.
 AddressSettings readAddressSettings(IpmiTransport& transport, std::uint8_t channel);
 
+// Reads one of them, in one round trip, into the settings.
+void readInto(AddressSettings& settings, IpmiTransport& transport, std::uint8_t channel, LanParameter parameter);
+
 // What the change makes of the settings. Throws IpmiError if the interface would be static without an address or a
 // mask, since it has none yet and the change brings none.
 AddressSettings withChange(const AddressSettings& present, const AddressChange& change);

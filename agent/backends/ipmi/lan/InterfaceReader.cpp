@@ -57,19 +57,17 @@ void readIpv6(const ParameterData& data, Ipv6Choice choice, NetworkInterface& in
 
 }  // namespace
 
-NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, Ipv6Choice ipv6) {
+NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, Ipv6Choice& ipv6) {
   const auto get = [&](LanParameter parameter) { return getParameter(transport, channel, parameter); };
   const auto source = get(LanParameter::AddressSource);
   const auto ipv4 = get(LanParameter::IpAddress);
   const auto mask = get(LanParameter::SubnetMask);
-  const auto mac = get(LanParameter::MacAddress);
-  if (!source && !ipv4 && !mask && !mac) {
-    throw IpmiError("the BMC has no LAN channel " + std::to_string(channel) + ": check channels");
+  if (!source && !ipv4 && !mask) {
+    throw noLanChannel(channel);
   }
 
   NetworkInterface interface;
   interface.name = interfaceName(channel);
-  interface.macAddress = toAddress<MacAddress>(mac);
   interface.ipv4Address = addressIn<Ipv4Address>(ipv4);
   interface.ipv4SubnetMask = addressIn<SubnetMask>(mask);
   interface.ipv4Gateway = addressIn<Ipv4Address>(get(LanParameter::DefaultGateway));
@@ -78,9 +76,15 @@ NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, I
     const bool fixed = ipv6 == Ipv6Choice::Static;
     if (const auto data = get(fixed ? LanParameter::Ipv6StaticAddress : LanParameter::Ipv6DynamicAddress)) {
       readIpv6(*data, ipv6, interface);
+    } else {
+      ipv6 = Ipv6Choice::Off;
     }
   }
   return interface;
+}
+
+std::optional<Ipv4Address> readAddress(IpmiTransport& transport, std::uint8_t channel) {
+  return addressIn<Ipv4Address>(getParameter(transport, channel, LanParameter::IpAddress));
 }
 
 std::string interfaceName(std::uint8_t channel) { return std::string(namePrefix) + std::to_string(channel); }

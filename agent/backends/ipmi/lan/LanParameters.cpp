@@ -5,6 +5,8 @@
 #include <cstdio>
 #include <map>
 
+#include "agent/backends/ipmi/session/IpmiLog.h"
+
 namespace QV::Ipmi {
 namespace {
 
@@ -26,15 +28,17 @@ std::optional<ParameterData> getParameter(IpmiTransport& transport, std::uint8_t
                                                 getLanConfigurationParameters,
                                                 {channel, static_cast<std::uint8_t>(parameter), firstSet, firstBlock}},
                                                Repetition::Allowed);
-  if (meansUnsupported(response.completionCode)) {
+  const auto notReported = [&] {
+    return "the BMC did not report the " + describe(parameter) + " of LAN channel " + std::to_string(channel) + ": " +
+           CompletionCode::describe(response.completionCode);
+  };
+  const bool done = response.completionCode == CompletionCode::done;
+  if (meansUnsupported(response.completionCode) || (done && response.data.empty())) {
+    trace(notReported());
     return std::nullopt;
   }
-  if (response.completionCode != CompletionCode::done) {
-    throw IpmiError("the BMC did not report the " + describe(parameter) + " of LAN channel " + std::to_string(channel) +
-                    ": " + CompletionCode::describe(response.completionCode));
-  }
-  if (response.data.empty()) {
-    return std::nullopt;
+  if (!done) {
+    throw Refused(notReported());
   }
   return ParameterData(response.data.begin() + 1, response.data.end());
 }
@@ -46,11 +50,14 @@ IpmiResponse setParameter(IpmiTransport& transport, std::uint8_t channel, LanPar
   return transport.send({NetworkFunction::Transport, setLanConfigurationParameters, request}, repetition);
 }
 
+IpmiError noLanChannel(std::uint8_t channel) {
+  return IpmiError("the BMC has no LAN channel " + std::to_string(channel) + ": check channels");
+}
+
 std::string describe(LanParameter parameter) {
   static const std::map<LanParameter, std::string> names = {{LanParameter::SetInProgress, "set-in-progress state"},
                                                             {LanParameter::IpAddress, "IP address"},
                                                             {LanParameter::AddressSource, "IP address source"},
-                                                            {LanParameter::MacAddress, "MAC address"},
                                                             {LanParameter::SubnetMask, "subnet mask"},
                                                             {LanParameter::DefaultGateway, "default gateway"},
                                                             {LanParameter::Ipv6StaticAddress, "static IPv6 address"},

@@ -34,7 +34,6 @@ enum class LanParameter : std::uint8_t {
   SetInProgress = 0,
   IpAddress = 3,        // 4 bytes, network order
   AddressSource = 4,    // low nibble, see AddressSource
-  MacAddress = 5,       // 6 bytes
   SubnetMask = 6,       // 4 bytes, network order
   DefaultGateway = 12,  // 4 bytes, network order
   Ipv6StaticAddress = 56,
@@ -69,6 +68,9 @@ std::optional<Address> toAddress(const std::optional<ParameterData>& data, std::
 }
 
 inline ParameterData toData(const DottedDecimal& address) { return {address.octets().begin(), address.octets().end()}; }
+
+// That the channel reports none of its addresses.
+IpmiError noLanChannel(std::uint8_t channel);
 
 // "IP address", "subnet mask"
 std::string describe(LanParameter parameter);

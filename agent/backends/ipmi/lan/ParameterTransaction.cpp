@@ -1,11 +1,17 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "agent/backends/ipmi/lan/ParameterTransaction.h"
 
+#include <thread>
+
 #include "agent/backends/ipmi/lan/LanParameters.h"
+#include "agent/backends/ipmi/session/Deadline.h"
 #include "agent/backends/ipmi/session/IpmiLog.h"
 
 namespace QV::Ipmi {
 namespace {
+
+constexpr std::chrono::milliseconds betweenRequests{50};
+constexpr int releaseAttempts = 3;
 
 IpmiResponse setProgress(IpmiTransport& transport, std::uint8_t channel, SetProgress progress, Repetition repetition) {
   return setParameter(transport, channel, LanParameter::SetInProgress, {static_cast<std::uint8_t>(progress)},
@@ -26,48 +32,84 @@ bool meansNoLock(std::uint8_t completionCode) {
          completionCode == CompletionCode::parameterOutOfRange || completionCode == CompletionCode::invalidData;
 }
 
+IpmiResponse askForLock(IpmiTransport& transport, std::uint8_t channel) {
+  return setProgress(transport, channel, SetProgress::InProgress, Repetition::Forbidden);
+}
+
+// Asks for the lock until it is not refused any more, because its holder has given it back, or patience is over.
+IpmiResponse insistOnLock(IpmiTransport& transport, std::uint8_t channel, std::chrono::milliseconds patience) {
+  for (const Deadline deadline(patience);;) {
+    IpmiResponse response = askForLock(transport, channel);
+    if (response.completionCode != CompletionCode::setInProgress || deadline.passed()) {
+      return response;
+    }
+    std::this_thread::sleep_for(betweenRequests);
+  }
+}
+
 }  // namespace
 
-void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held) {
+void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::chrono::milliseconds patience) {
   try {
-    const IpmiResponse response = setProgress(transport, channel, SetProgress::Complete, Repetition::Allowed);
-    if (response.completionCode == CompletionCode::done) {
-      held.erase(channel);
-    } else {
-      logFailure("the set-in-progress lock of " + nameOf(channel) +
-                 " is not given back: " + CompletionCode::describe(response.completionCode));
+    const bool surelyOurs = held.at(channel) == LockHolder::Us;
+    if (!surelyOurs) {
+      insistOnLock(transport, channel, patience);
     }
+    IpmiResponse response;
+    for (int attempt = 0; attempt < releaseAttempts; ++attempt) {
+      if (attempt > 0) {
+        std::this_thread::sleep_for(betweenRequests);
+      }
+      response = setProgress(transport, channel, SetProgress::Complete, Repetition::Allowed);
+      if (response.completionCode == CompletionCode::done || (!surelyOurs && meansNoLock(response.completionCode))) {
+        held.erase(channel);
+        return;
+      }
+    }
+    logFailure(
+        "the set-in-progress lock of " + nameOf(channel) +
+        " is not given back; the next operation tries again: " + CompletionCode::describe(response.completionCode));
   } catch (const IpmiError& error) {
     logFailure("the set-in-progress lock of " + nameOf(channel) +
                " may stay set; the next operation gives it back: " + error.what());
   }
 }
 
-ParameterTransaction::ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held)
-    : transport_(transport), channel_(channel), held_(held) {
+ParameterTransaction::ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held,
+                                           std::chrono::milliseconds patience)
+    : transport_(transport), channel_(channel), held_(held), patience_(patience) {
   try {
     take();
-  } catch (const ConnectionLost&) {
-    transport_.beginCleanup();
-    releaseLock(transport_, channel_, held_);
+  } catch (const IpmiError&) {
+    giveBack();
     throw;
   }
 }
 
+// Whoever asks for the lock and is not refused has it: to look first whether it is free would cost a round trip more.
 void ParameterTransaction::take() {
-  const auto progress = getParameter(transport_, channel_, LanParameter::SetInProgress);
-  const bool known = progress && !progress->empty();
-  if (known && static_cast<SetProgress>(progress->front() & 0x03) != SetProgress::Complete) {
-    throw IpmiError(busyText(channel_));
+  IpmiResponse response;
+  try {
+    response = askForLock(transport_, channel_);
+    // What is written without a lock to a processor that has one waits for the next client's commit: better sure.
+    if (meansNoLock(response.completionCode)) {
+      response = askForLock(transport_, channel_);
+    }
+  } catch (const ConnectionLost&) {
+    held_[channel_] = LockHolder::PerhapsAnother;
+    throw;
   }
-
-  held_.insert(channel_);
-  const IpmiResponse response = setProgress(transport_, channel_, SetProgress::InProgress, Repetition::Forbidden);
+  // Where the request had to be sent twice, this may be the answer to the second, and the first has taken the lock.
+  if (response.completionCode == CompletionCode::setInProgress && response.late) {
+    held_[channel_] = LockHolder::PerhapsAnother;
+    response = insistOnLock(transport_, channel_, patience_);
+    if (response.completionCode == CompletionCode::setInProgress) {
+      logProgress("the lock of " + nameOf(channel_) + " is taken to be ours: the answer that granted it was lost");
+      response.completionCode = CompletionCode::done;
+    }
+  }
   if (response.completionCode == CompletionCode::done) {
-    return;
-  }
-  // The lock was free a moment ago; where the request had to be sent twice, the first took it.
-  if (response.completionCode == CompletionCode::setInProgress && known && response.late) {
+    held_[channel_] = LockHolder::Us;
     return;
   }
   held_.erase(channel_);
@@ -80,13 +122,15 @@ void ParameterTransaction::take() {
   logProgress(nameOf(channel_) + " has no set-in-progress lock: its parameters are written without");
 }
 
-ParameterTransaction::~ParameterTransaction() {
+void ParameterTransaction::giveBack() {
   if (!held_.contains(channel_)) {
     return;
   }
   transport_.beginCleanup();
-  releaseLock(transport_, channel_, held_);
+  releaseLock(transport_, channel_, held_, patience_);
 }
+
+ParameterTransaction::~ParameterTransaction() { giveBack(); }
 
 void ParameterTransaction::write(const std::vector<ParameterWrite>& writes) {
   std::size_t written = 0;

@@ -3,8 +3,9 @@
 // parameter 0).
 #pragma once
 
+#include <chrono>
 #include <cstdint>
-#include <set>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -13,19 +14,24 @@
 
 namespace QV::Ipmi {
 
-// The channels whose lock is, or may be, ours. The lock knows no time-out: one that could not be given back shuts every
-// client out until somebody gives it back, so it is remembered until that has happened.
-using HeldLocks = std::set<std::uint8_t>;
+// The channels whose lock is ours, or may be because the answer to the request for it never came. The lock knows no
+// time-out: one that could not be given back shuts every client out until somebody gives it back, so it is remembered
+// until that has happened.
+enum class LockHolder { Us, PerhapsAnother };
+using HeldLocks = std::map<std::uint8_t, LockHolder>;
 
-// Gives the lock of a channel back and strikes it from `held`. A failure is logged, and the lock stays in `held`.
-void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held);
+// Gives the lock of a channel back and strikes it from `held`. Where another client may hold it, that one is given
+// `patience` to end its change first. A failure is logged, and the lock stays in `held`.
+void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::chrono::milliseconds patience);
 
 // Holds the lock from its construction to its destruction, whatever happens in between. A processor without the lock is
 // written to all the same.
 class ParameterTransaction {
  public:
-  // Throws IpmiError, and nothing has been written, if another client holds the lock or it cannot be taken.
-  ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held);
+  // Throws IpmiError, and nothing has been written, if another client holds the lock or it cannot be taken. Where an
+  // answer that came late leaves open whose the lock is, it is ours if it does not go within `patience`.
+  ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held,
+                       std::chrono::milliseconds patience);
   ~ParameterTransaction();
   ParameterTransaction(const ParameterTransaction&) = delete;
   ParameterTransaction& operator=(const ParameterTransaction&) = delete;
@@ -37,6 +43,7 @@ class ParameterTransaction {
 
  private:
   void take();
+  void giveBack();
   void writeOne(const ParameterWrite& write);
   std::string putBack(const std::vector<ParameterWrite>& writes, std::size_t count);
   void commit();
@@ -44,6 +51,7 @@ class ParameterTransaction {
   IpmiTransport& transport_;
   const std::uint8_t channel_;
   HeldLocks& held_;
+  const std::chrono::milliseconds patience_;
 };
 
 }  // namespace QV::Ipmi

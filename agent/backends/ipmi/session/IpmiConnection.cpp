@@ -29,8 +29,12 @@ void IpmiConnection::open() {
   }
   requireTime();
   roundTrips_ += IpmiSession::openingRoundTrips(settings_);
-  session_ = std::make_unique<IpmiSession>(settings_);
-  ++sessions_;
+  try {
+    session_ = std::make_unique<IpmiSession>(settings_);
+  } catch (const IpmiError&) {
+    ++breaks_;
+    throw;
+  }
 }
 
 IpmiResponse IpmiConnection::send(const IpmiRequest& request, Repetition repetition) {
@@ -42,6 +46,7 @@ IpmiResponse IpmiConnection::send(const IpmiRequest& request, Repetition repetit
     return session_->send(request);
   } catch (const ConnectionLost& loss) {
     session_.reset();
+    ++breaks_;
     const std::string what = nameOf(settings_) + " stopped answering: " + loss.what();
     if (!held || repetition == Repetition::Forbidden) {
       throw ConnectionLost(what);

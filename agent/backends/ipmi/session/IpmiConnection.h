@@ -31,9 +31,9 @@ class IpmiConnection : public IpmiTransport {
   // The round trips of the operation so far, those that opened sessions included.
   unsigned roundTrips() const { return roundTrips_; }
 
-  // The number of the session that is open, 0 for none. What was learned of the processor's build holds while it stays
-  // the same.
-  unsigned session() const { return session_ ? sessions_ : 0; }
+  // How often the processor could not be reached or stopped answering. What was learned of its build holds while this
+  // stays the same.
+  unsigned breaks() const { return breaks_; }
 
   // Ends the session: the processor has few of them. The next request opens another.
   void close() { session_.reset(); }
@@ -45,7 +45,7 @@ class IpmiConnection : public IpmiTransport {
   Deadline deadline_{std::chrono::milliseconds{0}};
   std::unique_ptr<IpmiSession> session_;
   unsigned roundTrips_ = 0;
-  unsigned sessions_ = 0;
+  unsigned breaks_ = 0;
 };
 
 }  // namespace QV::Ipmi

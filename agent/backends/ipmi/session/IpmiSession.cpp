@@ -8,6 +8,9 @@
 namespace QV::Ipmi {
 namespace {
 
+// libfreeipmi waits for whole milliseconds, what is left of one not included.
+constexpr std::chrono::milliseconds retransmissionIsEarlier{2};
+
 std::string addressOf(const IpmiSettings& settings) {
   const bool ipv6 = settings.host.find(':') != std::string::npos;
   return (ipv6 ? '[' + settings.host + ']' : settings.host) + ':' + std::to_string(settings.port);
@@ -123,12 +126,16 @@ IpmiResponse IpmiSession::send(const IpmiRequest& request) {
   const int length =
       ::ipmi_cmd_raw(context_.get(), 0, static_cast<std::uint8_t>(request.networkFunction), message.data(),
                      static_cast<unsigned>(message.size()), answer.data(), static_cast<unsigned>(answer.size()));
-  // The command's number and the completion code come first.
-  if (length < 2) {
+  if (length < 0) {
     throw ConnectionLost(::ipmi_ctx_errormsg(context_.get()));
   }
+  // The command's number and the completion code come first.
+  if (length < 2) {
+    throw ConnectionLost("its answer has no completion code");
+  }
   lastAnswer_ = Clock::now();
-  return {answer[1], {answer.begin() + 2, answer.begin() + length}, lastAnswer_ - sent >= retransmissionTimeout_};
+  const bool late = lastAnswer_ - sent >= retransmissionTimeout_ - retransmissionIsEarlier;
+  return {answer[1], {answer.begin() + 2, answer.begin() + length}, late};
 }
 
 }  // namespace QV::Ipmi

@@ -42,6 +42,12 @@ class NotSent : public IpmiError {
   using IpmiError::IpmiError;
 };
 
+// The processor answered that it does not do what it is asked.
+class Refused : public IpmiError {
+ public:
+  using IpmiError::IpmiError;
+};
+
 // What may happen to a request whose answer fails to come because a held session broke.
 enum class Repetition {
   Allowed,   // a new session is opened and the request sent once more: reads, and writes that may be done twice

@@ -5,6 +5,7 @@
 
 #include "tests/support/agent/SimulatedBmc.h"
 #include "tests/support/agent/UdpRelay.h"
+#include "tests/support/system/Poll.h"
 #include "tests/support/system/Process.h"
 
 namespace {
@@ -15,9 +16,11 @@ class IpmiProcessesTest : public testing::Test {
  protected:
   // The command of a process with the agent in it, which reaches the BMC through that port and keeps a look at it for
   // as long as it may.
-  std::vector<std::string> agentBehind(std::uint16_t port, const std::string& ini) const {
+  std::vector<std::string> agentBehind(std::uint16_t port, const std::string& ini,
+                                       const QV::BackEndSettings& more = {}) const {
     auto settings = bmc.settings(port);
     settings["cache"] = "60";
+    settings.insert(more.begin(), more.end());
     std::string text = "[log]\ndestination = stderr\n[processor]\nbackend = ipmi\n[ipmi]\n";
     for (const auto& [key, value] : settings) {
       text += key + " = " + value + '\n';
@@ -45,7 +48,7 @@ TEST_F(IpmiProcessesTest, SeeEachOthersChangesWithTheNextRead) {
   wire.reset();
   EXPECT_EQ(ask(writer, "change 192.0.2.77 255.255.255.128"), "done");
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.77/255.255.255.128");
-  EXPECT_EQ(wire.requests(), 6u);
+  EXPECT_EQ(wire.requests(), 5u);
 
   EXPECT_EQ(ask(reader, "change 192.0.2.78 255.255.255.0"), "done");
   EXPECT_EQ(ask(writer, "read"), "lan1 192.0.2.78/255.255.255.0");
@@ -60,6 +63,35 @@ TEST_F(IpmiProcessesTest, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
 
   EXPECT_EQ(wire.requests(), 0u);
+}
+
+// Given a process whose change met a BMC that stalled with the lock taken, and nobody asks it for more: it has a last
+// try when it ends.
+TEST_F(IpmiProcessesTest, GiveALockBackWhenTheyEndOrSayThatTheyCouldNot) {
+  for (const bool recovers : {true, false}) {
+    Process stalled(agentBehind(bmc.port(), "stalled.ini", {{"operation_timeout", "1"}, {"session_timeout", "0.6"}}));
+    bmc.hook("set", "kill -STOP $SIMULATOR");
+    EXPECT_THAT(ask(stalled, recovers ? "change 192.0.2.77 255.255.255.128" : "change 192.0.2.78 255.255.255.0"),
+                testing::HasSubstr("outcome is unknown"));
+    bmc.removeHook("set");
+    const auto says = [&](const char* text) {
+      return poll([&] { return stalled.errors().find(text) != std::string::npos; }, std::chrono::seconds(10));
+    };
+    EXPECT_TRUE(says("may stay set"));
+
+    if (recovers) {
+      bmc.resume();
+    }
+    stalled.closeInput();
+    EXPECT_EQ(stalled.wait(), 0);
+
+    if (recovers) {
+      EXPECT_EQ(bmc.witness("Set in Progress"), "Set Complete");
+    } else {
+      EXPECT_TRUE(says("a set-in-progress lock that may be ours cannot be given back"));
+      bmc.resume();
+    }
+  }
 }
 
 TEST_F(IpmiProcessesTest, SeeAChangeWhoseProcessEndedAtOnceAfterIt) {

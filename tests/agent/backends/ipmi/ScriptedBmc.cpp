@@ -16,7 +16,6 @@ ScriptedBmc::ScriptedBmc()
     : values{{LanParameter::AddressSource, {1}},
              {LanParameter::IpAddress, {192, 0, 2, 10}},
              {LanParameter::SubnetMask, {255, 255, 255, 0}},
-             {LanParameter::MacAddress, {2, 0, 0, 0, 0, 1}},
              {LanParameter::DefaultGateway, {192, 0, 2, 1}}} {}
 
 IpmiResponse ScriptedBmc::send(const IpmiRequest& request, QV::Ipmi::Repetition) {
@@ -65,10 +64,6 @@ IpmiResponse ScriptedBmc::get(LanParameter parameter) {
   if (const auto refused = readRefused.find(parameter); refused != readRefused.end()) {
     return {refused->second, {}};
   }
-  if (parameter == LanParameter::SetInProgress) {
-    return hasLock && tellsLock ? IpmiResponse{Code::done, {revision, locked || lockedByAnother}}
-                                : IpmiResponse{Code::parameterNotSupported, {}};
-  }
   if (parameter == LanParameter::IpAddress && readsUntilApplied > 0 && --readsUntilApplied == 0) {
     earlier_.reset();
   }
@@ -103,16 +98,20 @@ std::uint8_t ScriptedBmc::set(LanParameter parameter, const ParameterData& data)
   return Code::done;
 }
 
-std::uint8_t ScriptedBmc::setProgress(std::uint8_t progress) {
+std::uint8_t ScriptedBmc::setProgress(std::uint8_t step) {
   if (!hasLock) {
     return Code::parameterNotSupported;
   }
-  if (progress == 1) {
+  if (busy) {
+    return 0xC0;
+  }
+  progress.push_back(step);
+  if (step == 1) {
     if (locked || lockedByAnother) {
       return Code::setInProgress;
     }
     locked = true;
-  } else if (progress == 2) {
+  } else if (step == 2) {
     if (applies == Applies::AtOnce) {
       return Code::parameterNotSupported;
     }

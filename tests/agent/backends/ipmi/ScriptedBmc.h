@@ -25,7 +25,7 @@ class ScriptedBmc : public QV::Ipmi::IpmiTransport {
   // Its temper.
   Applies applies = Applies::OnCommit;
   bool hasLock = true;
-  bool tellsLock = true;         // parameter 0 can be read
+  bool busy = false;             // refuses what concerns the lock
   bool lockedByAnother = false;  // and stays so
   bool refusesAddressUnderDhcp = false;
   unsigned readsUntilApplied = 0;                    // reads of the address that still show the earlier values
@@ -40,13 +40,14 @@ class ScriptedBmc : public QV::Ipmi::IpmiTransport {
   // What it has, and what was written to it: parameter and data in order.
   std::map<LanParameter, ParameterData> values;
   std::vector<std::pair<LanParameter, ParameterData>> written;
+  std::vector<std::uint8_t> progress;  // the same for the set-in-progress parameter
   std::set<std::uint8_t> lanChannels = {1};
   std::uint8_t presentChannel = 1;  // 15: the system interface
   bool locked = false;
   unsigned requests = 0;
   bool cleaningUp = false;
 
-  // Static 192.0.2.10/255.255.255.0, gateway 192.0.2.1, MAC 02:00:00:00:00:01.
+  // Static 192.0.2.10/255.255.255.0, gateway 192.0.2.1.
   ScriptedBmc();
 
   IpmiResponse send(const IpmiRequest& request, QV::Ipmi::Repetition repetition) override;
@@ -57,7 +58,7 @@ class ScriptedBmc : public QV::Ipmi::IpmiTransport {
   IpmiResponse channelInfo(std::uint8_t channel) const;
   IpmiResponse get(LanParameter parameter);
   std::uint8_t set(LanParameter parameter, const ParameterData& data);
-  std::uint8_t setProgress(std::uint8_t progress);
+  std::uint8_t setProgress(std::uint8_t step);
   void apply();
 
   std::map<LanParameter, ParameterData> staged_;

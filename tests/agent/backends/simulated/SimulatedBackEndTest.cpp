@@ -1,8 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
+#include <sys/syscall.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <thread>
@@ -11,6 +13,8 @@
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "agent/backends/simulated/StateText.h"
 #include "tests/support/agent/Addresses.h"
+#include "tests/support/system/Poll.h"
+#include "tests/support/system/SystemCalls.h"
 #include "tests/support/system/TemporaryDirectory.h"
 #include "tests/support/system/Throws.h"
 
@@ -84,6 +88,38 @@ TEST_F(SimulatedBackEndTest, ShowsWhatAnotherProcessWrote) {
   processor_.read();
   SimulatedBackEnd(state_).change("eth0", {ipv4("192.0.2.77"), {}});
   EXPECT_EQ(processor_.read().interfaces[0].ipv4Address, ipv4("192.0.2.77"));
+}
+
+TEST_F(SimulatedBackEndTest, OpensItsStateOnlyWhereItIsAnotherThanBefore) {
+  const auto opens = [&] {
+    const auto calls = traced([&] { processor_.read(); }).calls;
+    return std::ranges::count_if(
+        calls, [&](const SystemCall& call) { return call.number == SYS_openat && call.path == state_; });
+  };
+  const auto settle = [&] { return poll([&] { return StateFile(state_).version().has_value(); }); };
+  processor_.read();
+  ASSERT_TRUE(settle());
+  EXPECT_EQ(opens(), 1);
+
+  processor_.read();
+  EXPECT_EQ(opens(), 0);
+  EXPECT_EQ(processor_.read(), factoryConfiguration());
+
+  SimulatedBackEnd(state_).change("eth0", {ipv4("192.0.2.77"), {}});
+  EXPECT_EQ(opens(), 1);
+  ASSERT_TRUE(settle());
+  EXPECT_EQ(opens(), 1);
+  EXPECT_EQ(processor_.read().interfaces[0].ipv4Address, ipv4("192.0.2.77"));
+}
+
+// Of the same length, in place, and many in a tick of the clock that the system marks files with.
+TEST_F(SimulatedBackEndTest, MissesNoChangeHoweverFastTheyCome) {
+  ManagementProcessor processor = factoryConfiguration();
+  for (int round = 0; round < 300; ++round) {
+    processor.interfaces[0].ipv4Address = ipv4(round % 2 == 0 ? "192.0.2.77" : "192.0.2.78");
+    writeFile(state_, writeState(processor));
+    ASSERT_EQ(processor_.read(), processor) << "round " << round;
+  }
 }
 
 TEST_F(SimulatedBackEndTest, RefusesToChangeAnInterfaceThatItDoesNotHave) {

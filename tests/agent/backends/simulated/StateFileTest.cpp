@@ -4,12 +4,14 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
 #include <set>
 
 #include "agent/backends/simulated/StateFile.h"
+#include "tests/support/system/Poll.h"
 #include "tests/support/system/TemporaryDirectory.h"
 #include "tests/support/system/Throws.h"
 
@@ -48,6 +50,61 @@ TEST(StateFileTest, IsReplacedByWhatTheEditMakesOfIt) {
   file.update([](const auto& current) { return current ? "no" : "one"; });
   file.update([](const auto& current) { return *current + " two"; });
   EXPECT_EQ(file.read(), "one two");
+}
+
+StateFile::Version versionOf(const StateFile& file) {
+  EXPECT_TRUE(poll([&] { return file.version().has_value(); }));
+  return file.version().value();
+}
+
+TEST(StateFileTest, HasNoVersionBeforeItIsWrittenAndJustAfter) {
+  const TemporaryDirectory directory;
+  const StateFile file(directory / "state");
+  EXPECT_EQ(file.version(), std::nullopt);
+  const auto start = std::chrono::steady_clock::now();
+  replace(directory / "state", "one");
+  versionOf(file);
+  EXPECT_GT(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(40));
+}
+
+TEST(StateFileTest, KeepsItsVersionWhileItIsTheSame) {
+  const TemporaryDirectory directory;
+  replace(directory / "state", "one");
+  const StateFile file(directory / "state");
+  const auto version = versionOf(file);
+  file.read();
+  EXPECT_EQ(file.version(), version);
+}
+
+// Of the same length, and dressed up as of the same time.
+TEST(StateFileTest, HasAnotherVersionHoweverItIsChanged) {
+  const TemporaryDirectory directory;
+  const std::string path = directory / "state";
+  replace(path, "one");
+  const StateFile file(path);
+  const auto first = versionOf(file);
+  const auto time = std::filesystem::last_write_time(path);
+
+  writeFile(path, "two");
+  std::filesystem::last_write_time(path, time);
+  const auto second = versionOf(file);
+  EXPECT_NE(second, first);
+
+  replace(path, "six");
+  std::filesystem::last_write_time(path, time);
+  EXPECT_NE(versionOf(file), second);
+}
+
+TEST(StateFileTest, BehindALinkHasTheVersionOfItsTarget) {
+  const TemporaryDirectory directory;
+  replace(directory / "one", "x");
+  replace(directory / "two", "x");
+  std::filesystem::create_symlink("one", directory / "link");
+  const StateFile file(directory / "link");
+  const auto first = versionOf(file);
+  std::filesystem::remove(directory / "link");
+  std::filesystem::create_symlink("two", directory / "link");
+  EXPECT_NE(versionOf(file), first);
 }
 
 TEST(StateFileTest, LeavesNothingBehindButItsLock) {

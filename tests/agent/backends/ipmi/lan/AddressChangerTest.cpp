@@ -30,8 +30,8 @@ const ParameterData oldAddress{192, 0, 2, 10}, newAddress{192, 0, 2, 77};
 const ParameterData oldMask{255, 255, 255, 0}, newMask{255, 255, 255, 128};
 const ParameterData fixed{1}, leased{2};
 
-// The requests of a change: three to look, the lock's state, the lock, then source, address and mask as they differ.
-constexpr unsigned lockRequest = 5, firstWrite = 6;
+// The requests of a change: three to look, the lock, then source, address and mask as they differ.
+constexpr unsigned lockRequest = 4, firstWrite = 5;
 
 class AddressChangerTest : public testing::Test {
  protected:
@@ -82,15 +82,6 @@ TEST_F(AddressChangerTest, DoesWithoutALockWhereThereIsNone) {
 
   expectNewValues();
   EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 4000, "has no set-in-progress lock"));
-}
-
-TEST_F(AddressChangerTest, TakesTheLockWhereItsStateIsNotTold) {
-  bmc.tellsLock = false;
-
-  change(bothValues);
-
-  expectNewValues();
-  expectNoLock();
 }
 
 TEST_F(AddressChangerTest, WritesOnlyWhatDiffers) {
@@ -155,21 +146,32 @@ TEST_F(AddressChangerTest, RefusesAnAddressWithoutAMaskWhereThereIsNone) {
 }
 
 TEST_F(AddressChangerTest, IsRefusedWhileAnotherHoldsTheLock) {
-  for (const bool tellsLock : {true, false}) {
-    bmc.tellsLock = tellsLock;
-    bmc.lockedByAnother = true;
+  bmc.lockedByAnother = true;
 
-    EXPECT_THAT([&] { change(bothValues); }, refusal("LAN channel 1 is being changed by another client", "0x81"));
+  EXPECT_THAT([&] { change(bothValues); }, refusal("LAN channel 1 is being changed by another client", "0x81"));
 
-    EXPECT_THAT(bmc.written, IsEmpty());
-    EXPECT_THAT(held, IsEmpty()) << "another client's lock is not ours to give back";
-  }
+  EXPECT_THAT(bmc.written, IsEmpty());
+  EXPECT_THAT(held, IsEmpty()) << "another client's lock is not ours to give back";
 }
 
 TEST_F(AddressChangerTest, KnowsItsOwnLockWhereTheRequestForItWentOutTwice) {
   bmc.lateRequest = lockRequest;
 
   change(bothValues);
+
+  expectNewValues();
+  expectNoLock();
+}
+
+TEST_F(AddressChangerTest, WaitsForAnotherClientsLockWhereTheRequestForItsOwnWentOutTwice) {
+  bmc.lateRequest = lockRequest;
+  bmc.lockedByAnother = true;
+  bmc.beforeRequest = [&](unsigned number) {
+    EXPECT_TRUE(bmc.written.empty() || !bmc.lockedByAnother);
+    bmc.lockedByAnother = number < lockRequest + 2;
+  };
+
+  change(bothValues, 10s);
 
   expectNewValues();
   expectNoLock();
@@ -323,8 +325,41 @@ TEST_F(AddressChangerTest, HasAnUnknownOutcomeWhereTheBmcIsGoneAndRemembersTheLo
   EXPECT_THAT([&] { change(bothValues); }, refusal("outcome of the change of lan1 is unknown", "set host to the new"));
 
   EXPECT_EQ(begun, 1);
-  EXPECT_THAT(held, ElementsAre(1));
+  EXPECT_THAT(held, ElementsAre(Pair(1, QV::Ipmi::LockHolder::Us)));
   EXPECT_TRUE(contains(takeLog(), "Tarnwick.Ipmi", 6000, "lock of LAN channel 1 may stay set"));
+}
+
+TEST_F(AddressChangerTest, GivesTheLockBackInTheEndWhereTheBmcIsBusy) {
+  constexpr unsigned unlock = firstWrite + 3;
+  bmc.beforeRequest = [&](unsigned number) { bmc.busy = number == unlock || number == unlock + 1; };
+
+  change(bothValues);
+
+  expectNewValues();
+  expectNoLock();
+}
+
+TEST_F(AddressChangerTest, LeavesAnotherClientsLockUntilThatOneIsDoneWhereTheConnectionBreaksWithItsOwn) {
+  bmc.lockedByAnother = true;
+  bmc.beforeRequest = [&](unsigned number) {
+    if (number == lockRequest) {
+      throw ConnectionLost("session timeout");
+    }
+    EXPECT_TRUE(bmc.progress.empty() || bmc.progress.back() == 1 || !bmc.lockedByAnother);
+    bmc.lockedByAnother = number < lockRequest + 3;
+  };
+
+  EXPECT_THAT([&] { change(bothValues, 10s); }, refusal("session timeout"));
+
+  expectNoLock();
+}
+
+TEST_F(AddressChangerTest, IsRefusedForAChannelThatReportsNothing) {
+  bmc.values.clear();
+
+  EXPECT_THAT([&] { change(bothValues); }, refusal("has no LAN channel 1"));
+
+  EXPECT_THAT(bmc.written, IsEmpty());
 }
 
 TEST_F(AddressChangerTest, ChangesNothingWhereTheConnectionBreaksWithTheLock) {

@@ -15,7 +15,6 @@ using QV::Ipmi::IpmiError;
 using QV::Ipmi::Ipv6Choice;
 using QV::Ipmi::LanParameter;
 using QV::Ipmi::ParameterData;
-using QV::Ipmi::readInterface;
 using testing::HasSubstr;
 using testing::ThrowsMessage;
 
@@ -29,20 +28,37 @@ ParameterData ipv6(std::uint8_t source, bool zero = false) {
   return data;
 }
 
-TEST(IpmiInterfaceTest, CostsAtMostSixRoundTrips) {
+QV::NetworkInterface readInterface(ScriptedBmc& bmc, std::uint8_t channel, Ipv6Choice ipv6) {
+  return QV::Ipmi::readInterface(bmc, channel, ipv6);
+}
+
+TEST(IpmiInterfaceTest, CostsAtMostFiveRoundTrips) {
   ScriptedBmc bmc;
   readInterface(bmc, 1, Ipv6Choice::Static);
-  EXPECT_EQ(bmc.requests, 6u);
+  EXPECT_EQ(bmc.requests, 5u);
+}
+
+TEST(IpmiInterfaceTest, IsNotAskedForIpv6AgainWhereTheBmcHasNone) {
+  for (const bool supported : {false, true}) {
+    ScriptedBmc bmc;
+    if (supported) {
+      bmc.values[LanParameter::Ipv6StaticAddress] = ipv6(0x80);
+    }
+    Ipv6Choice choice = Ipv6Choice::Static;
+
+    QV::Ipmi::readInterface(bmc, 1, choice);
+
+    EXPECT_EQ(choice, supported ? Ipv6Choice::Static : Ipv6Choice::Off);
+  }
 }
 
 TEST(IpmiInterfaceTest, LacksWhatTheBmcDoesNotSupport) {
   for (const std::uint8_t code : {0x80, 0xC9, 0xCC}) {
     ScriptedBmc bmc;
-    bmc.readRefused = {{LanParameter::MacAddress, code}, {LanParameter::DefaultGateway, code}};
+    bmc.readRefused = {{LanParameter::DefaultGateway, code}};
 
     const auto interface = readInterface(bmc, 1, Ipv6Choice::Static);
 
-    EXPECT_EQ(interface.macAddress, std::nullopt);
     EXPECT_EQ(interface.ipv4Gateway, std::nullopt);
     EXPECT_EQ(interface.ipv6Address, std::nullopt);
     EXPECT_EQ(interface.ipv4Address, QV::ipv4("192.0.2.10"));
@@ -54,7 +70,6 @@ TEST(IpmiInterfaceTest, LacksWhatTheBmcTellsTooShort) {
   bmc.values = {{LanParameter::AddressSource, {}},
                 {LanParameter::IpAddress, {192, 0, 2}},
                 {LanParameter::SubnetMask, {255}},
-                {LanParameter::MacAddress, {2, 0, 0, 0, 0}},
                 {LanParameter::Ipv6StaticAddress, {0, 0x80, 0x20}}};
 
   const auto interface = readInterface(bmc, 1, Ipv6Choice::Static);
@@ -62,7 +77,6 @@ TEST(IpmiInterfaceTest, LacksWhatTheBmcTellsTooShort) {
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Unknown);
   EXPECT_EQ(interface.ipv4Address, std::nullopt);
   EXPECT_EQ(interface.ipv4SubnetMask, std::nullopt);
-  EXPECT_EQ(interface.macAddress, std::nullopt);
   EXPECT_EQ(interface.ipv6Address, std::nullopt);
 }
 
