@@ -9,12 +9,13 @@
 
 #include "tests/faults/Allocations.h"
 #include "tests/faults/Calls.h"
+#include "tests/faults/Recording.h"
 
 namespace Testing {
 
-Agent& agent() {
-  static Agent running;
-  return running;
+std::vector<std::optional<std::string>>& nodeNames() {
+  static std::vector<std::optional<std::string>> names;
+  return names;
 }
 
 }  // namespace Testing
@@ -30,10 +31,11 @@ bool textEqual(const char* a, const char* b);
 
 }  // namespace RealQV
 
-using Testing::agent;
 using Testing::calls;
 using Testing::CountedAllocations;
 using Testing::Fault;
+using Testing::nodeNames;
+using Testing::recording;
 
 namespace QV {
 
@@ -80,7 +82,7 @@ bool textEqual(const char* a, const char* b) {
 
 namespace {
 
-void record(const std::string& call) { agent().record->instrumentation.push_back(call); }
+void record(const std::string& call) { recording().outcome.instrumentation.push_back(call); }
 
 }  // namespace
 
@@ -106,7 +108,7 @@ void Instrumentation::selectNode(NodeLexicon::NodeType type) {
   record("selectNode(" + std::to_string(type) + ")");
   const auto call = calls().meet("selectNode");
   call.noteAndThrow({Fault::ReturnsNothing});
-  state_->position = call.fault == Fault::ReturnsNothing ? agent().nodes.size() : 0;
+  state_->position = call.fault == Fault::ReturnsNothing ? nodeNames().size() : 0;
 }
 
 Instrumentation::operator bool() {
@@ -114,7 +116,7 @@ Instrumentation::operator bool() {
   record("bool");
   const auto call = calls().meet("operator bool");
   call.noteAndThrow({Fault::ReturnsNothing});
-  return call.fault == Fault::None && state_->position < agent().nodes.size();
+  return call.fault == Fault::None && state_->position < nodeNames().size();
 }
 
 bool Instrumentation::getProperty(NodeLexicon::Properties property, std::string& value) {
@@ -122,7 +124,7 @@ bool Instrumentation::getProperty(NodeLexicon::Properties property, std::string&
   record("getProperty(" + std::to_string(property) + ")");
   const auto call = calls().meet("Instrumentation::getProperty", static_cast<int>(property));
   call.noteAndThrow({Fault::ReturnsNothing, Fault::FailsDone});
-  const auto& name = agent().nodes.at(state_->position);
+  const auto& name = nodeNames().at(state_->position);
   if (!name || call.fault == Fault::ReturnsNothing) {
     ++state_->position;
     return false;
@@ -191,7 +193,7 @@ void send(bool trace, const char* function, const char* file, int line, const st
     calls().violation("the logger is called with more than a line");
   }
   if (call.fault == Fault::None) {
-    agent().record->lines.push_back({trace, function, file, line, component, level, message});
+    recording().outcome.lines.push_back({trace, function, file, line, component, level, message});
   }
 }
 

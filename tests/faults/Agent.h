@@ -7,15 +7,9 @@
 #include <string>
 #include <vector>
 
-#include "tests/faults/Outcome.h"
-
 namespace Testing {
 
-struct Agent {
-  std::vector<std::optional<std::string>> nodes;  // their names; absent: it cannot be read
-  Outcome* record = nullptr;
-};
-
-Agent& agent();
+// The names of the instrumentation's nodes; absent: it cannot be read.
+std::vector<std::optional<std::string>>& nodeNames();
 
 }  // namespace Testing

@@ -33,10 +33,8 @@ auto* another(Model model, const Call& call) {
 
 }  // namespace
 
+// Whatever the state says: there are object managers that flag good items as null.
 void adoptValue(const CMPIData& data, const Call& call) {
-  if (CMIsNullValue(data)) {
-    return;
-  }
   switch (data.type) {
     case CMPI_string:
       adopted(data.value.string, call);
@@ -64,8 +62,9 @@ Faults faultsOf(const CMPIData& data, bool tellsStatus) {
   if (tellsStatus) {
     faults.insert(faults.end(), {Fault::NullSilently, Fault::GoodWithError});
   }
-  const bool hasObject = !CMIsNullValue(data) && (data.type == CMPI_string || data.type == CMPI_ref ||
-                                                  data.type == CMPI_instance || CMIsArray(data));
+  const bool isObject =
+      data.type == CMPI_string || data.type == CMPI_ref || data.type == CMPI_instance || CMIsArray(data);
+  const bool hasObject = isObject && data.value.dataPtr.ptr;
   if (hasObject) {
     faults.insert(faults.end(), {Fault::WithoutHandle, Fault::NullPointer});
   }

@@ -14,7 +14,7 @@ namespace {
 using namespace Testing;
 
 #ifdef SANITIZED
-constexpr std::size_t shareOfPoints = 53;
+constexpr std::size_t shareOfPoints = 151;
 #else
 constexpr std::size_t shareOfPoints = 29;
 #endif

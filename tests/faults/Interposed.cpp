@@ -4,9 +4,11 @@
 #include <type_traits>
 #include <utility>
 
-#include "cimom/broker/BrokerCore.h"
+#include "cimom/broker/RequestScope.h"
 #include "tests/faults/Allocations.h"
 #include "tests/faults/Answers.h"
+#include "tests/support/broker/PersonalObjects.h"
+#include "tests/support/broker/Personality.h"
 
 namespace Testing {
 
@@ -98,7 +100,7 @@ void takeTable(const TableOf<Object>& table) {
   interposed<Table>.clone = cloned<Object>;
 }
 
-Filtered announceFilter = nullptr;
+decltype(Behind::filtered) announceFilter = nullptr;
 decltype(CMPIInstanceFT::setPropertyFilter) realFilter = nullptr;
 
 CMPIStatus announcedFilter(CMPIInstance* instance, const char** properties, const char** keys) {
@@ -107,12 +109,12 @@ CMPIStatus announcedFilter(CMPIInstance* instance, const char** properties, cons
 }
 
 void interposeStrings() {
-  takeTable<CMPIString>(Cimom::Abi<Cimom::Text>::table);
+  takeTable<CMPIString>(*personal(Cimom::make(Cimom::Text{}))->ft);
   INTERPOSE(CMPIStringFT, getCharPtr);
 }
 
 void interposePaths() {
-  takeTable<CMPIObjectPath>(Cimom::Abi<Cimom::ObjectPath>::table);
+  takeTable<CMPIObjectPath>(*personal(Cimom::make(Cimom::ObjectPath{}))->ft);
   INTERPOSE(CMPIObjectPathFT, setNameSpace);
   INTERPOSE(CMPIObjectPathFT, getNameSpace);
   INTERPOSE(CMPIObjectPathFT, setHostname);
@@ -132,8 +134,9 @@ void interposePaths() {
   INTERPOSE(CMPIObjectPathFT, toString);
 }
 
-void interposeInstances(Filtered filtered) {
-  takeTable<CMPIInstance>(Cimom::Abi<Cimom::Instance>::table);
+void interposeInstances(decltype(Behind::filtered) filtered) {
+  const Cimom::ClassDefinition definition;
+  takeTable<CMPIInstance>(*personal(Cimom::make(Cimom::Instance(definition, {})))->ft);
   announceFilter = filtered;
   realFilter = std::exchange(original<CMPIInstanceFT>.setPropertyFilter, announcedFilter);
   INTERPOSE(CMPIInstanceFT, getProperty);
@@ -146,6 +149,15 @@ void interposeInstances(Filtered filtered) {
   INTERPOSE(CMPIInstanceFT, setPropertyWithOrigin);
 }
 
+// Some object managers leave a state on the items that says nothing.
+CMPIData personalNext(const CMPIEnumeration* enumeration, CMPIStatus* status) {
+  CMPIData item = Cimom::Abi<Cimom::Enumeration>::table.getNext(enumeration, status);
+  if (item.type == CMPI_instance) {
+    item.state = personality().itemState;
+  }
+  return item;
+}
+
 void interposeCollections() {
   takeTable<CMPIArray>(Cimom::Abi<Cimom::Array>::table);
   INTERPOSE(CMPIArrayFT, getSize);
@@ -153,6 +165,7 @@ void interposeCollections() {
   INTERPOSE(CMPIArrayFT, getElementAt);
   INTERPOSE(CMPIArrayFT, setElementAt);
   takeTable<CMPIEnumeration>(Cimom::Abi<Cimom::Enumeration>::table);
+  original<CMPIEnumerationFT>.getNext = personalNext;
   INTERPOSE(CMPIEnumerationFT, getNext);
   INTERPOSE(CMPIEnumerationFT, hasNext);
   INTERPOSE(CMPIEnumerationFT, toArray);
@@ -172,7 +185,7 @@ void interposeCollections() {
   INTERPOSE(CMPIDateTimeFT, isInterval);
 }
 
-void interposeUpCalls(EnumerateInstances enumerateInstances) {
+void interposeUpCalls(decltype(Behind::enumerateInstances) enumerateInstances) {
   original<CMPIBrokerFT>.enumerateInstances = enumerateInstances;
   INTERPOSE(CMPIBrokerFT, enumerateInstanceNames);
   INTERPOSE(CMPIBrokerFT, getInstance);
@@ -239,15 +252,17 @@ void interpose(CMPIResult* object) {
 
 void interpose(CMPIError*) {}
 
-const CMPIBroker* interposedBroker(const CMPIBroker* real, EnumerateInstances enumerateInstances, Filtered filtered) {
+const CMPIBroker* interposedBroker(const CMPIBroker* real, const Behind& behind) {
+  const Cimom::RequestScope scope(real);
   interposeStrings();
   interposePaths();
-  interposeInstances(filtered);
+  interposeInstances(behind.filtered);
   interposeCollections();
   original<CMPIBrokerFT> = *real->bft;
   interposed<CMPIBrokerFT> = *real->bft;
-  interposeUpCalls(enumerateInstances);
+  interposeUpCalls(behind.enumerateInstances);
   original<CMPIBrokerEncFT> = *real->eft;
+  original<CMPIBrokerEncFT>.trace = behind.trace;
   interposed<CMPIBrokerEncFT> = *real->eft;
   interposeMakers();
   static CMPIBroker broker;

@@ -21,10 +21,15 @@ void interpose(CMPIContext* object);
 void interpose(CMPIResult* object);
 void interpose(CMPIError* object);
 
-// The broker with interposed tables; up-calls for instances are answered by `enumerateInstances`, the property filters
-// of instances are announced to `filtered`.
-using EnumerateInstances = decltype(CMPIBrokerFT::enumerateInstances);
-using Filtered = void (*)(const CMPIInstance*, const char** properties, const char** keys);
-const CMPIBroker* interposedBroker(const CMPIBroker* real, EnumerateInstances enumerateInstances, Filtered filtered);
+// What stands behind slots in place of the object manager's own.
+struct Behind {
+  decltype(CMPIBrokerFT::enumerateInstances) enumerateInstances;
+  decltype(CMPIBrokerEncFT::trace) trace;
+  // Is announced the property filters of instances.
+  void (*filtered)(const CMPIInstance*, const char** properties, const char** keys);
+};
+
+// The broker with the tables of the running personality interposed.
+const CMPIBroker* interposedBroker(const CMPIBroker* real, const Behind& behind);
 
 }  // namespace Testing

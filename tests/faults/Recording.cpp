@@ -3,7 +3,10 @@
 
 #include <cmpimacs.h>
 
+#include "cimom/broker/CmpiValue.h"
 #include "cimom/broker/Handle.h"
+#include "tests/faults/Answers.h"
+#include "tests/support/broker/Personality.h"
 
 namespace Testing {
 
@@ -24,15 +27,33 @@ std::string shown(const Value& value) {
   return value.isNull() ? "null" : std::to_string(value.type()) + ':' + value.toString();
 }
 
+// That the library sets, and that not every object manager's classes have.
+constexpr const char* undeclared[] = {"Antecedent",  "Dependent",      "ManagedElement",
+                                      "SettingData", "GroupComponent", "PartComponent"};
+
+std::string shownProperty(const CMPIInstance* instance, const char* name) {
+  const CMPIData data = original<CMPIInstanceFT>.getProperty(instance, name, nullptr);
+  constexpr CMPIValueState none = CMPI_nullValue | CMPI_notFound;
+  if ((data.state & none) != 0 || (data.type == CMPI_string && !data.value.string->hdl)) {
+    return "";
+  }
+  return std::string("; ") + name + '=' + shown(Cimom::fromCmpi(&data.value, data.type));
+}
+
 std::string shown(const CMPIInstance* instance) {
   if (!instance || !instance->hdl) {
     return instance ? "instance without handle" : "null instance";
   }
-  const auto& model = Cimom::modelOf<Instance>(instance);
-  std::string text = "instance " + model.path().toString();
-  for (std::size_t i = 0; i < model.size(); ++i) {
-    if (!model[i].isNull()) {
-      text += "; " + model.definition().properties[i].name + '=' + shown(model[i]);
+  // As the object manager itself sees it.
+  std::string text = "instance at " + textOf(original<CMPIInstanceFT>.getObjectPath(instance, nullptr));
+  for (const Cimom::PropertyDeclaration& property : Cimom::modelOf<Instance>(instance).definition().properties) {
+    text += shownProperty(instance, property.name.c_str());
+  }
+  if (personality().keepsUndeclared) {
+    for (const char* name : undeclared) {
+      if (!Cimom::modelOf<Instance>(instance).definition().findProperty(name)) {
+        text += shownProperty(instance, name);
+      }
     }
   }
   const auto filter = recording().filters.find(instance);
@@ -40,23 +61,23 @@ std::string shown(const CMPIInstance* instance) {
 }
 
 CMPIStatus returnInstance(const CMPIResult*, const CMPIInstance* instance) {
-  recording().outcome->answered.push_back(shown(instance));
+  recording().outcome.answered.push_back(shown(instance));
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnObjectPath(const CMPIResult*, const CMPIObjectPath* path) {
-  recording().outcome->answered.push_back(textOf(path));
+  recording().outcome.answered.push_back(textOf(path));
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnDone(const CMPIResult*) {
-  recording().outcome->answered.push_back("done");
+  recording().outcome.answered.push_back("done");
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnData(const CMPIResult*, const CMPIValue*, const CMPIType) {
-  recording().outcome->answered.push_back("data");
+  recording().outcome.answered.push_back("data");
   return {CMPI_RC_OK, nullptr};
 }
 CMPIStatus returnError(const CMPIResult*, const CMPIError*) {
-  recording().outcome->answered.push_back("error");
+  recording().outcome.answered.push_back("error");
   return {CMPI_RC_OK, nullptr};
 }
 
@@ -88,6 +109,13 @@ std::string textOf(const CMPIObjectPath* path) {
     return path ? "path without handle" : "null path";
   }
   return "path " + Cimom::modelOf<ObjectPath>(path).toString();
+}
+
+CMPIStatus recordTrace(const CMPIBroker*, int level, const char* component, const char* text,
+                       const CMPIString* string) {
+  recording().outcome.brokerTrace.push_back(std::to_string(level) + ' ' + component + ": " +
+                                            (string ? "a string" : text));
+  return {personality().traceCode, nullptr};
 }
 
 void recordFilter(const CMPIInstance* instance, const char** properties, const char** keys) {

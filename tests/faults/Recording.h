@@ -13,8 +13,8 @@ namespace Testing {
 
 // Of the run that is under way.
 struct Recording {
-  Outcome* outcome = nullptr;
-  std::map<const CMPIInstance*, std::string> filters = {};  // that were set
+  Outcome outcome;
+  std::map<const CMPIInstance*, std::string> filters;  // that were set
 };
 
 Recording& recording();
@@ -24,7 +24,8 @@ CMPIResult* recordingResult();
 
 std::string textOf(const CMPIObjectPath* path);
 
-// Keeps a property filter that was set.
+// Stand in for slots of the broker and of instances: they keep what reaches them.
+CMPIStatus recordTrace(const CMPIBroker*, int level, const char* component, const char* text, const CMPIString* string);
 void recordFilter(const CMPIInstance* instance, const char** properties, const char** keys);
 
 }  // namespace Testing

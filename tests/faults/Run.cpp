@@ -2,6 +2,7 @@
 #include "tests/faults/Run.h"
 
 #include <exception>
+#include <utility>
 
 #include "cimom/broker/Handle.h"
 #include "cimom/broker/RequestScope.h"
@@ -11,6 +12,7 @@
 #include "tests/faults/Recording.h"
 #include "tests/faults/World.h"
 #include "tests/faults/model/Model.h"
+#include "tests/support/broker/PersonalObjects.h"
 
 namespace Testing {
 
@@ -25,8 +27,7 @@ struct Objects {
   std::vector<const char*> properties;
 
   explicit Objects(const Request& request)
-      : path(Cimom::make(request.path)), properties(request.properties.value_or(std::vector<const char*>{})) {
-    interpose(path);
+      : path(world().path(request)), properties(request.properties.value_or(std::vector<const char*>{})) {
     interpose(context);
     calls().know(path, "the request's path");
     calls().know(context, "the context");
@@ -97,17 +98,20 @@ std::string shown(const CMPIStatus& status) {
 
 RunResult carryOut(Who who, const Request& request) {
   RunResult result;
-  recording() = {&result.outcome};
-  agent() = {request.nodes, &result.outcome};
+  recording() = {};
+  forgetInstances();
+  nodeNames() = request.nodes;
   Objects objects(request);
   const long before = libraryBlocks();
+  std::string& status = recording().outcome.status;
   try {
-    result.outcome.status = shown(call(who, request, objects));
+    status = shown(call(who, request, objects));
   } catch (const std::exception& exception) {
-    result.outcome.status = std::string("throws ") + exception.what();
+    status = std::string("throws ") + exception.what();
   } catch (int) {
-    result.outcome.status = "throws an int";
+    status = "throws an int";
   }
+  result.outcome = std::move(recording().outcome);
   result.leaked = libraryBlocks() - before;
   result.fired = calls().fired();
   result.violations = calls().violations();
@@ -122,13 +126,10 @@ RunResult run(Who who, const Request& request, CallKey key, Fault fault) {
   return carryOut(who, request);
 }
 
-std::vector<RecordedCall> record(Who who, const Request& request, RunResult* result) {
+std::vector<RecordedCall> record(Who who, const Request& request) {
   world();
   calls().beginRecording();
-  RunResult made = carryOut(who, request);
-  if (result) {
-    *result = std::move(made);
-  }
+  carryOut(who, request);
   return calls().recorded();
 }
 

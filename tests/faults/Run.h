@@ -20,6 +20,6 @@ enum class Who { Product, Model };
 RunResult run(Who who, const Request& request, CallKey key = 0, Fault fault = Fault::None);
 
 // Every call that the request makes.
-std::vector<RecordedCall> record(Who who, const Request& request, RunResult* result = nullptr);
+std::vector<RecordedCall> record(Who who, const Request& request);
 
 }  // namespace Testing

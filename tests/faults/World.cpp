@@ -1,10 +1,13 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "tests/faults/World.h"
 
+#include <cmpimacs.h>
+
 #include "Paths.h"
 #include "cimom/broker/Guard.h"
 #include "tests/faults/Interposed.h"
 #include "tests/faults/Recording.h"
+#include "tests/support/broker/Personality.h"
 
 namespace Testing {
 
@@ -43,14 +46,11 @@ World& world() {
 }
 
 World::World()
-    : broker_(interposedBroker(manager_.broker(), enumerateInstances, recordFilter)), result_(recordingResult()) {
+    : broker_(interposedBroker(personal_.broker(), {enumerateInstances, recordTrace, recordFilter})),
+      result_(recordingResult()) {
   for (const char* nameSpace : {"root/cimv2", underlyingNameSpace}) {
     manager_.loadSchemaText(everyClassIn(nameSpace), nameSpace);
   }
-  manager_.setTrace([](int level, std::string_view component, std::string_view text) {
-    recording().outcome->brokerTrace.push_back(std::to_string(level) + ' ' + std::string(component) + ": " +
-                                               std::string(text));
-  });
   interpose(result_);
   addSystems();
   addEndpoints();
@@ -63,6 +63,21 @@ World::World()
     associationMis_[unit.file] =
         unit.createAssociationMI ? unit.createAssociationMI(broker_, nullptr, nullptr) : nullptr;
   }
+}
+
+CMPIObjectPath* World::path(const Request& request) const {
+  const ObjectPath& wanted = request.path;
+  CMPIObjectPath* made =
+      CMNewObjectPath(personal_.broker(), wanted.nameSpace.c_str(), wanted.className.c_str(), nullptr);
+  if (personality().requestHost) {
+    CMSetHostname(made, personality().requestHost);
+  }
+  for (const auto& [name, value] : wanted.keys) {
+    const CMPIData key = Cimom::toCmpi(value);
+    CMAddKey(made, name.c_str(), &key.value, key.type);
+  }
+  interpose(made);
+  return made;
 }
 
 CMPIInstance* World::change(const Request& request) const {
@@ -87,7 +102,8 @@ Instance World::instanceOf(const char* className, const Texts& properties) const
 }
 
 void World::add(Instance instance) {
-  underlying_[instance.definition().name].push_back(Value::instance(std::move(instance)));
+  std::vector<Value>& ofClass = underlying_[instance.definition().name];
+  ofClass.push_back(Value::instance(std::move(instance)));
 }
 
 void World::addSystems() {
@@ -155,8 +171,8 @@ void World::addAccessPoints() {
 
 CMPIEnumeration* World::enumerateInstances(const CMPIBroker*, const CMPIContext*, const CMPIObjectPath* path,
                                            const char** properties, CMPIStatus* status) {
-  return Cimom::guarded(status, static_cast<CMPIEnumeration*>(nullptr), [&] {
-    recording().outcome->upCalls.push_back(textOf(path) + (properties ? " with properties" : ""));
+  CMPIEnumeration* made = Cimom::guarded(status, static_cast<CMPIEnumeration*>(nullptr), [&] {
+    recording().outcome.upCalls.push_back(textOf(path) + (properties ? " with properties" : ""));
     const auto& given = Cimom::argumentOf<ObjectPath>(path);
     const auto found = world().underlying_.find(given.className);
     if (given.nameSpace != underlyingNameSpace || found == world().underlying_.end()) {
@@ -164,6 +180,8 @@ CMPIEnumeration* World::enumerateInstances(const CMPIBroker*, const CMPIContext*
     }
     return Cimom::make(Cimom::Enumeration{found->second, 0});
   });
+  // Some object managers answer a failure with an enumeration of nothing.
+  return made || personality().failedUpCallIsNull ? made : Cimom::make(Cimom::Enumeration{});
 }
 
 }  // namespace Testing

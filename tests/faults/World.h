@@ -9,6 +9,7 @@
 #include "cimom/ObjectManager.h"
 #include "cimom/model/Instance.h"
 #include "tests/faults/Requests.h"
+#include "tests/support/broker/PersonalBroker.h"
 
 namespace Testing {
 
@@ -25,7 +26,8 @@ class World {
   CMPIInstanceMI* instanceMi(const Unit& unit) const { return instanceMis_.at(unit.file); }
   CMPIAssociationMI* associationMi(const Unit& unit) const { return associationMis_.at(unit.file); }
 
-  // The instance that the client sends with a change.
+  // The path of the request, and the instance that the client sends with a change, as object managers hand them on.
+  CMPIObjectPath* path(const Request& request) const;
   CMPIInstance* change(const Request& request) const;
 
  private:
@@ -42,6 +44,7 @@ class World {
   void addAccessPoints();
 
   Cimom::ObjectManager manager_;
+  PersonalBroker personal_{manager_.broker()};
   const CMPIBroker* broker_;
   CMPIResult* result_;
   std::map<std::string, CMPIInstanceMI*> instanceMis_;

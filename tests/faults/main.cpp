@@ -54,7 +54,11 @@ int runAll(const std::vector<std::string>& options) {
       throw std::invalid_argument("unknown option " + options[i]);
     }
   }
-  const Report report = carryOut(share(points(part), every), static_cast<unsigned>(jobs));
+  const std::vector<Point> chosen = share(points(part), every);
+  if (chosen.empty()) {
+    throw std::invalid_argument("there is no point to try of requests whose name has \"" + part + '"');
+  }
+  const Report report = carryOut(chosen, static_cast<unsigned>(jobs));
   std::ofstream failures(file);
   constexpr std::size_t shown = 20;
   for (std::size_t i = 0; i < report.failures.size(); ++i) {
