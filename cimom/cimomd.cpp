@@ -13,6 +13,7 @@
 #include <vector>
 
 #include "cimom/ObjectManager.h"
+#include "cimom/broker/ProviderFrame.h"
 #include "cimom/cimxml/Endpoint.h"
 #include "cimom/configuration/Configuration.h"
 #include "cimom/daemon/Account.h"
@@ -191,6 +192,7 @@ void serve(const Configuration& configuration, Signals& signals) {
   options.failureHandler = [&endpoint](const Http::Request& request, const std::string& why) {
     return endpoint.fail(request, why);
   };
+  options.threadEnd = &ProviderFrame::endedBy;
   Http::Server server(std::move(options),
                       [&endpoint](const Http::Request& request) { return endpoint.handle(request); });
   signals.serving();

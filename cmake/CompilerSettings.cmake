@@ -10,6 +10,13 @@ if(NOT CMAKE_BUILD_TYPE)
   set(CMAKE_BUILD_TYPE RelWithDebInfo)
 endif()
 
+# The presets compile several sources at a time (CMAKE_UNITY_BUILD), the packages each alone. These cannot share a
+# compilation with others of their target: they name something as another does, or a class of a header has a member of a
+# type that only they know.
+function(compile_alone)
+  set_source_files_properties(${ARGN} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
+endfunction()
+
 add_compile_options(-Wall -Wextra -Wpedantic -Wshadow -Wnon-virtual-dtor -Wold-style-cast -Woverloaded-virtual
                     -Wformat=2)
 

@@ -12,11 +12,9 @@ namespace {
 
 // Null for a pair that the model does not have.
 const CompositeClass* farEndOf(const char* sourceClass, const char* associationClass) {
-  for (const Association* association : associations) {
-    for (const End end : {End::A, End::B}) {
-      if (textEqual(sourceClass, association->classAt(end).name) && textEqual(associationClass, association->name)) {
-        return &association->classAt(otherThan(end));
-      }
+  for (const View& view : views) {
+    if (textEqual(sourceClass, view.sourceClass().name) && textEqual(associationClass, view.association.name)) {
+      return &view.farClass();
     }
   }
   return nullptr;

@@ -71,7 +71,7 @@ void setText(CMPIInstance* instance, const char* name, const char* text) {
 }
 
 void setReference(CMPIInstance* instance, const char* name, const CMPIObjectPath* path) {
-  if (!CMIsNullObject(instance) && path) {
+  if (!CMIsNullObject(instance) && !CMIsNullObject(path)) {
     CMSetProperty(instance, name, &path, CMPI_ref);
   }
 }

@@ -45,7 +45,7 @@ bool probeForArray(const Request& request) {
 void copyDedicated(const Frame& frame, const CMPIInstance* underlying, CMPIInstance* composite, CMPIStatus* status) {
   frame.progress(" CMGetProperty Dedicated");
   const CMPIData dedicated = propertyOf(underlying, "Dedicated", status);
-  if (CMIsNullValue(dedicated) || !CMIsArray(dedicated) || !dedicated.value.array) {
+  if (CMIsNullValue(dedicated) || !CMIsArray(dedicated) || CMIsNullObject(dedicated.value.array)) {
     return;
   }
   CMGetArrayCount(dedicated.value.array, status);

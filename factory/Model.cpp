@@ -173,11 +173,15 @@ constinit const Association dhcpOrderedMember = {
 
 namespace {
 
-constexpr const Association* allAssociations[] = {&hostedAccessPoint,  &remoteHostedAccessPoint, &clientAccess,
-                                                  &elementSettingData, &staticOrderedMember,     &dhcpOrderedMember};
+constexpr View allViews[] = {
+    {hostedAccessPoint, End::B},       {hostedAccessPoint, End::A},  {remoteHostedAccessPoint, End::A},
+    {remoteHostedAccessPoint, End::B}, {elementSettingData, End::B}, {elementSettingData, End::A},
+    {dhcpOrderedMember, End::A},       {dhcpOrderedMember, End::B},  {staticOrderedMember, End::B},
+    {staticOrderedMember, End::A},     {clientAccess, End::A},       {clientAccess, End::B},
+};
 
 }  // namespace
 
-constinit const std::span<const Association* const> associations = allAssociations;
+constinit const std::span<const View> views = allViews;
 
 }  // namespace QV::IPConfigComposite

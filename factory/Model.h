@@ -97,7 +97,16 @@ extern const Association elementSettingData;
 extern const Association staticOrderedMember;
 extern const Association dhcpOrderedMember;
 
-// All of them.
-extern const std::span<const Association* const> associations;
+// An association as it is seen from one of its ends.
+struct View {
+  const Association& association;
+  End source;
+
+  const CompositeClass& sourceClass() const { return association.classAt(source); }
+  const CompositeClass& farClass() const { return association.classAt(otherThan(source)); }
+};
+
+// All of them, in the order in which a source is held against them.
+extern const std::span<const View> views;
 
 }  // namespace QV::IPConfigComposite

@@ -7,7 +7,7 @@ namespace QV::IPConfigComposite {
 
 namespace {
 
-const CMPIBroker* broker = nullptr;
+UnitBroker broker = nullptr;
 const std::string loggerIPConfigStaticOrderedMembetOfCollProvider =
     "Tarnwick.IPConfigStaticOrderedMembetOfCollProvider";
 

@@ -37,18 +37,23 @@ CMPICount getKeyCount(const CMPIObjectPath* path, CMPIStatus* status) {
   return guarded(status, CMPICount(0), [&] { return static_cast<CMPICount>(modelOf<ObjectPath>(path).keys.size()); });
 }
 
+// The path that another is set from. It is the same kind of object, and as such an invalid handle where it has none.
+const ObjectPath& sourceOf(const CMPIObjectPath* source) {
+  return source ? modelOf<ObjectPath>(source) : argumentOf<ObjectPath>(source);
+}
+
 CMPIStatus setNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
   return guarded([&] {
     ObjectPath& model = modelOf<ObjectPath>(path);
-    model.nameSpace = argumentOf<ObjectPath>(source).nameSpace;
+    model.nameSpace = sourceOf(source).nameSpace;
   });
 }
 
 CMPIStatus setHostAndNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
   return guarded([&] {
     ObjectPath& model = modelOf<ObjectPath>(path);
-    model.nameSpace = argumentOf<ObjectPath>(source).nameSpace;
-    model.host = argumentOf<ObjectPath>(source).host;
+    model.nameSpace = sourceOf(source).nameSpace;
+    model.host = sourceOf(source).host;
   });
 }
 

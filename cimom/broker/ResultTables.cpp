@@ -82,7 +82,11 @@ template <OptionalArray member>
 CMPIStatus setArray(CMPIError* error, const CMPIArray* array) {
   return guarded([&] {
     Error& model = modelOf<Error>(error);
-    model.*member = argumentOf<Array>(array);
+    const Array& texts = argumentOf<Array>(array);
+    if (texts.elementType != CMPI_string) {
+      throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "the array must hold strings");
+    }
+    model.*member = texts;
   });
 }
 

@@ -47,13 +47,19 @@ CMPIArgs* readArguments(const OperationContext& manager, const Request& request,
   return arguments;
 }
 
-void writeArguments(XmlWriter& xml, ObjectWriter& writer, const CMPIArgs* arguments) {
+ObjectWriter::Embedding embeddingOf(const Qualifiers& qualifiers) {
+  return isQualified(qualifiers, "EmbeddedObject") ? ObjectWriter::Embedding::Object
+                                                   : ObjectWriter::Embedding::Instance;
+}
+
+void writeArguments(XmlWriter& xml, ObjectWriter& writer, const MethodDeclaration& method, const CMPIArgs* arguments) {
   const CMPICount count = CMGetArgCount(arguments, nullptr);
   for (CMPICount i = 0; i < count; ++i) {
     CMPIString* name = nullptr;
     const CMPIData data = CMGetArgAt(arguments, i, &name, nullptr);
     const auto scope = xml.element("PARAMVALUE", "NAME", CMGetCharsPtr(name, nullptr));
-    writer.type("PARAMTYPE", data.type);
+    const PropertyDeclaration* declared = findNamed(method.parameters, CMGetCharsPtr(name, nullptr));
+    writer.type("PARAMTYPE", data.type, embeddingOf(declared ? declared->qualifiers : Qualifiers()));
     writer.value(data);
   }
 }
@@ -75,10 +81,10 @@ void callMethod(const OperationContext& manager, const Request& request, XmlWrit
   ObjectWriter writer(xml, manager.host, request.nameSpace);
   if (!CMIsNullValue(returned)) {
     const auto value = xml.element("RETURNVALUE");
-    writer.type("PARAMTYPE", returned.type);
+    writer.type("PARAMTYPE", returned.type, embeddingOf(method.qualifiers));
     writer.value(returned);
   }
-  writeArguments(xml, writer, out);
+  writeArguments(xml, writer, method, out);
 }
 
 }  // namespace Cimom::CimXml

@@ -34,6 +34,12 @@ const CMPIObjectPath* pathOf(const CMPIInstance* instance) {
   return path;
 }
 
+ObjectWriter::Embedding embeddingOf(const CMPIObjectPath* path, const char* property) {
+  const CMPIData qualifier = CMGetPropertyQualifier(path, property, "EmbeddedObject", nullptr);
+  const bool isObject = qualifier.type == CMPI_boolean && !CMIsNullValue(qualifier) && qualifier.value.boolean;
+  return isObject ? ObjectWriter::Embedding::Object : ObjectWriter::Embedding::Instance;
+}
+
 }  // namespace
 
 void ObjectWriter::instanceName(const CMPIObjectPath* path) {
@@ -81,18 +87,19 @@ void ObjectWriter::objectPath(const CMPIObjectPath* path) {
 }
 
 void ObjectWriter::instance(const CMPIInstance* instance) {
-  const auto scope = xml_.element("INSTANCE", "CLASSNAME", chars(CMGetClassName(pathOf(instance), nullptr)));
+  const CMPIObjectPath* path = pathOf(instance);
+  const auto scope = xml_.element("INSTANCE", "CLASSNAME", chars(CMGetClassName(path, nullptr)));
   const CMPICount count = CMGetPropertyCount(instance, nullptr);
   for (CMPICount i = 0; i < count; ++i) {
     CMPIString* name = nullptr;
     const CMPIData data = CMGetPropertyAt(instance, i, &name, nullptr);
     if (filter_.includes(chars(name))) {
-      property(chars(name), data);
+      property(path, chars(name), data);
     }
   }
 }
 
-void ObjectWriter::property(const char* name, const CMPIData& data) {
+void ObjectWriter::property(const CMPIObjectPath* path, const char* name, const CMPIData& data) {
   if (data.type == CMPI_ref) {
     const auto scope = xml_.element("PROPERTY.REFERENCE", "NAME", name);
     value(data);
@@ -102,16 +109,17 @@ void ObjectWriter::property(const char* name, const CMPIData& data) {
     return;
   }
   const auto scope = xml_.element(CMIsArray(data) ? "PROPERTY.ARRAY" : "PROPERTY", "NAME", name);
-  type("TYPE", data.type);
+  const bool isEmbedded = elementTypeOf(data.type) == CMPI_instance;
+  type("TYPE", data.type, isEmbedded ? embeddingOf(path, name) : Embedding::Instance);
   value(data);
 }
 
-void ObjectWriter::type(const char* attributeName, CMPIType type) {
+void ObjectWriter::type(const char* attributeName, CMPIType type, Embedding embedding) {
   if (const char* name = xmlTypeName(type)) {
     xml_.attribute(attributeName, name);
   }
   if (elementTypeOf(type) == CMPI_instance) {
-    xml_.attribute("EmbeddedObject", "instance");
+    xml_.attribute("EmbeddedObject", embedding == Embedding::Object ? "object" : "instance");
   }
 }
 

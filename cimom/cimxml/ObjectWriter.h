@@ -59,14 +59,17 @@ class ObjectWriter {
   // VALUE, VALUE.ARRAY, VALUE.REFERENCE or VALUE.REFARRAY; nothing for a null value.
   void value(const CMPIData& data);
 
+  // What a string that embeds an instance is declared to embed: that, or an object of any kind.
+  enum class Embedding { Instance, Object };
+
   // The attributes of an element that say of which type its value is: TYPE, or by another name, and what a string
   // embeds.
-  void type(const char* attributeName, CMPIType type);
+  void type(const char* attributeName, CMPIType type, Embedding embedding);
 
  private:
   void keyBinding(const char* name, const CMPIData& data);
   void nameSpacePath(const CMPIObjectPath* path);
-  void property(const char* name, const CMPIData& data);
+  void property(const CMPIObjectPath* path, const char* name, const CMPIData& data);
   void reference(const CMPIObjectPath* path);
   void withPath(const char* element, const CMPIInstance* instance);
   void array(const CMPIData& data);

@@ -211,6 +211,10 @@ Configuration toConfiguration(const GivenValues& given, const Installation& inst
 
 }  // namespace
 
+Configuration readConfiguration(const std::filesystem::path& file, const Installation& installation) {
+  return toConfiguration(readConfigurationFile(file), installation);
+}
+
 std::optional<Configuration> readCommandLine(int argc, const char* const* argv, const Installation& installation) {
   CLI::App app("A CIM object manager for CMPI 2.0 providers: serves CIM-XML over HTTP.", "cimomd");
   app.set_version_flag("--version", "cimomd " CIMOMD_VERSION);

@@ -53,4 +53,7 @@ class UsageError : public std::runtime_error {
 // Returns nothing when help or the version was asked for, and has been printed. Throws UsageError.
 std::optional<Configuration> readCommandLine(int argc, const char* const* argv, const Installation& installation);
 
+// What that file and no option says.
+Configuration readConfiguration(const std::filesystem::path& file, const Installation& installation);
+
 }  // namespace Cimom

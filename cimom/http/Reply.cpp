@@ -13,7 +13,7 @@ namespace Cimom::Http {
 namespace {
 
 constexpr std::size_t chunkedFrom = 64 << 10;
-constexpr std::size_t blockSize = 16 << 10;
+constexpr std::size_t replyBlockSize = 16 << 10;
 
 void freeBody(void* body) { delete static_cast<std::string*>(body); }
 
@@ -31,7 +31,7 @@ MHD_Response* makeMessage(std::string text, bool isHttp11) {
   auto body = std::make_unique<std::string>(std::move(text));
   MHD_Response* message =
       isHttp11 && body->size() >= chunkedFrom
-          ? MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, blockSize, &readBody, body.get(), &freeBody)
+          ? MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, replyBlockSize, &readBody, body.get(), &freeBody)
           : MHD_create_response_from_buffer_with_free_callback_cls(body->size(), body->data(), &freeBody, body.get());
   if (message) {
     static_cast<void>(body.release());

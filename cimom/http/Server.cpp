@@ -186,7 +186,7 @@ struct Server::State {
   Handler handler;
   const std::string noAnswer =
       "the provider did not answer within " + std::to_string(options.operationTimeout.count()) + " s";
-  const std::string threadEnded = "the provider ended the thread of the request";
+  const std::string threadEnded = "a provider ended the thread of its request";
   HostNames hostNames;
   MemoryBudget budget;
   InFlight inFlight;
@@ -552,6 +552,12 @@ struct Server::State {
     suspensions.resume(exchange, std::move(response));
   }
 
+  // Who has ended the thread that this is called on.
+  const std::string& whyEnded() const {
+    const std::string& reason = options.threadEnd ? options.threadEnd() : threadEnded;
+    return reason.empty() ? threadEnded : reason;
+  }
+
   // Answers the request however its handler ends.
   struct Answering {
     State& state;
@@ -567,7 +573,7 @@ struct Server::State {
         // The provider has ended the thread, which another replaces.
         exchange->giveUpHandling(state.workers);
         exchange->endHandling();
-        state.fail(exchange, state.threadEnded);
+        state.fail(exchange, state.whyEnded());
       }
       state.inFlight.handled();
     }

@@ -46,6 +46,7 @@ struct ServerOptions {
   std::string tlsKey;                                 // PEM, unencrypted
   Authenticator authenticator;                        // none: everybody may
   FailureHandler failureHandler;                      // none: a 500 with the reason
+  std::function<const std::string&()> threadEnd;      // asked on a thread that its handler has ended: by whom, or ""
   std::function<void(const std::string& line)> log;   // what an administrator should see; none: nobody
   std::function<void(const RequestRecord& record)> requestLog;  // every request, once it has been answered
 };

@@ -67,7 +67,8 @@ CMPIStatus enumAssociationNames(const AssociationCall& call, BuildInstances buil
   std::vector<CMPIInstance*> instances;
   if (build(op, nullptr, ctx, instances) == 0) {
     for (std::uint16_t i = 0; i < countOf(instances); ++i) {
-      if (const CMPIObjectPath* path = pathOf(instances.at(i), &status)) {
+      const CMPIObjectPath* path = pathOf(instances.at(i), &status);
+      if (!CMIsNullObject(path)) {
         CMReturnObjectPath(rslt, path);
       }
     }

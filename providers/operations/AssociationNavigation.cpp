@@ -71,7 +71,8 @@ class Navigation {
 
   // A new association instance between the source, its path as received, and a far-end instance.
   ReferenceInstance makeReference(const CMPIInstance* farInstance) {
-    CMPIInstance* instance = associationPath_ ? CMNewInstance(broker_, associationPath_, &status_) : nullptr;
+    CMPIInstance* instance =
+        CMIsNullObject(associationPath_) ? nullptr : CMNewInstance(broker_, associationPath_, &status_);
     const CMPIObjectPath* farPath = rehomedPathOf(farInstance);
     for (const Reference& reference : unit_.association.references) {
       setReference(instance, reference.name, reference.end == farEnd_ ? farPath : op_);
@@ -79,8 +80,12 @@ class Navigation {
     return {instance, farPath != nullptr};
   }
 
+  // Null if it has none that can be used.
   CMPIObjectPath* rehomedPathOf(const CMPIInstance* instance) {
     CMPIObjectPath* path = pathOf(instance, &status_);
+    if (CMIsNullObject(path)) {
+      return nullptr;
+    }
     rehome(path, op_, &status_);
     return path;
   }

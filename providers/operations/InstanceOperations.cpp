@@ -92,7 +92,7 @@ CMPIStatus enumInstanceNames(const InstanceCall& call, const CMPIContext* ctx, c
   }
   for (std::uint16_t i = 0; i < countOf(instances); ++i) {
     CMPIObjectPath* path = pathOf(instances.at(i), &status);
-    if (!path) {
+    if (CMIsNullObject(path)) {
       continue;
     }
     rehome(path, op, &status);
@@ -111,9 +111,11 @@ CMPIStatus modifyInstance(const InstanceCall& call, Modify modify, const CMPICon
 
   if (CMIsNullObject(ci)) {
     constexpr const char* noInstance = "Modify instance Passed is NULL";
-    const CMPIString* message = call.broker ? CMNewString(call.broker, noInstance, nullptr) : nullptr;
-    // compatibility 16: the text goes to the log only; the client gets the bare code.
-    frame.progress(message ? textOf(message, nullptr) : noInstance, 353);
+    // compatibility 16: a message is made and dropped; the text goes to the log, the client gets the bare code.
+    if (call.broker) {
+      CMNewString(call.broker, noInstance, nullptr);
+    }
+    frame.progress(noInstance, 353);
     CMReturnDone(rslt);
     CMReturn(CMPI_RC_ERR_FAILED);
   }

@@ -5,6 +5,15 @@
 
 #include <cmpimacs.h>
 
+#include <atomic>
+
+namespace QV::IPConfigComposite {
+
+// What the factories of a unit set. An object manager may ask for the second MI while it is served by the first.
+using UnitBroker = std::atomic<const CMPIBroker*>;
+
+}  // namespace QV::IPConfigComposite
+
 // The slots that no provider of this library carries out, and cleanup: nothing is held that needs releasing.
 #define IPCONFIG_INSTANCE_STUBS(prefix)                                                                              \
   CMPIStatus prefix##Cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { CMReturn(CMPI_RC_OK); }             \

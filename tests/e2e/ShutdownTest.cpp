@@ -113,6 +113,23 @@ TEST_F(ShutdownTest, SaysThatAProviderDidNotAnswerInTime) {
   EXPECT_FALSE(has("cleaned"));
 }
 
+TEST_F(ShutdownTest, OutlivesAProviderThatEndsTheThreadOfItsRequest) {
+#ifdef SANITIZED
+  GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
+#endif
+  Cimomd cimomd(Cimomd::probeOptions(), environment());
+  for (int i = 0; i < 3; ++i) {
+    const Completed ended = cimomd.wbemcli({"cm"}, "TEST_Machine.Name=\"one\"", {"Exit"});
+    EXPECT_NE(ended.errors.find("(1) CIM_ERR_FAILED"), std::string::npos) << ended.errors;
+    EXPECT_NE(ended.errors.find("provider ProbeProvider ended the thread of its request"), std::string::npos)
+        << ended.errors;
+    EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
+  }
+  EXPECT_NE(cimomd.process().errors().find("cimomd: provider ProbeProvider ended its thread"), std::string::npos);
+  EXPECT_EQ(cimomd.stop(), 0);
+  EXPECT_TRUE(has("cleaned"));
+}
+
 TEST_F(ShutdownTest, OutlivesAClientThatGoesAway) {
   Cimomd cimomd(Cimomd::probeOptions(), environment());
   {

@@ -8,7 +8,6 @@ namespace {
 
 using namespace Testing;
 using QV::IPConfigComposite::IPConfigObjectFactory;
-using Strings = std::vector<std::string>;
 
 using namespace Classes;
 

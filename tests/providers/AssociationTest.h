@@ -15,8 +15,6 @@
 
 namespace Testing {
 
-using Strings = std::vector<std::string>;
-
 enum class Navigation { Associators, AssociatorNames, References, ReferenceNames };
 enum class Reading { GetInstance, EnumInstances, EnumInstanceNames };
 

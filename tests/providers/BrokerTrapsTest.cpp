@@ -84,8 +84,6 @@ class UnitTest : public CompositeTest, public ::testing::WithParamInterface<Unit
   CMPIAssociationMI* associations_ = nullptr;
 };
 
-std::string nameOf(const ::testing::TestParamInfo<Unit>& info) { return info.param.file; }
-
 INSTANTIATE_TEST_SUITE_P(All, UnitTest, ::testing::ValuesIn(allUnits()), nameOf);
 
 TEST_P(UnitTest, ServesWhileItsFactoriesAreCalledForOneClassAfterAnother) {

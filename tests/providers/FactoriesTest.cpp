@@ -9,8 +9,6 @@ using namespace Testing;
 
 class FactoriesTest : public CompositeTest, public ::testing::WithParamInterface<Unit> {};
 
-std::string nameOf(const ::testing::TestParamInfo<Unit>& info) { return info.param.file; }
-
 INSTANTIATE_TEST_SUITE_P(All, FactoriesTest, ::testing::ValuesIn(allUnits()), nameOf);
 
 TEST_P(FactoriesTest, TheInstanceTableCarriesVersionNameAndAllOperations) {

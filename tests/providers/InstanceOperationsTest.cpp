@@ -66,8 +66,6 @@ class InstanceOperationsTest : public CompositeTest, public ::testing::WithParam
   CMPIInstanceMI* mi_;
 };
 
-std::string nameOf(const ::testing::TestParamInfo<Unit>& info) { return info.param.file; }
-
 INSTANTIATE_TEST_SUITE_P(Six, InstanceOperationsTest, ::testing::ValuesIn(instanceUnits()), nameOf);
 
 TEST_P(InstanceOperationsTest, EnumInstancesAnswersEveryInstanceThenDone) {

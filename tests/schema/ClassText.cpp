@@ -10,7 +10,7 @@ namespace {
 
 using Cimom::Qualifiers;
 
-std::string textOf(const Qualifiers& qualifiers, const std::function<bool(const std::string&)>& isLeftOut) {
+std::string qualifiersText(const Qualifiers& qualifiers, const std::function<bool(const std::string&)>& isLeftOut) {
   std::map<std::string, std::string> sorted;
   for (const Cimom::Qualifier& qualifier : qualifiers) {
     if (isLeftOut(qualifier.name)) {
@@ -34,11 +34,11 @@ std::string textOf(const Qualifiers& qualifiers, const std::function<bool(const 
 std::string textOf(const Cimom::ClassDeclaration& declaration,
                    const std::function<bool(const std::string&)>& isLeftOut) {
   const Cimom::ClassDefinition& own = declaration.own;
-  std::string text = own.name + " : " + declaration.superclassName + textOf(own.qualifiers, isLeftOut);
+  std::string text = own.name + " : " + declaration.superclassName + qualifiersText(own.qualifiers, isLeftOut);
   for (const Cimom::PropertyDeclaration& property : own.properties) {
     text += "\n  " + property.name + ' ' + std::to_string(property.type) + ' ' + property.referenceClass;
     text += '[' + std::to_string(property.arraySize) + "] = " + property.defaultValue.toString();
-    text += textOf(property.qualifiers, isLeftOut);
+    text += qualifiersText(property.qualifiers, isLeftOut);
   }
   for (const Cimom::MethodDeclaration& method : own.methods) {
     text += "\n  " + method.name + "()";

@@ -102,6 +102,19 @@ std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
   return channels_;
 }
 
+// Another client may commit a change between the round trips of a look, which then has the old address with the new
+// mask. A pair that was not known before is one if the address is still the same afterwards; else it is looked at anew.
+NetworkInterface IpmiProcessor::look(Channel& channel) {
+  while (true) {
+    NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
+    const std::pair pair(interface.ipv4Address, interface.ipv4SubnetMask);
+    if (channel.known == pair || readAddress(connection_, channel.number) == interface.ipv4Address) {
+      channel.known = pair;
+      return interface;
+    }
+  }
+}
+
 ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   const auto now = Clock::now();
   if (snapshotHolds(now)) {
@@ -112,7 +125,7 @@ ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   const auto generationBefore = generation();
   ManagementProcessor processor{"BMC", "Management processor reached over IPMI", {}, {}};
   for (Channel& channel : channels()) {
-    processor.interfaces.push_back(readInterface(connection_, channel.number, channel.ipv6));
+    processor.interfaces.push_back(look(channel));
   }
   trace("read " + std::to_string(processor.interfaces.size()) + " interfaces in " +
         std::to_string(connection_.roundTrips()) + " round trips");

@@ -56,14 +56,17 @@ class IpmiProcessor {
   void announceChange();
   void reportGenerationFailure(const std::string& reason);
 
-  // A LAN channel, and which IPv6 address is read of it: none once the processor is known to have no such parameter.
+  // A LAN channel, which IPv6 address is read of it, none once the processor is known to have no such parameter, and
+  // the address and mask that it was last known to have together.
   struct Channel {
     std::uint8_t number;
     Ipv6Choice ipv6;
+    std::optional<std::pair<std::optional<Ipv4Address>, std::optional<SubnetMask>>> known = {};
   };
 
   void startOperation(Deadline deadline);
   std::vector<Channel>& channels();
+  NetworkInterface look(Channel& channel);
 
   const IpmiSettings settings_;
   IpmiConnection connection_;

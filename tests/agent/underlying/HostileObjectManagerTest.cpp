@@ -19,7 +19,7 @@ namespace {
 using namespace Testing;
 using testing::HasSubstr;
 
-constexpr const char* className = "YRNQV_SPComputerSystem";
+constexpr const char* systemClass = "YRNQV_SPComputerSystem";
 
 // How a maker misbehaves, and what the request then says of it.
 enum class Misbehaviour { NullWithoutAnError, WithoutAHandle, GoodBesideAnError };
@@ -90,7 +90,7 @@ class HostileObjectManagerTest : public BrokerFixture {
     return provider_->ft->getInstance(provider_, nullptr, to, of, nullptr);
   }
 
-  CMPIObjectPath* classPath() const { return path(className, "root/yrnse"); }
+  CMPIObjectPath* classPath() const { return path(systemClass, "root/yrnse"); }
 
   static std::string message(const CMPIStatus& status) { return status.msg ? characters(status.msg) : "(none)"; }
 
@@ -142,7 +142,7 @@ TEST_F(HostileObjectManagerTest, IsToldThatAPathWithoutAClassNamesNoneThatIsServ
   EXPECT_EQ(enumerate(altered, &result_).rc, CMPI_RC_ERR_INVALID_CLASS);
 
   altered.table.getClassName = [](const CMPIObjectPath*, CMPIStatus*) {
-    CMPIString* name = CMNewString(real, className, nullptr);
+    CMPIString* name = CMNewString(real, systemClass, nullptr);
     static CMPIStringFT table;
     table = *name->ft;
     table.getCharPtr = [](const CMPIString*, CMPIStatus*) -> const char* { return nullptr; };

@@ -129,6 +129,7 @@ TEST_F(EncapsulationTest, AnObjectThatIsMissingIsAnInvalidParameterAndNoInvalidH
   EXPECT_EQ(CMSetObjectPath(system("one"), nullptr).rc, CMPI_RC_ERR_INVALID_PARAMETER);
   CMPIObjectPath empty = {nullptr, systemPath("one")->ft};
   EXPECT_EQ(CMSetNameSpace(&empty, "n").rc, CMPI_RC_ERR_INVALID_HANDLE) << "what is acted on";
+  EXPECT_EQ(CMSetNameSpaceFromObjectPath(systemPath("one"), &empty).rc, CMPI_RC_ERR_INVALID_HANDLE) << "what is passed";
 }
 
 TEST_F(EncapsulationTest, TheTextOfManyValuesStaysShort) {

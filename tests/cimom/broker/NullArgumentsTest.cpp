@@ -224,29 +224,31 @@ TEST_F(NullArgumentsTest, InTheUpCallTable) {
   CMPIObjectPath* path = systemPath("one");
   CMPIInstance* instance = system("one");
   const auto* value = reinterpret_cast<const CMPIValue*>("a");
-  const struct {
+  struct Row {
     const CMPIBroker* broker;
     CMPIContext* context;
     CMPIObjectPath* path;
-  } rows[] = {{nullptr, request.context(), path},
-              {broker, nullptr, path},
-              {broker, request.context(), nullptr},
-              {broker, request.context(), &emptyPath}};
-  for (const auto& [b, c, p] : rows) {
-    REFUSED_BY_STATUS(bft.enumerateInstanceNames(b, c, p, st));
-    REFUSED_BY_STATUS(bft.enumerateInstances(b, c, p, nullptr, st));
-    REFUSED_BY_STATUS(bft.getInstance(b, c, p, nullptr, st));
-    REFUSED_BY_STATUS(bft.createInstance(b, c, p, instance, st));
-    REFUSED(bft.modifyInstance(b, c, p, instance, nullptr));
-    REFUSED(bft.deleteInstance(b, c, p));
-    REFUSED_BY_STATUS(bft.execQuery(b, c, p, "a", "a", st));
-    REFUSED_BY_STATUS(bft.associators(b, c, p, nullptr, nullptr, nullptr, nullptr, nullptr, st));
-    REFUSED_BY_STATUS(bft.associatorNames(b, c, p, nullptr, nullptr, nullptr, nullptr, st));
-    REFUSED_BY_STATUS(bft.references(b, c, p, nullptr, nullptr, nullptr, st));
-    REFUSED_BY_STATUS(bft.referenceNames(b, c, p, nullptr, nullptr, st));
-    REFUSED_BY_STATUS(bft.invokeMethod(b, c, p, "a", nullptr, nullptr, st));
-    REFUSED(bft.setProperty(b, c, p, "Name", value, CMPI_chars));
-    REFUSED_BY_STATUS(bft.getProperty(b, c, p, "Name", st));
+  };
+  const Row rows[] = {{nullptr, request.context(), path},
+                      {broker, nullptr, path},
+                      {broker, request.context(), nullptr},
+                      {broker, request.context(), &emptyPath}};
+  for (const Row& row : rows) {
+    REFUSED_BY_STATUS(bft.enumerateInstanceNames(row.broker, row.context, row.path, st));
+    REFUSED_BY_STATUS(bft.enumerateInstances(row.broker, row.context, row.path, nullptr, st));
+    REFUSED_BY_STATUS(bft.getInstance(row.broker, row.context, row.path, nullptr, st));
+    REFUSED_BY_STATUS(bft.createInstance(row.broker, row.context, row.path, instance, st));
+    REFUSED(bft.modifyInstance(row.broker, row.context, row.path, instance, nullptr));
+    REFUSED(bft.deleteInstance(row.broker, row.context, row.path));
+    REFUSED_BY_STATUS(bft.execQuery(row.broker, row.context, row.path, "a", "a", st));
+    REFUSED_BY_STATUS(
+        bft.associators(row.broker, row.context, row.path, nullptr, nullptr, nullptr, nullptr, nullptr, st));
+    REFUSED_BY_STATUS(bft.associatorNames(row.broker, row.context, row.path, nullptr, nullptr, nullptr, nullptr, st));
+    REFUSED_BY_STATUS(bft.references(row.broker, row.context, row.path, nullptr, nullptr, nullptr, st));
+    REFUSED_BY_STATUS(bft.referenceNames(row.broker, row.context, row.path, nullptr, nullptr, st));
+    REFUSED_BY_STATUS(bft.invokeMethod(row.broker, row.context, row.path, "a", nullptr, nullptr, st));
+    REFUSED(bft.setProperty(row.broker, row.context, row.path, "Name", value, CMPI_chars));
+    REFUSED_BY_STATUS(bft.getProperty(row.broker, row.context, row.path, "Name", st));
   }
   REFUSED_BY_STATUS(bft.createInstance(broker, request.context(), path, nullptr, st));
   REFUSED_BY_STATUS(bft.createInstance(broker, request.context(), path, &emptyInstance, st));

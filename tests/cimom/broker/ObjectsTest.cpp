@@ -137,6 +137,9 @@ TEST_F(ObjectsTest, AnErrorHoldsWhatIsSetAndNothingElse) {
   EXPECT_EQ(CMSetErrorSourceFormat(error, static_cast<CMPIErrorSrcFormat>(2)).rc, CMPI_RC_OK);
   EXPECT_EQ(CMSetRecommendedActions(error, actions).rc, CMPI_RC_OK);
   EXPECT_EQ(CMSetMessageArguments(error, actions).rc, CMPI_RC_OK);
+  CMPIArray* numbers = CMNewArray(broker, 1, CMPI_uint32, nullptr);
+  EXPECT_EQ(CMSetRecommendedActions(error, numbers).rc, CMPI_RC_ERR_INVALID_PARAMETER);
+  EXPECT_EQ(CMSetMessageArguments(error, numbers).rc, CMPI_RC_ERR_INVALID_PARAMETER);
   EXPECT_EQ(CMSetProbableCauseDescription(error, "dust").rc, CMPI_RC_OK);
   EXPECT_EQ(CMSetOtherErrorSourceFormat(error, "ours").rc, CMPI_RC_OK);
   EXPECT_EQ(CMSetCIMStatusCodeDescription(error, "failed").rc, CMPI_RC_OK);

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 namespace Testing {
 
@@ -26,6 +27,8 @@ inline std::string parameter(const std::string& name, const std::string& value) 
   return "<IPARAMVALUE NAME=\"" + name + "\">" + value + "</IPARAMVALUE>";
 }
 
+inline std::string value(const std::string& text) { return "<VALUE>" + text + "</VALUE>"; }
+
 inline std::string className(const std::string& name) {
   return parameter("ClassName", "<CLASSNAME NAME=\"" + name + "\"/>");
 }
@@ -37,6 +40,15 @@ inline std::string keyBinding(const std::string& name, const std::string& value,
 
 inline std::string instanceName(const std::string& name, const std::string& keys) {
   return "<INSTANCENAME CLASSNAME=\"" + name + "\">" + keys + "</INSTANCENAME>";
+}
+
+// How often the part stands in the text.
+inline int count(std::string_view text, std::string_view part) {
+  int found = 0;
+  for (auto at = text.find(part); at != std::string_view::npos; at = text.find(part, at + 1)) {
+    ++found;
+  }
+  return found;
 }
 
 }  // namespace Testing

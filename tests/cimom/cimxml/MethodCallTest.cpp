@@ -38,8 +38,6 @@ class MethodCallTest : public EndpointTest {
   }
 };
 
-std::string value(const std::string& text) { return "<VALUE>" + text + "</VALUE>"; }
-
 std::string argument(const std::string& name, const std::string& type, const std::string& content) {
   return "<PARAMVALUE NAME=\"" + name + "\"" + (type.empty() ? "" : " PARAMTYPE=\"" + type + "\"") + ">" + content +
          "</PARAMVALUE>";
@@ -210,6 +208,16 @@ TEST_F(MethodCallTest, AnInstanceShowsWhatItEmbeds) {
   EXPECT_THAT(result, HasSubstr("<PROPERTY.ARRAY NAME=\"Inners\" TYPE=\"string\" EmbeddedObject=\"instance\">"
                                 "<VALUE.ARRAY><VALUE>&lt;INSTANCE "));
   EXPECT_THAT(result, HasSubstr("</VALUE><VALUE.NULL></VALUE.NULL></VALUE.ARRAY>"));
+}
+
+// DSP0201: the attribute follows the qualifier of the declaration, not the value.
+TEST_F(MethodCallTest, WhatMayEmbedAnyObjectSaysSo) {
+  const std::string result =
+      called("Copy", argument("Object", "string\" EmbeddedObject=\"object", value(escaped(numbered))));
+  EXPECT_THAT(result, StartsWith("<RETURNVALUE PARAMTYPE=\"string\" EmbeddedObject=\"object\"><VALUE>&lt;INSTANCE "));
+  EXPECT_THAT(result, HasSubstr("<PARAMVALUE NAME=\"Object\" PARAMTYPE=\"string\" EmbeddedObject=\"object\">"));
+  EXPECT_THAT(returned("EnumerateInstances", className("TEST_Machine")),
+              HasSubstr("<PROPERTY NAME=\"Anything\" TYPE=\"string\" EmbeddedObject=\"object\"><VALUE>&lt;INSTANCE "));
 }
 
 TEST_F(MethodCallTest, AnInstanceThatIsEmbeddedIsTaken) {

@@ -25,8 +25,6 @@ std::string propertyList(const std::vector<std::string>& names) {
   return parameter("PropertyList", "<VALUE.ARRAY>" + values + "</VALUE.ARRAY>");
 }
 
-std::string value(const std::string& text) { return "<VALUE>" + text + "</VALUE>"; }
-
 std::string property(const std::string& name, const std::string& type, const std::string& text) {
   return "<PROPERTY NAME=\"" + name + "\" TYPE=\"" + type + "\">" + value(text) + "</PROPERTY>";
 }
@@ -34,14 +32,6 @@ std::string property(const std::string& name, const std::string& type, const std
 std::string modified(const std::string& name, const std::string& properties) {
   return parameter("ModifiedInstance", "<VALUE.NAMEDINSTANCE>" + name + "<INSTANCE CLASSNAME=\"TEST_Thing\">" +
                                            properties + "</INSTANCE></VALUE.NAMEDINSTANCE>");
-}
-
-int count(const std::string& text, const std::string& part) {
-  int found = 0;
-  for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) {
-    ++found;
-  }
-  return found;
 }
 
 const std::string instanceOne = parameter("InstanceName", thingName());

@@ -12,17 +12,7 @@ using testing::HasSubstr;
 using testing::Not;
 using testing::StartsWith;
 
-std::string text(const std::string& name, const std::string& value) {
-  return parameter(name, "<VALUE>" + value + "</VALUE>");
-}
-
-int count(const std::string& text, const std::string& part) {
-  int found = 0;
-  for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) {
-    ++found;
-  }
-  return found;
-}
+std::string text(const std::string& name, const std::string& value) { return parameter(name, Testing::value(value)); }
 
 // The value of an output parameter; empty if it is null or not there.
 std::string output(const std::string& reply, const std::string& name) {

@@ -29,7 +29,8 @@ constexpr long mostKibOfLargest = 64L << 10U;
 std::map<std::string, double> instructions(std::size_t bytes) {
   const TemporaryDirectory directory;
   const Completed completed = run({"valgrind", "--tool=callgrind", "--callgrind-out-file=" + (directory / "profile"),
-                                   REQUEST_COST, std::to_string(bytes)});
+                                   REQUEST_COST, std::to_string(bytes)},
+                                  {}, std::chrono::seconds(110));
   EXPECT_EQ(completed.status, 0) << completed.errors;
   std::map<std::string, double> counts;
   for (const auto& profile : std::filesystem::directory_iterator(directory.path())) {

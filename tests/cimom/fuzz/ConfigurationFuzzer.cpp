@@ -4,7 +4,6 @@
 #include <sys/mman.h>
 #include <unistd.h>
 
-#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
@@ -19,9 +18,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   if (ftruncate(file, 0) != 0 || pwrite(file, data, size, 0) != static_cast<ssize_t>(size)) {
     std::abort();
   }
-  const std::array<const char*, 3> arguments = {"cimomd", "--config", name.c_str()};
+  static const Cimom::Installation installation = {"/nowhere", "/tmp", "/tmp", "/tmp"};
   try {
-    Cimom::readCommandLine(arguments.size(), arguments.data(), {"/nowhere", "/tmp", "/tmp", "/tmp"});
+    Cimom::readConfiguration(name, installation);
   } catch (const Cimom::UsageError& error) {
     const std::string_view text = error.what();
     if (!text.starts_with(name) && !text.starts_with("tls-certificate and tls-key")) {

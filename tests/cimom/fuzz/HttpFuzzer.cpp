@@ -4,6 +4,7 @@
 #include <unistd.h>
 
 #include <array>
+#include <cerrno>
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
@@ -51,8 +52,16 @@ std::size_t exchange(Http::Server& server, const std::uint8_t* data, std::size_t
   }
   const Ground::Descriptor client(sockets[0]);
   server.adopt(sockets[1]);
-  // The socket takes what the fuzzer makes at once, 4 kB by default.
-  if (size > 0 && send(client.number(), data, size, MSG_NOSIGNAL) < 0) {
+  // libFuzzer's clock interrupts what waits.
+  const auto retried = [](auto call) {
+    ssize_t result = 0;
+    do {
+      result = call();
+    } while (result < 0 && errno == EINTR);
+    return result;
+  };
+  // The socket takes what the fuzzer makes at once.
+  if (size > 0 && retried([&] { return send(client.number(), data, size, MSG_NOSIGNAL); }) < 0) {
     return 0;
   }
   if (ends) {
@@ -61,7 +70,7 @@ std::size_t exchange(Http::Server& server, const std::uint8_t* data, std::size_t
   std::array<char, 4096> buffer{};
   std::size_t received = 0;
   ssize_t count = 0;
-  while ((count = read(client.number(), buffer.data(), buffer.size())) > 0) {
+  while ((count = retried([&] { return read(client.number(), buffer.data(), buffer.size()); })) > 0) {
     received += static_cast<std::size_t>(count);
   }
   return received;

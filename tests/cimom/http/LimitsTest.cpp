@@ -231,10 +231,25 @@ TEST_F(LimitsTest, OutlivesAHandlerThatEndsItsThread) {
   for (int i = 0; i < 3; ++i) {
     const Response ended = HttpClient(server_->port()).post("/exit", "");
     EXPECT_EQ(ended.status, 500u);
-    EXPECT_EQ(ended.body, "the provider ended the thread of the request\n");
+    EXPECT_EQ(ended.body, "a provider ended the thread of its request\n");
     EXPECT_TRUE(poll([&] { return client.post("/", "").status == 200; }));
   }
   EXPECT_TRUE(server_->drain(10s));
+}
+
+thread_local std::string culprit;
+
+TEST_F(LimitsTest, SaysWhoEndedTheThreadOfTheRequest) {
+#ifdef SANITIZED
+  GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
+#endif
+  options_.threadEnd = []() -> const std::string& { return culprit; };
+  start([](const Request& request) -> Response {
+    culprit = request.path == "/unknown" ? "" : "provider TST_Other did";
+    pthread_exit(nullptr);
+  });
+  EXPECT_EQ(HttpClient(server_->port()).post("/", "").body, "provider TST_Other did\n");
+  EXPECT_EQ(HttpClient(server_->port()).post("/unknown", "").body, "a provider ended the thread of its request\n");
 }
 
 TEST_F(LimitsTest, AnswersAHandlerWithoutMemoryAndOneThatThrowsNoException) {

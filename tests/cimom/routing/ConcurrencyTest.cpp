@@ -14,9 +14,9 @@ using namespace Testing;
 struct StatelessProvider {
   static CMPIStatus cleanup(CMPIInstanceMI*, const CMPIContext*, CMPIBoolean) { return ok; }
 
-  static CMPIStatus enumerateInstances(CMPIInstanceMI* mi, const CMPIContext* context, const CMPIResult* result,
+  static CMPIStatus enumerateInstances(CMPIInstanceMI* self, const CMPIContext* context, const CMPIResult* result,
                                        const CMPIObjectPath* asked, const char**) {
-    const auto* broker = static_cast<const CMPIBroker*>(mi->hdl);
+    const auto* broker = static_cast<const CMPIBroker*>(self->hdl);
     const CMPIInstance* system = CMNewInstance(broker, asked, nullptr);
     const CMPIData name = CMGetContextEntry(context, CMPIPrincipal, nullptr);
     CMSetProperty(system, "Name", &name.value.string, CMPI_string);

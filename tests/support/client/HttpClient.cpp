@@ -55,6 +55,8 @@ bool HttpClient::send(std::string_view bytes) {
   return true;
 }
 
+void HttpClient::finish() const { shutdown(socket_, SHUT_WR); }
+
 bool HttpClient::fill() {
   std::array<char, 65536> chunk{};
   const ssize_t received = recv(socket_, chunk.data(), chunk.size(), 0);

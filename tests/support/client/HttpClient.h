@@ -22,6 +22,9 @@ class HttpClient {
   // Returns false if the server has closed its end.
   bool send(std::string_view bytes);
 
+  // Sends no more: the server reads the end of what there is.
+  void finish() const;
+
   // The next response, its body decoded where it is chunked; one with status 100 counts.
   Cimom::Http::Response receive();
 

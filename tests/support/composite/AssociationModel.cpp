@@ -25,8 +25,6 @@ namespace Testing {
 
 namespace {
 
-using Strings = std::vector<std::string>;
-
 const Outcome goesOn = {Outcome::Course::GoesOn};
 const Outcome succeedsSilently = {Outcome::Course::Ends, 0};
 const Outcome failsSilently = {Outcome::Course::Ends, 1};

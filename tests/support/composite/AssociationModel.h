@@ -13,6 +13,8 @@
 
 namespace Testing {
 
+using Strings = std::vector<std::string>;
+
 // What a builder does about a failure.
 struct Outcome {
   enum class Course { GoesOn, Ends };

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cmpift.h>
+#include <gtest/gtest.h>
 
 #include <ostream>
 #include <string>
@@ -25,6 +26,9 @@ struct Unit {
   CreateAssociationMI* createAssociationMI;  // null for the six that serve no association
   bool acceptsModify;
 };
+
+// The name of a test that is run for each of several units.
+inline std::string nameOf(const ::testing::TestParamInfo<Unit>& info) { return info.param.file; }
 
 inline void PrintTo(const Unit& unit, std::ostream* stream) { *stream << unit.file; }
 

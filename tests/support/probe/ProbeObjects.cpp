@@ -99,6 +99,7 @@ CMPIInstance* machine(const CMPIBroker* broker, const char* nameSpace) {
   CMSetProperty(instance, "Name", "machine", CMPI_chars);
   CMSetProperty(instance, "Inner", &inner, CMPI_instance);
   CMSetProperty(instance, "Inners", &inners, CMPI_instanceA);
+  CMSetProperty(instance, "Anything", &inner, CMPI_instance);
   return instance;
 }
 

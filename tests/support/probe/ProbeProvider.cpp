@@ -3,6 +3,7 @@
 // provider tells there by files what it does: "reached" once a request for TEST_Slow waits, which it does until there
 // is a file "go", and "cleaned" once it has been cleaned up.
 #include <cmpimacs.h>
+#include <pthread.h>
 #include <strings.h>
 
 #include <chrono>
@@ -189,6 +190,13 @@ CMPIStatus echo(const CMPIResult* result, const CMPIArgs* in, CMPIArgs* out) {
   return CMReturnData(result, arrived.c_str(), CMPI_chars);
 }
 
+// Returns the one argument, and adds it to the output arguments.
+CMPIStatus copy(const CMPIResult* result, const CMPIArgs* in, CMPIArgs* out) {
+  const CMPIData object = CMGetArg(in, "Object", nullptr);
+  CMAddArg(out, "Object", &object.value, object.type);
+  return CMReturnData(result, &object.value, object.type);
+}
+
 CMPIStatus odd(const CMPIResult* result, CMPIArgs* out) {
   const CMPIUint32 number = 7;
   CMAddArg(out, "wide", &number, CMPI_uint32);
@@ -206,11 +214,17 @@ CMPIStatus ProbeInvokeMethod(CMPIMethodMI*, const CMPIContext* context, const CM
     const CMPIData caller = CMGetContextEntry(context, CMPIPrincipal, nullptr);
     return CMReturnData(result, &caller.value.string, CMPI_string);
   }
+  if (name == "Copy") {
+    return copy(result, in, out);
+  }
   if (name == "Odd") {
     return odd(result, out);
   }
   if (name == "Wrong") {
     return CMReturnData(result, "text", CMPI_chars);
+  }
+  if (name == "Exit") {
+    pthread_exit(nullptr);
   }
   if (name == "Silent") {
     return CMReturnDone(result);

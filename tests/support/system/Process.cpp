@@ -149,10 +149,10 @@ std::string Process::output() const { return readFile(directory_ / "output"); }
 
 std::string Process::errors() const { return readFile(directory_ / "errors"); }
 
-Completed run(const std::vector<std::string>& command, const Environment& environment) {
+Completed run(const std::vector<std::string>& command, const Environment& environment, std::chrono::seconds patience) {
   Process process(command, environment);
   process.closeInput();
-  const int status = process.wait();
+  const int status = process.wait(patience);
   return {status, process.output(), process.errors()};
 }
 

@@ -66,6 +66,7 @@ struct Completed {
 };
 
 // Runs a program that is given nothing on its standard input.
-Completed run(const std::vector<std::string>& command, const Environment& environment = {});
+Completed run(const std::vector<std::string>& command, const Environment& environment = {},
+              std::chrono::seconds patience = std::chrono::seconds(30));
 
 }  // namespace Testing

@@ -83,6 +83,10 @@ NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, I
   return interface;
 }
 
+std::optional<Ipv4Address> readAddress(IpmiTransport& transport, std::uint8_t channel) {
+  return addressIn<Ipv4Address>(getParameter(transport, channel, LanParameter::IpAddress));
+}
+
 std::string interfaceName(std::uint8_t channel) { return std::string(namePrefix) + std::to_string(channel); }
 
 std::optional<std::uint8_t> channelOf(const std::string& name) {

@@ -18,6 +18,9 @@ namespace QV::Ipmi {
 // IpmiError if the exchange fails or the channel reports nothing at all, which means that it is no LAN channel.
 NetworkInterface readInterface(IpmiTransport& transport, std::uint8_t channel, Ipv6Choice& ipv6);
 
+// The channel's address alone, absent where it is zero: one round trip.
+std::optional<Ipv4Address> readAddress(IpmiTransport& transport, std::uint8_t channel);
+
 // The node name of a channel, "lan1", and the channel of a node name; nothing if the name is none.
 std::string interfaceName(std::uint8_t channel);
 std::optional<std::uint8_t> channelOf(const std::string& interfaceName);

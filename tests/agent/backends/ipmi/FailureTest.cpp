@@ -29,7 +29,7 @@ auto refusal(const std::string& text) { return ThrowsMessage<std::runtime_error>
 
 constexpr auto operationTimeout = 1000ms;
 // What a busy machine takes to wake a thread.
-constexpr auto tolerance = 200ms;
+constexpr auto tolerance = 1000ms;
 
 BackEndSettings impatient(BackEndSettings settings) {
   settings["operation_timeout"] = "1";

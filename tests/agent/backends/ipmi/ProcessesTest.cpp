@@ -43,12 +43,12 @@ class IpmiProcessesTest : public testing::Test {
 
 TEST_F(IpmiProcessesTest, SeeEachOthersChangesWithTheNextRead) {
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
-  EXPECT_EQ(wire.requests(), 11u);
+  EXPECT_EQ(wire.requests(), 12u);
 
   wire.reset();
   EXPECT_EQ(ask(writer, "change 192.0.2.77 255.255.255.128"), "done");
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.77/255.255.255.128");
-  EXPECT_EQ(wire.requests(), 4u);
+  EXPECT_EQ(wire.requests(), 5u);
 
   EXPECT_EQ(ask(reader, "change 192.0.2.78 255.255.255.0"), "done");
   EXPECT_EQ(ask(writer, "read"), "lan1 192.0.2.78/255.255.255.0");

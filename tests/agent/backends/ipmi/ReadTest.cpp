@@ -55,6 +55,21 @@ TEST(IpmiReadTest, ShowsWhatAnotherClientChanged) {
   EXPECT_EQ(interface.ipv4Origin, AddressOrigin::Static);
 }
 
+// Each change is made whole while a look is between its round trips.
+TEST(IpmiReadTest, ShowsNoAddressWithTheMaskOfAnother) {
+  const SimulatedBmc bmc;
+  IpmiBackEnd backEnd(parseSettings(bmc.settings()));
+  const auto readAround = [&](const std::string& address, const std::string& mask) {
+    bmc.hook("get", "[ $1 = subnet_mask ] && mv on-get done-get && sed -i 's/^ip_addr=.*/ip_addr=" + address +
+                        "/; s/^subnet_mask=.*/subnet_mask=" + mask + "/' lan.state; exit 0");
+    const auto interface = backEnd.read().interfaces.at(0);
+    EXPECT_EQ(interface.ipv4Address, QV::ipv4(address));
+    EXPECT_EQ(interface.ipv4SubnetMask, QV::mask(mask));
+  };
+  readAround("192.0.2.77", "255.255.255.128");
+  readAround("198.51.100.5", "255.255.0.0");
+}
+
 TEST(IpmiReadTest, KeepsASnapshotForTheCacheTime) {
   const SimulatedBmc bmc;
   auto settings = parseSettings(bmc.settings());

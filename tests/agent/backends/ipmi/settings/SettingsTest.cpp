@@ -144,7 +144,8 @@ TEST_F(IpmiSettingsTest, RefuseBadValuesByNameAndReason) {
                         {"generation_file", "", "must be an absolute path"},
                         {"password_file", "/nowhere/password", "cannot be read: No such file"}};
   for (const auto& [key, value, reason] : cases) {
-    EXPECT_THAT([&] { parseSettings(lan({{key, value}})); }, refusal(key, reason)) << key << " = " << value;
+    const BackEndSettings settings = lan({{key, value}});
+    EXPECT_THAT([&] { parseSettings(settings); }, refusal(key, reason)) << key << " = " << value;
   }
 }
 

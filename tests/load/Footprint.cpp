@@ -1,0 +1,46 @@
+// SPDX-License-Identifier: Apache-2.0
+#include "tests/load/Footprint.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <filesystem>
+#include <sstream>
+
+#include "tests/support/system/TemporaryDirectory.h"
+
+namespace Testing {
+namespace {
+
+std::string entryOf(pid_t process, const char* name) { return "/proc/" + std::to_string(process) + '/' + name; }
+
+}  // namespace
+
+long residentKib(pid_t process) {
+  std::istringstream status(readFile(entryOf(process, "status")));
+  for (std::string word; status >> word;) {
+    long size = 0;
+    if (word == "VmRSS:" && status >> size) {
+      return size;
+    }
+  }
+  return 0;
+}
+
+std::vector<std::string> descriptorsOf(pid_t process) {
+  std::vector<std::string> targets;
+  std::error_code gone;  // one that is closed while this looks
+  for (const auto& entry : std::filesystem::directory_iterator(entryOf(process, "fd"), gone)) {
+    const std::string target = std::filesystem::read_symlink(entry.path(), gone).string();
+    // "socket:[4711]": which one it is does not matter.
+    targets.push_back(target.substr(0, target.find(":[")));
+  }
+  std::ranges::sort(targets);
+  return targets;
+}
+
+std::size_t configured(const char* variable, std::size_t otherwise) {
+  const char* text = std::getenv(variable);
+  return text ? std::stoul(text) : otherwise;
+}
+
+}  // namespace Testing

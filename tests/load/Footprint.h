@@ -1,0 +1,30 @@
+// SPDX-License-Identifier: Apache-2.0
+// What a process holds: its memory and its descriptors.
+#pragma once
+
+#include <sys/types.h>
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+namespace Testing {
+
+// What it has in memory, in KiB.
+long residentKib(pid_t process);
+
+// How much more it may have at the end: an allocator grows in steps, and the sanitizers keep for a while what has been
+// freed.
+#ifdef SANITIZED
+inline constexpr long toleratedKib = 32 << 10;
+#else
+inline constexpr long toleratedKib = 2 << 10;
+#endif
+
+// What its descriptors lead to, sorted: "socket", "/var/log/agent.log" and the like.
+std::vector<std::string> descriptorsOf(pid_t process);
+
+// A number that the environment gives to a long run; else the one of the short run, which the suite has.
+std::size_t configured(const char* variable, std::size_t otherwise);
+
+}  // namespace Testing
