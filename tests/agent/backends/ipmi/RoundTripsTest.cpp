@@ -277,7 +277,7 @@ TEST(IpmiRoundTripsTest, AreOneLessInALaterSessionThatFindsTheChannelKnown) {
   bmc.ipmitool({"lan", "set", "1", "ipsrc", "static"});
   UdpRelay wire(bmc.port());
   auto settings = bmc.settings(wire.port());
-  settings["session_timeout"] = "0.4";
+  settings["session_timeout"] = "1.2";
   IpmiBackEnd backEnd(parseSettings(settings));
   backEnd.read();
   const auto giveBack = [&] {
