@@ -4,12 +4,12 @@
 #include <cmpimacs.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <atomic>
 #include <cstdlib>
 #include <map>
 #include <memory>
 #include <mutex>
-#include <ranges>
 #include <string>
 #include <thread>
 #include <vector>
@@ -52,8 +52,9 @@ class Client {
     answers += enumerated([&](const CMPIContext* context, CMPIStatus* status) {
       return CBExecQuery(broker_, context, all.get(), "SELECT * FROM CIM_System", "WQL", status);
     });
-    const std::vector<Path> objects = objectsOf(unit.className);
-    for (const Path& object : objects | std::views::take(most)) {
+    std::vector<Path> objects = objectsOf(unit.className);
+    objects.resize(std::min(objects.size(), most));
+    for (const Path& object : objects) {
       answers += operationsOn(object.get());
       for (const Unit& association : associationUnits()) {
         answers += traversed(object.get(), association.className.c_str());

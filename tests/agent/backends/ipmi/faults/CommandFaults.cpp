@@ -75,21 +75,21 @@ extern "C" int ipmi_cmd_raw(ipmi_ctx_t context, std::uint8_t lun, std::uint8_t n
                             unsigned requestSize, void* answer, unsigned answerSize) {
   using Kind = Testing::CommandFault::Kind;
   static const auto real = reinterpret_cast<decltype(&ipmi_cmd_raw)>(::dlsym(RTLD_NEXT, "ipmi_cmd_raw"));
-  const auto fault = Testing::faultOf(networkFunction, request, requestSize);
-  if (fault && fault->kind == Kind::LostBefore) {
+  const auto wanted = Testing::faultOf(networkFunction, request, requestSize);
+  if (wanted && wanted->kind == Kind::LostBefore) {
     return -1;
   }
-  if (fault && fault->kind == Kind::Refused) {
+  if (wanted && wanted->kind == Kind::Refused) {
     auto* const bytes = static_cast<std::uint8_t*>(answer);
     bytes[0] = *static_cast<const std::uint8_t*>(request);
-    bytes[1] = fault->completionCode;
+    bytes[1] = wanted->completionCode;
     return 2;
   }
   const int length = real(context, lun, networkFunction, request, requestSize, answer, answerSize);
-  if (!fault || length < 0) {
+  if (!wanted || length < 0) {
     return length;
   }
-  switch (fault->kind) {
+  switch (wanted->kind) {
     case Kind::CutToNothing:
       return std::min(length, 1);
     case Kind::CutToCode:
