@@ -12,7 +12,7 @@ namespace {
 constexpr unsigned httpOk = 200;
 
 // The object manager gives up on a provider before.
-constexpr std::chrono::seconds patience{90};
+constexpr std::chrono::seconds replyPatience{90};
 
 // The value of an attribute of the first element of that name; empty if there is none.
 std::string attributeOf(const std::string& xml, const std::string& element, const std::string& name) {
@@ -53,7 +53,7 @@ Answer CimClient::ask(const std::string& method, const std::string& parameters, 
 Answer CimClient::send(const std::string& method, const std::string& object, const std::string& body) {
   try {
     if (!connection_) {
-      connection_.emplace(port_, "127.0.0.1", patience);
+      connection_.emplace(port_, "127.0.0.1", replyPatience);
     }
     auto response = connection_->post("/cimom", body,
                                       "Content-Type: application/xml; charset=\"utf-8\"\r\n"

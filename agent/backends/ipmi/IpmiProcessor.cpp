@@ -23,7 +23,7 @@ std::chrono::milliseconds patience(const IpmiSettings& settings) {
 // and to be seen in the end. A channel's name stays its own, so that no change goes astray meanwhile.
 constexpr std::chrono::minutes channelsHold{10};
 
-constexpr std::chrono::milliseconds betweenLooks{20};
+constexpr std::chrono::milliseconds betweenTries{20};
 
 }  // namespace
 
@@ -108,7 +108,7 @@ std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
 // round trips of a look. An address and mask that were not known to belong together do if they stay and nobody is at
 // work on them. Who has left a lock behind is waited for once, and not for long.
 NetworkInterface IpmiProcessor::look(Channel& channel) {
-  for (const Deadline end(settings_.operationTimeout / 2);; std::this_thread::sleep_for(betweenLooks)) {
+  for (const Deadline end(settings_.operationTimeout / 2);; std::this_thread::sleep_for(betweenTries)) {
     NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
     const AddressPair pair(interface.ipv4Address, interface.ipv4SubnetMask);
     if (channel.known == pair || end.passed() ||
