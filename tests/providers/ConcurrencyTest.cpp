@@ -205,7 +205,8 @@ TEST_F(ConcurrentRequestsTest, SixteenThreadsWithEveryOperationGetInNobodysWay) 
     threads.emplace_back([&, writer] {
       const Client client(manager_.broker());
       const auto objects = client.objectsOf(writer == 0 ? Classes::endpoint : Classes::staticSetting);
-      for (std::size_t round = 1; reading > 0; ++round) {
+      wrong += objects.empty() ? 1 : 0;
+      for (std::size_t round = 1; reading > 0 && !objects.empty(); ++round) {
         wrong += client.modify(objects.at(0).get(), "192.0.2." + std::to_string(1 + round % 200)) == CMPI_RC_OK ? 0 : 1;
       }
     });

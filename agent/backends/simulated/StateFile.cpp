@@ -169,7 +169,11 @@ void StateFile::update(const std::function<std::string(const std::optional<std::
   const fs::path target = followLinks(path_);
   makeDirectoryOf(target);
   const FileLock lock(lockOf(target), lockTimeout);
-  replace(target, edit(readAll(target)));
+  const std::optional<std::string> current = readAll(target);
+  // Those who find no file at the same time each come here: one of them writes it, for the others it is there.
+  if (const std::string text = edit(current); text != current) {
+    replace(target, text);
+  }
 }
 
 }  // namespace QV

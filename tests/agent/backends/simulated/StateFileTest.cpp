@@ -129,6 +129,17 @@ TEST(StateFileTest, StaysAsItIsWhereTheEditThrows) {
   EXPECT_EQ(readFile(directory / "state"), "old");
 }
 
+TEST(StateFileTest, IsNotReplacedByWhatItHolds) {
+  const TemporaryDirectory directory;
+  replace(directory / "state", "same");
+  // Under another name as well, the file stays the same one for as long as nobody replaces it.
+  std::filesystem::create_hard_link(directory / "state", directory / "witness");
+  replace(directory / "state", "same");
+  EXPECT_TRUE(std::filesystem::equivalent(directory / "state", directory / "witness"));
+  replace(directory / "state", "another");
+  EXPECT_FALSE(std::filesystem::equivalent(directory / "state", directory / "witness"));
+}
+
 TEST(StateFileTest, SweepsAwayWhatAKilledWriterLeft) {
   const TemporaryDirectory directory;
   writeFile(directory / "state", "old");
