@@ -13,8 +13,8 @@ namespace Testing {
 // What it has in memory, in KiB.
 long residentKib(pid_t process);
 
-// How much more it may have at the end: an allocator grows in steps, and the sanitizers keep what has been freed and where
-// it came from.
+// How much more it may have at the end: an allocator grows in steps, and the sanitizers keep what has been freed and
+// where it came from.
 #ifdef SANITIZED
 inline constexpr long toleratedKib = 256 << 10;
 #else

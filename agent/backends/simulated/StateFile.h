@@ -41,11 +41,10 @@ class StateFile {
   std::optional<Version> version() const;
 
   // Replaces the text by what `edit` makes of the current one, alone among all processes (the lock is the file's name
-  // with ".lock" after it), and leaves it where `edit` returns the current one; a missing directory is made. What `edit`
-  // throws passes through, and the file stays. Returns
-  // when the new text is on the disk; a new file is for its owner and group, an existing one keeps mode and owner.
-  // Throws std::runtime_error if it cannot be written; the file is then the old one, or the text says that it is
-  // replaced and that only its new name may not be on the disk.
+  // with ".lock" after it), and leaves it where `edit` returns the current one; a missing directory is made. What
+  // `edit` throws passes through, and the file stays. Returns when the new text is on the disk; a new file is for its
+  // owner and group, an existing one keeps mode and owner. Throws std::runtime_error if it cannot be written; the file
+  // is then the old one, or the text says that it is replaced and that only its new name may not be on the disk.
   void update(const std::function<std::string(const std::optional<std::string>& current)>& edit) const;
 
  private:
