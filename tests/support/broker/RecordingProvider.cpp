@@ -16,7 +16,10 @@ struct RecordingProvider::Slots {
     for (; properties && *properties; ++properties) {
       call.properties.emplace_back(*properties);
     }
-    probe.calls.push_back(std::move(call));
+    {
+      const std::lock_guard lock(probe.mutex_);
+      probe.calls.push_back(std::move(call));
+    }
     return probe.answer ? probe.answer(context, result, path, instance) : ok;
   }
 

@@ -5,6 +5,7 @@
 
 #include <functional>
 #include <memory>
+#include <mutex>
 #include <string>
 #include <vector>
 
@@ -26,7 +27,7 @@ struct Call {
 
 // A provider linked into the test that records its calls and answers as the test has set it up to. What it answers with
 // goes through the macros that any provider uses. It is shared with the object managers that it serves, which clean it
-// up when they end.
+// up when they end. Threads may call it side by side; what it has recorded is read when they have returned.
 class RecordingProvider : public std::enable_shared_from_this<RecordingProvider> {
  public:
   // Answers a call of the operation; the instance is null if the operation has none.
@@ -56,6 +57,7 @@ class RecordingProvider : public std::enable_shared_from_this<RecordingProvider>
 
   CMPIStatus cleaned();
 
+  std::mutex mutex_;  // of `calls`
   CMPIInstanceMI instanceMi_;
   CMPIAssociationMI associationMi_;
 };
