@@ -33,7 +33,7 @@ NameList visibleProperties(const Call& call, const std::string& className) {
 Found::Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown)
     : properties(std::move(shown)) {
   requireOk(status, found);
-  objects = std::move(modelOf<Enumeration>(found).items);
+  objects = std::move(ownModelOf<Enumeration>(found).items);
   call.takeHostOf(objects);
 }
 
@@ -79,7 +79,7 @@ void getInstance(Call& call) {
   CMPIStatus status{CMPI_RC_OK, nullptr};
   CMPIInstance* found = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
   requireOk(status, found);
-  const auto instance = Cimom::Value::instance(modelOf<Cimom::Instance>(found));
+  const auto instance = Cimom::Value::instance(heldBy<Cimom::Instance>(found));
   call.takeHostOf({instance});
   const auto scope = call.xml.element("IRETURNVALUE");
   call.writer(filterOf(list)).instance(*instance.embedded());
@@ -92,7 +92,7 @@ void createInstance(Call& call) {
   CMPIObjectPath* created =
       CBCreateInstance(call.manager.broker, call.context, call.objects.path(given.path), instance, &status);
   requireOk(status, created);
-  const auto path = Cimom::Value::reference(modelOf<ObjectPath>(created));
+  const auto path = Cimom::Value::reference(heldBy<ObjectPath>(created));
   call.takeHostOf({path});
   const auto scope = call.xml.element("IRETURNVALUE");
   call.writer().instanceName(*path.path());

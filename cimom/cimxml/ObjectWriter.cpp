@@ -47,7 +47,7 @@ void ObjectWriter::objectPath(const ObjectPath& path) {
   instancePath(path);
 }
 
-void ObjectWriter::instance(const Cimom::Instance& object) { instance(object, object.path()); }
+void ObjectWriter::instance(const Cimom::Instance& object) { instance(object, *object.path()); }
 
 void ObjectWriter::instance(const Cimom::Instance& object, const ObjectPath& path) {
   const auto scope = xml_.element("INSTANCE", "CLASSNAME", path.className);
@@ -85,9 +85,9 @@ void ObjectWriter::type(const char* attributeName, CMPIType type, const Qualifie
 
 void ObjectWriter::namedInstance(const Cimom::Instance& object) {
   const auto scope = xml_.element("VALUE.NAMEDINSTANCE");
-  const ObjectPath path = object.path();
-  instanceName(path);
-  instance(object, path);
+  const Shared<ObjectPath> path = object.path();
+  instanceName(*path);
+  instance(object, *path);
 }
 
 void ObjectWriter::objectWithPath(const Cimom::Instance& object) { withPath("VALUE.OBJECTWITHPATH", object); }
@@ -96,9 +96,9 @@ void ObjectWriter::instanceWithPath(const Cimom::Instance& object) { withPath("V
 
 void ObjectWriter::withPath(const char* element, const Cimom::Instance& object) {
   const auto scope = xml_.element(element);
-  const ObjectPath path = object.path();
-  instancePath(path);
-  instance(object, path);
+  const Shared<ObjectPath> path = object.path();
+  instancePath(*path);
+  instance(object, *path);
 }
 
 void ObjectWriter::value(const Cimom::Value& value) {

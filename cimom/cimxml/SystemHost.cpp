@@ -39,7 +39,7 @@ class Hosts {
   }
 
   void add(const Cimom::Instance& instance) {
-    add(instance.path());
+    add(*instance.path());
     for (std::size_t index = 0; index < instance.size(); ++index) {
       if (const ObjectPath* reference = instance[index].path()) {
         add(*reference);

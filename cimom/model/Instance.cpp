@@ -9,7 +9,7 @@
 
 namespace Cimom {
 
-Instance::Instance(const ClassDefinition& definition, ObjectPath path)
+Instance::Instance(const ClassDefinition& definition, Shared<ObjectPath> path)
     : definition_(&definition), path_(std::move(path)), values_(definition.properties.size()) {
   takeKeys();
 }
@@ -45,26 +45,26 @@ void Instance::setFilter(const std::vector<std::string>& properties) {
   filter_.emplace(properties.begin(), properties.end());
 }
 
-ObjectPath Instance::path() const {
-  ObjectPath complete = path_;
+Shared<ObjectPath> Instance::path() const {
+  Shared<ObjectPath> complete = path_;
   for (std::size_t index = 0; index < size(); ++index) {
     const PropertyDeclaration& property = definition_->properties[index];
     const Value& value = (*this)[index];
     if (!property.isKey() || value.isNull()) {
       continue;
     }
-    const Value* given = complete.keys.find(property.name);
+    const Value* given = complete->keys.find(property.name);
     if (!given || given->isNull()) {
-      complete.keys.set(property.name, value);
+      complete.own().keys.set(property.name, value);
     }
   }
   return complete;
 }
 
-void Instance::setPath(ObjectPath path) {
-  if (!sameName(path.className, definition_->name)) {
+void Instance::setPath(Shared<ObjectPath> path) {
+  if (!sameName(path->className, definition_->name)) {
     throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER,
-                      "an instance of " + definition_->name + " cannot have a path of " + path.className);
+                      "an instance of " + definition_->name + " cannot have a path of " + path->className);
   }
   path_ = std::move(path);
   takeKeys();
@@ -81,7 +81,7 @@ Instance Instance::withoutDefaults() const {
 }
 
 void Instance::takeKeys() {
-  for (const auto& [name, value] : path_.keys) {
+  for (const auto& [name, value] : path_->keys) {
     const PropertyDeclaration* property = definition_->findProperty(name);
     if (!property || !property->isKey()) {
       continue;
