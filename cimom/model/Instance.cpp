@@ -20,7 +20,7 @@ const Value& Instance::operator[](std::size_t index) const {
 
 const Value* Instance::find(std::string_view name) const {
   const PropertyDeclaration* property = definition_->findProperty(name);
-  return property ? &(*this)[static_cast<std::size_t>(property - definition_->properties.data())] : nullptr;
+  return property ? &(*this)[definition_->properties.indexOf(*property)] : nullptr;
 }
 
 void Instance::set(std::string_view name, Value value) {
@@ -38,7 +38,7 @@ void Instance::set(std::string_view name, Value value) {
   if (filter_ && !filter_->contains(property->name) && !property->isKey()) {
     return;
   }
-  values_[static_cast<std::size_t>(property - definition_->properties.data())] = std::move(value);
+  values_[definition_->properties.indexOf(*property)] = std::move(value);
 }
 
 void Instance::setFilter(const std::vector<std::string>& properties) {
@@ -47,15 +47,12 @@ void Instance::setFilter(const std::vector<std::string>& properties) {
 
 Shared<ObjectPath> Instance::path() const {
   Shared<ObjectPath> complete = path_;
-  for (std::size_t index = 0; index < size(); ++index) {
-    const PropertyDeclaration& property = definition_->properties[index];
+  for (const std::size_t index : definition_->keys) {
+    const std::string& name = definition_->properties[index].name;
     const Value& value = (*this)[index];
-    if (!property.isKey() || value.isNull()) {
-      continue;
-    }
-    const Value* given = complete->keys.find(property.name);
-    if (!given || given->isNull()) {
-      complete.own().keys.set(property.name, value);
+    const Value* given = path_->keys.find(name);
+    if (!value.isNull() && (!given || given->isNull())) {
+      complete.own().keys.set(name, value);
     }
   }
   return complete;
