@@ -1,9 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
-#include "cimom/model/NamedList.h"
-
 #include <gtest/gtest.h>
 
 #include <string>
+
+#include "cimom/model/NamedList.h"
 
 namespace {
 

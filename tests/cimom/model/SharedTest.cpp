@@ -1,10 +1,10 @@
 // SPDX-License-Identifier: Apache-2.0
-#include "cimom/model/Shared.h"
-
 #include <gtest/gtest.h>
 
 #include <string>
 #include <utility>
+
+#include "cimom/model/Shared.h"
 
 namespace {
 
