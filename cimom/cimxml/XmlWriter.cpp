@@ -3,15 +3,12 @@
 
 #include <algorithm>
 #include <array>
-#include <new>
 #include <utility>
 
 #include "cimom/cimxml/Utf8.h"
 
 namespace Cimom::CimXml {
 namespace {
-
-using namespace std::literals;
 
 constexpr bool isPlain(unsigned char byte) {
   return byte >= 0x20 && byte < 0x7F && byte != '&' && byte != '<' && byte != '>' && byte != '"';
@@ -64,75 +61,9 @@ Copied copyPlain(std::string_view text, char* to) {
 
 }  // namespace
 
-XmlWriter::XmlWriter(Prolog prolog) {
-  if (prolog == Prolog::Declared) {
-    put("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"sv);
-  }
-}
-
-XmlWriter::Scope::~Scope() {
-  try {
-    writer_.endTag(name_);
-  } catch (const std::bad_alloc&) {
-    writer_.isCut_ = true;
-  }
-}
-
-XmlWriter::Scope XmlWriter::element(std::string_view name) {
-  closeStartTag();
-  put("<"sv, name);
-  inStartTag_ = true;
-  return {*this, name};
-}
-
-XmlWriter::Scope XmlWriter::element(std::string_view name, std::string_view attributeName,
-                                    std::string_view attributeValue) {
-  closeStartTag();
-  put("<"sv, name);
-  inStartTag_ = true;
-  attribute(attributeName, attributeValue);
-  return {*this, name};
-}
-
-void XmlWriter::attribute(std::string_view name, std::string_view value) {
-  put(" "sv, name, "=\""sv);
-  escape(value, Place::AttributeValue);
-  put("\""sv);
-}
-
-void XmlWriter::text(std::string_view text) {
-  closeStartTag();
-  escape(text, Place::Content);
-}
-
-void XmlWriter::textElement(std::string_view name, std::string_view content) {
-  const auto scope = element(name);
-  text(content);
-}
-
-void XmlWriter::written(std::string_view xml) {
-  closeStartTag();
-  put(xml);
-}
-
 std::string XmlWriter::take() {
-  if (isCut_) {
-    throw std::bad_alloc();
-  }
   xml_.resize(std::exchange(size_, 0));
   return std::exchange(xml_, {});
-}
-
-void XmlWriter::endTag(std::string_view name) {
-  closeStartTag();
-  put("</"sv, name, ">"sv);
-}
-
-void XmlWriter::closeStartTag() {
-  if (inStartTag_) {
-    put(">"sv);
-    inStartTag_ = false;
-  }
 }
 
 void XmlWriter::escape(std::string_view text, Place place) {
@@ -155,20 +86,6 @@ void XmlWriter::escape(std::string_view text, Place place) {
   }
 }
 
-template <typename... Pieces>
-void XmlWriter::put(Pieces... pieces) {
-  char* at = room((pieces.size() + ...));
-  ((at = std::copy(pieces.begin(), pieces.end(), at)), ...);
-  size_ = static_cast<std::size_t>(at - xml_.data());
-}
-
-char* XmlWriter::room(std::size_t bytes) {
-  if (xml_.size() - size_ < bytes) {
-    grow(bytes);
-  }
-  return xml_.data() + size_;
-}
-
-void XmlWriter::grow(std::size_t bytes) { xml_.resize(std::max(size_ + bytes, 2 * xml_.size())); }
+void XmlWriter::grow(std::size_t bytes) { xml_.resize(std::max(size_ + reserved_ + bytes, 2 * xml_.size())); }
 
 }  // namespace Cimom::CimXml
