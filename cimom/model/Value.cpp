@@ -31,14 +31,17 @@ void visitInteger(CMPIType type, Union& value, Operation operation) {
 }
 
 std::string quoted(std::string_view text) {
-  std::string result = "\"";
+  std::string result;
+  result.reserve(text.size() + 2);
+  result += '"';
   for (const char letter : text) {
     if (letter == '"' || letter == '\\') {
       result += '\\';
     }
     result += letter;
   }
-  return result + '"';
+  result += '"';
+  return result;
 }
 
 // Every level of references within references would double the text of the innermost.

@@ -56,8 +56,8 @@ int main(int argc, char** argv) {
   // The part is a thing, too.
   Probe::setThings(static_cast<CMPIUint16>(std::atoi(argv[1]) - 1));
   const Server server;
-  const auto request = Server::request(
-      "EnumerateInstances", Testing::intrinsicCall("EnumerateInstances", Testing::className("TEST_Thing")));
+  const auto request = Server::request("EnumerateInstances",
+                                       Testing::intrinsicCall("EnumerateInstances", Testing::className("TEST_Thing")));
   server.endpoint_.handle(request);  // loads and makes what stays
   const long before = allocations;
   CALLGRIND_ZERO_STATS;
