@@ -34,6 +34,11 @@ Found::Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found,
     : properties(std::move(shown)) {
   requireOk(status, found);
   objects = std::move(ownModelOf<Enumeration>(found).items);
+  for (Cimom::Value& object : objects) {
+    if (auto* instance = object.own<Cimom::Instance>()) {
+      instance->completePath();
+    }
+  }
   call.takeHostOf(objects);
 }
 

@@ -39,6 +39,10 @@ class Instance {
 
   // The path with every key that has a value: one given with the path wins over the property's value.
   Shared<ObjectPath> path() const;
+  // Makes that its path, so that it need not be put together again.
+  void completePath() { path_ = path(); }
+  // The namespace of the path.
+  const std::string& nameSpace() const { return path_->nameSpace; }
   // Replaces the path; its keys become values of the key properties.
   // Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER if it is the path of another class.
   void setPath(Shared<ObjectPath> path);

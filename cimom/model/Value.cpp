@@ -174,6 +174,9 @@ void NamedValues::set(std::string_view name, Value value) {
   if (Entry* entry = findNamed(entries_, name)) {
     entry->value = std::move(value);
   } else {
+    if (entries_.empty()) {
+      entries_.reserve(4);  // most paths have no more keys
+    }
     entries_.push_back({std::string(name), std::move(value)});
   }
 }

@@ -34,12 +34,10 @@ Context providerContext(const Operation& operation) {
 void completeNamespace(Value& item, const std::string& nameSpace) {
   if (const ObjectPath* path = item.path(); path && path->nameSpace.empty()) {
     item.own<ObjectPath>()->nameSpace = nameSpace;
-  } else if (const Instance* instance = item.embedded()) {
-    Shared<ObjectPath> own = instance->path();
-    if (own->nameSpace.empty()) {
-      own.own().nameSpace = nameSpace;
-      item.own<Instance>()->setPath(std::move(own));
-    }
+  } else if (const Instance* instance = item.embedded(); instance && instance->nameSpace().empty()) {
+    Shared<ObjectPath> complete = instance->path();
+    complete.own().nameSpace = nameSpace;
+    item.own<Instance>()->setPath(std::move(complete));
   }
 }
 
