@@ -201,4 +201,28 @@ TEST_F(InstanceTest, HoldsACopyOfAReferenceAndOfAnArray) {
   EXPECT_EQ(shownText(CMGetNameSpace(held, nullptr)), testNamespace);
 }
 
+TEST_F(InstanceTest, KeepsItsArrayWhateverHappensToTheOneThatWasSet) {
+  CMPIInstance* instance = CMNewInstance(broker, path("TST_Processor"), nullptr);
+  CMPIArray* notes = CMNewArray(broker, 1, CMPI_string, nullptr);
+  CMSetArrayElementAt(notes, 0, "first", CMPI_chars);
+  CMSetProperty(instance, "Notes", &notes, CMPI_stringA);
+  CMSetArrayElementAt(notes, 0, "second", CMPI_chars);
+  CMPIArray* held = CMGetProperty(instance, "Notes", nullptr).value.array;
+  EXPECT_EQ(shownText(CMGetArrayElementAt(held, 0, nullptr).value.string), "first");
+  CMSetArrayElementAt(held, 0, "third", CMPI_chars);
+  EXPECT_EQ(shownText(CMGetArrayElementAt(notes, 0, nullptr).value.string), "second");
+  held = CMGetProperty(instance, "Notes", nullptr).value.array;
+  EXPECT_EQ(shownText(CMGetArrayElementAt(held, 0, nullptr).value.string), "first");
+}
+
+TEST_F(InstanceTest, KeepsItsPathWhateverHappensToTheOneThatItWasMadeOf) {
+  CMPIObjectPath* given = systemPath("one");
+  const CMPIInstance* instance = CMNewInstance(broker, given, nullptr);
+  CMSetNameSpace(given, "root/elsewhere");
+  CMPIObjectPath* shown = CMGetObjectPath(instance, nullptr);
+  EXPECT_EQ(shownText(CMGetNameSpace(shown, nullptr)), testNamespace);
+  CMSetNameSpace(shown, "root/elsewhere");
+  EXPECT_EQ(shownText(CMGetNameSpace(CMGetObjectPath(instance, nullptr), nullptr)), testNamespace);
+}
+
 }  // namespace

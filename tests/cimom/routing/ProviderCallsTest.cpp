@@ -170,4 +170,28 @@ TEST(ProviderLifeTest, TheFactoryIsCalledOnceAndCleanupOncePerInterface) {
   EXPECT_EQ(probe->cleanups, 2);
 }
 
+TEST_F(ProviderCallsTest, WhatIsReturnedStaysAsItWasWhateverTheProviderDoesToItsOwn) {
+  CMPIInstance* kept = nullptr;
+  probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath* asked, const CMPIInstance*) {
+    CMPIInstance* instance = CMNewInstance(broker, asked, nullptr);
+    CMSetProperty(instance, "Caption", "returned", CMPI_chars);
+    kept = CMClone(instance, nullptr);
+    CMReturnInstance(result, kept);
+    CMReturnInstance(result, instance);
+    CMSetProperty(kept, "Caption", "changed", CMPI_chars);
+    CMSetProperty(instance, "Caption", "changed", CMPI_chars);
+    return ok;
+  };
+  CMPIEnumeration* found = CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, nullptr);
+  CMSetProperty(kept, "Caption", "changed again", CMPI_chars);
+  for (int item = 0; item < 2; ++item) {
+    const CMPIInstance* returned = CMGetNext(found, &status).value.inst;
+    ASSERT_EQ(status.rc, CMPI_RC_OK);
+    EXPECT_EQ(shownText(CMGetProperty(returned, "Caption", nullptr).value.string), "returned");
+    CMSetProperty(returned, "Caption", "the client's", CMPI_chars);
+  }
+  EXPECT_EQ(shownText(CMGetProperty(kept, "Caption", nullptr).value.string), "changed again");
+  EXPECT_EQ(CMRelease(kept).rc, CMPI_RC_OK);
+}
+
 }  // namespace
