@@ -60,7 +60,8 @@ std::string systemHost(const std::vector<Cimom::Value>& objects, const std::stri
   for (const Cimom::Value& object : objects) {
     hosts.add(object);
   }
-  return hosts.only() ? *hosts.only() : otherwise;
+  const std::string* only = hosts.only();
+  return only ? *only : otherwise;
 }
 
 }  // namespace Cimom::CimXml

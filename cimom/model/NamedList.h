@@ -16,9 +16,7 @@ namespace Cimom {
 template <typename Element>
 class NamedList {
  public:
-  using value_type = Element;
-
-  void push_back(Element element) {
+  void add(Element element) {
     elements_.push_back(std::move(element));
     if (2 * elements_.size() > slots_.size()) {
       slots_.assign(std::bit_ceil(4 * elements_.size()), 0);

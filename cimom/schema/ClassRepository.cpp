@@ -2,7 +2,6 @@
 #include "cimom/schema/ClassRepository.h"
 
 #include <algorithm>
-#include <iterator>
 #include <utility>
 
 #include "cimom/model/Errors.h"
@@ -52,15 +51,18 @@ MethodDeclaration inherited(MethodDeclaration method) {
 // Takes the features of the superclass over, those in their place that the class overrides.
 void inherit(ClassDefinition& resolved, const ClassDeclaration& declaration, const ClassDefinition& superclass) {
   inheritQualifiers(resolved.qualifiers, superclass.qualifiers);
-  const auto takenOver = [](const auto& feature) { return inherited(feature); };
   resolved.properties.clear();
   resolved.methods.clear();
-  std::ranges::transform(superclass.properties, std::back_inserter(resolved.properties), takenOver);
-  std::ranges::transform(superclass.methods, std::back_inserter(resolved.methods), takenOver);
+  for (const PropertyDeclaration& property : superclass.properties) {
+    resolved.properties.add(inherited(property));
+  }
+  for (const MethodDeclaration& method : superclass.methods) {
+    resolved.methods.add(inherited(method));
+  }
   for (PropertyDeclaration property : declaration.own.properties) {
     PropertyDeclaration* overridden = resolved.properties.find(property.name);
     if (!overridden) {
-      resolved.properties.push_back(std::move(property));
+      resolved.properties.add(std::move(property));
       continue;
     }
     if (overridden->type != property.type) {
@@ -77,7 +79,7 @@ void inherit(ClassDefinition& resolved, const ClassDeclaration& declaration, con
   for (MethodDeclaration method : declaration.own.methods) {
     MethodDeclaration* overridden = resolved.methods.find(method.name);
     if (!overridden) {
-      resolved.methods.push_back(std::move(method));
+      resolved.methods.add(std::move(method));
       continue;
     }
     inheritQualifiers(method.qualifiers, overridden->qualifiers);

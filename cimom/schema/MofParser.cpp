@@ -202,7 +202,7 @@ void MofParser::feature(ClassDefinition& definition) {
   arrayBounds(property);
   property.defaultValue = accept("=") ? initializer(property.type) : Value::null(property.type);
   expect(";");
-  definition.properties.push_back(std::move(property));
+  definition.properties.add(std::move(property));
 }
 
 void MofParser::method(ClassDefinition& definition, const std::string& name, CMPIType returnType,
@@ -216,7 +216,7 @@ void MofParser::method(ClassDefinition& definition, const std::string& name, CMP
   }
   expect(")");
   expect(";");
-  definition.methods.push_back(std::move(declaration));
+  definition.methods.add(std::move(declaration));
 }
 
 PropertyDeclaration MofParser::parameter() {

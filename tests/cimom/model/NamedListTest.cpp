@@ -18,7 +18,7 @@ TEST(NamedListTest, FindsEveryElementWithoutRegardToCase) {
   Names names;
   EXPECT_EQ(names.find("Name0"), nullptr);
   for (int number = 0; number < 300; ++number) {
-    names.push_back({"Name" + std::to_string(number), number});
+    names.add({"Name" + std::to_string(number), number});
     for (int earlier = 0; earlier <= number; ++earlier) {
       const Named* found = names.find("nAME" + std::to_string(earlier));
       ASSERT_NE(found, nullptr) << earlier;
@@ -32,10 +32,10 @@ TEST(NamedListTest, FindsEveryElementWithoutRegardToCase) {
 
 TEST(NamedListTest, FindsTheFirstOfOneName) {
   Names names;
-  names.push_back({"Name", 1});
-  names.push_back({"NAME", 2});
+  names.add({"Name", 1});
+  names.add({"NAME", 2});
   for (int number = 3; number < 20; ++number) {
-    names.push_back({std::to_string(number), number});
+    names.add({std::to_string(number), number});
     EXPECT_EQ(names.find("name")->number, 1);
   }
   EXPECT_EQ(names.size(), 19U);
@@ -44,11 +44,11 @@ TEST(NamedListTest, FindsTheFirstOfOneName) {
 
 TEST(NamedListTest, FindsNothingOnceItIsCleared) {
   Names names;
-  names.push_back({"Name", 1});
+  names.add({"Name", 1});
   names.clear();
   EXPECT_EQ(names.find("Name"), nullptr);
   EXPECT_TRUE(names.empty());
-  names.push_back({"Name", 2});
+  names.add({"Name", 2});
   EXPECT_EQ(names.find("Name")->number, 2);
 }
 
