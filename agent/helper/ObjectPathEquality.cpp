@@ -112,23 +112,22 @@ bool sameKeysInAnyOrder(const std::optional<Keys>& a, const std::optional<Keys>&
   return a && b && holdsAll(*a, *b) && holdsAll(*b, *a);
 }
 
-// Paths of one class nearly always have their keys in one order, and what tells its instances apart, "Name" or
-// "InstanceID", at the end: a candidate that is another one is left after a look at one key.
+// The paths of one object manager have their keys in one order, and what tells the instances of a class apart, "Name"
+// or "InstanceID", at one of its ends: of a candidate that is another one the rest is not looked at.
 bool sameKeys(const CMPIObjectPath* a, const CMPIObjectPath* b) {
-  const auto countOfA = keyCountOf(a);
-  const auto countOfB = keyCountOf(b);
-  if (!countOfA || countOfA != countOfB) {
+  const auto count = keyCountOf(a);
+  if (!count || count != keyCountOf(b)) {
     return false;
   }
-  for (CMPICount index = *countOfA; index > 0;) {
-    --index;
+  for (CMPICount turn = 0; turn < *count; ++turn) {
+    const CMPICount index = turn == 0 ? 0 : *count - turn;
     const auto keyOfA = keyAt(a, index);
     const auto keyOfB = keyAt(b, index);
     if (!keyOfA || !keyOfB) {
       return false;
     }
     if (!textEqual(keyOfA->name, keyOfB->name)) {
-      return sameKeysInAnyOrder(keysOf(a, *countOfA), keysOf(b, *countOfB));
+      return sameKeysInAnyOrder(keysOf(a, *count), keysOf(b, *count));
     }
     if (!sameValue(keyOfA->value, keyOfB->value)) {
       return false;
