@@ -176,6 +176,7 @@ void measureMemory(Results& results) {
   const auto sendAll = [&](int count, std::size_t size) {
     for (const CostlyRequest& request : costlyRequests()) {
       std::vector<std::jthread> all;
+      all.reserve(static_cast<std::size_t>(count));
       for (int client = 0; client < count; ++client) {
         all.emplace_back([&] { send(cimomd.port(), request, size); });
       }
