@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <stdexcept>
 
 #include "Paths.h"
 #include "bench/Measurements.h"
@@ -20,13 +21,37 @@ namespace {
 using Testing::Cost;
 using Testing::TemporaryDirectory;
 
-// The program `workload` with a part of it, on a simulated processor whose agent writes no line.
+// A simulated processor whose agent writes no line.
+class Processor {
+ public:
+  explicit Processor(int interfaces)
+      : environment_{
+            {"QV_AGENT_INI", directory_.write("agent.ini", Testing::quietAgent(directory_.write(
+                                                               "state.json", Testing::stateOf(interfaces))))}} {}
+
+  const Testing::Environment& environment() const { return environment_; }
+
+ private:
+  const TemporaryDirectory directory_;
+  const Testing::Environment environment_;
+};
+
+std::vector<std::string> command(const char* part, int interfaces) {
+  return {BINARY_DIR "/bin/workload", part, std::to_string(interfaces)};
+}
+
+// What the steps of a part of the program `workload` cost.
 std::map<std::string, Cost> workload(const char* part, int interfaces) {
-  const TemporaryDirectory directory;
-  const std::string ini =
-      directory.write("agent.ini", Testing::quietAgent(directory.write("state.json", Testing::stateOf(interfaces))));
-  return Testing::costsOf({BINARY_DIR "/bin/workload", part, std::to_string(interfaces)}, {{"QV_AGENT_INI", ini}},
-                          std::chrono::minutes(5));
+  return Testing::costsOf(command(part, interfaces), Processor(interfaces).environment(), std::chrono::minutes(5));
+}
+
+// The most memory that a part takes by itself, in KiB.
+double peakOf(const char* part, int interfaces) {
+  const auto completed = Testing::run(command(part, interfaces), Processor(interfaces).environment());
+  if (completed.status != 0) {
+    throw std::runtime_error(completed.errors);
+  }
+  return std::stod(completed.output);
 }
 
 constexpr int usual = 34;
@@ -88,6 +113,8 @@ void measureAssociations(Results& results) {
     const int objects = step == "enumerate pairs" ? interfaces * settings : settings;
     results.figures[step] = cost.instructions / objects;
   }
+  constexpr int many = 100;
+  results.figures["memory of a pair"] = (peakOf("associations", many) - peakOf("associations", 1)) / (many * 2 * many);
 }
 
 void measureRequests(Results& results) {

@@ -18,6 +18,7 @@ const std::vector<Row> rows = {
     {"associations", "references", "References, for each object answered", "instructions"},
     {"associations", "reference names", "ReferenceNames, for each object answered", "instructions"},
     {"associations", "enumerate pairs", "EnumerateInstances of an association, for each pair", "instructions"},
+    {"associations", "memory of a pair", "Memory of a pair meanwhile", "KiB"},
     {"requests", "allocations", "Allocations of one request of 34 instances", "allocations", 3000},
     {"requests", "growth", "An instance of 10,000 beside an instance of 100, instructions", "times", 1.20},
     {"echo", "echo 3", "cimomd beside an HTTP echo of the same bytes, processor time: 3 instances", "times", 12},

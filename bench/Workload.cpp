@@ -1,9 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 // workload PART INTERFACES: carries out one part of what is measured, on a simulated management processor with that
 // many interfaces, whose agent.ini the environment names. Under callgrind each step is counted alone and dumped under
-// its name; a step is warmed up first, so that what is done once in a process is not counted.
+// its name; a step is warmed up first, so that what is done once in a process is not counted. Prints the most memory
+// that it took, in KiB.
 #include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
+#include <sys/resource.h>
 #include <valgrind/callgrind.h>
 
 #include <cstdlib>
@@ -244,6 +246,9 @@ int main(int argc, char** argv) {
   }
   try {
     part->second(std::atoi(argv[2]));
+    rusage usage{};
+    ::getrusage(RUSAGE_SELF, &usage);
+    std::cout << usage.ru_maxrss << '\n';
     return 0;
   } catch (const std::exception& error) {
     std::cerr << "workload: " << part->first << ": " << error.what() << '\n';
