@@ -2,9 +2,9 @@
 // The CMPI instance provider of the underlying classes, one algorithm over their table. Read only: the processor is
 // changed through the instrumentation. Object managers do hand out null objects with a good status, and good pointers
 // beside a bad one: what is made or delivered is looked at, and a request that cannot go on says why.
-#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
+#include <cstring>
 #include <exception>
 #include <functional>
 #include <stdexcept>
@@ -79,9 +79,10 @@ void setProperty(const Setter& set, const Property& property) {
   std::visit([&](const auto& value) { setValue(set, property.name, value); }, property.value);
 }
 
+// Both names are of this library's own tables, spelled alike.
 bool isKey(const UnderlyingClass& underlyingClass, const Property& property) {
   for (const char* key : underlyingClass.keys) {
-    if (textEqual(key, property.name)) {
+    if (key && std::strcmp(key, property.name) == 0) {
       return true;
     }
   }
