@@ -1,4 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
+#include <malloc.h>
 #include <netdb.h>
 #include <unistd.h>
 
@@ -170,6 +171,14 @@ Http::ServerOptions serverOptions(const Configuration& configuration) {
   return options;
 }
 
+// A body or a reply of this size is a mapping of its own, which is the system's again as soon as it is freed. Left
+// alone the allocator raises the size with every such block, until even the largest stay in its pools. What requests
+// usually take stays there for the next one.
+void boundKeptMemory() {
+  mallopt(M_MMAP_THRESHOLD, 256 << 10);
+  mallopt(M_TRIM_THRESHOLD, 1 << 20);
+}
+
 void chooseUser(const Configuration& configuration) {
   if (!configuration.user.empty()) {
     becomeUser(configuration.user);
@@ -179,6 +188,7 @@ void chooseUser(const Configuration& configuration) {
 }
 
 void serve(const Configuration& configuration, Signals& signals) {
+  boundKeptMemory();
   chooseUser(configuration);
   ObjectManager manager;
   if (configuration.trace) {

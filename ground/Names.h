@@ -22,9 +22,10 @@ struct NameLess {
   }
 };
 
+// Most names come as they were declared.
 inline bool sameName(std::string_view left, std::string_view right) {
-  return std::equal(left.begin(), left.end(), right.begin(), right.end(),
-                    [](char a, char b) { return lowerCase(a) == lowerCase(b); });
+  return left == right || std::equal(left.begin(), left.end(), right.begin(), right.end(),
+                                     [](char a, char b) { return lowerCase(a) == lowerCase(b); });
 }
 
 }  // namespace Ground

@@ -26,10 +26,10 @@ Value arrayFromCmpi(const CMPIArray* array, CMPIType stored) {
   if (!array) {
     return Value::null(stored);
   }
-  const Array& source = modelOf<Array>(array);
-  if (source.elementType != elementTypeOf(stored)) {
+  const Shared<Array>& source = heldBy<Array>(array);
+  if (source->elementType != elementTypeOf(stored)) {
     throw StatusError(CMPI_RC_ERR_TYPE_MISMATCH,
-                      "expected " + describeType(stored) + ", not " + describeType(arrayOf(source.elementType)));
+                      "expected " + describeType(stored) + ", not " + describeType(arrayOf(source->elementType)));
   }
   return Value::array(source);
 }
@@ -71,9 +71,9 @@ Value fromCmpi(const CMPIValue* value, CMPIType type) {
     case CMPI_string:
       return Value::string(textOf(member<const CMPIString*>(value)));
     case CMPI_ref:
-      return Value::reference(modelOf<ObjectPath>(member<const CMPIObjectPath*>(value)));
+      return Value::reference(heldBy<ObjectPath>(member<const CMPIObjectPath*>(value)));
     case CMPI_instance:
-      return Value::instance(modelOf<Instance>(member<const CMPIInstance*>(value)));
+      return Value::instance(heldBy<Instance>(member<const CMPIInstance*>(value)));
     case CMPI_args:
       return Value::arguments(modelOf<Args>(member<const CMPIArgs*>(value)).arguments);
     case CMPI_enumeration:
@@ -87,15 +87,15 @@ CMPIData toCmpi(const Value& value, CMPIValueState state) {
   CMPIData data = {value.type(), state, {}};
   if (const CMPIValue* scalar = value.scalar()) {
     data.value = *scalar;
-  } else if (const std::string* text = value.text()) {
+  } else if (const auto* text = value.shared<std::string>()) {
     data.value.string = make(Text{*text});
   } else if (const DateTime* time = value.time()) {
     data.value.dateTime = make(*time);
-  } else if (const ObjectPath* reference = value.path()) {
+  } else if (const auto* reference = value.shared<ObjectPath>()) {
     data.value.ref = make(*reference);
-  } else if (const Instance* instance = value.embedded()) {
+  } else if (const auto* instance = value.shared<Instance>()) {
     data.value.inst = make(*instance);
-  } else if (const Array* array = value.elements()) {
+  } else if (const auto* array = value.shared<Array>()) {
     data.value.array = make(*array);
   } else if (const NamedValues* arguments = value.arguments()) {
     data.value.args = make(Args{*arguments});

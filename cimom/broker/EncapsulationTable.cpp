@@ -21,8 +21,8 @@ auto made(const CMPIBroker* broker, CMPIStatus* status, Operation operation) {
 
 CMPIInstance* newInstance(const CMPIBroker* broker, const CMPIObjectPath* path, CMPIStatus* status) {
   return made(broker, status, [&] {
-    const ObjectPath& model = argumentOf<ObjectPath>(path);
-    return make(Instance(coreOf(broker).requireClass(model.nameSpace, model.className), model));
+    const Shared<ObjectPath>& model = argumentOf<ObjectPath>(path);
+    return make(Instance(coreOf(broker).requireClass(model->nameSpace, model->className), model));
   });
 }
 
@@ -74,7 +74,7 @@ CMPISelectExp* newSelectExp(const CMPIBroker* broker, const char*, const char*, 
 CMPIBoolean classPathIsA(const CMPIBroker* broker, const CMPIObjectPath* path, const char* className,
                          CMPIStatus* status) {
   return made(broker, status, [&] {
-    const ObjectPath& model = argumentOf<ObjectPath>(path);
+    const ObjectPath& model = *argumentOf<ObjectPath>(path);
     const ClassDefinition& definition = coreOf(broker).requireClass(model.nameSpace, model.className);
     return static_cast<CMPIBoolean>(definition.isA(required(className, "the class's name")));
   });
@@ -123,7 +123,7 @@ std::string described(const Instance& instance) {
       properties.set(instance.definition().properties[index].name, instance[index]);
     }
   }
-  return instance.path().toString() + " " + listed(properties);
+  return instance.path()->toString() + " " + listed(properties);
 }
 
 struct ObjectType {

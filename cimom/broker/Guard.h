@@ -79,7 +79,7 @@ typename Abi<Model>::Type* clone(const typename Abi<Model>::Type* object, CMPISt
     if constexpr (std::is_same_v<Model, Text>) {
       return new Handle<Text>(Text{textOf(object)});
     } else {
-      return new Handle<Model>(modelOf<Model>(object));
+      return new Handle<Model>(heldBy<Model>(object));
     }
   });
 }

@@ -3,7 +3,6 @@
 
 #include <cmpift.h>
 
-#include <memory>
 #include <string>
 #include <type_traits>
 #include <utility>
@@ -12,6 +11,7 @@
 #include "cimom/broker/RequestScope.h"
 #include "cimom/model/Errors.h"
 #include "cimom/model/Instance.h"
+#include "cimom/model/Shared.h"
 
 namespace Cimom {
 
@@ -40,21 +40,40 @@ CIMOM_ABI(Error, CMPIError);
 
 #undef CIMOM_ABI
 
+// How a model stands behind its object: paths, instances and arrays are shared with the values that they came from or
+// went to.
+template <typename Model>
+struct Held {
+  using Type = Model;
+};
+template <>
+struct Held<ObjectPath> {
+  using Type = Shared<ObjectPath>;
+};
+template <>
+struct Held<Instance> {
+  using Type = Shared<Instance>;
+};
+template <>
+struct Held<Array> {
+  using Type = Shared<Array>;
+};
+
 // A CMPI object: the struct that providers see, and the model behind it. The struct's handle is this object, but for
 // strings it is the characters, as providers that read a string's handle directly expect.
 template <typename Model>
 struct Handle final : Object, Abi<Model>::Type {
-  explicit Handle(Model contents, bool ownedElsewhere = false) : model(std::move(contents)) {
+  explicit Handle(typename Held<Model>::Type contents, bool ownedElsewhere = false) : model(std::move(contents)) {
     inScope = ownedElsewhere;
     if constexpr (std::is_same_v<Model, Text>) {
-      this->hdl = model.characters.data();
+      this->hdl = const_cast<char*>(model.characters->data());
     } else {
       this->hdl = this;
     }
     this->ft = &Abi<Model>::table;
   }
 
-  Model model;
+  typename Held<Model>::Type model;
 };
 
 // A CMPI object for the time of a call, on the caller's stack.
@@ -62,11 +81,15 @@ template <typename Model>
 Handle<Model> lend(Model model) {
   return Handle<Model>(std::move(model), true);
 }
+template <typename Model>
+Handle<Model> lend(Shared<Model> model) {
+  return Handle<Model>(std::move(model), true);
+}
 
-// The model behind a CMPI object.
+// What is behind a CMPI object.
 // Throws StatusError CMPI_RC_ERR_INVALID_HANDLE if the object or its handle is null.
 template <typename Model>
-Model& modelOf(const typename Abi<Model>::Type* object) {
+typename Held<Model>::Type& heldBy(const typename Abi<Model>::Type* object) {
   static_assert(!std::is_same_v<Model, Text>, "textOf reads a string");
   if (!object || !object->hdl) {
     throw StatusError(CMPI_RC_ERR_INVALID_HANDLE, std::string(Abi<Model>::name) + " must not be null");
@@ -77,11 +100,31 @@ Model& modelOf(const typename Abi<Model>::Type* object) {
 // The same for an object that a slot is given to act with, not on.
 // Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER if the object or its handle is null.
 template <typename Model>
-Model& argumentOf(const typename Abi<Model>::Type* object) {
+const typename Held<Model>::Type& argumentOf(const typename Abi<Model>::Type* object) {
   if (!object || !object->hdl) {
     throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, std::string(Abi<Model>::name) + " must not be null");
   }
-  return modelOf<Model>(object);
+  return heldBy<Model>(object);
+}
+
+// The model behind a CMPI object. Throws as heldBy does.
+template <typename Model>
+const Model& modelOf(const typename Abi<Model>::Type* object) {
+  if constexpr (std::is_same_v<typename Held<Model>::Type, Model>) {
+    return heldBy<Model>(object);
+  } else {
+    return *heldBy<Model>(object);
+  }
+}
+
+// The same, to be changed. Throws as heldBy does.
+template <typename Model>
+Model& ownModelOf(const typename Abi<Model>::Type* object) {
+  if constexpr (std::is_same_v<typename Held<Model>::Type, Model>) {
+    return heldBy<Model>(object);
+  } else {
+    return heldBy<Model>(object).own();
+  }
 }
 
 // The characters of a CMPI string.
@@ -96,13 +139,17 @@ inline const char* textOf(const CMPIString* string) {
 // Makes a CMPI object, owned by the current request scope if there is one and else by the caller.
 template <typename Model>
 typename Abi<Model>::Type* make(Model model) {
-  auto handle = std::make_unique<Handle<Model>>(std::move(model));
-  auto* object = handle.get();
   if (RequestScope* scope = RequestScope::current()) {
-    scope->adopt(std::move(handle));
-    return object;
+    return scope->make<Handle<Model>>(std::move(model));
   }
-  return handle.release();
+  return new Handle<Model>(std::move(model));
+}
+template <typename Model>
+typename Abi<Model>::Type* make(Shared<Model> model) {
+  if (RequestScope* scope = RequestScope::current()) {
+    return scope->make<Handle<Model>>(std::move(model));
+  }
+  return new Handle<Model>(std::move(model));
 }
 
 }  // namespace Cimom

@@ -46,7 +46,7 @@ CMPICount getPropertyCount(const CMPIInstance* instance, CMPIStatus* status) {
 
 CMPIStatus setProperty(const CMPIInstance* instance, const char* name, const CMPIValue* value, CMPIType type) {
   return guarded([&] {
-    Instance& model = modelOf<Instance>(instance);
+    Instance& model = ownModelOf<Instance>(instance);
     model.set(required(name, "the property's name"), fromCmpi(value, type));
   });
 }
@@ -64,7 +64,7 @@ CMPIObjectPath* getObjectPath(const CMPIInstance* instance, CMPIStatus* status) 
 
 CMPIStatus setObjectPath(CMPIInstance* instance, const CMPIObjectPath* path) {
   return guarded([&] {
-    Instance& model = modelOf<Instance>(instance);
+    Instance& model = ownModelOf<Instance>(instance);
     model.setPath(argumentOf<ObjectPath>(path));
   });
 }
@@ -72,7 +72,7 @@ CMPIStatus setObjectPath(CMPIInstance* instance, const CMPIObjectPath* path) {
 // The class knows its keys, so that the caller's list of them is not needed.
 CMPIStatus setPropertyFilter(CMPIInstance* instance, const char** properties, const char**) {
   return guarded([&] {
-    Instance& model = modelOf<Instance>(instance);
+    Instance& model = ownModelOf<Instance>(instance);
     if (!properties) {
       return;
     }

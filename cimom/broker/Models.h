@@ -6,15 +6,20 @@
 
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "cimom/broker/RequestScope.h"
+#include "cimom/model/Shared.h"
 #include "cimom/model/Value.h"
 
 namespace Cimom {
 
 struct Text {
-  std::string characters;
+  explicit Text(std::string text) : characters(std::move(text)) {}
+  explicit Text(Shared<std::string> text) : characters(std::move(text)) {}
+
+  Shared<std::string> characters;
 };
 
 struct Context {

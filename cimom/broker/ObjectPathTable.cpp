@@ -9,7 +9,7 @@ using Member = std::string ObjectPath::*;
 
 template <Member member>
 CMPIStatus setText(CMPIObjectPath* path, const char* text) {
-  return guarded([&] { modelOf<ObjectPath>(path).*member = required(text, "the text"); });
+  return guarded([&] { ownModelOf<ObjectPath>(path).*member = required(text, "the text"); });
 }
 
 template <Member member>
@@ -20,7 +20,7 @@ CMPIString* getText(const CMPIObjectPath* path, CMPIStatus* status) {
 
 CMPIStatus addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, const CMPIType type) {
   return guarded([&] {
-    ObjectPath& model = modelOf<ObjectPath>(path);
+    ObjectPath& model = ownModelOf<ObjectPath>(path);
     model.keys.set(required(name, "the key's name"), fromCmpi(value, type));
   });
 }
@@ -39,19 +39,19 @@ CMPICount getKeyCount(const CMPIObjectPath* path, CMPIStatus* status) {
 
 // The path that another is set from. It is the same kind of object, and as such an invalid handle where it has none.
 const ObjectPath& sourceOf(const CMPIObjectPath* source) {
-  return source ? modelOf<ObjectPath>(source) : argumentOf<ObjectPath>(source);
+  return source ? modelOf<ObjectPath>(source) : *argumentOf<ObjectPath>(source);
 }
 
 CMPIStatus setNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
   return guarded([&] {
-    ObjectPath& model = modelOf<ObjectPath>(path);
+    ObjectPath& model = ownModelOf<ObjectPath>(path);
     model.nameSpace = sourceOf(source).nameSpace;
   });
 }
 
 CMPIStatus setHostAndNameSpaceFromObjectPath(CMPIObjectPath* path, const CMPIObjectPath* source) {
   return guarded([&] {
-    ObjectPath& model = modelOf<ObjectPath>(path);
+    ObjectPath& model = ownModelOf<ObjectPath>(path);
     model.nameSpace = sourceOf(source).nameSpace;
     model.host = sourceOf(source).host;
   });

@@ -28,13 +28,14 @@ RequestScope::~RequestScope() {
     delete innermost;
   }
   innermost = outer_;
+  while (last_) {
+    std::exchange(last_, last_->before)->~Object();
+  }
 }
 
 CMPIContext* RequestScope::context() {
   if (!context_) {
-    auto handle = std::make_unique<Handle<Context>>(Context{{}, deadline_});
-    context_ = handle.get();
-    adopt(std::move(handle));
+    context_ = make<Handle<Context>>(Context{{}, deadline_});
   }
   return context_;
 }
@@ -44,11 +45,6 @@ RequestScope* RequestScope::current() { return innermost; }
 const CMPIBroker* RequestScope::currentBroker() { return innermost ? innermost->broker_ : nullptr; }
 
 Deadline RequestScope::currentDeadline() { return innermost ? innermost->deadline_ : std::nullopt; }
-
-void RequestScope::adopt(std::unique_ptr<Object> object) {
-  object->inScope = true;
-  objects_.push_back(std::move(object));
-}
 
 RequestScope* RequestScope::open(const CMPIBroker* broker, Deadline deadline) {
   return new RequestScope(broker, deadline, true);

@@ -4,9 +4,10 @@
 #include <cmpift.h>
 
 #include <chrono>
-#include <memory>
+#include <memory_resource>
+#include <new>
 #include <optional>
-#include <vector>
+#include <utility>
 
 namespace Cimom {
 
@@ -20,6 +21,7 @@ class Object {
 
   // Owned by a scope or a caller's stack: releasing the object early is harmless and does nothing.
   bool inScope = false;
+  Object* before = nullptr;  // the one that the scope made before it
 };
 
 // The moment after which up-calls fail; none: they never do.
@@ -46,7 +48,15 @@ class RequestScope {
   // The deadline of the innermost scope of this thread.
   static Deadline currentDeadline();
 
-  void adopt(std::unique_ptr<Object> object);
+  // Makes an object that dies with the scope.
+  template <typename Type, typename... Arguments>
+  Type* make(Arguments&&... arguments) {
+    void* place = memory_.allocate(sizeof(Type), alignof(Type));
+    auto* object = new (place) Type(std::forward<Arguments>(arguments)...);
+    object->inScope = true;
+    object->before = std::exchange(last_, object);
+    return object;
+  }
 
   // Opens a scope on this thread that a later call of `close`, or the end of an outer scope, ends.
   static RequestScope* open(const CMPIBroker* broker, Deadline deadline = {});
@@ -61,7 +71,8 @@ class RequestScope {
   Deadline deadline_;
   bool opened_;
   CMPIContext* context_ = nullptr;
-  std::vector<std::unique_ptr<Object>> objects_;
+  std::pmr::monotonic_buffer_resource memory_;
+  Object* last_ = nullptr;
 };
 
 }  // namespace Cimom

@@ -9,7 +9,7 @@ namespace {
 // CMPIResult.
 
 void deliver(const CMPIResult* result, Value item) {
-  Result& model = modelOf<Result>(result);
+  Result& model = ownModelOf<Result>(result);
   if (item.isNull()) {
     throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "a result must not be null");
   }
@@ -47,7 +47,7 @@ CMPIStatus returnDone(const CMPIResult* result) {
 
 CMPIStatus returnError(const CMPIResult* result, const CMPIError* error) {
   return guarded([&] {
-    Result& model = modelOf<Result>(result);
+    Result& model = ownModelOf<Result>(result);
     const Error& returned = argumentOf<Error>(error);
     if (!model.error) {
       model.error = returned;
@@ -67,7 +67,7 @@ CMPIString* getText(const CMPIError* error, CMPIStatus* status) {
 
 template <OptionalText member>
 CMPIStatus setText(CMPIError* error, const char* text) {
-  return guarded([&] { modelOf<Error>(error).*member = required(text, "the text"); });
+  return guarded([&] { ownModelOf<Error>(error).*member = required(text, "the text"); });
 }
 
 template <OptionalArray member>
@@ -81,8 +81,8 @@ CMPIArray* getArray(const CMPIError* error, CMPIStatus* status) {
 template <OptionalArray member>
 CMPIStatus setArray(CMPIError* error, const CMPIArray* array) {
   return guarded([&] {
-    Error& model = modelOf<Error>(error);
-    const Array& texts = argumentOf<Array>(array);
+    Error& model = ownModelOf<Error>(error);
+    const Array& texts = *argumentOf<Array>(array);
     if (texts.elementType != CMPI_string) {
       throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER, "the array must hold strings");
     }
@@ -101,7 +101,7 @@ Number getNumber(const CMPIError* error, CMPIStatus* status) {
 
 template <typename Number, Number Error::*member>
 CMPIStatus setNumber(CMPIError* error, const Number number) {
-  return guarded([&] { modelOf<Error>(error).*member = number; });
+  return guarded([&] { ownModelOf<Error>(error).*member = number; });
 }
 
 }  // namespace

@@ -46,7 +46,7 @@ CMPIInstance* getInstance(const CMPIBroker* broker, const CMPIContext* context, 
 CMPIObjectPath* createInstance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                                const CMPIInstance* instance, CMPIStatus* status) {
   return guarded(status, static_cast<CMPIObjectPath*>(nullptr), [&] {
-    const Instance& model = argumentOf<Instance>(instance);
+    const Instance& model = *argumentOf<Instance>(instance);
     const Operation operation(broker, context, path);
     return toCmpi(operation.core.operations->createInstance(operation, model)).value.ref;
   });
@@ -55,7 +55,7 @@ CMPIObjectPath* createInstance(const CMPIBroker* broker, const CMPIContext* cont
 CMPIStatus modifyInstance(const CMPIBroker* broker, const CMPIContext* context, const CMPIObjectPath* path,
                           const CMPIInstance* instance, const char** properties) {
   return guarded([&] {
-    const Instance& model = argumentOf<Instance>(instance);
+    const Instance& model = *argumentOf<Instance>(instance);
     const Operation operation(broker, context, path);
     operation.core.operations->modifyInstance(operation, model, properties);
   });
@@ -118,7 +118,7 @@ CMPIData invokeMethod(const CMPIBroker* broker, const CMPIContext* context, cons
     const Value value = operation.core.operations->invokeMethod(operation, *declared, given, returned);
     for (const auto& [name, argument] : returned) {
       if (out) {
-        modelOf<Args>(out).arguments.set(name, argument);
+        ownModelOf<Args>(out).arguments.set(name, argument);
       }
     }
     return toCmpi(value);

@@ -56,7 +56,7 @@ CMPIData getElementAt(const CMPIArray* array, CMPICount index, CMPIStatus* statu
 
 CMPIStatus setElementAt(CMPIArray* array, CMPICount index, const CMPIValue* value, CMPIType type) {
   return guarded([&] {
-    Array& model = modelOf<Array>(array);
+    Array& model = ownModelOf<Array>(array);
     requireIndex(model, index);
     Value element = fromCmpi(value, type);
     if (element.isNull()) {
@@ -76,7 +76,7 @@ constexpr auto pastTheEnd = static_cast<CMPIrc>(18);
 
 CMPIData getNext(const CMPIEnumeration* enumeration, CMPIStatus* status) {
   return guarded(status, noData, [&] {
-    auto& model = modelOf<Enumeration>(enumeration);
+    auto& model = ownModelOf<Enumeration>(enumeration);
     if (model.next >= model.items.size()) {
       throw StatusError(pastTheEnd, "past the end of the enumeration");
     }
@@ -101,8 +101,8 @@ CMPIArray* toArray(const CMPIEnumeration* enumeration, CMPIStatus* status) {
 
 // CMPIArgs and CMPIContext: both are named values to the interface.
 
-NamedValues& valuesOf(const CMPIArgs* args) { return modelOf<Args>(args).arguments; }
-NamedValues& valuesOf(const CMPIContext* context) { return modelOf<Context>(context).entries; }
+NamedValues& valuesOf(const CMPIArgs* args) { return ownModelOf<Args>(args).arguments; }
+NamedValues& valuesOf(const CMPIContext* context) { return ownModelOf<Context>(context).entries; }
 
 template <typename Type>
 CMPIStatus add(const Type* object, const char* name, const CMPIValue* value, const CMPIType type) {

@@ -34,16 +34,16 @@ struct Traversal {
 void writeInstances(const Call& call, const Found& found) {
   const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer(found.properties);
-  for (const CMPIData& object : found.objects) {
-    writer.objectWithPath(object.value.inst);
+  for (const Cimom::Value& object : found.objects) {
+    writer.objectWithPath(*object.embedded());
   }
 }
 
 void writeNames(const Call& call, const Found& found) {
   const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  for (const CMPIData& object : found.objects) {
-    writer.objectPath(object.value.ref);
+  for (const Cimom::Value& object : found.objects) {
+    writer.objectPath(*object.path());
   }
 }
 

@@ -28,7 +28,7 @@ struct Call {
   std::string& host;  // stands in the answer's paths that name none
 
   // Gives the paths that name no host the one that the answer's objects name.
-  void takeHostOf(const std::vector<CMPIData>& answered) const {
+  void takeHostOf(const std::vector<Cimom::Value>& answered) const {
     host = systemHost(answered, request.nameSpace, manager.host);
   }
 
@@ -44,7 +44,7 @@ struct Found {
   // Throws OperationError for a status that is not OK.
   Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown = {});
 
-  std::vector<CMPIData> objects;
+  std::vector<Cimom::Value> objects;
   PropertyFilter properties;  // of instances: those that the client wants to see
 };
 

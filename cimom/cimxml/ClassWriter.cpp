@@ -1,11 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/cimxml/ClassWriter.h"
 
-#include <cmpimacs.h>
-
 #include <algorithm>
 
-#include "cimom/broker/CmpiValue.h"
 #include "cimom/model/Names.h"
 #include "cimom/model/Types.h"
 
@@ -79,7 +76,7 @@ void ClassWriter::write(const QualifierDeclaration& declaration) {
   }
   flavor(qualifier);
   writeScope(xml_, declaration.scopes);
-  values_.value(toCmpi(qualifier.value));
+  values_.value(qualifier.value);
 }
 
 bool ClassWriter::isShown(bool propagated) const { return !view_.localOnly || !propagated; }
@@ -96,7 +93,7 @@ void ClassWriter::qualifiers(const Qualifiers& qualifiers) {
       xml_.attribute("PROPAGATED", truth(true));
     }
     flavor(qualifier);
-    values_.value(toCmpi(qualifier.value));
+    values_.value(qualifier.value);
   }
 }
 
@@ -111,7 +108,7 @@ void ClassWriter::property(const PropertyDeclaration& property) {
   writeType(xml_, property);
   origin(property.originClass, property.propagated);
   qualifiers(property.qualifiers);
-  values_.value(toCmpi(property.defaultValue));
+  values_.value(property.defaultValue);
 }
 
 void ClassWriter::method(const MethodDeclaration& method) {

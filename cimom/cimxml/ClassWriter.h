@@ -14,7 +14,7 @@ struct ClassView {
   PropertyFilter properties;
 };
 
-// Writes CLASS and QUALIFIER.DECLARATION. Default values are made in the current request scope.
+// Writes CLASS and QUALIFIER.DECLARATION.
 class ClassWriter {
  public:
   ClassWriter(XmlWriter& xml, ClassView view) : xml_(xml), values_(xml, none_, none_), view_(std::move(view)) {}

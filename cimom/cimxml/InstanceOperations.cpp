@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <algorithm>
 
+#include "cimom/broker/CmpiValue.h"
+#include "cimom/broker/Handle.h"
 #include "cimom/cimxml/Call.h"
 #include "cimom/model/Names.h"
 
@@ -31,11 +33,7 @@ NameList visibleProperties(const Call& call, const std::string& className) {
 Found::Found(const Call& call, const CMPIStatus& status, CMPIEnumeration* found, PropertyFilter shown)
     : properties(std::move(shown)) {
   requireOk(status, found);
-  while (CMHasNext(found, nullptr)) {
-    CMPIStatus next{CMPI_RC_OK, nullptr};
-    objects.push_back(CMGetNext(found, &next));
-    requireOk(next, objects.back().value.dataPtr.ptr);
-  }
+  objects = std::move(ownModelOf<Enumeration>(found).items);
   call.takeHostOf(objects);
 }
 
@@ -60,8 +58,8 @@ void enumerateInstances(Call& call) {
   const Found found = findInstances(call);
   const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer(found.properties);
-  for (const CMPIData& object : found.objects) {
-    writer.namedInstance(object.value.inst);
+  for (const Cimom::Value& object : found.objects) {
+    writer.namedInstance(*object.embedded());
   }
 }
 
@@ -69,8 +67,8 @@ void enumerateInstanceNames(Call& call) {
   const Found found = findInstanceNames(call);
   const auto scope = call.xml.element("IRETURNVALUE");
   ObjectWriter writer = call.writer();
-  for (const CMPIData& object : found.objects) {
-    writer.instanceName(object.value.ref);
+  for (const Cimom::Value& object : found.objects) {
+    writer.instanceName(*object.path());
   }
 }
 
@@ -79,25 +77,25 @@ void getInstance(Call& call) {
   const NameList list = call.parameters.propertyList();
   PropertyNames names(list);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIData data{CMPI_instance, CMPI_goodValue, {}};
-  data.value.inst = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
-  requireOk(status, data.value.inst);
-  call.takeHostOf({data});
+  CMPIInstance* found = CBGetInstance(call.manager.broker, call.context, path, names.get(), &status);
+  requireOk(status, found);
+  const auto instance = Cimom::Value::instance(heldBy<Cimom::Instance>(found));
+  call.takeHostOf({instance});
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer(filterOf(list)).instance(data.value.inst);
+  call.writer(filterOf(list)).instance(*instance.embedded());
 }
 
 void createInstance(Call& call) {
   const Instance& given = call.parameters.instance("NewInstance");
   const CMPIInstance* instance = call.objects.instance(given);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  CMPIData data{CMPI_ref, CMPI_goodValue, {}};
-  data.value.ref =
+  CMPIObjectPath* created =
       CBCreateInstance(call.manager.broker, call.context, call.objects.path(given.path), instance, &status);
-  requireOk(status, data.value.ref);
-  call.takeHostOf({data});
+  requireOk(status, created);
+  const auto path = Cimom::Value::reference(heldBy<ObjectPath>(created));
+  call.takeHostOf({path});
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer().instanceName(data.value.ref);
+  call.writer().instanceName(*path.path());
 }
 
 void modifyInstance(Call& call) {
@@ -121,7 +119,7 @@ void getProperty(Call& call) {
   const CMPIData data = CBGetProperty(call.manager.broker, call.context, path, name.c_str(), &status);
   requireOk(status);
   const auto scope = call.xml.element("IRETURNVALUE");
-  call.writer().value(data);
+  call.writer().value(fromCmpi(CMIsNullValue(data) ? nullptr : &data.value, data.type));
 }
 
 void setProperty(Call& call) {

@@ -1,5 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 // Extrinsic methods (DSP0200, 5.3.2 and 5.4): arguments get their types from the class, as keys and properties do.
+#include "cimom/broker/CmpiValue.h"
+#include "cimom/broker/Handle.h"
 #include "cimom/broker/RequestScope.h"
 #include "cimom/cimxml/Call.h"
 #include "cimom/model/Names.h"
@@ -47,20 +49,12 @@ CMPIArgs* readArguments(const OperationContext& manager, const Request& request,
   return arguments;
 }
 
-ObjectWriter::Embedding embeddingOf(const Qualifiers& qualifiers) {
-  return isQualified(qualifiers, "EmbeddedObject") ? ObjectWriter::Embedding::Object
-                                                   : ObjectWriter::Embedding::Instance;
-}
-
 void writeArguments(XmlWriter& xml, ObjectWriter& writer, const MethodDeclaration& method, const CMPIArgs* arguments) {
-  const CMPICount count = CMGetArgCount(arguments, nullptr);
-  for (CMPICount i = 0; i < count; ++i) {
-    CMPIString* name = nullptr;
-    const CMPIData data = CMGetArgAt(arguments, i, &name, nullptr);
-    const auto scope = xml.element("PARAMVALUE", "NAME", CMGetCharsPtr(name, nullptr));
-    const PropertyDeclaration* declared = findNamed(method.parameters, CMGetCharsPtr(name, nullptr));
-    writer.type("PARAMTYPE", data.type, embeddingOf(declared ? declared->qualifiers : Qualifiers()));
-    writer.value(data);
+  for (const auto& [name, value] : modelOf<Args>(arguments).arguments) {
+    const auto scope = xml.element("PARAMVALUE", "NAME", name);
+    const PropertyDeclaration* declared = findNamed(method.parameters, name);
+    writer.type("PARAMTYPE", value.type(), declared ? declared->qualifiers : Qualifiers());
+    writer.value(value);
   }
 }
 
@@ -75,13 +69,14 @@ void callMethod(const OperationContext& manager, const Request& request, XmlWrit
   const CMPIArgs* in = readArguments(manager, request, method, objects);
   CMPIArgs* out = newArguments(manager.broker);
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIData returned =
+  const CMPIData data =
       CBInvokeMethod(manager.broker, context, objects.path(request.target), method.name.c_str(), in, out, &status);
   requireOk(status);
+  const Cimom::Value returned = fromCmpi(CMIsNullValue(data) ? nullptr : &data.value, data.type);
   ObjectWriter writer(xml, manager.host, request.nameSpace);
-  if (!CMIsNullValue(returned)) {
+  if (!returned.isNull()) {
     const auto value = xml.element("RETURNVALUE");
-    writer.type("PARAMTYPE", returned.type, embeddingOf(method.qualifiers));
+    writer.type("PARAMTYPE", returned.type(), method.qualifiers);
     writer.value(returned);
   }
   writeArguments(xml, writer, method, out);

@@ -42,21 +42,14 @@ CMPIType claimedType(const KeyValue& key) {
 
 // A class with one key may be named by the key's value alone.
 std::string loneKey(const ClassDefinition* definition, const ObjectName& name) {
-  std::string key;
-  for (const auto& property : definition ? definition->properties : std::vector<PropertyDeclaration>()) {
-    if (!property.isKey()) {
-      continue;
-    }
-    if (!key.empty()) {
-      throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
-                           "class " + name.className + " has more than one key, so each must be named");
-    }
-    key = property.name;
-  }
-  if (key.empty()) {
+  if (!definition || definition->keys.empty()) {
     throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER, "class " + name.className + " has no key");
   }
-  return key;
+  if (definition->keys.size() > 1) {
+    throw OperationError(CMPI_RC_ERR_INVALID_PARAMETER,
+                         "class " + name.className + " has more than one key, so each must be named");
+  }
+  return definition->properties[definition->keys.front()].name;
 }
 
 }  // namespace

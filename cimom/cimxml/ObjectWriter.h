@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
-// Writes CMPI objects as CIM-XML (DSP0201).
+// Writes paths, instances and values as CIM-XML (DSP0201).
 #pragma once
 
 #include <cmpidt.h>
@@ -12,7 +12,10 @@
 #include <vector>
 
 #include "cimom/cimxml/XmlWriter.h"
+#include "cimom/model/Instance.h"
 #include "cimom/model/Names.h"
+#include "cimom/model/ObjectPath.h"
+#include "cimom/model/Value.h"
 
 namespace Cimom::CimXml {
 
@@ -36,44 +39,42 @@ class ObjectWriter {
       : xml_(xml), host_(host), nameSpace_(nameSpace), filter_(std::move(filter)) {}
 
   // INSTANCENAME; a key that is null has no form in CIM-XML and is left out.
-  void instanceName(const CMPIObjectPath* path);
+  void instanceName(const ObjectPath& path);
 
   // INSTANCEPATH: with host and namespace.
-  void instancePath(const CMPIObjectPath* path);
+  void instancePath(const ObjectPath& path);
 
   // OBJECTPATH.
-  void objectPath(const CMPIObjectPath* path);
+  void objectPath(const ObjectPath& path);
 
   // INSTANCE; a property without a value is an empty element.
-  void instance(const CMPIInstance* instance);
+  void instance(const Cimom::Instance& instance);
 
   // VALUE.NAMEDINSTANCE.
-  void namedInstance(const CMPIInstance* instance);
+  void namedInstance(const Cimom::Instance& instance);
 
   // VALUE.OBJECTWITHPATH.
-  void objectWithPath(const CMPIInstance* instance);
+  void objectWithPath(const Cimom::Instance& instance);
 
   // VALUE.INSTANCEWITHPATH, which is the same by another name.
-  void instanceWithPath(const CMPIInstance* instance);
+  void instanceWithPath(const Cimom::Instance& instance);
 
   // VALUE, VALUE.ARRAY, VALUE.REFERENCE or VALUE.REFARRAY; nothing for a null value.
-  void value(const CMPIData& data);
+  void value(const Cimom::Value& value);
 
-  // What a string that embeds an instance is declared to embed: that, or an object of any kind.
-  enum class Embedding { Instance, Object };
-
-  // The attributes of an element that say of which type its value is: TYPE, or by another name, and what a string
-  // embeds.
-  void type(const char* attributeName, CMPIType type, Embedding embedding);
+  // The attributes of an element that say of which type its value is: TYPE, or by another name, and what a string with
+  // those qualifiers embeds: an instance, or an object of any kind.
+  void type(const char* attributeName, CMPIType type, const Qualifiers& qualifiers);
 
  private:
-  void keyBinding(const char* name, const CMPIData& data);
-  void nameSpacePath(const CMPIObjectPath* path);
-  void property(const CMPIObjectPath* path, const char* name, const CMPIData& data);
-  void reference(const CMPIObjectPath* path);
-  void withPath(const char* element, const CMPIInstance* instance);
-  void array(const CMPIData& data);
-  std::string scalar(CMPIType type, const CMPIValue& value) const;
+  void keyBinding(const std::string& name, const Cimom::Value& value);
+  void nameSpacePath(const ObjectPath& path);
+  void instance(const Cimom::Instance& instance, const ObjectPath& path);
+  void property(const PropertyDeclaration& declaration, const Cimom::Value& value);
+  void reference(const ObjectPath& path);
+  void withPath(const char* element, const Cimom::Instance& instance);
+  void array(const Array& array);
+  void text(const Cimom::Value& value);
 
   XmlWriter& xml_;
   const std::string& host_;

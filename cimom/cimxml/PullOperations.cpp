@@ -69,13 +69,13 @@ void open(Call& call, PulledItem item, Find find) {
   const std::size_t maxCount = call.parameters.number("MaxObjectCount").value_or(0);
 
   const Found found = find(call);
-  for (const CMPIData& object : found.objects) {
+  for (const Cimom::Value& object : found.objects) {
     XmlWriter xml(XmlWriter::Prolog::None);
     ObjectWriter writer(xml, call.host, call.request.nameSpace, found.properties);
     if (item == PulledItem::InstanceWithPath) {
-      writer.instanceWithPath(object.value.inst);
+      writer.instanceWithPath(*object.embedded());
     } else {
-      writer.instancePath(object.value.ref);
+      writer.instancePath(*object.path());
     }
     enumeration.items.push_back(xml.take());
   }

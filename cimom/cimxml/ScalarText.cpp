@@ -1,8 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/cimxml/ScalarText.h"
 
-#include <cmpimacs.h>
-
 #include <charconv>
 #include <limits>
 #include <type_traits>
@@ -35,15 +33,6 @@ bool parseNumber(std::string_view text, Number& number) {
   return parseWith(text, number);
 }
 
-std::string formatString(const CMPIString* string) {
-  const char* chars = string ? CMGetCharsPtr(string, nullptr) : nullptr;
-  return chars ? chars : "";
-}
-
-std::string formatDateTime(const CMPIDateTime* dateTime) {
-  return dateTime ? formatString(CMGetStringFormat(dateTime, nullptr)) : "";
-}
-
 }  // namespace
 
 const char* keyValueType(CMPIType type) {
@@ -74,20 +63,20 @@ std::optional<CMPIValue> parseScalar(CMPIType type, std::string_view text) {
   return value;
 }
 
-std::string formatScalar(CMPIType type, const CMPIValue& value) {
-  switch (type) {
+std::string formatScalar(const Cimom::Value& value) {
+  if (const DateTime* time = value.time()) {
+    return time->format();
+  }
+  const CMPIValue* scalar = value.scalar();
+  switch (scalar ? value.type() : CMPIType(CMPI_null)) {
     case CMPI_boolean:
-      return value.boolean ? "TRUE" : "FALSE";
+      return scalar->boolean ? "TRUE" : "FALSE";
     case CMPI_char16:
-      return encode(value.char16);
-    case CMPI_string:
-      return formatString(value.string);
-    case CMPI_chars:
-      return value.chars ? value.chars : "";
-    case CMPI_dateTime:
-      return formatDateTime(value.dateTime);
+      return encode(scalar->char16);
+    case CMPI_null:
+      return "";
     default:
-      return numberText(type, value);
+      return numberText(value.type(), *scalar);
   }
 }
 

@@ -8,6 +8,8 @@
 #include <string>
 #include <string_view>
 
+#include "cimom/model/Value.h"
+
 namespace Cimom::CimXml {
 
 // The VALUETYPE of a key of that type: "string", "boolean" or "numeric".
@@ -17,7 +19,7 @@ const char* keyValueType(CMPIType type);
 // Nothing when the text is none of that type or the value does not fit.
 std::optional<CMPIValue> parseScalar(CMPIType type, std::string_view text);
 
-// The same way back, and strings and date-times too. A null string is the empty text.
-std::string formatScalar(CMPIType type, const CMPIValue& value);
+// The same way back, and date-times too; empty for a value that is none of these.
+std::string formatScalar(const Cimom::Value& value);
 
 }  // namespace Cimom::CimXml

@@ -1,64 +1,66 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/cimxml/SystemHost.h"
 
-#include <cmpimacs.h>
-
-#include <set>
-
+#include "cimom/model/Instance.h"
 #include "cimom/model/Names.h"
+#include "cimom/model/ObjectPath.h"
 
 namespace Cimom::CimXml {
 namespace {
 
-using Hosts = std::set<std::string, NameLess>;
+// The hosts that objects in a namespace name, as far as it matters.
+class Hosts {
+ public:
+  explicit Hosts(std::string_view nameSpace) : nameSpace_(bareNamespace(nameSpace)) {}
 
-std::string textOf(const CMPIString* string) {
-  const char* text = string ? CMGetCharsPtr(string, nullptr) : nullptr;
-  return text ? text : "";
-}
+  // The one host; null if there is none or more than one.
+  const std::string* only() const { return differ_ || first_.empty() ? nullptr : &first_; }
 
-// The hosts of a path and of the references among its keys, as far as they are in the namespace.
-void collect(const CMPIObjectPath* path, const std::string& nameSpace, Hosts& hosts) {
-  if (!path) {
-    return;
-  }
-  const std::string host = textOf(CMGetHostname(path, nullptr));
-  if (!host.empty() && sameName(bareNamespace(textOf(CMGetNameSpace(path, nullptr))), bareNamespace(nameSpace))) {
-    hosts.insert(host);
-  }
-  const CMPICount count = CMGetKeyCount(path, nullptr);
-  for (CMPICount i = 0; i < count; ++i) {
-    const CMPIData key = CMGetKeyAt(path, i, nullptr, nullptr);
-    if (key.type == CMPI_ref && !CMIsNullValue(key)) {
-      collect(key.value.ref, nameSpace, hosts);
+  void add(const Cimom::Value& value) {
+    if (const ObjectPath* path = value.path()) {
+      add(*path);
+    } else if (const Cimom::Instance* instance = value.embedded()) {
+      add(*instance);
     }
   }
-}
 
-void collect(const CMPIInstance* instance, const std::string& nameSpace, Hosts& hosts) {
-  collect(CMGetObjectPath(instance, nullptr), nameSpace, hosts);
-  const CMPICount count = CMGetPropertyCount(instance, nullptr);
-  for (CMPICount i = 0; i < count; ++i) {
-    const CMPIData property = CMGetPropertyAt(instance, i, nullptr, nullptr);
-    if (property.type == CMPI_ref && !CMIsNullValue(property)) {
-      collect(property.value.ref, nameSpace, hosts);
+ private:
+  // That of a path, and of the references among its keys.
+  void add(const ObjectPath& path) {
+    if (!path.host.empty() && sameName(bareNamespace(path.nameSpace), nameSpace_)) {
+      differ_ = differ_ || (!first_.empty() && !sameName(first_, path.host));
+      first_ = first_.empty() ? path.host : first_;
+    }
+    for (const auto& [name, value] : path.keys) {
+      if (const ObjectPath* key = value.path()) {
+        add(*key);
+      }
     }
   }
-}
+
+  void add(const Cimom::Instance& instance) {
+    add(*instance.path());
+    for (std::size_t index = 0; index < instance.size(); ++index) {
+      if (const ObjectPath* reference = instance[index].path()) {
+        add(*reference);
+      }
+    }
+  }
+
+  std::string_view nameSpace_;
+  std::string first_;
+  bool differ_ = false;
+};
 
 }  // namespace
 
-std::string systemHost(const std::vector<CMPIData>& objects, const std::string& nameSpace,
+std::string systemHost(const std::vector<Cimom::Value>& objects, const std::string& nameSpace,
                        const std::string& otherwise) {
-  Hosts hosts;
-  for (const CMPIData& object : objects) {
-    if (object.type == CMPI_instance) {
-      collect(object.value.inst, nameSpace, hosts);
-    } else if (object.type == CMPI_ref) {
-      collect(object.value.ref, nameSpace, hosts);
-    }
+  Hosts hosts(nameSpace);
+  for (const Cimom::Value& object : objects) {
+    hosts.add(object);
   }
-  return hosts.size() == 1 ? *hosts.begin() : otherwise;
+  return hosts.only() ? *hosts.only() : otherwise;
 }
 
 }  // namespace Cimom::CimXml

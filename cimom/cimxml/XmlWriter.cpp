@@ -3,7 +3,6 @@
 
 #include <algorithm>
 #include <array>
-#include <new>
 #include <utility>
 
 #include "cimom/cimxml/Utf8.h"
@@ -46,96 +45,47 @@ std::string_view reference(char character, bool inAttributeValue) {
   }
 }
 
+struct Copied {
+  std::string_view::iterator read;
+  char* written;
+};
+
+// Copies a text up to its first character that is not plain.
+Copied copyPlain(std::string_view text, char* to) {
+  const auto* from = text.begin();
+  while (from != text.end() && plainBytes[static_cast<unsigned char>(*from)]) {
+    *to++ = *from++;
+  }
+  return {from, to};
+}
+
 }  // namespace
 
-XmlWriter::XmlWriter(Prolog prolog) {
-  if (prolog == Prolog::Declared) {
-    xml_ = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n";
-  }
-}
-
-XmlWriter::Scope::~Scope() {
-  try {
-    writer_.endTag(name_);
-  } catch (const std::bad_alloc&) {
-    writer_.isCut_ = true;
-  }
-}
-
-XmlWriter::Scope XmlWriter::element(const char* name) {
-  closeStartTag();
-  xml_.append("<").append(name);
-  inStartTag_ = true;
-  return {*this, name};
-}
-
-XmlWriter::Scope XmlWriter::element(const char* name, const char* attributeName, std::string_view attributeValue) {
-  closeStartTag();
-  xml_.append("<").append(name);
-  inStartTag_ = true;
-  attribute(attributeName, attributeValue);
-  return {*this, name};
-}
-
-void XmlWriter::attribute(const char* name, std::string_view value) {
-  xml_.append(" ").append(name).append("=\"");
-  append(value, Place::AttributeValue);
-  xml_.append("\"");
-}
-
-void XmlWriter::text(std::string_view text) {
-  closeStartTag();
-  append(text, Place::Content);
-}
-
-void XmlWriter::textElement(const char* name, std::string_view content) {
-  const auto scope = element(name);
-  text(content);
-}
-
-void XmlWriter::written(std::string_view xml) {
-  closeStartTag();
-  xml_.append(xml);
-}
-
 std::string XmlWriter::take() {
-  if (isCut_) {
-    throw std::bad_alloc();
-  }
-  return std::move(xml_);
+  xml_.resize(std::exchange(size_, 0));
+  return std::exchange(xml_, {});
 }
 
-void XmlWriter::endTag(const char* name) {
-  closeStartTag();
-  xml_.append("</").append(name).append(">");
-}
-
-void XmlWriter::closeStartTag() {
-  if (inStartTag_) {
-    xml_.append(">");
-    inStartTag_ = false;
-  }
-}
-
-void XmlWriter::append(std::string_view text, Place place) {
+void XmlWriter::escape(std::string_view text, Place place) {
   while (!text.empty()) {
-    const auto* const special = std::find_if_not(
-        text.begin(), text.end(), [](char byte) { return plainBytes[static_cast<unsigned char>(byte)]; });
-    const auto plain = static_cast<std::size_t>(special - text.begin());
-    xml_.append(text.substr(0, plain));
-    text.remove_prefix(plain);
+    char* const begin = room(text.size());
+    const auto [special, end] = copyPlain(text, begin);
+    size_ += static_cast<std::size_t>(end - begin);
+    text.remove_prefix(static_cast<std::size_t>(special - text.begin()));
     if (text.empty()) {
       return;
     }
     if (const auto escaped = reference(text.front(), place == Place::AttributeValue); !escaped.empty()) {
-      xml_.append(escaped);
+      put(escaped);
       text.remove_prefix(1);
       continue;
     }
     const XmlCharacter character = firstXmlCharacter(text);
-    xml_.append(character.text);
+    put(character.text);
     text.remove_prefix(character.size);
   }
 }
+
+void XmlWriter::grow(std::size_t bytes) { xml_.resize(std::max(size_ + reserved_ + bytes, 2 * xml_.size())); }
 
 }  // namespace Cimom::CimXml

@@ -2,6 +2,8 @@
 // Writes an XML document into memory.
 #pragma once
 
+#include <algorithm>
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -12,45 +14,114 @@ class XmlWriter {
  public:
   enum class Prolog { Declared, None };
 
-  explicit XmlWriter(Prolog prolog = Prolog::Declared);
+  explicit XmlWriter(Prolog prolog = Prolog::Declared) {
+    if (prolog == Prolog::Declared) {
+      put("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n");
+    }
+  }
 
   // An element that ends with its scope.
   class [[nodiscard]] Scope {
    public:
-    Scope(XmlWriter& writer, const char* name) : writer_(writer), name_(name) {}
-    ~Scope();
+    Scope(XmlWriter& writer, std::string_view name) : writer_(writer), name_(name) {}
+    ~Scope() { writer_.endTag(name_); }
     Scope(const Scope&) = delete;
     Scope& operator=(const Scope&) = delete;
 
    private:
     XmlWriter& writer_;
-    const char* name_;
+    std::string_view name_;
   };
 
   // Names must outlive the element, as literals do.
-  Scope element(const char* name);
-  Scope element(const char* name, const char* attributeName, std::string_view attributeValue);
+  Scope element(std::string_view name) {
+    startTag(name);
+    return {*this, name};
+  }
+  Scope element(std::string_view name, std::string_view attributeName, std::string_view attributeValue) {
+    startTag(name);
+    attribute(attributeName, attributeValue);
+    return {*this, name};
+  }
 
-  void attribute(const char* name, std::string_view value);  // of the element begun last, before its content
-  void text(std::string_view text);
-  void textElement(const char* name, std::string_view text);
+  // Of the element begun last, before its content.
+  void attribute(std::string_view name, std::string_view value) {
+    put(" ", name, "=\"");
+    escape(value, Place::AttributeValue);
+    put("\"");
+  }
+
+  void text(std::string_view text) {
+    closeStartTag();
+    escape(text, Place::Content);
+  }
+
+  void textElement(std::string_view name, std::string_view content) {
+    const auto scope = element(name);
+    text(content);
+  }
+
   // Elements that another writer has written without a prolog.
-  void written(std::string_view xml);
+  void written(std::string_view xml) {
+    closeStartTag();
+    put(xml);
+  }
 
   // The document so far; complete when every scope has ended.
-  // Throws std::bad_alloc if memory ran out at the end of an element.
   std::string take();
 
  private:
   enum class Place { Content, AttributeValue };
 
-  void endTag(const char* name);
-  void closeStartTag();
-  void append(std::string_view text, Place place);
+  void startTag(std::string_view name) {
+    closeStartTag();
+    room(name.size() + 1 + atEnd(name));
+    reserved_ += atEnd(name);
+    put("<", name);
+    inStartTag_ = true;
+  }
+
+  // Room for it was made with the start tag, so that it cannot fail.
+  void endTag(std::string_view name) {
+    reserved_ -= atEnd(name);
+    closeStartTag();
+    put("</", name, ">");
+  }
+
+  void closeStartTag() {
+    if (inStartTag_) {
+      put(">");
+      inStartTag_ = false;
+    }
+  }
+
+  // What the end of an element takes at most: its tag, and the end of its start tag.
+  static std::size_t atEnd(std::string_view name) { return name.size() + std::string_view("></>").size(); }
+
+  void escape(std::string_view text, Place place);
+
+  // An answer is many short pieces: they are copied to where there is room for them.
+  template <typename... Pieces>
+  void put(const Pieces&... pieces) {
+    const auto copy = [](char* to, std::string_view piece) { return std::copy(piece.begin(), piece.end(), to); };
+    char* at = room((std::string_view(pieces).size() + ...));
+    ((at = copy(at, pieces)), ...);
+    size_ = static_cast<std::size_t>(at - xml_.data());
+  }
+
+  char* room(std::size_t bytes) {
+    if (xml_.size() - size_ - reserved_ < bytes) {
+      grow(bytes);
+    }
+    return xml_.data() + size_;
+  }
+
+  void grow(std::size_t bytes);
 
   std::string xml_;
+  std::size_t size_ = 0;      // of what is written; the rest is room
+  std::size_t reserved_ = 0;  // of the room, for the ends of the elements that are open
   bool inStartTag_ = false;
-  bool isCut_ = false;
 };
 
 }  // namespace Cimom::CimXml

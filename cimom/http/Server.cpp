@@ -3,11 +3,13 @@
 
 #include <cxxabi.h>
 #include <gnutls/gnutls.h>
+#include <malloc.h>
 #include <microhttpd.h>
 #include <sys/resource.h>
 #include <sys/socket.h>
 
 #include <algorithm>
+#include <atomic>
 #include <charconv>
 #include <condition_variable>
 #include <exception>
@@ -51,6 +53,11 @@ constexpr std::intptr_t beyondAllLimits = 1 << 30;
 
 // TLS 1.2 at least, and no key exchange whose traffic can be read later with the server's key.
 constexpr const char* priorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2:-RSA:%SERVER_PRECEDENCE";
+
+// What a request of this size, or one with a reply of this size, has taken goes back to the system after a while: the
+// allocator keeps what it was in small blocks for the thread that it served. Once for all that come meanwhile.
+constexpr std::size_t largeBytes = 1 << 20;
+constexpr std::chrono::seconds untilTrim{1};
 
 // Descriptors for what is no connection: files, providers, their sessions.
 constexpr rlim_t otherDescriptors = 64;
@@ -194,6 +201,7 @@ struct Server::State {
   Timers timers;
   Connections connections;
   LoginDelay loginDelay;
+  std::atomic<bool> willTrim = false;
   std::mutex certificateMutex;
   std::shared_ptr<Certificate> certificate;  // none: plain HTTP
   Workers workers;
@@ -566,6 +574,7 @@ struct Server::State {
 
     ~Answering() {
       state.timers.cancel(exchange->timeLimit);
+      state.trimAfter(std::max(exchange->request.body.size(), response ? response->body.size() : 0));
       if (response) {
         exchange->endHandling();
         state.suspensions.resume(exchange, std::move(response));
@@ -578,6 +587,20 @@ struct Server::State {
       state.inFlight.handled();
     }
   };
+
+  void trimAfter(std::size_t bytes) {
+    if (bytes < largeBytes || willTrim.exchange(true)) {
+      return;
+    }
+    try {
+      timers.at(std::chrono::steady_clock::now() + untilTrim, [this] {
+        willTrim = false;
+        malloc_trim(0);
+      });
+    } catch (const std::bad_alloc&) {
+      willTrim = false;  // the next large request will do
+    }
+  }
 
   void dispatch(const ExchangePointer& exchange) {
     try {

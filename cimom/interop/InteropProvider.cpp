@@ -162,7 +162,7 @@ std::vector<Instance> Catalogue::objectManagers() const {
 }
 
 std::vector<Instance> Catalogue::namespaces() const {
-  const ObjectPath manager = objectManagers().front().path();
+  const ObjectPath manager = *objectManagers().front().path();
   std::vector<Instance> all;
   for (const std::string& name : classes_.namespaces()) {
     NamedValues properties;
@@ -205,10 +205,10 @@ ObjectPath Catalogue::pathOfProfile(const Profile& profile) const {
 }
 
 std::vector<Catalogue::Link> Catalogue::namespacesInManager(const CMPIContext*) const {
-  const ObjectPath manager = objectManagers().front().path();
+  const ObjectPath manager = *objectManagers().front().path();
   std::vector<Link> links;
   for (const Instance& one : namespaces()) {
-    links.push_back({manager, one.path()});
+    links.push_back({manager, *one.path()});
   }
   return links;
 }
@@ -323,7 +323,7 @@ CMPIInstanceMI* Catalogue::instanceMi(const CMPIBroker* broker) {
          const char**) {
         return guarded([&] {
           for (const Instance& instance : of(mi).instancesOf(path, context)) {
-            if (sameObject(instance.path(), modelOf<ObjectPath>(path), interopNamespace)) {
+            if (sameObject(*instance.path(), modelOf<ObjectPath>(path), interopNamespace)) {
               const auto lent = lend(instance);
               CMReturnInstance(result, &lent);
             }

@@ -24,11 +24,11 @@ CMPIType valueType(CMPIType type, const Qualifiers& qualifiers) {
 }
 
 const PropertyDeclaration* ClassDefinition::findProperty(std::string_view propertyName) const {
-  return findNamed(properties, propertyName);
+  return properties.find(propertyName);
 }
 
 const MethodDeclaration* ClassDefinition::findMethod(std::string_view methodName) const {
-  return findNamed(methods, methodName);
+  return methods.find(methodName);
 }
 
 bool ClassDefinition::isA(std::string_view className) const {

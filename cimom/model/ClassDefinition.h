@@ -5,6 +5,7 @@
 #include <string_view>
 #include <vector>
 
+#include "cimom/model/NamedList.h"
 #include "cimom/model/Value.h"
 
 namespace Cimom {
@@ -69,8 +70,9 @@ struct ClassDefinition {
   std::string name;
   const ClassDefinition* superclass = nullptr;
   Qualifiers qualifiers;
-  std::vector<PropertyDeclaration> properties;
-  std::vector<MethodDeclaration> methods;
+  NamedList<PropertyDeclaration> properties;
+  std::vector<std::size_t> keys;  // the indexes of those properties that are keys
+  NamedList<MethodDeclaration> methods;
   std::string declaredAt;  // "FILE:LINE"
 
   const PropertyDeclaration* findProperty(std::string_view propertyName) const;

@@ -3,7 +3,6 @@
 
 #include <charconv>
 #include <chrono>
-#include <cstdio>
 #include <cstdlib>
 
 #include "cimom/model/Errors.h"
@@ -85,13 +84,23 @@ std::string DateTime::format() const {
     date = static_cast<unsigned long>(static_cast<int>(civil.year())) * 10'000 +
            static_cast<unsigned long>(static_cast<unsigned>(civil.month())) * 100 + static_cast<unsigned>(civil.day());
   }
-  char text[64];
-  const int length = std::snprintf(
-      text, sizeof text, "%08lu%02u%02u%02u.%06u%c%03u", date, static_cast<unsigned>(local % perDay / perHour),
-      static_cast<unsigned>(local % perHour / perMinute), static_cast<unsigned>(local % perMinute / perSecond),
-      static_cast<unsigned>(local % perSecond), interval ? ':' : (utcOffset < 0 ? '-' : '+'),
-      static_cast<unsigned>(interval ? 0 : std::abs(utcOffset)));
-  return std::string(text, static_cast<std::size_t>(length));
+  // The years of a date beyond 9999 come before the text that all others have.
+  std::string text = date < 100'000'000 ? std::string() : std::to_string(date / 100'000'000);
+  const std::size_t begin = text.size();
+  text += "yyyymmddhhmmss.mmmmmm+utc";
+  const auto put = [&](std::size_t position, std::size_t length, std::uint64_t number) {
+    for (std::size_t digit = length; digit > 0; --digit, number /= 10) {
+      text[begin + position + digit - 1] = static_cast<char>('0' + number % 10);
+    }
+  };
+  put(0, 8, date);
+  put(8, 2, local % perDay / perHour);
+  put(10, 2, local % perHour / perMinute);
+  put(12, 2, local % perMinute / perSecond);
+  put(15, 6, local % perSecond);
+  text[begin + 21] = interval ? ':' : (utcOffset < 0 ? '-' : '+');
+  put(22, 3, static_cast<std::uint64_t>(interval ? 0 : std::abs(utcOffset)));
+  return text;
 }
 
 }  // namespace Cimom

@@ -9,7 +9,7 @@
 
 namespace Cimom {
 
-Instance::Instance(const ClassDefinition& definition, ObjectPath path)
+Instance::Instance(const ClassDefinition& definition, Shared<ObjectPath> path)
     : definition_(&definition), path_(std::move(path)), values_(definition.properties.size()) {
   takeKeys();
 }
@@ -20,7 +20,7 @@ const Value& Instance::operator[](std::size_t index) const {
 
 const Value* Instance::find(std::string_view name) const {
   const PropertyDeclaration* property = definition_->findProperty(name);
-  return property ? &(*this)[static_cast<std::size_t>(property - definition_->properties.data())] : nullptr;
+  return property ? &(*this)[definition_->properties.indexOf(*property)] : nullptr;
 }
 
 void Instance::set(std::string_view name, Value value) {
@@ -38,33 +38,30 @@ void Instance::set(std::string_view name, Value value) {
   if (filter_ && !filter_->contains(property->name) && !property->isKey()) {
     return;
   }
-  values_[static_cast<std::size_t>(property - definition_->properties.data())] = std::move(value);
+  values_[definition_->properties.indexOf(*property)] = std::move(value);
 }
 
 void Instance::setFilter(const std::vector<std::string>& properties) {
   filter_.emplace(properties.begin(), properties.end());
 }
 
-ObjectPath Instance::path() const {
-  ObjectPath complete = path_;
-  for (std::size_t index = 0; index < size(); ++index) {
-    const PropertyDeclaration& property = definition_->properties[index];
+Shared<ObjectPath> Instance::path() const {
+  Shared<ObjectPath> complete = path_;
+  for (const std::size_t index : definition_->keys) {
+    const std::string& name = definition_->properties[index].name;
     const Value& value = (*this)[index];
-    if (!property.isKey() || value.isNull()) {
-      continue;
-    }
-    const Value* given = complete.keys.find(property.name);
-    if (!given || given->isNull()) {
-      complete.keys.set(property.name, value);
+    const Value* given = path_->keys.find(name);
+    if (!value.isNull() && (!given || given->isNull())) {
+      complete.own().keys.set(name, value);
     }
   }
   return complete;
 }
 
-void Instance::setPath(ObjectPath path) {
-  if (!sameName(path.className, definition_->name)) {
+void Instance::setPath(Shared<ObjectPath> path) {
+  if (!sameName(path->className, definition_->name)) {
     throw StatusError(CMPI_RC_ERR_INVALID_PARAMETER,
-                      "an instance of " + definition_->name + " cannot have a path of " + path.className);
+                      "an instance of " + definition_->name + " cannot have a path of " + path->className);
   }
   path_ = std::move(path);
   takeKeys();
@@ -81,7 +78,7 @@ Instance Instance::withoutDefaults() const {
 }
 
 void Instance::takeKeys() {
-  for (const auto& [name, value] : path_.keys) {
+  for (const auto& [name, value] : path_->keys) {
     const PropertyDeclaration* property = definition_->findProperty(name);
     if (!property || !property->isKey()) {
       continue;

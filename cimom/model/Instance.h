@@ -10,6 +10,7 @@
 #include "cimom/model/ClassDefinition.h"
 #include "cimom/model/Names.h"
 #include "cimom/model/ObjectPath.h"
+#include "cimom/model/Shared.h"
 
 namespace Cimom {
 
@@ -18,7 +19,7 @@ namespace Cimom {
 class Instance {
  public:
   // Keys of the path become values of the key properties.
-  Instance(const ClassDefinition& definition, ObjectPath path);
+  Instance(const ClassDefinition& definition, Shared<ObjectPath> path);
 
   const ClassDefinition& definition() const { return *definition_; }
 
@@ -37,10 +38,10 @@ class Instance {
   void setFilter(const std::vector<std::string>& properties);
 
   // The path with every key that has a value: one given with the path wins over the property's value.
-  ObjectPath path() const;
+  Shared<ObjectPath> path() const;
   // Replaces the path; its keys become values of the key properties.
   // Throws StatusError CMPI_RC_ERR_INVALID_PARAMETER if it is the path of another class.
-  void setPath(ObjectPath path);
+  void setPath(Shared<ObjectPath> path);
 
   // The same instance, in which a property that nobody set is null, as ModifyInstance hands it to a provider.
   Instance withoutDefaults() const;
@@ -49,7 +50,7 @@ class Instance {
   void takeKeys();
 
   const ClassDefinition* definition_;
-  ObjectPath path_;
+  Shared<ObjectPath> path_;
   std::vector<std::optional<Value>> values_;
   std::optional<std::set<std::string, NameLess>> filter_;
 };

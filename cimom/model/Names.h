@@ -2,8 +2,12 @@
 #pragma once
 
 #include <algorithm>
+#include <cstddef>
+#include <cstdint>
 #include <memory>
+#include <string>
 #include <string_view>
+#include <unordered_map>
 
 #include "ground/Names.h"
 
@@ -19,6 +23,30 @@ auto* findNamed(Range& range, std::string_view name) {
   const auto found = std::ranges::find_if(range, [name](const auto& element) { return sameName(element.name, name); });
   return found == std::ranges::end(range) ? nullptr : std::to_address(found);
 }
+
+// A hash of names without regard to case. It takes the ends of names, which differ where their beginnings do not.
+struct NameHash {
+  using is_transparent = void;
+
+  std::size_t operator()(std::string_view name) const {
+    constexpr std::uint64_t lowerCaseBits = 0x2020202020202020;
+    constexpr std::uint64_t multiplier = 0x9E3779B97F4A7C15;  // of Fibonacci hashing
+    std::uint64_t end = 0;
+    const std::size_t length = std::min(name.size(), sizeof end);
+    std::copy_n(name.end() - static_cast<std::ptrdiff_t>(length), length, reinterpret_cast<char*>(&end));
+    return static_cast<std::size_t>(((end | lowerCaseBits) + name.size()) * multiplier >> 32U);
+  }
+};
+
+struct SameName {
+  using is_transparent = void;
+
+  bool operator()(std::string_view left, std::string_view right) const { return sameName(left, right); }
+};
+
+// Elements by name, in no order.
+template <typename Element>
+using ByName = std::unordered_map<std::string, Element, NameHash, SameName>;
 
 // A namespace as it is compared: without the slashes that some clients put around it.
 inline std::string_view bareNamespace(std::string_view nameSpace) {

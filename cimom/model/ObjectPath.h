@@ -26,7 +26,7 @@ struct ObjectPath {
     text += className;
     char separator = '.';
     for (const auto& [name, value] : keys) {
-      text += separator + name + "=" + value.toString();
+      text.append(1, separator).append(name).append("=").append(value.toString());
       separator = ',';
     }
     return text;

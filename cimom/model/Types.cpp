@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <array>
 #include <charconv>
+#include <cstdint>
 #include <iterator>
 
 #include "cimom/model/Names.h"
@@ -42,6 +43,26 @@ constexpr CimType types[] = {
     {CMPI_ptr, "pointer", nullptr, nullptr, sizeof(CMPIValuePtr)},
 };
 
+// Where the number of a type's row stands: its code has bits in one of its two bytes.
+constexpr std::size_t placeOf(CMPIType code) { return (code & 0xFFU) + (code >> 8U); }
+
+// At the place of a type's code the number of its row, from 1.
+constexpr auto rowNumbers = [] {
+  std::array<std::uint8_t, 0x200> numbers{};
+  for (std::uint8_t row = 0; row < std::size(types); ++row) {
+    numbers[placeOf(types[row].code)] = static_cast<std::uint8_t>(row + 1);
+  }
+  return numbers;
+}();
+
+constexpr const CimType* rowOf(CMPIType code) {
+  const std::uint8_t number = rowNumbers[placeOf(code)];
+  return number > 0 && types[number - 1].code == code ? &types[number - 1] : nullptr;
+}
+
+static_assert(std::ranges::all_of(types, [](const CimType& type) { return rowOf(type.code) == &type; }),
+              "two types share a place");
+
 // The first type for which the test holds, or CMPI_null.
 template <typename Test>
 CMPIType firstType(Test test) {
@@ -51,10 +72,7 @@ CMPIType firstType(Test test) {
 
 }  // namespace
 
-const CimType* findType(CMPIType code) {
-  const auto* const found = std::ranges::find(types, elementTypeOf(code), &CimType::code);
-  return found == std::end(types) ? nullptr : found;
-}
+const CimType* findType(CMPIType code) { return rowOf(elementTypeOf(code)); }
 
 CMPIType typeOfMofName(std::string_view name) {
   return firstType([name](const CimType& type) { return type.mofName && sameName(type.mofName, name); });

@@ -31,21 +31,17 @@ void visitInteger(CMPIType type, Union& value, Operation operation) {
 }
 
 std::string quoted(std::string_view text) {
-  std::string result = "\"";
+  std::string result;
+  result.reserve(text.size() + 2);
+  result += '"';
   for (const char letter : text) {
     if (letter == '"' || letter == '\\') {
       result += '\\';
     }
     result += letter;
   }
-  return result + '"';
-}
-
-// The object of that type that a value shares, or null.
-template <typename T, typename Content>
-const T* shared(const Content& content) {
-  const auto* pointer = std::get_if<std::shared_ptr<const T>>(&content);
-  return pointer ? pointer->get() : nullptr;
+  result += '"';
+  return result;
 }
 
 // Every level of references within references would double the text of the innermost.
@@ -76,26 +72,18 @@ Value Value::sint64(CMPISint64 value) { return Value(CMPI_sint64, scalarOf(value
 Value Value::real64(CMPIReal64 value) { return Value(CMPI_real64, scalarOf(value)); }
 Value Value::char16(CMPIChar16 value) { return Value(CMPI_char16, scalarOf(value)); }
 Value Value::scalar(CMPIType type, const CMPIValue& value) { return Value(type, value); }
-Value Value::string(std::string value) {
-  return Value(CMPI_string, std::make_shared<const std::string>(std::move(value)));
-}
+Value Value::string(std::string value) { return string(Shared<std::string>(std::move(value))); }
+Value Value::string(Shared<std::string> value) { return Value(CMPI_string, std::move(value)); }
 Value Value::dateTime(DateTime value) { return Value(CMPI_dateTime, value); }
-Value Value::reference(ObjectPath value) {
-  return Value(CMPI_ref, std::make_shared<const ObjectPath>(std::move(value)));
+Value Value::reference(Shared<ObjectPath> value) { return Value(CMPI_ref, std::move(value)); }
+Value Value::instance(Shared<Instance> value) { return Value(CMPI_instance, std::move(value)); }
+Value Value::array(Shared<Array> value) {
+  const CMPIType type = arrayOf(value->elementType);
+  return Value(type, std::move(value));
 }
-Value Value::instance(Instance value) {
-  return Value(CMPI_instance, std::make_shared<const Instance>(std::move(value)));
-}
-Value Value::array(Array value) {
-  const CMPIType type = arrayOf(value.elementType);
-  return Value(type, std::make_shared<const Array>(std::move(value)));
-}
-
-Value Value::arguments(NamedValues value) {
-  return Value(CMPI_args, std::make_shared<const NamedValues>(std::move(value)));
-}
+Value Value::arguments(NamedValues value) { return Value(CMPI_args, Shared<NamedValues>(std::move(value))); }
 Value Value::enumeration(std::vector<Value> items) {
-  return Value(CMPI_enumeration, std::make_shared<const std::vector<Value>>(std::move(items)));
+  return Value(CMPI_enumeration, Shared<std::vector<Value>>(std::move(items)));
 }
 
 bool Value::isTrue() const {
@@ -103,17 +91,18 @@ bool Value::isTrue() const {
   return type_ == CMPI_boolean && content && content->boolean;
 }
 
-const std::string* Value::text() const { return shared<std::string>(content_); }
+const std::string* Value::text() const { return object<std::string>(); }
+const ObjectPath* Value::path() const { return object<ObjectPath>(); }
+const Instance* Value::embedded() const { return object<Instance>(); }
+const Array* Value::elements() const { return object<Array>(); }
+const NamedValues* Value::arguments() const { return object<NamedValues>(); }
+const std::vector<Value>* Value::items() const { return object<std::vector<Value>>(); }
 
-const ObjectPath* Value::path() const { return shared<ObjectPath>(content_); }
-
-const Instance* Value::embedded() const { return shared<Instance>(content_); }
-
-const Array* Value::elements() const { return shared<Array>(content_); }
-
-const NamedValues* Value::arguments() const { return shared<NamedValues>(content_); }
-
-const std::vector<Value>* Value::items() const { return shared<std::vector<Value>>(content_); }
+template <typename T>
+const T* Value::object() const {
+  const Shared<T>* content = shared<T>();
+  return content ? &**content : nullptr;
+}
 
 std::optional<Value> Value::asInteger(CMPIType type) const {
   std::optional<Value> result;
@@ -150,7 +139,7 @@ std::string Value::toString() const {
     return quoted(shortened(reference->toString()));
   }
   if (const Instance* instance = embedded()) {
-    return quoted(shortened(instance->path().toString()));
+    return quoted(shortened(instance->path()->toString()));
   }
   if (const DateTime* dateTime = time()) {
     return quoted(dateTime->format());

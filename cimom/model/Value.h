@@ -4,7 +4,6 @@
 
 #include <cmpidt.h>
 
-#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -13,6 +12,7 @@
 #include <vector>
 
 #include "cimom/model/DateTime.h"
+#include "cimom/model/Shared.h"
 
 namespace Cimom {
 
@@ -39,10 +39,11 @@ class Value {
   // Of any type that CMPI passes by value.
   static Value scalar(CMPIType type, const CMPIValue& value);
   static Value string(std::string value);
+  static Value string(Shared<std::string> value);
   static Value dateTime(DateTime value);
-  static Value reference(ObjectPath value);
-  static Value instance(Instance value);
-  static Value array(Array value);
+  static Value reference(Shared<ObjectPath> value);
+  static Value instance(Shared<Instance> value);
+  static Value array(Shared<Array> value);
   // What only CMPI passes as a value: arguments of a method, and items of an enumeration.
   static Value arguments(NamedValues value);
   static Value enumeration(std::vector<Value> items);
@@ -68,6 +69,17 @@ class Value {
   const NamedValues* arguments() const;
   // The items of the enumeration, or null.
   const std::vector<Value>* items() const;
+  // The text, path, instance or array as this value shares it, or null.
+  template <typename T>
+  const Shared<T>* shared() const {
+    return std::get_if<Shared<T>>(&content_);
+  }
+  // The path or instance, to be changed in this value alone, or null.
+  template <typename T>
+  T* own() {
+    auto* object = std::get_if<Shared<T>>(&content_);
+    return object ? &object->own() : nullptr;
+  }
 
   // The same number as another integer type; none if it is no integer or does not fit.
   std::optional<Value> asInteger(CMPIType type) const;
@@ -78,10 +90,8 @@ class Value {
   std::string toString() const;
 
  private:
-  using Content =
-      std::variant<std::monostate, CMPIValue, DateTime, std::shared_ptr<const std::string>,
-                   std::shared_ptr<const ObjectPath>, std::shared_ptr<const Instance>, std::shared_ptr<const Array>,
-                   std::shared_ptr<const NamedValues>, std::shared_ptr<const std::vector<Value>>>;
+  using Content = std::variant<std::monostate, CMPIValue, DateTime, Shared<std::string>, Shared<ObjectPath>,
+                               Shared<Instance>, Shared<Array>, Shared<NamedValues>, Shared<std::vector<Value>>>;
 
   // What a variant does whose copy throws is not to be relied on.
   template <typename... Types>
@@ -90,6 +100,9 @@ class Value {
   }
 
   Value(CMPIType type, Content content);
+
+  template <typename T>
+  const T* object() const;
 
   CMPIType type_ = CMPI_null;
   Content content_;

@@ -37,7 +37,10 @@ bool anyPair(const ClassDefinition& association, Check check) {
 }
 
 // The path of an answer: of an instance its own.
-ObjectPath pathOf(const Value& answer) { return answer.path() ? *answer.path() : answer.embedded()->path(); }
+Shared<ObjectPath> pathOf(const Value& answer) {
+  const auto* path = answer.shared<ObjectPath>();
+  return path ? *path : answer.embedded()->path();
+}
 
 }  // namespace
 
@@ -87,8 +90,8 @@ bool AssociationCheck::canLead(const ClassDefinition& association) const {
 }
 
 bool AssociationCheck::isReference(const Value& answer) const {
-  const ObjectPath path = pathOf(answer);
-  const ClassDefinition* definition = classOf(path);
+  const Shared<ObjectPath> path = pathOf(answer);
+  const ClassDefinition* definition = classOf(*path);
   if (isGiven(filter_.associationClass) && definition && !definition->isA(filter_.associationClass)) {
     return false;
   }
@@ -96,7 +99,7 @@ bool AssociationCheck::isReference(const Value& answer) const {
     return true;
   }
   const Instance* instance = answer.embedded();
-  const Value* end = instance ? instance->find(filter_.role) : path.keys.find(filter_.role);
+  const Value* end = instance ? instance->find(filter_.role) : path->keys.find(filter_.role);
   if (!end) {
     return !instance;
   }
@@ -125,10 +128,10 @@ void AssociationCheck::filterAssociated(const ClassDefinition& association, std:
     });
   };
   std::erase_if(answers, [&](const Value& answer) {
-    const ObjectPath path = pathOf(answer);
-    const ClassDefinition* definition = classOf(path);
+    const Shared<ObjectPath> path = pathOf(answer);
+    const ClassDefinition* definition = classOf(*path);
     const auto isOf = [&](const std::string& className) {
-      return definition ? definition->isA(className) : sameName(path.className, className);
+      return definition ? definition->isA(className) : sameName(path->className, className);
     };
     if (isGiven(filter_.resultClass) && !isOf(filter_.resultClass)) {
       return true;
@@ -149,7 +152,7 @@ void AssociationCheck::filterAssociated(const ClassDefinition& association, std:
     const bool must = anyPair(association, [&](const Reference& source, const Reference& result) {
       return canBePair(source, result) && isAskedPair(source, result) && !mayBeReversed(source, result);
     });
-    return !must && (!canBe || !isLinked(path));
+    return !must && (!canBe || !isLinked(*path));
   });
 }
 

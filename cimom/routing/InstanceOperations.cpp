@@ -72,7 +72,7 @@ Instance inClass(const ClassDefinition& definition, const Instance& given) {
   if (sameName(given.definition().name, definition.name)) {
     return bare;
   }
-  Instance other = Instance(definition, {}).withoutDefaults();
+  Instance other = Instance(definition, ObjectPath()).withoutDefaults();
   for (std::size_t index = 0; index < bare.size(); ++index) {
     const PropertyDeclaration* property = definition.findProperty(given.definition().properties[index].name);
     if (property && property->type == given.definition().properties[index].type) {
@@ -180,7 +180,8 @@ void Router::requireConsistent(const Operation& operation, const Instance& insta
       requireSame(property.name, sent.find(property.name));
     }
   }
-  for (const auto& [name, value] : instance.path().keys) {
+  const Shared<ObjectPath> own = instance.path();
+  for (const auto& [name, value] : own->keys) {
     requireSame(name, &value);
   }
   for (; properties && *properties; ++properties) {
@@ -196,7 +197,8 @@ void Router::modifyInstance(const Operation& operation, const Instance& instance
     requireConsistent(operation, instance, properties);
   }
   ObjectPath complete = operation.path;
-  for (const auto& [name, value] : instance.path().keys) {
+  const Shared<ObjectPath> own = instance.path();
+  for (const auto& [name, value] : own->keys) {
     if (!complete.keys.find(name)) {
       complete.keys.set(name, value);
     }

@@ -33,15 +33,13 @@ Context providerContext(const Operation& operation) {
 
 void completeNamespace(Value& item, const std::string& nameSpace) {
   if (const ObjectPath* path = item.path(); path && path->nameSpace.empty()) {
-    ObjectPath complete = *path;
-    complete.nameSpace = nameSpace;
-    item = Value::reference(std::move(complete));
-  } else if (const Instance* instance = item.embedded(); instance && instance->path().nameSpace.empty()) {
-    ObjectPath complete = instance->path();
-    complete.nameSpace = nameSpace;
-    Instance moved = *instance;
-    moved.setPath(std::move(complete));
-    item = Value::instance(std::move(moved));
+    item.own<ObjectPath>()->nameSpace = nameSpace;
+  } else if (const Instance* instance = item.embedded()) {
+    Shared<ObjectPath> own = instance->path();
+    if (own->nameSpace.empty()) {
+      own.own().nameSpace = nameSpace;
+      item.own<Instance>()->setPath(std::move(own));
+    }
   }
 }
 

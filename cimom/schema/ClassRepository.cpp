@@ -49,21 +49,16 @@ MethodDeclaration inherited(MethodDeclaration method) {
   return method;
 }
 
-// Builds the resolved form of a class from its superclass's.
-ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefinition* superclass) {
-  ClassDefinition resolved = declaration.own;
-  resolved.superclass = superclass;
-  if (!superclass) {
-    return resolved;
-  }
-  inheritQualifiers(resolved.qualifiers, superclass->qualifiers);
-  const auto inherit = [](const auto& feature) { return inherited(feature); };
+// Takes the features of the superclass over, those in their place that the class overrides.
+void inherit(ClassDefinition& resolved, const ClassDeclaration& declaration, const ClassDefinition& superclass) {
+  inheritQualifiers(resolved.qualifiers, superclass.qualifiers);
+  const auto takenOver = [](const auto& feature) { return inherited(feature); };
   resolved.properties.clear();
   resolved.methods.clear();
-  std::ranges::transform(superclass->properties, std::back_inserter(resolved.properties), inherit);
-  std::ranges::transform(superclass->methods, std::back_inserter(resolved.methods), inherit);
+  std::ranges::transform(superclass.properties, std::back_inserter(resolved.properties), takenOver);
+  std::ranges::transform(superclass.methods, std::back_inserter(resolved.methods), takenOver);
   for (PropertyDeclaration property : declaration.own.properties) {
-    PropertyDeclaration* overridden = findNamed(resolved.properties, property.name);
+    PropertyDeclaration* overridden = resolved.properties.find(property.name);
     if (!overridden) {
       resolved.properties.push_back(std::move(property));
       continue;
@@ -80,7 +75,7 @@ ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefiniti
     *overridden = std::move(property);
   }
   for (MethodDeclaration method : declaration.own.methods) {
-    MethodDeclaration* overridden = findNamed(resolved.methods, method.name);
+    MethodDeclaration* overridden = resolved.methods.find(method.name);
     if (!overridden) {
       resolved.methods.push_back(std::move(method));
       continue;
@@ -93,6 +88,20 @@ ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefiniti
     }
     method.originClass = overridden->originClass;
     *overridden = std::move(method);
+  }
+}
+
+// Builds the resolved form of a class from its superclass's.
+ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefinition* superclass) {
+  ClassDefinition resolved = declaration.own;
+  resolved.superclass = superclass;
+  if (superclass) {
+    inherit(resolved, declaration, *superclass);
+  }
+  for (std::size_t index = 0; index < resolved.properties.size(); ++index) {
+    if (resolved.properties[index].isKey()) {
+      resolved.keys.push_back(index);
+    }
   }
   return resolved;
 }
@@ -185,6 +194,7 @@ std::vector<const ClassDefinition*> ClassRepository::subclasses(std::string_view
       result.push_back(definition);
     }
   }
+  std::ranges::sort(result, NameLess(), &ClassDefinition::name);
   return result;
 }
 

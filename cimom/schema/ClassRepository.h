@@ -32,8 +32,8 @@ class ClassRepository {
   // All classes by name, of all namespaces and of none.
   std::vector<const ClassDefinition*> all() const;
 
-  // The direct subclasses that the namespace shows, or all below if `deep` says so; an empty name stands for the root
-  // of all classes.
+  // The direct subclasses that the namespace shows, or all below if `deep` says so, by name; an empty name stands for
+  // the root of all classes.
   std::vector<const ClassDefinition*> subclasses(std::string_view nameSpace, std::string_view className,
                                                  bool deep) const;
 
@@ -59,9 +59,9 @@ class ClassRepository {
   using Classes = std::map<std::string, ClassDefinition, NameLess>;
 
   struct Namespace {
-    Classes own;                                                    // that stand under its pragma
-    std::map<std::string, const ClassDefinition*, NameLess> shown;  // those, and what it shows of the schema
-    std::set<std::string, NameLess> asked;                          // to be shown
+    Classes own;                            // that stand under its pragma
+    ByName<const ClassDefinition*> shown;   // those, and what it shows of the schema
+    std::set<std::string, NameLess> asked;  // to be shown
   };
 
   using Namespaces = std::map<std::string, Namespace, NameLess>;

@@ -126,7 +126,8 @@ CMPIData spoiled(CMPIData data, CMPIStatus* status, const Call& call) {
         return bare;
       }();
       data = {CMPI_instance, CMPI_goodValue, {}};
-      data.value.inst = another(Cimom::Instance(definition, {"", "root/yrnse", definition.name, {}}), call);
+      data.value.inst =
+          another(Cimom::Instance(definition, Cimom::ObjectPath{"", "root/yrnse", definition.name, {}}), call);
       return data;
     }
     case Fault::Characters: {

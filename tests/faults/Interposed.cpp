@@ -109,7 +109,7 @@ CMPIStatus announcedFilter(CMPIInstance* instance, const char** properties, cons
 }
 
 void interposeStrings() {
-  takeTable<CMPIString>(*personal(Cimom::make(Cimom::Text{}))->ft);
+  takeTable<CMPIString>(*personal(Cimom::make(Cimom::Text{std::string()}))->ft);
   INTERPOSE(CMPIStringFT, getCharPtr);
 }
 
@@ -136,7 +136,7 @@ void interposePaths() {
 
 void interposeInstances(decltype(Behind::filtered) filtered) {
   const Cimom::ClassDefinition definition;
-  takeTable<CMPIInstance>(*personal(Cimom::make(Cimom::Instance(definition, {})))->ft);
+  takeTable<CMPIInstance>(*personal(Cimom::make(Cimom::Instance(definition, Cimom::ObjectPath{})))->ft);
   announceFilter = filtered;
   realFilter = std::exchange(original<CMPIInstanceFT>.setPropertyFilter, announcedFilter);
   INTERPOSE(CMPIInstanceFT, getProperty);

@@ -173,7 +173,7 @@ CMPIEnumeration* World::enumerateInstances(const CMPIBroker*, const CMPIContext*
                                            const char** properties, CMPIStatus* status) {
   CMPIEnumeration* made = Cimom::guarded(status, static_cast<CMPIEnumeration*>(nullptr), [&] {
     recording().outcome.upCalls.push_back(textOf(path) + (properties ? " with properties" : ""));
-    const auto& given = Cimom::argumentOf<ObjectPath>(path);
+    const auto& given = *Cimom::argumentOf<ObjectPath>(path);
     const auto found = world().underlying_.find(given.className);
     if (given.nameSpace != underlyingNameSpace || found == world().underlying_.end()) {
       throw Cimom::StatusError(CMPI_RC_ERR_INVALID_CLASS, "no such class");

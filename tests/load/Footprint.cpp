@@ -13,18 +13,22 @@ namespace {
 
 std::string entryOf(pid_t process, const char* name) { return "/proc/" + std::to_string(process) + '/' + name; }
 
-}  // namespace
-
-long residentKib(pid_t process) {
+long kibOf(pid_t process, const char* row) {
   std::istringstream status(readFile(entryOf(process, "status")));
   for (std::string word; status >> word;) {
     long size = 0;
-    if (word == "VmRSS:" && status >> size) {
+    if (word == row && status >> size) {
       return size;
     }
   }
   return 0;
 }
+
+}  // namespace
+
+long residentKib(pid_t process) { return kibOf(process, "VmRSS:"); }
+
+long peakResidentKib(pid_t process) { return kibOf(process, "VmHWM:"); }
 
 std::vector<std::string> descriptorsOf(pid_t process) {
   std::vector<std::string> targets;

@@ -10,8 +10,9 @@
 
 namespace Testing {
 
-// What it has in memory, in KiB.
+// What it has in memory, in KiB, and the most that it ever had.
 long residentKib(pid_t process);
+long peakResidentKib(pid_t process);
 
 // How much more it may have at the end: an allocator grows in steps, and the sanitizers keep what has been freed and
 // where it came from.

@@ -34,7 +34,7 @@ class ModifyOperationTest : public CompositeTest {
   CMPIInstance* makeSent(const std::string& className, const Properties& properties) {
     CMPIInstance* instance = makeInstance(requestNameSpace, className, properties);
     if (!personality().sendsDefaults) {
-      auto& model = Cimom::modelOf<Cimom::Instance>(instance);
+      auto& model = Cimom::ownModelOf<Cimom::Instance>(instance);
       model = model.withoutDefaults();
     }
     return instance;

@@ -1,6 +1,6 @@
 // SPDX-License-Identifier: Apache-2.0
-// What the most costly requests cost: instructions as callgrind counts them, and memory. Neither depends on what else
-// the machine does.
+// What requests cost, the most costly ones and an enumeration: instructions as callgrind counts them, and memory.
+// Neither depends on what else the machine does.
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -25,11 +25,17 @@ constexpr double mostInstructions = 90e6;
 constexpr long mostKibOfSmall = 16L << 10U;
 constexpr long mostKibOfLargest = 64L << 10U;
 
-// The instructions that each request takes, by its name.
-std::map<std::string, double> instructions(std::size_t bytes) {
+// An enumeration: beside what a request costs, so much for each instance. Both have room for what other compilers make.
+constexpr double mostInstructionsOfRequest = 200e3;
+constexpr double mostInstructionsOfInstance = 64e3;
+constexpr long mostAllocationsOf34 = 1000;
+constexpr double mostAllocationsOfInstance = 25;
+
+// The instructions that each request takes which a program has answered, by its name.
+std::map<std::string, double> instructions(const std::string& program, std::size_t argument) {
   const TemporaryDirectory directory;
   const Completed completed = run({"valgrind", "--tool=callgrind", "--callgrind-out-file=" + (directory / "profile"),
-                                   REQUEST_COST, std::to_string(bytes)},
+                                   program, std::to_string(argument)},
                                   {}, std::chrono::seconds(110));
   EXPECT_EQ(completed.status, 0) << completed.errors;
   std::map<std::string, double> counts;
@@ -61,8 +67,8 @@ long peakKib(const std::string& name, std::size_t bytes) {
 }
 
 TEST(RequestCostTest, ProcessorTimeIsBoundedAndGrowsWithTheSize) {
-  const auto ofSmall = instructions(small);
-  const auto ofMedium = instructions(medium);
+  const auto ofSmall = instructions(REQUEST_COST, small);
+  const auto ofMedium = instructions(REQUEST_COST, medium);
   for (const CostlyRequest& request : costlyRequests()) {
     SCOPED_TRACE(request.name);
     ASSERT_TRUE(ofSmall.contains(request.name) && ofMedium.contains(request.name));
@@ -84,6 +90,33 @@ TEST(RequestCostTest, MemoryIsBounded) {
     EXPECT_LT(ofSmall, mostKibOfSmall);
     EXPECT_LT(ofLargest, mostKibOfLargest);
   }
+}
+
+// How often an enumeration of so many instances allocates memory.
+long allocations(std::size_t instances) {
+  const Completed completed = run({ENUMERATION_COST, std::to_string(instances)});
+  EXPECT_EQ(completed.status, 0) << completed.errors;
+  return std::stol(completed.output);
+}
+
+TEST(RequestCostTest, AnInstanceTakesFewInstructions) {
+  const double few = instructions(ENUMERATION_COST, 34)["answer"];
+  const double many = instructions(ENUMERATION_COST, 334)["answer"];
+  const double ofInstance = (many - few) / 300;
+  const double ofRequest = few - 34 * ofInstance;
+  std::cout << ofRequest << " instructions, and " << ofInstance << " for each instance\n";
+  EXPECT_GT(ofInstance, 0);
+  EXPECT_LT(ofInstance, mostInstructionsOfInstance);
+  EXPECT_LT(ofRequest, mostInstructionsOfRequest);
+}
+
+TEST(RequestCostTest, AnInstanceTakesFewAllocations) {
+  const long few = allocations(34);
+  const long many = allocations(334);
+  std::cout << few << " and " << many << " allocations\n";
+  EXPECT_GT(few, 0);
+  EXPECT_LT(few, mostAllocationsOf34);
+  EXPECT_LT(static_cast<double>(many - few) / 300, mostAllocationsOfInstance);
 }
 
 }  // namespace

@@ -64,17 +64,21 @@ TEST(ScalarTextTest, ReadsAndWritesScalars) {
     const auto value = parseScalar(text.type, text.text);
     ASSERT_EQ(value.has_value(), text.canonical ? true : false);
     if (value) {
-      EXPECT_EQ(formatScalar(text.type, *value), text.canonical);
+      EXPECT_EQ(formatScalar(Cimom::Value::scalar(text.type, *value)), text.canonical);
     }
   }
 }
 
-TEST(ScalarTextTest, WritesNullObjectsAsTheEmptyText) {
-  const CMPIValue null{};
-  EXPECT_EQ(formatScalar(CMPI_string, null), "");
-  EXPECT_EQ(formatScalar(CMPI_chars, null), "");
-  EXPECT_EQ(formatScalar(CMPI_dateTime, null), "");
-  EXPECT_EQ(formatScalar(CMPI_args, null), "");
+TEST(ScalarTextTest, WritesDateTimes) {
+  constexpr const char* text = "20260102030405.000000+060";
+  EXPECT_EQ(formatScalar(Cimom::Value::dateTime(Cimom::DateTime::parse(text))), text);
+}
+
+TEST(ScalarTextTest, WritesWhatIsNoScalarAsTheEmptyText) {
+  for (const CMPIType type : {CMPI_string, CMPI_dateTime, CMPI_uint8, CMPI_null}) {
+    EXPECT_EQ(formatScalar(Cimom::Value::null(type)), "");
+  }
+  EXPECT_EQ(formatScalar(Cimom::Value::arguments({})), "");
 }
 
 }  // namespace

@@ -32,7 +32,8 @@ TEST(ValueTest, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value::uint64(std::numeric_limits<CMPIUint64>::max()).toString(), "18446744073709551615");
   EXPECT_EQ(Value::real64(1.5).toString(), "1.5");
   EXPECT_EQ(Value::char16(65).toString(), "65");
-  EXPECT_EQ(Value::array({CMPI_string, {Value::string("a"), Value::null(CMPI_string)}}).toString(), "{\"a\",NULL}");
+  EXPECT_EQ(Value::array(Array{CMPI_string, {Value::string("a"), Value::null(CMPI_string)}}).toString(),
+            "{\"a\",NULL}");
 }
 
 TEST(ValueTest, OfReferencesWithinReferencesStaysShort) {

@@ -54,7 +54,7 @@ CMPIObjectPath* PersonalBroker::newObjectPath(const CMPIBroker* broker, const ch
   CMPIObjectPath* path = Cimom::encapsulationTable.newObjectPath(broker, nameSpace, className, status);
   personalize(status);
   if (path && definition && personality().countsUnsetKeys) {
-    addUnsetKeys(Cimom::modelOf<Cimom::ObjectPath>(path), *definition);
+    addUnsetKeys(Cimom::ownModelOf<Cimom::ObjectPath>(path), *definition);
   }
   return personal(path);
 }

@@ -263,7 +263,7 @@ CMPIObjectPath* getObjectPath(const CMPIInstance* instance, CMPIStatus* status) 
     return nullptr;
   }
   const Instance& model = modelOf<Instance>(instance);
-  ObjectPath& keyed = modelOf<ObjectPath>(path);
+  auto& keyed = Cimom::ownModelOf<ObjectPath>(path);
   if (!personality().keysOfThePathWin) {
     keyed.keys = {};
     for (const PropertyDeclaration& property : model.definition().properties) {

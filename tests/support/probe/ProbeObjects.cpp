@@ -4,6 +4,7 @@
 #include <cmpimacs.h>
 #include <strings.h>
 
+#include <atomic>
 #include <mutex>
 
 namespace Probe {
@@ -13,6 +14,7 @@ constexpr const char* originalText = "<plain> & \"quoted\" \xE2\x82\xAC";
 
 std::mutex mutex;
 std::string currentText = originalText;
+std::atomic<CMPIUint16> things = 2;
 
 std::string chars(const CMPIString* string) {
   const char* text = string ? CMGetCharsPtr(string, nullptr) : nullptr;
@@ -133,6 +135,8 @@ void setText(const std::string& text) {
   currentText = text;
 }
 
+void setThings(CMPIUint16 count) { things = count; }
+
 CMPIObjectPath* thingPath(const CMPIBroker* broker, const char* nameSpace, const char* className, CMPIUint16 number) {
   CMPIObjectPath* path = CMNewObjectPath(broker, nameSpace, className, nullptr);
   CMPIValue value{};
@@ -147,7 +151,11 @@ std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjec
   const std::string className = chars(CMGetClassName(path, nullptr));
   const auto is = [&className](const char* name) { return strcasecmp(className.c_str(), name) == 0; };
   if (is("TEST_Thing")) {
-    return {thing(broker, nameSpace.c_str(), "TEST_Thing", 1), thing(broker, nameSpace.c_str(), "TEST_Thing", 2)};
+    std::vector<CMPIInstance*> all;
+    for (CMPIUint16 number = 1; number <= things; ++number) {
+      all.push_back(thing(broker, nameSpace.c_str(), "TEST_Thing", number));
+    }
+    return all;
   }
   if (is("TEST_Part")) {
     return {thing(broker, nameSpace.c_str(), "TEST_Part", 3)};

@@ -12,7 +12,10 @@ namespace Probe {
 std::string text();
 void setText(const std::string& text);
 
-// The instances of a class in the path's namespace: two things, one part, one link from the first thing to the part,
+// How many instances of TEST_Thing there are, two where nobody says.
+void setThings(CMPIUint16 count);
+
+// The instances of a class in the path's namespace: the things, one part, one link from the first thing to the part,
 // one numbered, one machine; none of any other class.
 std::vector<CMPIInstance*> instancesOf(const CMPIBroker* broker, const CMPIObjectPath* path);
 
