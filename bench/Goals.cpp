@@ -28,7 +28,7 @@ const std::vector<Row> rows = {
     {"bmc", "write cold", "A BMC's address and mask written and read back, from cold", "round trips", 15},
     {"bmc", "read held", "A BMC read, in a held session", "round trips", 6},
     {"bmc", "read cold", "A BMC read, from cold", "round trips", 11},
-    {"bmc", "burst", "Sessions opened for a burst of eight requests", "sessions", 1},
+    {"bmc", "burst", "Sessions opened for a burst of eight requests", "in all", 1},
     {"memory", "peak", "cimomd with 60 requests of 3 MiB at once, at most", "MiB", 300},
     {"memory", "kept", "What cimomd keeps of that afterwards", "MiB", 30},
     {"peers", "pegasus 3", "cimomd beside OpenPegasus, EnumerateInstances, median: 3 instances", "times", 0.25},

@@ -5,7 +5,6 @@
 
 #include <algorithm>
 #include <chrono>
-#include <fstream>
 #include <memory>
 #include <optional>
 #include <stdexcept>
@@ -14,9 +13,11 @@
 #include "Paths.h"
 #include "bench/Measurements.h"
 #include "tests/cimom/cimxml/CostlyRequests.h"
+#include "tests/load/Footprint.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/client/Enumeration.h"
 #include "tests/support/client/HttpClient.h"
+#include "tests/support/system/Poll.h"
 
 namespace Benchmark {
 namespace {
@@ -142,19 +143,6 @@ void measureEcho(Results& results) {
 
 namespace {
 
-// A figure of /proc/PID/status, in MiB.
-double memoryOf(pid_t process, const std::string& figure) {
-  std::ifstream status("/proc/" + std::to_string(process) + "/status");
-  for (std::string word; status >> word;) {
-    if (word == figure + ":") {
-      double kib = 0;
-      status >> kib;
-      return kib / 1024;
-    }
-  }
-  throw std::runtime_error("process " + std::to_string(process) + " shows no " + figure);
-}
-
 // One of many clients: sends the request, and takes whatever answer there is. A server that has enough says so.
 void send(std::uint16_t port, const CostlyRequest& request, std::size_t bytes) {
   try {
@@ -168,25 +156,33 @@ void send(std::uint16_t port, const CostlyRequest& request, std::size_t bytes) {
 
 }  // namespace
 
+// Of each kind of costly request, in a cimomd of its own; the worst counts.
 void measureMemory(Results& results) {
   constexpr int clients = 60;
   constexpr std::size_t bytes = 3U << 20U;
-  Cimomd cimomd(Cimomd::probeOptions());
-  const pid_t process = cimomd.process().id();
-  const auto sendAll = [&](int count, std::size_t size) {
-    for (const CostlyRequest& request : costlyRequests()) {
+  constexpr double mebibyte = 1024;
+  double& peak = results.figures["peak"];
+  double& kept = results.figures["kept"];
+  for (const CostlyRequest& request : costlyRequests()) {
+    Cimomd cimomd(Cimomd::probeOptions());
+    const pid_t process = cimomd.process().id();
+    {
       std::vector<std::jthread> all;
-      all.reserve(static_cast<std::size_t>(count));
-      for (int client = 0; client < count; ++client) {
-        all.emplace_back([&] { send(cimomd.port(), request, size); });
+      all.reserve(clients);
+      for (int client = 0; client < clients; ++client) {
+        all.emplace_back([&] { send(cimomd.port(), request, bytes); });
       }
     }
-  };
-  sendAll(1, 1024);
-  const double before = memoryOf(process, "VmRSS");
-  sendAll(clients, bytes);
-  results.figures["peak"] = memoryOf(process, "VmHWM");
-  results.figures["kept"] = std::max(0.0, memoryOf(process, "VmRSS") - before);
+    peak = std::max(peak, static_cast<double>(peakResidentKib(process)) / mebibyte);
+    // What is idle goes back to the system within a moment.
+    long least = residentKib(process);
+    const auto deadline = Clock::now() + std::chrono::seconds(1);
+    poll([&] {
+      least = std::min(least, residentKib(process));
+      return Clock::now() > deadline;
+    });
+    kept = std::max(kept, static_cast<double>(least) / mebibyte);
+  }
 }
 
 }  // namespace Benchmark

@@ -5,7 +5,7 @@
 // that it took, in KiB.
 #include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
-#include <sys/resource.h>
+#include <unistd.h>
 #include <valgrind/callgrind.h>
 
 #include <cstdlib>
@@ -21,6 +21,7 @@
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
 #include "cimom/cimxml/Endpoint.h"
+#include "tests/load/Footprint.h"
 #include "tests/support/client/Enumeration.h"
 #include "trace/Trace.h"
 
@@ -246,9 +247,7 @@ int main(int argc, char** argv) {
   }
   try {
     part->second(std::atoi(argv[2]));
-    rusage usage{};
-    ::getrusage(RUSAGE_SELF, &usage);
-    std::cout << usage.ru_maxrss << '\n';
+    std::cout << peakResidentKib(::getpid()) << '\n';
     return 0;
   } catch (const std::exception& error) {
     std::cerr << "workload: " << part->first << ": " << error.what() << '\n';
