@@ -69,6 +69,15 @@ TEST(PageTest, SaysWhatWasNotMeasured) {
   EXPECT_THAT(pageOf(results), HasSubstr("## Not measured\n\n- sfcb: there is none\n"));
 }
 
+TEST(PageTest, SaysWhatTheLinesOfAnInstanceCostBesideTheMinimalProvider) {
+  Results results = measured();
+  EXPECT_THAT(pageOf(results), Not(HasSubstr("eight lines")));
+  results.figures = {{"line", 1500}};
+  results.size(34).minimal = 34 * 60000.0;
+  EXPECT_THAT(pageOf(results),
+              HasSubstr("The eight lines that each instance has in the log and in the trace cost 0.2 "));
+}
+
 TEST(PageTest, ShowsWhatAnInstanceCostsAtEachSize) {
   EXPECT_THAT(pageOf(measured()), HasSubstr("| 1,000 | 300,000,000 | 300,000 | 140,000 | 120,000 | 70 | 4 |\n"));
 }
