@@ -43,16 +43,20 @@ std::string fixed(double figure, int digits) {
 
 std::string cell(double figure) { return figure > 0 ? shown(figure) : ""; }
 
+const char* verdictOf(const Row& row, double figure) {
+  if (isMissed(row, figure)) {
+    return "**missed**";
+  }
+  return row.most && figure > *row.most ? "within a tenth" : "";
+}
+
 std::string goalsOf(const Results& results) {
   std::string table = "| what | figure | goal | |\n|---|--:|--:|---|\n";
   for (const Row& row : rows) {
-    const auto figure = results.figures.find(row.name);
-    if (figure == results.figures.end()) {
-      continue;
+    if (const auto figure = results.figures.find(row.name); figure != results.figures.end()) {
+      table += std::string("| ") + row.what + " | " + shown(figure->second) + ' ' + row.unit + " | " +
+               (row.most ? "≤ " + shown(*row.most) : "") + " | " + verdictOf(row, figure->second) + " |\n";
     }
-    table += std::string("| ") + row.what + " | " + shown(figure->second) + ' ' + row.unit + " | " +
-             (row.most ? "≤ " + shown(*row.most) : "") + " | " + (isMissed(row, figure->second) ? "**missed**" : "") +
-             " |\n";
   }
   return table;
 }
