@@ -176,7 +176,7 @@ Http::ServerOptions serverOptions(const Configuration& configuration) {
 // usually take stays there for the next one.
 void boundKeptMemory() {
   mallopt(M_MMAP_THRESHOLD, 256 << 10);
-  mallopt(M_TRIM_THRESHOLD, 1 << 20);
+  mallopt(M_TRIM_THRESHOLD, 4 << 20);
 }
 
 void chooseUser(const Configuration& configuration) {

@@ -10,7 +10,7 @@ if(NOT CMAKE_BUILD_TYPE)
   set(CMAKE_BUILD_TYPE RelWithDebInfo)
 endif()
 
-# The presets and the packages compile several sources at a time (CMAKE_UNITY_BUILD). These cannot share a
+# The presets compile several sources at a time (CMAKE_UNITY_BUILD), the packages each alone. These cannot share a
 # compilation with others of their target: they name something as another does, or a class of a header has a member of a
 # type that only they know.
 function(compile_alone)

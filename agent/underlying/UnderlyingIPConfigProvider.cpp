@@ -2,6 +2,7 @@
 // The CMPI instance provider of the underlying classes, one algorithm over their table. Read only: the processor is
 // changed through the instrumentation. Object managers do hand out null objects with a good status, and good pointers
 // beside a bad one: what is made or delivered is looked at, and a request that cannot go on says why.
+#include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
 #include <cstring>

@@ -23,9 +23,10 @@ void ObjectWriter::keyBinding(const std::string& name, const Cimom::Value& value
     reference(*path);
     return;
   }
-  const auto keyValue = xml_.element("KEYVALUE", "VALUETYPE", keyValueType(value.type()));
+  const auto keyValue = xml_.element("KEYVALUE");
+  xml_.plainAttribute("VALUETYPE", keyValueType(value.type()));
   if (const char* type = xmlTypeName(value.type())) {
-    xml_.attribute("TYPE", type);
+    xml_.plainAttribute("TYPE", type);
   }
   text(value);
 }
@@ -61,25 +62,32 @@ void ObjectWriter::instance(const Cimom::Instance& object, const ObjectPath& pat
 
 void ObjectWriter::property(const PropertyDeclaration& declaration, const Cimom::Value& given) {
   const CMPIType valueType = given.isNull() ? declaration.valueType() : given.type();
-  if (valueType == CMPI_ref) {
-    const auto scope = xml_.element("PROPERTY.REFERENCE", "NAME", declaration.name);
-    value(given);
+  const char* typeName = xmlTypeName(valueType);
+  if (!typeName) {
     return;
   }
-  if (!xmlTypeName(valueType)) {
-    return;
+  const bool isReference = valueType == CMPI_ref;
+  const auto scope = xml_.element(isReference          ? "PROPERTY.REFERENCE"
+                                  : isArray(valueType) ? "PROPERTY.ARRAY"
+                                                       : "PROPERTY");
+  xml_.plainAttribute("NAME", declaration.name);
+  if (!isReference) {
+    xml_.plainAttribute("TYPE", typeName);
+    embedding(valueType, declaration.qualifiers);
   }
-  const auto scope = xml_.element(isArray(valueType) ? "PROPERTY.ARRAY" : "PROPERTY", "NAME", declaration.name);
-  type("TYPE", valueType, declaration.qualifiers);
   value(given);
 }
 
 void ObjectWriter::type(const char* attributeName, CMPIType type, const Qualifiers& qualifiers) {
   if (const char* name = xmlTypeName(type)) {
-    xml_.attribute(attributeName, name);
+    xml_.plainAttribute(attributeName, name);
   }
+  embedding(type, qualifiers);
+}
+
+void ObjectWriter::embedding(CMPIType type, const Qualifiers& qualifiers) {
   if (elementTypeOf(type) == CMPI_instance) {
-    xml_.attribute("EmbeddedObject", isQualified(qualifiers, "EmbeddedObject") ? "object" : "instance");
+    xml_.plainAttribute("EmbeddedObject", isQualified(qualifiers, "EmbeddedObject") ? "object" : "instance");
   }
 }
 

@@ -70,6 +70,7 @@ class ObjectWriter {
   void keyBinding(const std::string& name, const Cimom::Value& value);
   void nameSpacePath(const ObjectPath& path);
   void instance(const Cimom::Instance& instance, const ObjectPath& path);
+  void embedding(CMPIType type, const Qualifiers& qualifiers);
   void property(const PropertyDeclaration& declaration, const Cimom::Value& value);
   void reference(const ObjectPath& path);
   void withPath(const char* element, const Cimom::Instance& instance);

@@ -51,6 +51,9 @@ class XmlWriter {
     put("\"");
   }
 
+  // The same of a value that needs no escape, as a name from the schema.
+  void plainAttribute(std::string_view name, std::string_view value) { put(" ", name, "=\"", value, "\""); }
+
   void text(std::string_view text) {
     closeStartTag();
     escape(text, Place::Content);
@@ -100,9 +103,10 @@ class XmlWriter {
 
   void escape(std::string_view text, Place place);
 
-  // An answer is many short pieces: they are copied to where there is room for them.
+  // An answer is many short pieces: they are copied to where there is room for them. In line, so that literals are
+  // copied by a length that is known.
   template <typename... Pieces>
-  void put(const Pieces&... pieces) {
+  [[gnu::always_inline]] void put(const Pieces&... pieces) {
     const auto copy = [](char* to, std::string_view piece) { return std::copy(piece.begin(), piece.end(), to); };
     char* at = room((std::string_view(pieces).size() + ...));
     ((at = copy(at, pieces)), ...);

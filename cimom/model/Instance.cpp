@@ -15,7 +15,7 @@ Instance::Instance(const ClassDefinition& definition, Shared<ObjectPath> path)
 }
 
 const Value& Instance::operator[](std::size_t index) const {
-  return values_[index] ? *values_[index] : definition_->properties[index].defaultValue;
+  return isSet(index) ? values_[index] : definition_->properties[index].defaultValue;
 }
 
 const Value* Instance::find(std::string_view name) const {
@@ -70,7 +70,7 @@ void Instance::setPath(Shared<ObjectPath> path) {
 Instance Instance::withoutDefaults() const {
   Instance bare = *this;
   for (std::size_t index = 0; index < size(); ++index) {
-    if (!bare.values_[index]) {
+    if (!bare.isSet(index)) {
       bare.values_[index] = Value::null(definition_->properties[index].type);
     }
   }

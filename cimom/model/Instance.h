@@ -47,11 +47,12 @@ class Instance {
   Instance withoutDefaults() const;
 
  private:
+  bool isSet(std::size_t index) const { return values_[index].type() != CMPI_null; }
   void takeKeys();
 
   const ClassDefinition* definition_;
   Shared<ObjectPath> path_;
-  std::vector<std::optional<Value>> values_;
+  std::vector<Value> values_;  // one of no type: nobody has set it
   std::optional<std::set<std::string, NameLess>> filter_;
 };
 

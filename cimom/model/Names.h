@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -32,8 +33,13 @@ struct NameHash {
     constexpr std::uint64_t lowerCaseBits = 0x2020202020202020;
     constexpr std::uint64_t multiplier = 0x9E3779B97F4A7C15;  // of Fibonacci hashing
     std::uint64_t end = 0;
-    const std::size_t length = std::min(name.size(), sizeof end);
-    std::copy_n(name.end() - static_cast<std::ptrdiff_t>(length), length, reinterpret_cast<char*>(&end));
+    if (name.size() >= sizeof end) {
+      std::memcpy(&end, name.data() + name.size() - sizeof end, sizeof end);
+    } else {
+      for (const char letter : name) {
+        end = end << 8U | static_cast<unsigned char>(letter);
+      }
+    }
     return static_cast<std::size_t>(((end | lowerCaseBits) + name.size()) * multiplier >> 32U);
   }
 };
