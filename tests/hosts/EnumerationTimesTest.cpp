@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "tests/hosts/HostTest.h"
+#include "tests/support/Classes.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/client/Enumeration.h"
 #include "tests/support/client/HttpClient.h"
