@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "factory/CompositeInstances.h"
 
+#include <string_view>
+
 #include "factory/CmpiAccess.h"
 #include "factory/FactoryFrame.h"
 
@@ -22,7 +24,8 @@ bool isSelected(const CompositeClass& row, const CMPIInstance* underlying, CMPIS
     case Selection::Every:
       return true;
     case Selection::OwnedByProcessor:
-      return std::string(textOf(propertyOf(underlying, "SystemCreationClassName", status), status)) == processorClass;
+      return textOf(propertyOf(underlying, "SystemCreationClassName", status), status) ==
+             std::string_view(processorClass);
     case Selection::IdentifierOfFields:
       return identifierHasForm(textOf(propertyOf(underlying, "InstanceID", status), status), row.identifierFields);
   }

@@ -3,14 +3,17 @@
 // that an administrator can follow a request line by line in the agent's log and trace.
 //
 // A line is formatted into one of two static buffers that all callers share without a lock: a line costs no allocation
-// for its text, and threads that trace at the same moment may garble each other's diagnostic text, nothing else.
+// for its text, and threads that trace at the same moment may garble each other's diagnostic text, nothing else. Every
+// line is formatted, whatever the agent's thresholds are, so it is done without printf.
 #pragma once
 
 #include <TWLog/TWLog.h>
 
-#include <cstdio>
+#include <charconv>
 #include <cstring>
+#include <limits>
 #include <string>
+#include <string_view>
 
 namespace QV {
 
@@ -23,9 +26,41 @@ enum MessageType : int {
 
 namespace IPConfigComposite::TraceDetail {
 
-constexpr std::size_t bufferSize = 512;
+using Buffer = char[512];
 
-inline const char* orEmpty(const char* text) { return text ? text : ""; }
+// Clears a buffer and writes texts into it, one after another, as far as they go before the null at its end.
+class Line {
+ public:
+  explicit Line(Buffer& buffer) : next_(buffer), end_(buffer + sizeof buffer - 1) {
+    // The C library's, which knows the processor: in place of a plain memset the compiler puts string instructions.
+    ::explicit_bzero(buffer, sizeof buffer);
+  }
+
+  Line& operator<<(std::string_view text) {
+    const auto room = static_cast<std::size_t>(end_ - next_);
+    if (text.size() <= room) {
+      std::memcpy(next_, text.data(), text.size());
+      next_ += text.size();
+    } else {
+      std::memcpy(next_, text.data(), room);
+      next_ = end_;
+    }
+    return *this;
+  }
+
+  // A null writes nothing.
+  Line& operator<<(const char* text) { return *this << std::string_view(text ? text : ""); }
+
+  Line& operator<<(unsigned int line) {
+    char digits[std::numeric_limits<int>::digits10 + 2];
+    const char* end = std::to_chars(std::begin(digits), std::end(digits), static_cast<int>(line)).ptr;
+    return *this << std::string_view(digits, static_cast<std::size_t>(end - digits));
+  }
+
+ private:
+  char* next_;
+  char* const end_;
+};
 
 }  // namespace IPConfigComposite::TraceDetail
 
@@ -33,25 +68,20 @@ inline const char* orEmpty(const char* text) { return text ? text : ""; }
 // that is none of the four yields the empty text; a line longer than 511 characters is cut. The result is valid until
 // the next call of this overload anywhere in the library.
 inline char* trace(const char* file, const char* text, unsigned int line, MessageType type) {
-  using IPConfigComposite::TraceDetail::orEmpty;
-  static char messageBuffer[IPConfigComposite::TraceDetail::bufferSize];
-  std::memset(messageBuffer, 0, sizeof messageBuffer);
-  file = orEmpty(file);
-  text = orEmpty(text);
-  const int lineNumber = static_cast<int>(line);
+  static IPConfigComposite::TraceDetail::Buffer messageBuffer;
+  IPConfigComposite::TraceDetail::Line message(messageBuffer);
   switch (type) {
     case EntryMessage:
-      std::snprintf(messageBuffer, sizeof messageBuffer, "ENTERING: %s() in %s [Line: %d]", text, file, lineNumber);
+      message << "ENTERING: " << text << "() in " << file << " [Line: " << line << "]";
       break;
     case ExitMessage:
-      std::snprintf(messageBuffer, sizeof messageBuffer, "EXITING: %s() in %s [Line: %d]", text, file, lineNumber);
+      message << "EXITING: " << text << "() in " << file << " [Line: " << line << "]";
       break;
     case MethodInvokedMessage:
-      std::snprintf(messageBuffer, sizeof messageBuffer, "METHOD: %s() was invoked in %s [Line: %d]", text, file,
-                    lineNumber);
+      message << "METHOD: " << text << "() was invoked in " << file << " [Line: " << line << "]";
       break;
     case FreeMessage:
-      std::snprintf(messageBuffer, sizeof messageBuffer, "MESSAGE [File: %s, Line: %d]: %s", file, lineNumber, text);
+      message << "MESSAGE [File: " << file << ", Line: " << line << "]: " << text;
       break;
   }
   return messageBuffer;
@@ -59,11 +89,9 @@ inline char* trace(const char* file, const char* text, unsigned int line, Messag
 
 // Formats a line about a variable. The result is valid until the next call of this overload anywhere in the library.
 inline char* trace(const char* name, const char* file, unsigned int line, const char* value) {
-  using IPConfigComposite::TraceDetail::orEmpty;
-  static char messageBuffer[IPConfigComposite::TraceDetail::bufferSize];
-  std::memset(messageBuffer, 0, sizeof messageBuffer);
-  std::snprintf(messageBuffer, sizeof messageBuffer, "VARIABLE: '%s' has Value '%s' at line %d in %s", orEmpty(name),
-                orEmpty(value), static_cast<int>(line), orEmpty(file));
+  static IPConfigComposite::TraceDetail::Buffer messageBuffer;
+  IPConfigComposite::TraceDetail::Line message(messageBuffer);
+  message << "VARIABLE: '" << name << "' has Value '" << value << "' at line " << line << " in " << file;
   return messageBuffer;
 }
 

@@ -38,22 +38,18 @@ std::optional<Integer> integerOf(const CMPIData& data) {
   }
 }
 
-std::optional<std::string> textOf(const CMPIData& data) {
+const char* textOf(const CMPIData& data) {
   if (!hasValue(data)) {
-    return std::nullopt;
+    return nullptr;
   }
-  if (data.type == CMPI_chars && data.value.chars) {
+  if (data.type == CMPI_chars) {
     return data.value.chars;
   }
-  return data.type == CMPI_string ? textOf(data.value.string) : std::nullopt;
+  return data.type == CMPI_string ? textOf(data.value.string) : nullptr;
 }
 
-std::optional<std::string> textOf(const CMPIString* string) {
-  const char* characters = CMIsNullObject(string) ? nullptr : CMGetCharsPtr(string, nullptr);
-  if (!characters) {
-    return std::nullopt;
-  }
-  return characters;
+const char* textOf(const CMPIString* string) {
+  return CMIsNullObject(string) ? nullptr : CMGetCharsPtr(string, nullptr);
 }
 
 }  // namespace QV

@@ -8,7 +8,6 @@
 #include <cstdint>
 #include <limits>
 #include <optional>
-#include <string>
 
 namespace QV {
 
@@ -30,10 +29,9 @@ bool hasValue(const CMPIData& data);
 
 std::optional<Integer> integerOf(const CMPIData& data);
 
-// The characters of a string or chars datum.
-std::optional<std::string> textOf(const CMPIData& data);
-
-// The characters of a broker's string.
-std::optional<std::string> textOf(const CMPIString* string);
+// The characters of a string or chars datum, and of a broker's string; null if it has none. They are the broker's and
+// live as long as what they were read from.
+const char* textOf(const CMPIData& data);
+const char* textOf(const CMPIString* string);
 
 }  // namespace QV

@@ -2,8 +2,6 @@
 #include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
-#include <optional>
-
 #include "agent/helper/Conversion.h"
 
 namespace QV {
@@ -11,12 +9,12 @@ namespace {
 
 // The datum under the wanted type, as setProperty takes it: CMPI_chars is itself the pointer, all else is pointed at.
 CMPIStatus set(CMPIInstance* target, const char* name, DataType type, const CMPIData& data) {
-  const auto integer = integerOf(data);
-  const auto text = textOf(data);
-  if (type == String && text) {
-    return CMSetProperty(target, name, text->c_str(), CMPI_chars);
+  if (type == String) {
+    const char* text = textOf(data);
+    return text ? CMSetProperty(target, name, text, CMPI_chars) : CMPIStatus{CMPI_RC_ERR_TYPE_MISMATCH, nullptr};
   }
   CMPIValue value{};
+  const auto integer = integerOf(data);
   if (type == Uint16 && integer && integer->fits<CMPIUint16>()) {
     value.uint16 = static_cast<CMPIUint16>(integer->bits);
     return CMSetProperty(target, name, &value, CMPI_uint16);

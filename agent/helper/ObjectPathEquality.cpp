@@ -3,8 +3,8 @@
 #include <cmpimacs.h>
 
 #include <algorithm>
+#include <cstring>
 #include <optional>
-#include <string>
 #include <vector>
 
 #include "agent/helper/Conversion.h"
@@ -12,52 +12,68 @@
 namespace QV {
 namespace {
 
+// A key as the broker holds it; its name lives as long as the request.
 struct Key {
-  std::string name;
+  const char* name;
   CMPIData value;
 };
 
 using Keys = std::vector<Key>;
 
-// Nothing if they cannot be read, or one of them has no name: such a path names no instance that can be told.
-// Some object managers look a key up by its exact spelling only, so the keys are taken by index.
-std::optional<Keys> keysOf(const CMPIObjectPath* path) {
+// Nothing if it cannot be read or has no name: a path with such a key names no instance that can be told. Some object
+// managers look a key up by its exact spelling only, so keys are taken by index.
+std::optional<Key> keyAt(const CMPIObjectPath* path, CMPICount index) {
+  CMPIStatus status{CMPI_RC_OK, nullptr};
+  CMPIString* string = nullptr;
+  const CMPIData value = CMGetKeyAt(path, index, &string, &status);
+  const char* name = textOf(string);
+  if (status.rc != CMPI_RC_OK || !name) {
+    return std::nullopt;
+  }
+  return Key{name, value};
+}
+
+std::optional<CMPICount> keyCountOf(const CMPIObjectPath* path) {
   CMPIStatus status{CMPI_RC_OK, nullptr};
   const CMPICount count = CMGetKeyCount(path, &status);
+  return status.rc == CMPI_RC_OK ? std::optional(count) : std::nullopt;
+}
+
+std::optional<Keys> keysOf(const CMPIObjectPath* path, CMPICount count) {
   Keys keys;
-  for (CMPICount index = 0; status.rc == CMPI_RC_OK && index < count; ++index) {
-    CMPIString* string = nullptr;
-    const CMPIData value = CMGetKeyAt(path, index, &string, &status);
-    const auto name = textOf(string);
-    if (!name) {
+  keys.reserve(count);
+  for (CMPICount index = 0; index < count; ++index) {
+    const auto key = keyAt(path, index);
+    if (!key) {
       return std::nullopt;
     }
-    keys.push_back({*name, value});
-  }
-  if (status.rc != CMPI_RC_OK) {
-    return std::nullopt;
+    keys.push_back(*key);
   }
   return keys;
 }
 
 bool samePath(const CMPIObjectPath* a, const CMPIObjectPath* b);
 
-template <typename Optional>
-bool bothEqual(const Optional& a, const Optional& b) {
-  return a && b && *a == *b;
-}
+bool sameText(const char* a, const char* b) { return a && b && std::strcmp(a, b) == 0; }
 
+// Of a value that has no characters.
 bool isNull(const CMPIData& data) {
-  return !hasValue(data) || (data.type == CMPI_string && !textOf(data.value.string)) ||
-         (data.type == CMPI_chars && !data.value.chars) || (data.type == CMPI_ref && CMIsNullObject(data.value.ref)) ||
+  return !hasValue(data) || data.type == CMPI_string || data.type == CMPI_chars ||
+         (data.type == CMPI_ref && CMIsNullObject(data.value.ref)) ||
          (data.type == CMPI_dateTime && CMIsNullObject(data.value.dateTime));
 }
 
 bool sameValue(const CMPIData& a, const CMPIData& b) {
+  const char* textOfA = textOf(a);
+  const char* textOfB = textOf(b);
+  if (textOfA || textOfB) {
+    return sameText(textOfA, textOfB);
+  }
   if (isNull(a) || isNull(b)) {
     return isNull(a) && isNull(b);
   }
-  if (bothEqual(integerOf(a), integerOf(b)) || bothEqual(textOf(a), textOf(b))) {
+  const auto integerOfA = integerOf(a);
+  if (integerOfA && integerOfA == integerOf(b)) {
     return true;
   }
   if (a.type != b.type) {
@@ -75,8 +91,8 @@ bool sameValue(const CMPIData& a, const CMPIData& b) {
     case CMPI_ref:
       return samePath(a.value.ref, b.value.ref);
     case CMPI_dateTime:
-      return bothEqual(textOf(CMGetStringFormat(a.value.dateTime, nullptr)),
-                       textOf(CMGetStringFormat(b.value.dateTime, nullptr)));
+      return sameText(textOf(CMGetStringFormat(a.value.dateTime, nullptr)),
+                      textOf(CMGetStringFormat(b.value.dateTime, nullptr)));
     default:
       return false;
   }
@@ -84,7 +100,7 @@ bool sameValue(const CMPIData& a, const CMPIData& b) {
 
 bool hasEqualKey(const Keys& keys, const Key& wanted) {
   return std::any_of(keys.begin(), keys.end(), [&](const Key& key) {
-    return textEqual(key.name.c_str(), wanted.name.c_str()) && sameValue(key.value, wanted.value);
+    return textEqual(key.name, wanted.name) && sameValue(key.value, wanted.value);
   });
 }
 
@@ -92,38 +108,53 @@ bool holdsAll(const Keys& keys, const Keys& wanted) {
   return std::all_of(wanted.begin(), wanted.end(), [&](const Key& key) { return hasEqualKey(keys, key); });
 }
 
-bool sameKeys(const std::optional<Keys>& a, const std::optional<Keys>& b) {
-  return a && b && a->size() == b->size() && holdsAll(*a, *b) && holdsAll(*b, *a);
+bool sameKeysInAnyOrder(const std::optional<Keys>& a, const std::optional<Keys>& b) {
+  return a && b && holdsAll(*a, *b) && holdsAll(*b, *a);
 }
 
-// A name as it was read; nothing beside an error, whatever the pointer is.
-std::optional<std::string> asRead(const CMPIString* name, const CMPIStatus& status) {
-  return status.rc == CMPI_RC_OK ? textOf(name) : std::nullopt;
+// The paths of one object manager have their keys in one order, and what tells the instances of a class apart, "Name"
+// or "InstanceID", at one of its ends: of a candidate that is another one the rest is not looked at.
+bool sameKeys(const CMPIObjectPath* a, const CMPIObjectPath* b) {
+  const auto count = keyCountOf(a);
+  if (!count || count != keyCountOf(b)) {
+    return false;
+  }
+  for (CMPICount turn = 0; turn < *count; ++turn) {
+    const CMPICount index = turn == 0 ? 0 : *count - turn;
+    const auto keyOfA = keyAt(a, index);
+    const auto keyOfB = keyAt(b, index);
+    if (!keyOfA || !keyOfB) {
+      return false;
+    }
+    if (!textEqual(keyOfA->name, keyOfB->name)) {
+      return sameKeysInAnyOrder(keysOf(a, *count), keysOf(b, *count));
+    }
+    if (!sameValue(keyOfA->value, keyOfB->value)) {
+      return false;
+    }
+  }
+  return true;
 }
 
-std::optional<std::string> classOf(const CMPIObjectPath* path) {
+using NameGetter = CMPIString* (*)(const CMPIObjectPath*, CMPIStatus*);
+
+// A name of the path; null beside an error, whatever the pointer is.
+const char* nameOf(const CMPIObjectPath* path, NameGetter getter) {
   CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIString* name = CMGetClassName(path, &status);
-  return asRead(name, status);
-}
-
-std::string namespaceOf(const CMPIObjectPath* path) {
-  CMPIStatus status{CMPI_RC_OK, nullptr};
-  const CMPIString* name = CMGetNameSpace(path, &status);
-  return asRead(name, status).value_or("");
+  const CMPIString* name = getter(path, &status);
+  return status.rc == CMPI_RC_OK ? textOf(name) : nullptr;
 }
 
 // By class and keys, without the namespaces. A path whose class is not known equals nothing.
 bool samePath(const CMPIObjectPath* a, const CMPIObjectPath* b) {
-  const auto classOfA = classOf(a);
-  const auto classOfB = classOf(b);
-  return classOfA && classOfB && textEqual(classOfA->c_str(), classOfB->c_str()) && sameKeys(keysOf(a), keysOf(b));
+  return sameKeys(a, b) && textEqual(nameOf(a, a->ft->getClassName), nameOf(b, b->ft->getClassName));
 }
 
 bool sameNamespace(const CMPIObjectPath* a, const CMPIObjectPath* b) {
-  const std::string namespaceOfA = namespaceOf(a);
-  const std::string namespaceOfB = namespaceOf(b);
-  return namespaceOfA.empty() || namespaceOfB.empty() || textEqual(namespaceOfA.c_str(), namespaceOfB.c_str());
+  const char* nameSpaceOfA = nameOf(a, a->ft->getNameSpace);
+  const char* nameSpaceOfB = nameOf(b, b->ft->getNameSpace);
+  const auto isAbsent = [](const char* nameSpace) { return !nameSpace || *nameSpace == '\0'; };
+  return isAbsent(nameSpaceOfA) || isAbsent(nameSpaceOfB) || textEqual(nameSpaceOfA, nameSpaceOfB);
 }
 
 }  // namespace

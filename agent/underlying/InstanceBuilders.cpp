@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "agent/underlying/InstanceBuilders.h"
 
+#include <iterator>
 #include <optional>
 #include <utility>
 
@@ -56,6 +57,12 @@ PropertyValue orNull(const std::optional<Address>& address) {
 
 std::uint16_t number(AddressOrigin origin) { return static_cast<std::uint16_t>(origin); }
 
+// Moves them in: from a list in braces a vector can only copy.
+template <std::size_t count>
+InstanceProperties instance(Property (&&properties)[count]) {
+  return {std::make_move_iterator(std::begin(properties)), std::make_move_iterator(std::end(properties))};
+}
+
 // One instance for each interface that has a name.
 template <typename Build>
 Instances forEachInterface(const System& system, const Build& build) {
@@ -70,7 +77,7 @@ Instances forEachInterface(const System& system, const Build& build) {
 
 InstanceProperties endpoint(const System& system, const NetworkInterface& interface, const std::string& name) {
   const Versions& versions = versionsOf(interface);
-  return {
+  return instance({
       {"SystemCreationClassName", system.creationClassName},
       {"SystemName", system.configuration.name},
       {"CreationClassName", "YRNQV_IPProtocolEndpoint"},
@@ -87,18 +94,18 @@ InstanceProperties endpoint(const System& system, const NetworkInterface& interf
       {"EnabledState", interface.enabled ? enabledStateEnabled : enabledStateDisabled},
       {"RequestedState", requestedStateNotApplicable},
       {"AddressOrigin", number(versions.ipv4 ? interface.ipv4Origin : interface.ipv6Origin)},
-  };
+  });
 }
 
 InstanceProperties setting(const std::string& instanceId, const std::string& elementName, AddressOrigin origin) {
-  return {{"InstanceID", instanceId}, {"ElementName", elementName}, {"AddressOrigin", number(origin)}};
+  return instance({{"InstanceID", instanceId}, {"ElementName", elementName}, {"AddressOrigin", number(origin)}});
 }
 
 bool isIpv6(const std::string& address) { return address.find(':') != std::string::npos; }
 
 InstanceProperties accessPoint(const System& system, const std::string& name, std::uint16_t context,
                                const std::string& address) {
-  return {
+  return instance({
       {"SystemCreationClassName", system.creationClassName},
       {"SystemName", system.configuration.name},
       {"CreationClassName", "YRNQV_IPRemoteServiceAccessPoint"},
@@ -106,7 +113,7 @@ InstanceProperties accessPoint(const System& system, const std::string& name, st
       {"AccessContext", context},
       {"AccessInfo", address},
       {"InfoFormat", isIpv6(address) ? infoFormatIpv6 : infoFormatIpv4},
-  };
+  });
 }
 
 }  // namespace

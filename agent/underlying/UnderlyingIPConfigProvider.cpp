@@ -5,6 +5,7 @@
 #include <QV/ProviderHelper.h>
 #include <cmpimacs.h>
 
+#include <cstring>
 #include <exception>
 #include <functional>
 #include <stdexcept>
@@ -25,9 +26,9 @@ const CMPIBroker* broker = nullptr;
 // Throws where the object manager did not do what it was asked for: "take the key" "Name".
 void require(const CMPIStatus& status, const char* what, const char* which) {
   if (status.rc != CMPI_RC_OK) {
-    const auto reason = textOf(status.msg);
+    const char* reason = textOf(status.msg);
     throw std::runtime_error("the object manager does not " + std::string(what) + ' ' + which + ": status " +
-                             std::to_string(status.rc) + (reason ? ", " + *reason : ""));
+                             std::to_string(status.rc) + (reason ? std::string(", ") + reason : ""));
   }
 }
 
@@ -79,9 +80,10 @@ void setProperty(const Setter& set, const Property& property) {
   std::visit([&](const auto& value) { setValue(set, property.name, value); }, property.value);
 }
 
+// Both names are of this library's own tables, spelled alike.
 bool isKey(const UnderlyingClass& underlyingClass, const Property& property) {
   for (const char* key : underlyingClass.keys) {
-    if (textEqual(key, property.name)) {
+    if (key && std::strcmp(key, property.name) == 0) {
       return true;
     }
   }
@@ -157,6 +159,8 @@ CMPIStatus failed(CMPIrc code, const char* reason,
   return {code, made.rc == CMPI_RC_OK && !CMIsNullObject(message) ? message : nullptr};
 }
 
+const char* orEmpty(const char* text) { return text ? text : ""; }
+
 // Runs an operation on the class that the path names; no exception leaves for the object manager.
 CMPIStatus serve(const CMPIResult* result, const CMPIObjectPath* path,
                  const std::function<CMPIStatus(Request&)>& operation) {
@@ -164,12 +168,12 @@ CMPIStatus serve(const CMPIResult* result, const CMPIObjectPath* path,
     return failed(CMPI_RC_ERR_INVALID_PARAMETER, "the object manager passes no object path, or nowhere to put results");
   }
   try {
-    const std::string name = textOf(CMGetClassName(path, nullptr)).value_or("");
+    const std::string name = orEmpty(textOf(CMGetClassName(path, nullptr)));
     const UnderlyingClass* underlyingClass = findUnderlyingClass(name.c_str());
     if (!underlyingClass) {
       return failed(CMPI_RC_ERR_INVALID_CLASS, ("the class '" + name + "' is not served here").c_str());
     }
-    Request request(*underlyingClass, textOf(CMGetNameSpace(path, nullptr)).value_or(""), result);
+    Request request(*underlyingClass, orEmpty(textOf(CMGetNameSpace(path, nullptr))), result);
     return operation(request);
   } catch (const std::exception& error) {
     return failed(CMPI_RC_ERR_FAILED, error.what());

@@ -1,7 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
 
+#include <cstdio>
+#include <limits>
+
 #include "tests/support/agent/RecordingLog.h"
+#include "tests/support/system/AllocationCount.h"
 #include "trace/Trace.h"
 
 namespace {
@@ -57,6 +61,32 @@ TEST_F(TraceTest, ALineIsCutAt511Characters) {
   const std::string endless(2000, 'x');
   EXPECT_EQ(std::string(QV::trace("file", endless.c_str(), 1, QV::FreeMessage)).size(), 511u);
   EXPECT_EQ(std::string(QV::trace("n", "file", 1, endless.c_str())).size(), 511u);
+}
+
+TEST_F(TraceTest, ALineIsCutWhereverItsEndFalls) {
+  for (std::size_t length = 0; length <= 520; ++length) {
+    const std::string file(length, 'x');
+    char expected[512];
+    std::snprintf(expected, sizeof expected, "MESSAGE [File: %s, Line: %d]: %s", file.c_str(), 123456, "text");
+    ASSERT_STREQ(QV::trace(file.c_str(), "text", 123456, QV::FreeMessage), expected) << length;
+    std::snprintf(expected, sizeof expected, "VARIABLE: '%s' has Value '%s' at line %d in %s", "n", file.c_str(),
+                  123456, "file");
+    ASSERT_STREQ(QV::trace("n", "file", 123456, file.c_str()), expected) << length;
+  }
+}
+
+TEST_F(TraceTest, ALineNumberIsShownAsASignedOne) {
+  EXPECT_STREQ(QV::trace("file", "f", std::numeric_limits<int>::max(), QV::EntryMessage),
+               "ENTERING: f() in file [Line: 2147483647]");
+  EXPECT_STREQ(QV::trace("file", "f", 1U << 31U, QV::EntryMessage), "ENTERING: f() in file [Line: -2147483648]");
+}
+
+TEST_F(TraceTest, ALineIsFormattedWithoutAnAllocation) {
+  const std::string endless(2000, 'x');
+  const long before = allocationCount();
+  QV::trace("file", endless.c_str(), 1, QV::EntryMessage);
+  QV::trace("n", "file", 1, endless.c_str());
+  EXPECT_EQ(allocationCount(), before);
 }
 
 TEST_F(TraceTest, ANullTextCountsAsEmpty) {

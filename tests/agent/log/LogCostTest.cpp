@@ -7,11 +7,10 @@
 #include <algorithm>
 #include <cstdlib>
 #include <iostream>
-#include <sstream>
 #include <string>
 
 #include "tests/agent/log/FrameLines.h"
-#include "tests/support/system/Process.h"
+#include "tests/support/system/Callgrind.h"
 #include "tests/support/system/SystemCalls.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -28,31 +27,13 @@ class LogCostTest : public testing::Test {
               "[log]\ndestination = off\n[trace]\ndestination = file\nfile = " + (directory_ / "trace") + "\n");
   }
 
-  double instructionsOf(int lines) const {
-    const std::string profile = directory_ / ("profile" + std::to_string(lines));
-    const Completed completed =
-        run({"valgrind", "--tool=callgrind", "--callgrind-out-file=" + profile, LOG_COST, std::to_string(lines)},
-            environment_);
-    EXPECT_EQ(completed.status, 0) << completed.errors;
-    std::istringstream text(readFile(profile));
-    constexpr std::string_view totals = "totals: ";
-    for (std::string line; std::getline(text, line);) {
-      if (line.starts_with(totals)) {
-        return std::stod(line.substr(totals.size()));
-      }
-    }
-    ADD_FAILURE() << "no totals in " << profile;
-    return 0;
-  }
-
   const TemporaryDirectory directory_;
   const Environment environment_ = {{"QV_AGENT_INI", directory_ / "agent.ini"}};
 };
 
 TEST_F(LogCostTest, OfALineIsFewInstructions) {
-  constexpr int few = 1000;
-  constexpr int many = 3000;
-  const double perLine = (instructionsOf(many) - instructionsOf(few)) / (many - few);
+  constexpr int lines = 2000;
+  const double perLine = costsOf({LOG_COST, std::to_string(lines)}, environment_).at("lines").instructions / lines;
   std::cout << perLine << " instructions a line\n";
   EXPECT_GT(perLine, 0);
   EXPECT_LT(perLine, mostInstructions);

@@ -2,6 +2,7 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <memory>
 #include <thread>
 
@@ -39,6 +40,26 @@ TEST(FileLockTest, WaitsForAHolderThatLetsGo) {
   holder.reset();
   waiter.join();
   EXPECT_TRUE(waited);
+}
+
+TEST(FileLockTest, LetsOthersInWhereOneTakesItAgainAndAgain) {
+  const TemporaryDirectory directory;
+  std::atomic<bool> ends = false;
+  auto first = std::make_unique<FileLock>(directory / "lock", 0ms);
+  std::thread greedy([&] {
+    while (!ends) {
+      // Gone for no time at all, held for long.
+      first.reset();
+      first = std::make_unique<FileLock>(directory / "lock", 10s);
+      std::this_thread::sleep_for(20ms);
+    }
+  });
+  // Far fewer looks than it would take to come upon a moment when nobody has it.
+  for (int i = 0; i < 5; ++i) {
+    EXPECT_NO_THROW(FileLock(directory / "lock", 500ms)) << i;
+  }
+  ends = true;
+  greedy.join();
 }
 
 TEST(FileLockTest, TellsWhyItCannotBeOpened) {
