@@ -151,6 +151,12 @@ TEST_P(CompositeInstancesTest, MakingWithoutAPathEndsEarly) {
   EXPECT_NE(messages()[2].find("EXITING: "), std::string::npos);
 }
 
+TEST_P(CompositeInstancesTest, MakingForARequestWithoutAPathNamesNoNamespace) {
+  (IPConfigObjectFactory().*GetParam().make)(broker(), nullptr, nullptr, false, &status);
+  ASSERT_GT(messages().size(), 3u);
+  EXPECT_NE(messages()[3].find("VARIABLE: 'namesp' has Value '' at"), std::string::npos) << messages()[3];
+}
+
 TEST_P(CompositeInstancesTest, MakingWithoutAnInstanceAnswersNull) {
   faults.failNewInstance = [](const std::string&, int) { return true; };
   EXPECT_EQ(make(), nullptr);

@@ -83,12 +83,13 @@ class IdentifierTest : public SelectionTest, public ::testing::WithParamInterfac
 
 INSTANTIATE_TEST_SUITE_P(Forms, IdentifierTest,
                          ::testing::Values(Identifier{"BMC:a:b", 1, 0}, Identifier{"BMC:a", 0, 1},
-                                           Identifier{"BMC::a:", 0, 1}, Identifier{":BMC:a", 0, 1},
-                                           Identifier{":BMC::a::b:", 1, 0}, Identifier{"bmc:a", 0, 1},
-                                           Identifier{"Bmc:a:b", 1, 0}, Identifier{"BMC", 0, 0},
-                                           Identifier{"BMC:a:b:c", 0, 0}, Identifier{"Host1:a", 0, 0},
-                                           Identifier{"Host1:a:b", 0, 0}, Identifier{"a:BMC", 0, 0},
-                                           Identifier{"BMCa:b", 0, 0}, Identifier{"", 0, 0}, Identifier{":::", 0, 0}));
+                                           Identifier{"BMC:a~b", 0, 1}, Identifier{"BMC::a:", 0, 1},
+                                           Identifier{":BMC:a", 0, 1}, Identifier{":BMC::a::b:", 1, 0},
+                                           Identifier{"bmc:a", 0, 1}, Identifier{"Bmc:a:b", 1, 0},
+                                           Identifier{"BMC", 0, 0}, Identifier{"BMC:a:b:c", 0, 0},
+                                           Identifier{"Host1:a", 0, 0}, Identifier{"Host1:a:b", 0, 0},
+                                           Identifier{"a:BMC", 0, 0}, Identifier{"BMCa:b", 0, 0}, Identifier{"", 0, 0},
+                                           Identifier{":::", 0, 0}));
 
 TEST_P(IdentifierTest, DecidesBetweenSequenceAndSetting) {
   EXPECT_EQ(takenWithIdentifier(Classes::sequence, GetParam().text), GetParam().asSequence);

@@ -129,6 +129,12 @@ TEST_F(ObjectPathEqualityTest, FindNullKeysEqualToEachOtherAndToNothingElse) {
   EXPECT_FALSE(equal(ofNull(), ofSigned(0)));
 }
 
+TEST_F(ObjectPathEqualityTest, TellNullFromFalse) {
+  CMPIObjectPath* unknown = path("Unknown");
+  EXPECT_EQ(CMAddKey(unknown, "Key", nullptr, CMPI_boolean).rc, CMPI_RC_OK);
+  EXPECT_FALSE(equal(unknown, ofBoolean(false)));
+}
+
 TEST_F(ObjectPathEqualityTest, CompareReferencesByClassAndKeys) {
   EXPECT_TRUE(equal(ofReference(keyed("1", "2")), ofReference(keyed("1", "2"))));
   EXPECT_FALSE(equal(ofReference(keyed("1", "2")), ofReference(keyed("1", "3"))));
@@ -186,6 +192,9 @@ TEST_F(ObjectPathEqualityTest, WhoseClassIsNotToldEqualNothing) {
 }
 
 TEST_F(ObjectPathEqualityTest, WithoutANamespaceAreComparedWithoutIt) {
+  Altered elsewhere(path("Keyed", "root/other"));
+  elsewhere.table.getNameSpace = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
+  EXPECT_TRUE(equal(elsewhere, path("Keyed"), true));
   Altered lacking(keyed("1", "2"));
   lacking.table.getNameSpace = [](const CMPIObjectPath*, CMPIStatus*) -> CMPIString* { return nullptr; };
   EXPECT_TRUE(equal(lacking, keyed("1", "2"), true));
@@ -228,6 +237,35 @@ TEST_F(ObjectPathEqualityTest, WhoseKeysCannotBeReadEqualNothing) {
       return data;
     };
   });
+}
+
+TEST_F(ObjectPathEqualityTest, AreReadFromAnObjectManagerThatLeavesAGoodStatusAsItIs) {
+  static CMPIObjectPathFT real;
+  real = *path("Keyed")->ft;
+  const auto alter = [](CMPIObjectPathFT& table) {
+    table.getKeyCount = [](const CMPIObjectPath* path, CMPIStatus*) { return real.getKeyCount(path, nullptr); };
+    table.getKeyAt = [](const CMPIObjectPath* path, CMPICount index, CMPIString** name, CMPIStatus*) {
+      return real.getKeyAt(path, index, name, nullptr);
+    };
+    table.getClassName = [](const CMPIObjectPath* path, CMPIStatus*) { return real.getClassName(path, nullptr); };
+    table.getNameSpace = [](const CMPIObjectPath* path, CMPIStatus*) { return real.getNameSpace(path, nullptr); };
+  };
+  Altered one(keyed("1", "2"));
+  Altered other(path("Keyed", "root/other"));
+  alter(one.table);
+  alter(other.table);
+  EXPECT_TRUE(equal(one, keyed("1", "2"), true));
+  EXPECT_FALSE(equal(other, path("Keyed"), true)) << "its namespace is known";
+}
+
+TEST_F(ObjectPathEqualityTest, DifferWhereOneHasAKeyTwiceAndTheOtherTwoKeys) {
+  static CMPIObjectPathFT real;
+  real = *path("Keyed")->ft;
+  Altered twice(keyed("1", "2"));
+  twice.table.getKeyAt = [](const CMPIObjectPath* path, CMPICount, CMPIString** name, CMPIStatus* code) {
+    return real.getKeyAt(path, 0, name, code);
+  };
+  EXPECT_FALSE(equal(twice, keyed("1", "2")));
 }
 
 TEST_F(ObjectPathEqualityTest, AreEqualInBothDirectionsWhereAKeyComesTwice) {
@@ -305,6 +343,29 @@ TEST_F(KeysAsDeliveredTest, WithoutAValueEqualEachOtherAndNothingElse) {
     EXPECT_TRUE(equal(delivering(data), delivering(withoutValue.front()))) << data.type << ' ' << data.state;
     EXPECT_FALSE(equal(delivering(data), delivering(seven))) << data.type << ' ' << data.state;
     EXPECT_FALSE(equal(delivering(data), delivering(empty))) << data.type << ' ' << data.state;
+  }
+}
+
+TEST_F(KeysAsDeliveredTest, AreComparedByTheirTypesValues) {
+  const auto key = [](CMPIType type, const auto& set) {
+    CMPIData data{type, CMPI_keyValue, {}};
+    set(data.value);
+    return data;
+  };
+  const CMPIData pairs[][2] = {
+      {key(CMPI_char16, [](CMPIValue& value) { value.char16 = 'a'; }),
+       key(CMPI_char16, [](CMPIValue& value) { value.char16 = 'b'; })},
+      {key(CMPI_real32, [](CMPIValue& value) { value.real32 = 0.5; }),
+       key(CMPI_real32, [](CMPIValue& value) { value.real32 = 0.25; })},
+      {key(CMPI_real64, [](CMPIValue& value) { value.real64 = 0.5; }),
+       key(CMPI_real64, [](CMPIValue& value) { value.real64 = 0.25; })},
+      {key(CMPI_dateTime, [&](CMPIValue& value) { value.dateTime = CMNewDateTimeFromBinary(broker, 1, 0, nullptr); }),
+       key(CMPI_dateTime, [&](CMPIValue& value) { value.dateTime = CMNewDateTimeFromBinary(broker, 2, 0, nullptr); })},
+  };
+  for (const auto& [one, other] : pairs) {
+    EXPECT_TRUE(equal(delivering(one), delivering(one))) << one.type;
+    EXPECT_TRUE(equal(delivering(other), delivering(other))) << one.type;
+    EXPECT_FALSE(equal(delivering(one), delivering(other))) << one.type;
   }
 }
 

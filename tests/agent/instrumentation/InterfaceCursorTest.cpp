@@ -256,6 +256,14 @@ TEST_F(InterfaceCursorTest, DoesNotHoldAnAddressAgainstACurrentMaskThatTellsNoth
   EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 192.0.2.255 -"));
 }
 
+TEST_F(InterfaceCursorTest, DoesNotHoldAMaskAgainstACurrentAddressThatTellsNothing) {
+  ManagementProcessor processor = factoryConfiguration();
+  processor.interfaces[0].ipv4Address = ipv4("0.0.0.0");
+  install(processor);
+  cursor_.set(Ipv4SubnetMask, "255.255.0.0");
+  EXPECT_THAT(backEnd_->changes, ElementsAre("eth0 - 255.255.0.0"));
+}
+
 TEST_F(InterfaceCursorTest, PassesOnWhatTheProcessorThrowsAndSendsNothingTwice) {
   backEnd_->unreachable = true;
   cursor_.set(Ipv4Address, "192.0.2.99");
