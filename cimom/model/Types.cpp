@@ -49,7 +49,7 @@ constexpr std::size_t placeOf(CMPIType code) { return (code & 0xFFU) + (code >> 
 // At the place of a type's code the number of its row, from 1.
 constexpr auto rowNumbers = [] {
   std::array<std::uint8_t, 0x200> numbers{};
-  for (std::uint8_t row = 0; row < std::size(types); ++row) {
+  for (std::size_t row = 0; row < std::size(types); ++row) {
     numbers[placeOf(types[row].code)] = static_cast<std::uint8_t>(row + 1);
   }
   return numbers;
