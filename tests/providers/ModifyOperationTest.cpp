@@ -195,6 +195,12 @@ TEST_F(ModifyOperationTest, StaticSettingsThatCouldNotBeWrittenEndAllTheSame) {
   EXPECT_EQ(result.order, Calls{"done"});
 }
 
+TEST_F(ModifyOperationTest, ATildeIsPartOfAnInterfacesName) {
+  instrumentation().nodes = {{""}, {"eth~0"}};
+  modifyStatic(staticPath("BMC:eth~0"), addressAndMask);
+  EXPECT_EQ(instrumentation().nodes[1].values.size(), 2u);
+}
+
 TEST_F(ModifyOperationTest, AnIdentifierOfAnotherFormNamesTheEmptyInterface) {
   instrumentation().nodes = {{"eth0"}, {""}};
   for (const std::string id : {"BMC", "BMC:eth0:static", "", ":::"}) {
