@@ -29,9 +29,9 @@ TEST(StateWritersTest, ThatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
   SimulatedBackEnd processor(state);
   processor.change("eth0", {ipv4("192.0.2.1"), mask("255.255.255.0")});
   std::mt19937 random(20);
-  std::uniform_int_distribution<int> microseconds(0, 1500);
+  std::uniform_int_distribution<int> microseconds(0, 6000);  // a change, and the pause before the next
   int interrupted = 0;
-  for (int kills = 0; kills < 1000; ++kills) {
+  for (int kills = 0; kills < 400; ++kills) {
     // When a writer is killed somewhere in its work
     Process process(writer(state, "eth0", "192.0.2", 0));
     process.readLine();
@@ -46,6 +46,7 @@ TEST(StateWritersTest, ThatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
                 (interface.ipv4Address == ipv4("192.0.2.2") && interface.ipv4SubnetMask == mask("255.255.0.0")))
         << readFile(state);
   }
+  RecordProperty("interrupted", interrupted);
   EXPECT_GT(interrupted, 0) << "no kill met a writer between its first byte and its last step";
 
   // And the next change works and sweeps up
