@@ -6,21 +6,8 @@
 #include <cstdlib>
 #include <iostream>
 
-#include "tests/cimom/cimxml/EndpointTest.h"
+#include "tests/cimom/cimxml/EndpointServer.h"
 #include "tests/support/probe/ProbeObjects.h"
-
-namespace {
-
-class Server : public Testing::EndpointTest {
- public:
-  using EndpointTest::endpoint_;
-  using EndpointTest::request;
-
- private:
-  void TestBody() override {}
-};
-
-}  // namespace
 
 int main(int argc, char** argv) {
   if (argc != 2) {
@@ -29,9 +16,9 @@ int main(int argc, char** argv) {
   }
   // The part is a thing, too.
   Probe::setThings(static_cast<CMPIUint16>(std::atoi(argv[1]) - 1));
-  const Server server;
-  const auto request = Server::request("EnumerateInstances",
-                                       Testing::intrinsicCall("EnumerateInstances", Testing::className("TEST_Thing")));
+  const Testing::EndpointServer server;
+  const auto request = Testing::EndpointServer::request(
+      "EnumerateInstances", Testing::intrinsicCall("EnumerateInstances", Testing::className("TEST_Thing")));
   server.endpoint_.handle(request);  // loads and makes what stays
   CALLGRIND_ZERO_STATS;
   server.endpoint_.handle(request);

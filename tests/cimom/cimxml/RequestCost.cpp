@@ -10,18 +10,9 @@
 #include <iostream>
 
 #include "tests/cimom/cimxml/CostlyRequests.h"
-#include "tests/cimom/cimxml/EndpointTest.h"
+#include "tests/cimom/cimxml/EndpointServer.h"
 
 namespace {
-
-class Server : public Testing::EndpointTest {
- public:
-  using EndpointTest::endpoint_;
-  using EndpointTest::request;
-
- private:
-  void TestBody() override {}
-};
 
 // What the process has had in memory at most since it was last told to count anew.
 long peakKib() {
@@ -50,12 +41,12 @@ int main(int argc, char** argv) {
     return 2;
   }
   const auto bytes = static_cast<std::size_t>(std::atol(argv[1]));
-  const Server server;
+  const Testing::EndpointServer server;
   for (const Testing::CostlyRequest& costly : Testing::costlyRequests()) {
     if (argc > 2 && costly.name != argv[2]) {
       continue;
     }
-    const auto request = Server::request(costly.method, costly.body(bytes));
+    const auto request = Testing::EndpointServer::request(costly.method, costly.body(bytes));
     countAnew();
     const long before = peakKib();
     CALLGRIND_ZERO_STATS;

@@ -31,7 +31,7 @@ TEST(StateWritersTest, ThatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {
   std::mt19937 random(20);
   std::uniform_int_distribution<int> microseconds(0, 6000);  // a change, and the pause before the next
   int interrupted = 0;
-  for (int kills = 0; kills < 400; ++kills) {
+  for (int kills = 0; kills < 1000; ++kills) {
     // When a writer is killed somewhere in its work
     Process process(writer(state, "eth0", "192.0.2", 0));
     process.readLine();
