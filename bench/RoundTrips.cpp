@@ -30,7 +30,7 @@ void change(IpmiBackEnd& backEnd, const char* address, const char* mask) {
 template <typename Operation>
 void count(Results& results, const SimulatedBmc& bmc, const char* cold, const char* held, Operation operation) {
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
   operation(backEnd, 1);
   results.figures[cold] = wire.requests();
   wire.reset();
@@ -50,7 +50,7 @@ void measureBmc(Results& results) {
 
   constexpr unsigned clients = 8;
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
   std::vector<std::future<void>> requests;
   for (unsigned client = 0; client < clients; ++client) {
     requests.push_back(std::async(std::launch::async, [&] { backEnd.read(); }));

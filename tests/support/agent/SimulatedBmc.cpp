@@ -71,6 +71,13 @@ QV::BackEndSettings SimulatedBmc::settings(std::uint16_t port) const {
           {"generation_file", generationFile()}};
 }
 
+QV::BackEndSettings SimulatedBmc::patientSettings(std::uint16_t port) const {
+  auto patient = settings(port);
+  patient["operation_timeout"] = "60";
+  patient["retransmission_timeout"] = "10";
+  return patient;
+}
+
 std::string SimulatedBmc::ipmitool(const std::vector<std::string>& command) const {
   std::vector<std::string> full = {"ipmitool", "-I",    "lanplus", "-H",   "127.0.0.1", "-p", std::to_string(port_),
                                    "-U",       "admin", "-P",      "test", "-C",        "3"};

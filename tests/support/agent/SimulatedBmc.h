@@ -28,6 +28,10 @@ class SimulatedBmc {
   // A section of agent.ini that reaches it through the given port of this machine; 0 means its own. Nothing is cached.
   QV::BackEndSettings settings(std::uint16_t port = 0) const;
 
+  // The same with times that no busy machine takes: whoever counts what is sent must neither repeat a request nor give
+  // an idle session back.
+  QV::BackEndSettings patientSettings(std::uint16_t port = 0) const;
+
   // What ipmitool says: of a value that `lan print` shows, "IP Address Source" say; of any command.
   std::string witness(const std::string& label) const;
   std::string ipmitool(const std::vector<std::string>& command) const;

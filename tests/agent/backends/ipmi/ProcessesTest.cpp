@@ -14,13 +14,9 @@ using namespace Testing;
 
 class IpmiProcessesTest : public testing::Test {
  protected:
-  // The command of a process with the agent in it, which reaches the BMC through that port and keeps a look at it for
-  // as long as it may.
-  std::vector<std::string> agentBehind(std::uint16_t port, const std::string& ini,
-                                       const QV::BackEndSettings& more = {}) const {
-    auto settings = bmc.settings(port);
+  // The command of a process with the agent in it, which keeps a look at the BMC for as long as it may.
+  std::vector<std::string> agentBehind(QV::BackEndSettings settings, const std::string& ini) const {
     settings["cache"] = "60";
-    settings.insert(more.begin(), more.end());
     std::string text = "[log]\ndestination = stderr\n[processor]\nbackend = ipmi\n[ipmi]\n";
     for (const auto& [key, value] : settings) {
       text += key + " = " + value + '\n';
@@ -37,8 +33,8 @@ class IpmiProcessesTest : public testing::Test {
   const TemporaryDirectory directory;
   const SimulatedBmc bmc;
   UdpRelay wire{bmc.port()};
-  Process reader{agentBehind(wire.port(), "reader.ini")};
-  Process writer{agentBehind(bmc.port(), "writer.ini")};
+  Process reader{agentBehind(bmc.patientSettings(wire.port()), "reader.ini")};
+  Process writer{agentBehind(bmc.patientSettings(), "writer.ini")};
 };
 
 TEST_F(IpmiProcessesTest, SeeEachOthersChangesWithTheNextRead) {
@@ -68,8 +64,11 @@ TEST_F(IpmiProcessesTest, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
 // Given a process whose change met a BMC that stalled with the lock taken, and nobody asks it for more: it has a last
 // try when it ends.
 TEST_F(IpmiProcessesTest, GiveALockBackWhenTheyEndOrSayThatTheyCouldNot) {
+  auto impatient = bmc.settings();
+  impatient["operation_timeout"] = "1";
+  impatient["session_timeout"] = "0.6";
   for (const bool recovers : {true, false}) {
-    Process stalled(agentBehind(bmc.port(), "stalled.ini", {{"operation_timeout", "1"}, {"session_timeout", "0.6"}}));
+    Process stalled(agentBehind(impatient, "stalled.ini"));
     bmc.hook("set", "kill -STOP $SIMULATOR");
     EXPECT_THAT(ask(stalled, recovers ? "change 192.0.2.77 255.255.255.128" : "change 192.0.2.78 255.255.255.0"),
                 testing::HasSubstr("outcome is unknown"));
@@ -97,7 +96,7 @@ TEST_F(IpmiProcessesTest, GiveALockBackWhenTheyEndOrSayThatTheyCouldNot) {
 TEST_F(IpmiProcessesTest, SeeAChangeWhoseProcessEndedAtOnceAfterIt) {
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.10/255.255.255.0");
   {
-    Process passing(agentBehind(bmc.port(), "passing.ini"));
+    Process passing(agentBehind(bmc.patientSettings(), "passing.ini"));
     EXPECT_EQ(ask(passing, "change 192.0.2.77 255.255.255.128"), "done");
   }
   EXPECT_EQ(ask(reader, "read"), "lan1 192.0.2.77/255.255.255.128");

@@ -29,7 +29,7 @@ bool traced(const std::string& text) {
 TEST(IpmiRoundTripsTest, OfAReadAreFourteenFromColdAndFourInAHeldSession) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
   takeLog();
 
   backEnd.read();
@@ -45,7 +45,7 @@ TEST(IpmiRoundTripsTest, OfAReadAreFourteenFromColdAndFourInAHeldSession) {
 TEST(IpmiRoundTripsTest, AreNoneWithinTheCacheTime) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
-  auto settings = parseSettings(bmc.settings(wire.port()));
+  auto settings = parseSettings(bmc.patientSettings(wire.port()));
   settings.cache = std::chrono::minutes(1);
   IpmiBackEnd backEnd(settings);
   const auto first = backEnd.read();
@@ -59,8 +59,8 @@ TEST(IpmiRoundTripsTest, AreNoneWithinTheCacheTime) {
 // Two back ends are what two processes have: each its own look, and the file in common.
 class IpmiRoundTripsWithAnotherTest : public testing::Test {
  protected:
-  QV::Ipmi::IpmiSettings cached(std::uint16_t port) const {
-    auto settings = parseSettings(bmc.settings(port));
+  static QV::Ipmi::IpmiSettings cached(const QV::BackEndSettings& section) {
+    auto settings = parseSettings(section);
     settings.cache = std::chrono::minutes(1);
     return settings;
   }
@@ -74,8 +74,8 @@ class IpmiRoundTripsWithAnotherTest : public testing::Test {
 
   const SimulatedBmc bmc;
   UdpRelay wire{bmc.port()};
-  IpmiBackEnd reader{cached(wire.port())};
-  IpmiBackEnd writer{cached(bmc.port())};
+  IpmiBackEnd reader{cached(bmc.patientSettings(wire.port()))};
+  IpmiBackEnd writer{cached(bmc.patientSettings())};
 };
 
 TEST_F(IpmiRoundTripsWithAnotherTest, AreSevenAfterItsChangeAndThenNone) {
@@ -111,7 +111,7 @@ TEST_F(IpmiRoundTripsWithAnotherTest, AreFourOnceWhileItsChangeIsUnderWayAndSeve
   // Given a change that waits for the answer to its first write: three requests to look, one for the lock
   constexpr unsigned firstWrite = 5;
   UdpRelay slowWire(bmc.port());
-  IpmiBackEnd slowWriter(cached(slowWire.port()));
+  IpmiBackEnd slowWriter(cached(bmc.settings(slowWire.port())));
   slowWriter.read();
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 14u);
   slowWire.reset();
@@ -141,7 +141,7 @@ TEST_F(IpmiRoundTripsWithAnotherTest, OfAReadWaitForAMaskWhoseAddressIsWrittenAl
   constexpr unsigned secondWrite = 6;
   bmc.ipmitool({"lan", "set", "1", "ipsrc", "static"});
   UdpRelay slowWire(bmc.port());
-  IpmiBackEnd slowWriter(cached(slowWire.port()));
+  IpmiBackEnd slowWriter(cached(bmc.settings(slowWire.port())));
   slowWriter.read();
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 14u);
   slowWire.reset();
@@ -230,7 +230,7 @@ TEST_F(IpmiRoundTripsWithAnotherTest, AreFourEachTimeWhereChangesCannotBeLearned
 }
 
 TEST_F(IpmiRoundTripsWithAnotherTest, AreSevenAfterTheChangeOfOneThatCachesNothingItself) {
-  IpmiBackEnd uncached(parseSettings(bmc.settings()));
+  IpmiBackEnd uncached(parseSettings(bmc.patientSettings()));
   EXPECT_EQ(requestsOfRead("192.0.2.10"), 14u);
 
   uncached.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
@@ -248,7 +248,7 @@ TEST(IpmiRoundTripsTest, OfAChangeAreTenInAHeldSessionAndSixMoreFromCold) {
   const SimulatedBmc bmc;
   bmc.ipmitool({"lan", "set", "1", "ipsrc", "static"});
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
 
   changeByName(backEnd, "192.0.2.77", "255.255.255.128");
   // Five to open the session, one to find the channel; then three to look, lock, address, mask, commit, unlock, two to
@@ -263,7 +263,7 @@ TEST(IpmiRoundTripsTest, OfAChangeAreTenInAHeldSessionAndSixMoreFromCold) {
 TEST(IpmiRoundTripsTest, OfAChangeAreTwoMoreWhereTheSourceChanges) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
   backEnd.read();
 
   wire.reset();
@@ -278,6 +278,7 @@ TEST(IpmiRoundTripsTest, AreOneLessInALaterSessionThatFindsTheChannelKnown) {
   UdpRelay wire(bmc.port());
   auto settings = bmc.settings(wire.port());
   settings["session_timeout"] = "1.2";
+  settings["retransmission_timeout"] = "0.6";
   IpmiBackEnd backEnd(parseSettings(settings));
   backEnd.read();
   const auto giveBack = [&] {
@@ -299,7 +300,7 @@ TEST(IpmiRoundTripsTest, OpenOneSessionForABurstOfRequests) {
   constexpr unsigned clients = 8;
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
   std::vector<std::future<void>> requests;
   for (unsigned client = 0; client < clients; ++client) {
     requests.push_back(std::async(std::launch::async, [&] { backEnd.read(); }));
@@ -314,7 +315,7 @@ TEST(IpmiRoundTripsTest, OpenOneSessionForABurstOfRequests) {
 TEST(IpmiRoundTripsTest, OfAChangeToWhatIsSoAlreadyAreThoseOfLooking) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
-  IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+  IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
   backEnd.change("lan1", {QV::ipv4("192.0.2.77"), QV::mask("255.255.255.128")});
 
   wire.reset();
@@ -327,7 +328,7 @@ TEST(IpmiRoundTripsTest, IncludeTheOneThatGivesTheSessionBack) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   {
-    IpmiBackEnd backEnd(parseSettings(bmc.settings(wire.port())));
+    IpmiBackEnd backEnd(parseSettings(bmc.patientSettings(wire.port())));
     backEnd.read();
     wire.reset();
   }
@@ -339,7 +340,8 @@ TEST(IpmiRoundTripsTest, IncludeTheOneThatGivesAnIdleSessionBack) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());
   auto settings = bmc.settings(wire.port());
-  settings["session_timeout"] = "0.4";
+  settings["session_timeout"] = "1.2";
+  settings["retransmission_timeout"] = "0.6";
   IpmiBackEnd backEnd(parseSettings(settings));
   backEnd.read();
   wire.reset();
