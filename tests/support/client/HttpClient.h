@@ -16,7 +16,7 @@ class HttpClient {
  public:
   // @param from the address that it comes from, any of 127.0.0.0/8
   explicit HttpClient(std::uint16_t port, const char* from = "127.0.0.1",
-                      std::chrono::seconds patience = std::chrono::seconds(10));
+                      std::chrono::seconds patience = std::chrono::seconds(60));
   ~HttpClient();
   HttpClient(const HttpClient&) = delete;
   HttpClient& operator=(const HttpClient&) = delete;

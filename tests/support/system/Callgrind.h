@@ -20,6 +20,6 @@ struct Cost {
 // CALLGRIND_DUMP_STATS_AT that followed, by the name that it was dumped at. Throws std::runtime_error with what the
 // program said if it fails.
 std::map<std::string, Cost> costsOf(const std::vector<std::string>& command, const Environment& environment = {},
-                                    std::chrono::seconds patience = std::chrono::seconds(110));
+                                    std::chrono::seconds patience = std::chrono::seconds(280));
 
 }  // namespace Testing

@@ -8,7 +8,7 @@ namespace Testing {
 
 // Asks until the condition holds; returns false when it does not within the time.
 template <typename Condition>
-bool poll(Condition condition, std::chrono::milliseconds patience = std::chrono::seconds(30)) {
+bool poll(Condition condition, std::chrono::milliseconds patience = std::chrono::seconds(100)) {
   const auto deadline = std::chrono::steady_clock::now() + patience;
   while (!condition()) {
     if (std::chrono::steady_clock::now() > deadline) {

@@ -35,7 +35,7 @@ class Process {
 
   // The exit status; 128 and the signal's number if a signal ended it. Throws std::runtime_error when the program has
   // not ended by then.
-  int wait(std::chrono::seconds patience = std::chrono::seconds(30));
+  int wait(std::chrono::seconds patience = std::chrono::seconds(100));
   bool isRunning();
 
   // Hands it a line on its standard input, which is open until closeInput().
@@ -67,6 +67,6 @@ struct Completed {
 
 // Runs a program that is given nothing on its standard input.
 Completed run(const std::vector<std::string>& command, const Environment& environment = {},
-              std::chrono::seconds patience = std::chrono::seconds(30));
+              std::chrono::seconds patience = std::chrono::seconds(100));
 
 }  // namespace Testing
