@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <limits>
+#include <string>
 
 #include "cimom/model/ObjectPath.h"
 #include "cimom/model/Value.h"
@@ -26,6 +27,46 @@ TEST(ValueTest, KeepsTheNumberOrRefuses) {
   EXPECT_EQ(Value::uint64(65535).asInteger(CMPI_uint16)->scalar()->uint16, 65535);
 }
 
+// The integer types of CIM with the bounds of what they hold, in two types, since none of the language holds all.
+struct IntegerType {
+  CMPIType type;
+  CMPISint64 least;
+  CMPIUint64 most;
+};
+
+template <typename T>
+constexpr IntegerType integer(CMPIType type) {
+  return {type, std::numeric_limits<T>::min(), std::numeric_limits<T>::max()};
+}
+
+constexpr IntegerType integers[] = {integer<CMPIUint8>(CMPI_uint8),   integer<CMPIUint16>(CMPI_uint16),
+                                    integer<CMPIUint32>(CMPI_uint32), integer<CMPIUint64>(CMPI_uint64),
+                                    integer<CMPISint8>(CMPI_sint8),   integer<CMPISint16>(CMPI_sint16),
+                                    integer<CMPISint32>(CMPI_sint32), integer<CMPISint64>(CMPI_sint64)};
+
+TEST(ValueTest, IsTakenForAnotherIntegerTypeWhereThatHoldsTheNumber) {
+  const auto expectTaken = [](const Value& bound, const IntegerType& from, const IntegerType& to, bool holds) {
+    const auto given = bound.asInteger(from.type);
+    ASSERT_TRUE(given) << bound.toString() << " as type " << from.type;
+    const auto taken = given->as(to.type);
+    ASSERT_EQ(taken.has_value(), holds) << bound.toString() << " of type " << from.type << " as type " << to.type;
+    if (holds) {
+      EXPECT_EQ(taken->type(), to.type);
+      EXPECT_EQ(taken->toString(), bound.toString());
+    }
+  };
+  for (const IntegerType& from : integers) {
+    for (const IntegerType& to : integers) {
+      expectTaken(Value::sint64(from.least), from, to, from.least >= to.least);
+      expectTaken(Value::sint64(0), from, to, true);
+      expectTaken(Value::uint64(from.most), from, to, from.most <= to.most);
+    }
+    EXPECT_FALSE(Value::sint64(1).asInteger(from.type)->as(CMPI_boolean));
+    EXPECT_FALSE(Value::sint64(1).asInteger(from.type)->as(CMPI_real64));
+    EXPECT_EQ(Value::null(from.type).as(CMPI_string)->type(), CMPI_string);
+  }
+}
+
 TEST(ValueTest, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value().toString(), "NULL");
   EXPECT_EQ(Value::sint64(std::numeric_limits<CMPISint64>::min()).toString(), "-9223372036854775808");
@@ -34,6 +75,9 @@ TEST(ValueTest, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value::char16(65).toString(), "65");
   EXPECT_EQ(Value::array(Array{CMPI_string, {Value::string("a"), Value::null(CMPI_string)}}).toString(),
             "{\"a\",NULL}");
+  EXPECT_EQ(Value::boolean(true).toString(), "TRUE");
+  EXPECT_EQ(Value::boolean(false).toString(), "FALSE");
+  EXPECT_EQ(Value::arguments({}).toString(), "(arguments)");
 }
 
 TEST(ValueTest, OfReferencesWithinReferencesStaysShort) {

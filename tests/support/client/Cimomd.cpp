@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <chrono>
 #include <stdexcept>
 
 #include "Paths.h"
@@ -44,6 +45,14 @@ Cimomd::Cimomd(const std::vector<std::string>& options, const Environment& envir
     throw std::runtime_error("cimomd does not listen: " + process_.errors());
   }
   port_ = static_cast<std::uint16_t>(std::stoul(output.substr(colon + 1)));
+}
+
+// What is killed has neither cleaned up nor written the counters of a coverage build.
+Cimomd::~Cimomd() {
+  if (process_.isRunning()) {
+    process_.signal(SIGTERM);
+    poll([this] { return !process_.isRunning(); }, std::chrono::seconds(10));
+  }
 }
 
 std::vector<std::string> Cimomd::probeOptions() {

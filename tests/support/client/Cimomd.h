@@ -10,13 +10,15 @@
 
 namespace Testing {
 
-// A running cimomd on a free port of 127.0.0.1, stopped at the latest with this object.
+// A running cimomd on a free port of 127.0.0.1, stopped at the latest with this object: as its administrator stops it,
+// and killed where it does not end so.
 class Cimomd {
  public:
   // Waits until it listens. Throws std::runtime_error with what it wrote to the standard error where it ends instead.
   // @param options further options; --port is given already
   explicit Cimomd(const std::vector<std::string>& options, const Environment& environment = {},
                   const std::string& program = BINARY_DIR "/bin/cimomd");
+  ~Cimomd();
 
   // Options with which it serves the probe provider and its classes, in root/test.
   static std::vector<std::string> probeOptions();
