@@ -146,9 +146,12 @@ TEST_P(CompositeInstancesTest, MakingAnInstanceTellsEachStep) {
 
 TEST_P(CompositeInstancesTest, MakingWithoutAPathEndsEarly) {
   faults.failNewObjectPath = [](const std::string&, int) { return true; };
-  EXPECT_EQ(make(), nullptr);
-  EXPECT_EQ(messages().size(), 3u);
-  EXPECT_NE(messages()[2].find("EXITING: "), std::string::npos);
+  for (CMPIObjectPath* unusable : {static_cast<CMPIObjectPath*>(nullptr), pathWithoutHandle()}) {
+    faults.unmadePath = unusable;
+    EXPECT_EQ(make(), nullptr);
+    EXPECT_EQ(messages().size() % 3, 0u);
+    EXPECT_TRUE(messages().back().starts_with("EXITING: ")) << messages().back();
+  }
 }
 
 TEST_P(CompositeInstancesTest, MakingForARequestWithoutAPathNamesNoNamespace) {
@@ -186,11 +189,15 @@ TEST_P(CompositeInstancesTest, NoFilterLeavesEveryPropertyVisible) {
   }
 }
 
-TEST_P(CompositeInstancesTest, AnInstanceThatCannotBeMadeIsAppendedAsNull) {
+TEST_P(CompositeInstancesTest, AnInstanceThatCannotBeMadeIsAppendedAsItIs) {
   addUnderlying(sample().underlying, acceptable(sample(), 1));
   faults.failNewInstance = [](const std::string&, int) { return true; };
-  EXPECT_EQ(getAll(), 0);
-  EXPECT_EQ(out, std::vector<CMPIInstance*>{nullptr});
+  for (CMPIInstance* unusable : {static_cast<CMPIInstance*>(nullptr), withoutHandle()}) {
+    faults.unmadeInstance = unusable;
+    out.clear();
+    EXPECT_EQ(getAll(), 0);
+    EXPECT_EQ(out, std::vector<CMPIInstance*>{unusable});
+  }
 }
 
 TEST_P(CompositeInstancesTest, WronglyTypedUnderlyingPropertiesCountAsUnset) {

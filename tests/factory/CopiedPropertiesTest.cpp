@@ -134,8 +134,12 @@ TEST_F(CopiedPropertiesTest, AComputerSystemWithoutADedicationStillHasItsPositio
   withProperty(addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp2"}}), "Dedicated", withoutArray);
   CMPIData notAnArray = {CMPI_uint16, CMPI_goodValue, {}};
   withProperty(addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp3"}}), "Dedicated", notAnArray);
-  ASSERT_EQ(composeAll(Classes::computerSystem).size(), 3u);
-  for (int n = 1; n <= 3; ++n) {
+  CMPIArray handleless = {nullptr, nullptr};
+  CMPIData withoutHandle = {CMPI_uint16A, CMPI_goodValue, {}};
+  withoutHandle.value.array = &handleless;
+  withProperty(addUnderlying("YRNQV_SPComputerSystem", {{"Name", "sp4"}}), "Dedicated", withoutHandle);
+  ASSERT_EQ(composeAll(Classes::computerSystem).size(), 4u);
+  for (int n = 1; n <= 4; ++n) {
     EXPECT_FALSE(hasProperty(result_.instances[n - 1], "Dedicated")) << n;
     EXPECT_EQ(number(result_.instances[n - 1], "Index"), n);
   }

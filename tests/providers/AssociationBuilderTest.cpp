@@ -155,15 +155,15 @@ TEST_P(AssociationBuilderTest, IsFramedByItsMarkersAtTheirSourceLines) {
 }
 
 TEST_P(AssociationBuilderTest, EndsWithoutPathAreSkipped) {
-  addEnds(2, 2);
+  addEnds(3, 3);
   faults.onNewInstance = [&](const std::string& className, int call, CMPIInstance* instance) {
-    if ((className == model().outer || className == model().inner) && call == 1) {
-      withoutPath(instance);
+    if ((className == model().outer || className == model().inner) && call <= 2) {
+      withPath(instance, call == 1 ? nullptr : pathWithoutHandle());
     }
   };
   EXPECT_EQ(build(out), 0);
-  // The first outer does not count; of the inners read for the second one, the first does not.
-  EXPECT_EQ(pairs(), (Strings{pairOf(1, 1)}));
+  // The first two outers do not count; of the inners read for the third one, the first two do not.
+  EXPECT_EQ(pairs(), (Strings{pairOf(2, 2)}));
   EXPECT_EQ(unitLines(), framed(model().builderName));
 }
 

@@ -207,14 +207,16 @@ TEST_P(AssociationInstancesTest, AnUnmadeInstanceIsAnsweredAsItIsAndHasNoName) {
 TEST_P(AssociationInstancesTest, AnInstanceWithoutPathHasNoNameAndMatchesNothing) {
   addThreeOfEach();
   const CMPIObjectPath* path = clientPathOf(0);
-  faults.onNewInstance = [&](const std::string& className, int, CMPIInstance* instance) {
-    if (className == model().className) {
-      withoutPath(instance);
-    }
-  };
-  EXPECT_EQ(read(Reading::EnumInstances, classPath()).instances.size(), 9U);
-  EXPECT_EQ(read(Reading::EnumInstanceNames, classPath()).order, (Strings{"done"}));
-  EXPECT_EQ(read(Reading::GetInstance, path).order, (Strings{"done"}));
+  for (CMPIObjectPath* unusable : {static_cast<CMPIObjectPath*>(nullptr), pathWithoutHandle()}) {
+    faults.onNewInstance = [this, unusable](const std::string& className, int, CMPIInstance* instance) {
+      if (className == model().className) {
+        withPath(instance, unusable);
+      }
+    };
+    EXPECT_EQ(read(Reading::EnumInstances, classPath()).instances.size(), 9U);
+    EXPECT_EQ(read(Reading::EnumInstanceNames, classPath()).order, (Strings{"done"}));
+    EXPECT_EQ(read(Reading::GetInstance, path).order, (Strings{"done"}));
+  }
 }
 
 TEST_P(AssociationInstancesTest, AFailedBuilderAnswersNothingAndIsDoneAllTheSame) {

@@ -172,14 +172,16 @@ TEST_P(AssociationNavigationFailureTest, AReferenceToAnUnmadeFarInstanceHasItsSo
 }
 
 TEST_P(AssociationNavigationFailureTest, AFarInstanceWithoutPathHasNoName) {
-  faults.onNewInstance = [this](const std::string& className, int call, CMPIInstance* instance) {
-    if (className == farClass() && call % 3 == 2) {
-      withoutPath(instance);
-    }
-  };
-  EXPECT_EQ(answered(Navigation::Associators), (Strings{"instance", "instance", "instance"}));
-  EXPECT_EQ(answered(Navigation::AssociatorNames), (Strings{"path", "path"}));
-  EXPECT_EQ(answered(Navigation::ReferenceNames), (Strings{"path", "path"}));
+  for (CMPIObjectPath* unusable : {static_cast<CMPIObjectPath*>(nullptr), pathWithoutHandle()}) {
+    faults.onNewInstance = [this, unusable](const std::string& className, int call, CMPIInstance* instance) {
+      if (className == farClass() && call % 3 == 2) {
+        withPath(instance, unusable);
+      }
+    };
+    EXPECT_EQ(answered(Navigation::Associators), (Strings{"instance", "instance", "instance"}));
+    EXPECT_EQ(answered(Navigation::AssociatorNames), (Strings{"path", "path"}));
+    EXPECT_EQ(answered(Navigation::ReferenceNames), (Strings{"path", "path"}));
+  }
 }
 
 TEST_P(AssociationNavigationFailureTest, AReferenceThatCouldNotBeMadeIsAnsweredAsItIsAndHasNoName) {

@@ -337,6 +337,25 @@ TEST_P(InstanceOperationsTest, NullUnderlyingInstancesDoNoHarm) {
   EXPECT_EQ(getInstance(instancePath(1)).rc, CMPI_RC_OK);
 }
 
+TEST_P(InstanceOperationsTest, AnInstanceWithoutPathHasNoNameAndMatchesNothing) {
+  add(1);
+  const CMPIObjectPath* path = instancePath(1);
+  for (CMPIObjectPath* unusable : {static_cast<CMPIObjectPath*>(nullptr), pathWithoutHandle()}) {
+    faults.onNewInstance = [this, unusable](const std::string& className, int, CMPIInstance* instance) {
+      if (className == GetParam().className) {
+        withPath(instance, unusable);
+      }
+    };
+    result.order.clear();
+    EXPECT_EQ(enumInstances(classPath()).rc, CMPI_RC_OK);
+    // The object manager says itself that it has no path.
+    const CMPIrc code = unusable ? CMPI_RC_OK : CMPI_RC_ERR_FAILED;
+    EXPECT_EQ(enumInstanceNames(classPath()).rc, code);
+    EXPECT_EQ(getInstance(path).rc, code);
+    EXPECT_EQ(result.order, (std::vector<std::string>{"instance", "done", "done", "done"}));
+  }
+}
+
 TEST_P(InstanceOperationsTest, AnExceptionPassesThroughToTheObjectManager) {
   faults.onUpCall = [](const UpCall&) { throw std::runtime_error("thrown below"); };
   EXPECT_THROW(enumInstances(classPath()), std::runtime_error);

@@ -183,8 +183,6 @@ CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path) {
   return instance;
 }
 
-CMPIInstance* withoutPath(CMPIInstance* instance) { return withPath(instance, nullptr); }
-
 CMPIInstance* withPathsCounted(CMPIInstance* instance, int& count) {
   InstanceAlteration& alteration = alterationOf(instance);
   alteration.pathCount = &count;

@@ -13,8 +13,6 @@ namespace Testing {
 CMPIInstance* withProperty(CMPIInstance* instance, const std::string& name, CMPIData data, CMPIrc rc = CMPI_RC_OK);
 // getObjectPath answers `path`.
 CMPIInstance* withPath(CMPIInstance* instance, CMPIObjectPath* path);
-// getObjectPath answers null.
-CMPIInstance* withoutPath(CMPIInstance* instance);
 // The calls of getObjectPath are counted.
 CMPIInstance* withPathsCounted(CMPIInstance* instance, int& count);
 // "setPropertyFilter(list or null; keys)" and "setProperty(name)" are appended to `calls`.
