@@ -48,7 +48,61 @@ TEST_F(BmcipConnectionTest, NamesFileLineAndKeyOfAMistake) {
   expectFailure({}, 2, "BMCIP_URL: \"what is this\" must be a host");
   environment_.erase("BMCIP_URL");
   expectFailure({"--timeout", "0"}, 2, "--timeout: must be");
+  expectFailure({"--parallel", "0"}, 2, "--parallel: must be a number from 1 to 10000");
   expectFailure({"--cacert", directory_ / "missing.pem"}, 2, "missing.pem cannot be read");
+  expectFailure({"--cacert", directory_.path().string()}, 2, "cannot be read: it is a directory");
+  expectFailure({"--config", directory_.path().string()}, 2, directory_.path().string() + ": is a directory");
+  directory_.write("bmcip.ini", "[server]\nurl = web1\n");
+  expectFailure({"--config", file.string()}, 2, "bmcip.ini:2: unknown key \"url\" in [server]: there are no sections");
+}
+
+TEST_F(BmcipConnectionTest, LooksForItsFileInTheHomeThatThereIs) {
+  const RecordedServer server("sfcb");
+  const auto file = directory_.write("configuration/bmcip.ini", "netrc = no\nurl = " + server.url() + "\n");
+  directory_.write(".config/bmcip.ini", "url = http://127.0.0.1:1\n");
+  EXPECT_EQ(bmcip({"show"}).status, 10);
+  environment_["XDG_CONFIG_HOME"] = file.parent_path().string();
+  EXPECT_EQ(bmcip({"show"}).status, 0);
+  environment_["XDG_CONFIG_HOME"] = environment_["HOME"] = "";
+  EXPECT_EQ(bmcip({"show", "--url", server.url()}).status, 0);
+  expectFailure({"--netrc"}, 2, "/.netrc cannot be read");
+}
+
+TEST_F(BmcipConnectionTest, SaysWhatAnHttpStatusMeans) {
+  writePrivateFile(directory_ / "login", "admin:secret");
+  struct Row {
+    unsigned status;
+    const char* cimError;
+    std::vector<std::string> options;
+    int exitStatus;
+    const char* says;
+  };
+  for (const Row& row : std::vector<Row>{
+           {401, "", {}, 13, "asks for a login: give --credentials"},
+           {403, "", {"--credentials", directory_ / "login"}, 13, "does not accept this login (HTTP status 403)"},
+           {404, "", {}, 16, "no object manager answers there (HTTP status 404 for /cimom)"},
+           {503, "", {}, 10, "takes no more requests now (HTTP status 503)"},
+           {500, "", {}, 15, "does not take the request: HTTP status 500"},
+           {501, "unsupported-operation", {}, 15, "HTTP status 501, unsupported-operation"}}) {
+    const Cimom::Http::Server server({}, [&](const Cimom::Http::Request&) {
+      Cimom::Http::Response response{row.status, {}, ""};
+      if (*row.cimError) {
+        response.headers.add("CIMError", row.cimError);
+      }
+      return response;
+    });
+    std::vector<std::string> options = {"--url", "http://127.0.0.1:" + std::to_string(server.port())};
+    options.insert(options.end(), row.options.begin(), row.options.end());
+    expectFailure(options, row.exitStatus, row.says);
+  }
+}
+
+TEST_F(BmcipConnectionTest, SaysWhyThereIsNoTls) {
+  const RawServer server(RawServer::Manner::Babble);
+  const std::string url = "https" + server.url().substr(4);
+  expectFailure({"--url", url}, 12, "does the server speak https on this port?");
+  const auto empty = directory_.write("empty.pem", "");
+  expectFailure({"--url", url, "--cacert", empty.string()}, 12, "the file for --cacert cannot be used");
 }
 
 TEST_F(BmcipConnectionTest, OutlivesEveryHostileServer) {
@@ -104,8 +158,10 @@ TEST_F(BmcipLoginTest, TakesCredentialsFromAPrivateFile) {
   EXPECT_EQ(bmcip({"show", "--cacert", trusted(), "--credentials", directory_ / "login"}).status, 0);
   writePrivateFile(directory_ / "login", "admin:wrong\n");
   expectFailure({"--cacert", trusted(), "--credentials", directory_ / "login"}, 13, "does not accept this login");
-  writePrivateFile(directory_ / "login", "admin\n");
-  expectFailure({"--credentials", directory_ / "login"}, 2, "must be one line, USER:PASSWORD");
+  for (const char* text : {"admin\n", ":secret\n", "", "admin:secret\noperator:secret\n"}) {
+    writePrivateFile(directory_ / "login", text);
+    expectFailure({"--credentials", directory_ / "login"}, 2, "must be one line, USER:PASSWORD");
+  }
   expectFailure({"--credentials", directory_ / "nothing"}, 2, "nothing cannot be read");
   expectFailure({"--credentials", directory_.path().string()}, 2, "is no file");
   std::filesystem::permissions(directory_ / "login", std::filesystem::perms(0640));

@@ -62,6 +62,14 @@ TEST(RepliesTest, SaysWhatAnErrorMeans) {
   EXPECT_EQ(failureOf(error("5")), FailureKind::NotServed);
   EXPECT_EQ(failureOf(error("4711")), FailureKind::Error);
   EXPECT_THAT(Testing::thrownBy([&] { readNothing(error("1")); }), HasSubstr("CIM status 1, failed: because"));
+  EXPECT_THAT(Testing::thrownBy([] { readNothing(reply("<ERROR CODE=\"6\"/>")); }),
+              HasSubstr("CIM status 6, not found"));
+  EXPECT_THAT(Testing::thrownBy([] { readNothing(reply("<ERROR CODE=\"99\"/>")); }), HasSubstr("CIM status 99"));
+}
+
+TEST(RepliesTest, RefusesAValueWhereNoneIsExpected) {
+  EXPECT_THAT(Testing::thrownBy([] { readNothing(reply("<IRETURNVALUE><VALUE>1</VALUE></IRETURNVALUE>")); }),
+              HasSubstr("is not expected in this reply"));
 }
 
 TEST(RepliesTest, RefusesWhatIsNoReply) {
@@ -92,6 +100,21 @@ TEST(RepliesTest, TellsObjectsByTheirKeysWhateverTheirOrder) {
   const std::string b = "<KEYBINDING NAME=\"b\"><KEYVALUE>2</KEYVALUE></KEYBINDING>";
   EXPECT_EQ(identityOf(name(a + b)), identityOf(name(b + a)));
   EXPECT_NE(identityOf(name(a + b)), identityOf(name(a)));
+}
+
+TEST(RepliesTest, SendsANameBackAsItCame) {
+  const std::string keys =
+      "<KEYBINDING NAME=\"Flag\"><KEYVALUE VALUETYPE=\"boolean\">TRUE</KEYVALUE></KEYBINDING>"
+      "<KEYBINDING NAME=\"Index\"><KEYVALUE VALUETYPE=\"numeric\" TYPE=\"uint16\">7</KEYVALUE></KEYBINDING>"
+      "<KEYBINDING NAME=\"Part\"><VALUE.REFERENCE><LOCALINSTANCEPATH><LOCALNAMESPACEPATH><NAMESPACE NAME=\"root\">"
+      "</NAMESPACE><NAMESPACE NAME=\"other\"></NAMESPACE></LOCALNAMESPACEPATH><INSTANCENAME "
+      "CLASSNAME=\"D\"><KEYBINDING NAME=\"Name\">"
+      "<KEYVALUE VALUETYPE=\"string\">a</KEYVALUE></KEYBINDING></INSTANCENAME></LOCALINSTANCEPATH></VALUE.REFERENCE>"
+      "</KEYBINDING>";
+  const std::string name = "<INSTANCENAME CLASSNAME=\"C\">" + keys + "</INSTANCENAME>";
+  const ObjectName read = readNames(reply("<IRETURNVALUE>" + name + "</IRETURNVALUE>")).at(0);
+  EXPECT_THAT(associatorNames("root/cimv2", read, "A").message, HasSubstr(name));
+  EXPECT_EQ(identityOf(read), "C,flag=TRUE,index=7,part=D,name=a");
 }
 
 TEST(RepliesTest, ReadsTheNamesThatObjectManagersAnswer) {

@@ -114,6 +114,44 @@ TEST_F(BmcipSetAnswersTest, SaysThatAChangeWasRefused) {
   EXPECT_THAT(refused.output, HasSubstr("now     192.0.2.10"));
 }
 
+TEST_F(BmcipSetAnswersTest, TakesAnErrorForARefusalAndNoAnswerForNone) {
+  struct Row {
+    const char* code;
+    const char* outcome;
+    const char* says;
+  };
+  for (const Row& row : {Row{"1", "refused", "CIM status 1, failed"}, Row{"2", "refused", "this login may not do that"},
+                         Row{"3", "refused", "the server has no such namespace"}, Row{"", "ignored", "CODE"}}) {
+    const std::size_t before = server_.requests().size();
+    server_.alter([&, before](std::string& message) {
+      if (server_.requests().size() == before + 4) {
+        message =
+            "<CIM CIMVERSION=\"2.0\" DTDVERSION=\"2.0\"><MESSAGE ID=\"1\" PROTOCOLVERSION=\"1.0\"><SIMPLERSP>"
+            "<IMETHODRESPONSE NAME=\"ModifyInstance\"><ERROR" +
+            (*row.code ? " CODE=\"" + std::string(row.code) + "\"" : "") +
+            "/></IMETHODRESPONSE></SIMPLERSP></MESSAGE></CIM>";
+      }
+    });
+    EXPECT_THAT(set({"--json"}).output, AllOf(HasSubstr("\"outcome\":\"" + std::string(row.outcome) + "\""),
+                                              HasSubstr(row.says), HasSubstr(R"("after":{"address":"192.0.2.10",)")));
+  }
+}
+
+TEST_F(BmcipSetAnswersTest, SaysThatTheInterfaceIsNotThereOrNoLonger) {
+  server_.alter([this](std::string&) {
+    if (server_.requests().size() == 4) {
+      server_.answer("YRNx_MgmtHwIPProtocolEndPoint", "modified");
+    }
+  });
+  const Completed gone = set({"--json"});
+  EXPECT_EQ(gone.status, 6);
+  EXPECT_THAT(gone.output, AllOf(HasSubstr(R"("outcome":"unknown","changed":false)"), HasSubstr(R"("after":null)"),
+                                 HasSubstr("no longer shows the interface")));
+  const Completed none = set();
+  EXPECT_EQ(none.status, 2);
+  EXPECT_THAT(none.errors, HasSubstr("there is no interface eth0: the management processor shows none"));
+}
+
 TEST_F(BmcipSetAnswersTest, SaysThatAChangeIsHalfThere) {
   server_.alter([this](std::string& message) {
     if (const auto found = message.find("192.0.2.10"); server_.requests().size() > 4 && found != std::string::npos) {
@@ -166,6 +204,9 @@ TEST_F(BmcipSetAnswersTest, AsksBeforeItCutsItsOwnConnection) {
   // The read-back goes to the new address, which is nobody's here.
   EXPECT_THAT(answering("y"), HasSubstr("unknown: the change was sent"));
   EXPECT_EQ(server_.requests().size(), 10U);
+  EXPECT_THAT(answering("Y"), HasSubstr("unknown: the change was sent"));
+  EXPECT_THAT(answering("yes"), HasSubstr("unknown: the change was sent"));
+  EXPECT_THAT(answering("yeah"), HasSubstr("nothing was sent"));
   EXPECT_EQ(set({"--yes", "--connect-timeout", "0.2"}).status, 6);
 }
 

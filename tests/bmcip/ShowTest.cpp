@@ -83,6 +83,7 @@ TEST_F(BmcipShowTest, IsColouredOnATerminalThatWantsIt) {
     return run({"script", "-qec", command, "/dev/null"}, {{"TERM", "xterm"}, {"NO_COLOR", noColour}}).output;
   };
   EXPECT_THAT(onTerminal(""), HasSubstr("\033[1mIP interfaces\033[0m"));
+  EXPECT_THAT(run({"script", "-qec", command, "/dev/null"}, {{"TERM", "dumb"}}).output, Not(HasSubstr("\033")));
   EXPECT_THAT(onTerminal("1"), AllOf(HasSubstr("IP interfaces"), Not(HasSubstr("\033"))));
   EXPECT_THAT(bmcip({"show"}).output, Not(HasSubstr("\033")));
 }

@@ -15,6 +15,7 @@ TEST(TextTest, SteersNoTerminal) {
                      "31m"),
             "?31m");
   EXPECT_EQ(harmless("Müller → 1"), "Müller → 1");
+  EXPECT_EQ(harmless("\xc2\xa0 \xc2"), "\xc2\xa0 \xc2");
 }
 
 TEST(TextTest, AlignsByCharacters) {
