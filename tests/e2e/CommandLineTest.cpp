@@ -106,6 +106,7 @@ TEST_F(CommandLineTest, FailsWithStatusOneForWhatItIsGiven) {
   expectFailure({"--address", "localhost"}, "localhost");
   expectFailure({"--address", "192.0.2.1"}, "192.0.2.1");
   expectFailure({"--password-file", "/nowhere"}, "/nowhere");
+  expectFailure({"--request-log", "/nowhere/requests"}, "request-log: /nowhere/requests: No such file or directory");
   expectFailure({"--tls-certificate", "/nowhere", "--tls-key", "/nowhere"}, "/nowhere");
 }
 

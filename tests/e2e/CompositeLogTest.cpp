@@ -50,6 +50,13 @@ TEST_F(CompositeLogTest, FramesEveryOperationAtLevel4000) {
   EXPECT_THAT(having(stack.log(), "ENTERING: makeIPProtocolEndptInstance()"), testing::SizeIs(2));
 }
 
+TEST_F(CompositeLogTest, TheObjectManagerWritesWhatIsTracedToIt) {
+  CompositeStack stack(processor(), 6000, {"--trace", "yes"});
+  stack.instances("ei", "YRNx_MgmtHwIPProtocolEndPoint");
+  EXPECT_THAT(stack.cimomd().process().errors(),
+              HasSubstr("trace: CompositeIPConfigProvider: ***Returning One IPConfig instance***\n"));
+}
+
 TEST_F(CompositeLogTest, TellsOfAChangeDownToTheInterface) {
   const CompositeStack stack(processor(), 4000);
   stack.modify(endpoint("eth0"), "IPv4Address=192.0.2.77");

@@ -197,6 +197,21 @@ TEST_F(SecurityTest, WritesALineForEachRequestWhereItIsAskedTo) {
   EXPECT_TRUE(poll([&] { return readFile(file).find("127.0.0.1 admin 401 ") != std::string::npos; })) << readFile(file);
 }
 
+TEST_F(SecurityTest, WritesTheLineOfARequestWithoutALoginToTheStandardOutput) {
+  Cimomd cimomd(options({"--request-log", "-", "--server-name", "bmc.example"}));
+  const auto ask = [&](const std::string& host) {
+    HttpClient client(cimomd.port());
+    client.send("POST /cimom HTTP/1.1\r\nHost: " + host + "\r\nContent-Length: 0\r\n\r\n");
+    return client.receive().status;
+  };
+  EXPECT_EQ(ask("bmc.example"), 400u);
+  EXPECT_EQ(ask("web.example"), 421u);
+  ASSERT_TRUE(poll([&] { return linesOf(cimomd.process().output()).size() == 3; })) << cimomd.process().output();
+  const std::vector<std::string> lines = linesOf(cimomd.process().output());
+  EXPECT_TRUE(std::regex_match(lines[1], std::regex(R"(\S+Z 127\.0\.0\.1 - 400 \d+ POST /cimom)"))) << lines[1];
+  EXPECT_TRUE(std::regex_match(lines[2], std::regex(R"(\S+Z 127\.0\.0\.1 - 421 \d+ POST /cimom)"))) << lines[2];
+}
+
 TEST_F(SecurityTest, WarnsOfRunningAsRoot) {
   if (geteuid() != 0) {
     GTEST_SKIP() << "needs root";

@@ -5,6 +5,7 @@
 #include "cimom/cimxml/Errors.h"
 #include "cimom/cimxml/Request.h"
 #include "tests/cimom/cimxml/Messages.h"
+#include "tests/support/system/Throws.h"
 
 namespace {
 
@@ -165,6 +166,9 @@ TEST(RequestTest, ReadsEveryKindOfProperty) {
       "</VALUE.REFERENCE></PROPERTY.REFERENCE>");
   EXPECT_EQ(reference.type, "reference");
   EXPECT_EQ(std::get<ObjectName>(reference.value).className, "X");
+  const Property qualified = propertyOf(
+      "<PROPERTY NAME=\"A\" TYPE=\"uint8\"><QUALIFIER NAME=\"Q\" TYPE=\"boolean\"/><VALUE>1</VALUE></PROPERTY>");
+  EXPECT_EQ(std::get<std::string>(qualified.value), "1");
   const Property null = propertyOf("<PROPERTY NAME=\"A\" TYPE=\"uint8\"/>");
   EXPECT_TRUE(std::holds_alternative<std::monostate>(null.value));
 }
@@ -173,6 +177,13 @@ TEST(RequestTest, TakesADocumentTypeWithoutFetchingIt) {
   std::string message = intrinsicCall("M", "");
   message.insert(message.find("<CIM "), "<!DOCTYPE CIM SYSTEM \"http://localhost:1/cim.dtd\">");
   EXPECT_EQ(readRequest(message).method, "M");
+}
+
+TEST(RequestTest, ReadsUtf8WithItsMark) { EXPECT_EQ(readRequest("\xEF\xBB\xBF" + intrinsicCall("M", "")).method, "M"); }
+
+TEST(RequestTest, ReadsAnEmbeddedInstanceAndNothingElse) {
+  EXPECT_EQ(readEmbeddedInstance("<INSTANCE CLASSNAME=\"C\"/>").className, "C");
+  EXPECT_THAT(thrownBy([] { readEmbeddedInstance("<CLASS NAME=\"C\"/>"); }), HasSubstr("is not an instance"));
 }
 
 TEST(RequestTest, ReadsUtf16) {
@@ -371,6 +382,71 @@ INSTANTIATE_TEST_SUITE_P(
         Refusal{"TwoLoneKeys",
                 intrinsicCall("M", parameter("P", instanceName("C", "<KEYVALUE>1</KEYVALUE><KEYVALUE>2</KEYVALUE>"))),
                 400, notValid, "KEYVALUE"},
+        Refusal{"StrangeInNamespace",
+                messageOf("<IMETHODCALL NAME=\"M\"><LOCALNAMESPACEPATH><THING/></LOCALNAMESPACEPATH></IMETHODCALL>"),
+                400, notValid, "THING must be NAMESPACE"},
+        Refusal{"ParameterBeforeNamespace",
+                messageOf("<IMETHODCALL NAME=\"M\"><IPARAMVALUE NAME=\"P\"/></IMETHODCALL>"), 400, notValid,
+                "must begin with LOCALNAMESPACEPATH"},
+        Refusal{"ParameterBeforeTarget", messageOf("<METHODCALL NAME=\"M\"><PARAMVALUE NAME=\"P\"/></METHODCALL>"), 400,
+                notValid, "must begin with LOCALCLASSPATH or LOCALINSTANCEPATH"},
+        Refusal{"StrangeKey",
+                intrinsicCall("M", parameter("P", instanceName("C", "<KEYBINDING NAME=\"K\"><VALUE/></KEYBINDING>"))),
+                400, notValid, "VALUE is not a key value"},
+        Refusal{"LoneKeyAfterAnother",
+                intrinsicCall("M", parameter("P", instanceName("C", keyBinding("K", "1") + "<KEYVALUE>1</KEYVALUE>"))),
+                400, notValid, "KEYVALUE must not stand beside other keys"},
+        Refusal{"StrangeReference", intrinsicCall("M", parameter("P", "<VALUE.REFERENCE><VALUE/></VALUE.REFERENCE>")),
+                400, notValid, "VALUE is not a class or instance name"},
+        Refusal{"EmptyPath", intrinsicCall("M", parameter("P", "<INSTANCEPATH/>")), 400, notValid,
+                "INSTANCEPATH must contain a namespace path and a name"},
+        Refusal{
+            "PathOfThree",
+            intrinsicCall("M", parameter("P", "<LOCALCLASSPATH>" + nameSpacePath() +
+                                                  "<CLASSNAME NAME=\"C\"/><CLASSNAME NAME=\"C\"/></LOCALCLASSPATH>")),
+            400, notValid, "LOCALCLASSPATH must contain a namespace path and a name"},
+        Refusal{"StrangeInPath",
+                intrinsicCall("M", parameter("P", "<LOCALCLASSPATH>" + nameSpacePath() + "<THING/></LOCALCLASSPATH>")),
+                400, notValid, "THING is not a class or instance name"},
+        Refusal{"StrangePlace",
+                intrinsicCall("M", parameter("P", "<CLASSPATH><THING/><CLASSNAME NAME=\"C\"/></CLASSPATH>")), 400,
+                notValid, "THING is not a namespace path"},
+        Refusal{"EmptyPlace",
+                intrinsicCall("M", parameter("P", "<CLASSPATH><NAMESPACEPATH/><CLASSNAME NAME=\"C\"/></CLASSPATH>")),
+                400, notValid, "NAMESPACEPATH is not a namespace path"},
+        Refusal{"PlaceOfAHostAlone",
+                intrinsicCall(
+                    "M",
+                    parameter(
+                        "P",
+                        "<CLASSPATH><NAMESPACEPATH><HOST>h</HOST></NAMESPACEPATH><CLASSNAME NAME=\"C\"/></CLASSPATH>")),
+                400, notValid, "NAMESPACEPATH is not a namespace path"},
+        Refusal{"StrangeAfterTheHost",
+                intrinsicCall("M", parameter("P",
+                                             "<CLASSPATH><NAMESPACEPATH><HOST>h</HOST><THING/></"
+                                             "NAMESPACEPATH><CLASSNAME NAME=\"C\"/></CLASSPATH>")),
+                400, notValid, "NAMESPACEPATH is not a namespace path"},
+        Refusal{"EmptyNamedInstance", intrinsicCall("M", parameter("P", "<VALUE.NAMEDINSTANCE/>")), 400, notValid,
+                "must contain an INSTANCENAME and an INSTANCE"},
+        Refusal{"NamedInstanceOfThree",
+                intrinsicCall(
+                    "M",
+                    parameter("P", "<VALUE.NAMEDINSTANCE>" + instanceName("C", "") +
+                                       "<INSTANCE CLASSNAME=\"C\"/><INSTANCE CLASSNAME=\"C\"/></VALUE.NAMEDINSTANCE>")),
+                400, notValid, "must contain an INSTANCENAME and an INSTANCE"},
+        Refusal{"NamedInstanceOfTwoNames",
+                intrinsicCall("M", parameter("P", "<VALUE.NAMEDINSTANCE>" + instanceName("C", "") +
+                                                      instanceName("C", "") + "</VALUE.NAMEDINSTANCE>")),
+                400, notValid, "must contain an INSTANCENAME and an INSTANCE"},
+        Refusal{"NamedInstanceTheOtherWayRound",
+                intrinsicCall("M", parameter("P", "<VALUE.NAMEDINSTANCE><INSTANCE CLASSNAME=\"C\"/>" +
+                                                      instanceName("C", "") + "</VALUE.NAMEDINSTANCE>")),
+                400, notValid, "must contain an INSTANCENAME and an INSTANCE"},
+        Refusal{"ArrayInAProperty",
+                intrinsicCall("M", parameter("P",
+                                             "<INSTANCE CLASSNAME=\"C\"><PROPERTY NAME=\"A\" "
+                                             "TYPE=\"string\"><VALUE.ARRAY/></PROPERTY></INSTANCE>")),
+                400, notValid, "VALUE.ARRAY is not allowed in PROPERTY"},
         Refusal{"NamelessClass", intrinsicCall("M", parameter("P", "<CLASS/>")), 400, notValid, "NAME"},
         Refusal{"StrangeInClass", intrinsicCall("M", parameter("P", "<CLASS NAME=\"C\"><VALUE/></CLASS>")), 400,
                 notValid, "VALUE is not allowed in CLASS"},
@@ -412,6 +488,8 @@ INSTANTIATE_TEST_SUITE_P(
                             "unsupported-cim-version", "3.0"},
                     Refusal{"DtdVersion", replaced(good, "DTDVERSION=\"2.0\"", "DTDVERSION=\"1.0\""), 501,
                             "unsupported-dtd-version", "1.0"},
+                    Refusal{"HalfAVersion", replaced(good, "CIMVERSION=\"2.0\"", "CIMVERSION=\"2\""), 501,
+                            "unsupported-cim-version", "must be 2.x"},
                     Refusal{"ProtocolVersion", replaced(good, "PROTOCOLVERSION=\"1.0\"", "PROTOCOLVERSION=\"10.0\""),
                             501, "unsupported-protocol-version", "10.0"}),
     [](const auto& test) { return test.param.name; });

@@ -81,6 +81,41 @@ TEST_F(ConfigurationTest, IsExactUnlessItSaysBare) {
   EXPECT_EQ(complaint({"--strictness", "Bare"}), "--strictness: must be exact or bare, not \"Bare\"");
 }
 
+TEST_F(ConfigurationTest, TakesThePortOfHttpsWithTls) {
+  EXPECT_EQ(read({"--tls-certificate", "cert.pem", "--tls-key", "key.pem"}).port, 5989);
+  EXPECT_EQ(read({"--tls-certificate", "cert.pem", "--tls-key", "key.pem", "--port", "5988"}).port, 5988);
+}
+
+TEST_F(ConfigurationTest, TakesFilesRelativeToItsOwnAndNamesAsTheyAre) {
+  directory_.write("etc/cimomd.ini",
+                   "server-name = bmc.example\nserver-name = bmc\nrequest-log = requests.log\ntrace = yes\n"
+                   "user = cimomd\n");
+  const Configuration configuration = read({});
+  EXPECT_THAT(configuration.serverNames, ElementsAre("bmc.example", "bmc"));
+  EXPECT_EQ(configuration.requestLog, directory_.path() / "etc/requests.log");
+  EXPECT_TRUE(configuration.trace);
+  EXPECT_EQ(configuration.user, "cimomd");
+  EXPECT_EQ(read({"--request-log", "-"}).requestLog, "-") << "the standard output";
+  EXPECT_FALSE(read({"--trace", "no"}).trace);
+}
+
+TEST_F(ConfigurationTest, RefusesValuesWithTheirPlace) {
+  const struct {
+    const char* line;
+    const char* says;
+  } rows[] = {
+      {"schema =", "cimomd.ini:1: schema: must not be empty"},
+      {"request-log =", "cimomd.ini:1: request-log: must not be empty"},
+      {"server-name =", "cimomd.ini:1: server-name: must"},
+      {"trace = perhaps", "cimomd.ini:1: trace: must"},
+      {"tls-key = key.pem", "tls-certificate and tls-key must be given together"},
+  };
+  for (const auto& row : rows) {
+    directory_.write("etc/cimomd.ini", std::string(row.line) + "\n");
+    EXPECT_THAT(complaint({}), HasSubstr(row.says));
+  }
+}
+
 TEST_F(ConfigurationTest, NamesWhatIsNotInstalledAndTheOptionForIt) {
   std::filesystem::remove_all(installation_.providerDirectory);
   EXPECT_THAT(complaint({"--port", "1"}),

@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 #include <time.h>
+
+#include <utility>
 
 #include "cimom/http/Listener.h"
 #include "cimom/http/PasswordFile.h"
@@ -109,6 +112,20 @@ TEST_F(PasswordFileTest, RefusesAFileWithoutUsers) { EXPECT_EQ(errorOf("# none\n
 
 TEST_F(PasswordFileTest, NamesAFileThatIsNotThere) {
   EXPECT_THROW(PasswordFile(directory_.path() / "missing"), ServerError);
+}
+
+TEST_F(PasswordFileTest, RefusesWhatIsNoFileWithoutWaitingForIt) {
+  const auto fifo = directory_.path() / "fifo";
+  ASSERT_EQ(mkfifo(fifo.c_str(), 0600), 0);
+  for (const auto& [file, reason] :
+       {std::pair(directory_.path(), "is a directory"), {fifo, "must be a regular file"}, {write(""), "is empty"}}) {
+    try {
+      PasswordFile passwords(file);
+      ADD_FAILURE() << reason;
+    } catch (const ServerError& error) {
+      EXPECT_EQ(error.what(), file.string() + ": " + reason);
+    }
+  }
 }
 
 }  // namespace

@@ -3,7 +3,11 @@
 
 #include <chrono>
 #include <future>
+#include <list>
+#include <mutex>
+#include <string>
 #include <thread>
+#include <vector>
 
 #include "cimom/http/Server.h"
 #include "tests/support/client/HttpClient.h"
@@ -239,6 +243,8 @@ class AuthenticatedServerTest : public testing::Test {
     return options;
   }
 
+  static constexpr const char* wrong_ = "Authorization: Basic YWRtaW46d3Jvbmc=\r\n";
+
   Server server_{options(), echo};
   HttpClient client_{server_.port()};
 };
@@ -249,8 +255,36 @@ TEST_F(AuthenticatedServerTest, ChallengesAClientWithoutCredentials) {
   EXPECT_EQ(*response.headers.find("WWW-Authenticate"), "Basic realm=\"cimom\"");
 }
 
-TEST_F(AuthenticatedServerTest, RefusesAWrongPassword) {
-  EXPECT_EQ(client_.post("/", "", "Authorization: Basic YWRtaW46d3Jvbmc=\r\n").status, 401u);
+TEST_F(AuthenticatedServerTest, RefusesAWrongPassword) { EXPECT_EQ(client_.post("/", "", wrong_).status, 401u); }
+
+TEST_F(AuthenticatedServerTest, TurnsAwayWhoGuessesManyAtOnceAndEndsWhileTheOthersWait) {
+  ServerOptions many = options();
+  many.maxConnectionsPerAddress = 200;
+  std::vector<std::string> lines;
+  std::mutex mutex;
+  many.log = [&](const std::string& line) {
+    const std::lock_guard lock(mutex);
+    lines.push_back(line);
+  };
+  std::list<HttpClient> waiting;
+  {
+    Server server(many, echo);
+    for (int i = 0; i < 3; ++i) {
+      EXPECT_EQ(HttpClient(server.port()).post("/", "", wrong_).status, 401u);
+    }
+    for (int i = 0; i < 100; ++i) {
+      waiting.emplace_back(server.port())
+          .send("POST / HTTP/1.1\r\nHost: localhost\r\nContent-Length: 0\r\n" + std::string(wrong_) + "\r\n");
+    }
+    const Response refused = HttpClient(server.port()).post("/", "", wrong_);
+    EXPECT_EQ(refused.status, 429u);
+    EXPECT_EQ(*refused.headers.find("Retry-After"), "10");
+    // Others may log in meanwhile.
+    EXPECT_EQ(HttpClient(server.port(), "127.0.0.2").post("/", "", "Authorization: Basic YWRtaW46c2VjcmV0\r\n").status,
+              200u);
+  }
+  EXPECT_EQ(waiting.back().receive().status, 429u);
+  EXPECT_EQ(lines.front(), "login failed: user \"admin\" from 127.0.0.1");
 }
 
 TEST_F(AuthenticatedServerTest, RefusesMalformedCredentials) {

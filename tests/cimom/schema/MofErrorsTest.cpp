@@ -73,6 +73,8 @@ TEST(MofErrorsTest, NameTheLineAndWhatWasExpected) {
       {"# include(\"x\")", "expected \"pragma\", not \"include\""},
       {"#pragma include(x)", "expected the pragma's argument in quotes, not \"x\""},
       {"\n#pragma include(\"no-such.mof\")", "text:2: \"no-such.mof\" cannot be included: No such file or directory"},
+      {"\n#pragma include(\"/\")", "text:2: \"/\" cannot be included: Is a directory"},
+      {"class A { char16 P = '\xF0\x9F\x98\x80'; };", "must be one character"},
       {"class A { uint32 M(string; };", "expected the parameter's name, not \";\""},
       {"class A { uint32 M(string a }", "expected \")\", not \"}\""},
   };

@@ -79,11 +79,16 @@ TEST(MofTest, DefaultsAreValuesOfTheDeclaredType) {
       {"boolean P = false;", CMPI_boolean, "FALSE"},
       {"char16 P = 'A';", CMPI_char16, "65"},
       {"char16 P = '\\x20AC';", CMPI_char16, "8364"},
+      {"char16 P = '\xE2\x82\xAC';", CMPI_char16, "8364"},
+      {"char16 P = '\xC3\xA9';", CMPI_char16, "233"},
+      {"char16 P = '\\xE9';", CMPI_char16, "233"},
       {"string P = \"one \" /* and */ \"two\";", CMPI_string, "\"one two\""},
       {"string P = NULL;", CMPI_string, "NULL"},
       {"datetime P = \"00000001000000.000000:000\";", CMPI_dateTime, "\"00000001000000.000000:000\""},
       {"uint16 P[] = { 1, 2 };", CMPI_uint16A, "{1,2}"},
       {"string P[] = {};", CMPI_stringA, "{}"},
+      {"string P[] = null;", CMPI_stringA, "NULL"},
+      {"real64 P = .5;", CMPI_real64, "0.5"},
   };
   for (const auto& row : rows) {
     const Value value = propertyOf(row.declaration).defaultValue;
@@ -93,8 +98,8 @@ TEST(MofTest, DefaultsAreValuesOfTheDeclaredType) {
 }
 
 TEST(MofTest, StringsUnderstandEscapes) {
-  EXPECT_EQ(*propertyOf(R"(string P = "\b\t\n\f\r\"\'\\\x41\x20AC";)").defaultValue.text(),
-            "\b\t\n\f\r\"'\\A\xE2\x82\xAC");
+  EXPECT_EQ(*propertyOf(R"(string P = "\b\t\n\f\r\"\'\\\x41\xE9\x20AC";)").defaultValue.text(),
+            "\b\t\n\f\r\"'\\A\xC3\xA9\xE2\x82\xAC");
 }
 
 TEST(MofTest, QualifiersTakeTheDeclaredTypeDefaultAndFlavor) {
