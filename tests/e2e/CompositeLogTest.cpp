@@ -52,7 +52,7 @@ TEST_F(CompositeLogTest, FramesEveryOperationAtLevel4000) {
 
 TEST_F(CompositeLogTest, TheObjectManagerWritesWhatIsTracedToIt) {
   CompositeStack stack(processor(), 6000, {"--trace", "yes"});
-  stack.instances("ei", "YRNx_MgmtHwIPProtocolEndPoint");
+  stack.instances("ei", "YRNx_MgmtHwComputerSystem");
   EXPECT_THAT(stack.cimomd().process().errors(),
               HasSubstr("trace: CompositeIPConfigProvider: ***Returning One IPConfig instance***\n"));
 }
