@@ -118,6 +118,9 @@ TEST_F(ClassOperationsTest, QualifiersAreAnsweredAsTheSchemaDeclaresThem) {
       "</QUALIFIER.DECLARATION></IRETURNVALUE>");
   EXPECT_THAT(getQualifier("Values"), AllOf(HasSubstr("TYPE=\"string\" ISARRAY=\"true\" OVERRIDABLE=\"true\""),
                                             HasSubstr("></SCOPE></QUALIFIER.DECLARATION>")));
+  manager_.loadSchemaText("Qualifier Pair : uint8[2] = {1, 2}, Scope(property);", "root/test");
+  EXPECT_THAT(getQualifier("Pair"), AllOf(HasSubstr("TYPE=\"uint8\" ISARRAY=\"true\" ARRAYSIZE=\"2\""),
+                                          HasSubstr("<VALUE.ARRAY><VALUE>1</VALUE><VALUE>2</VALUE></VALUE.ARRAY>")));
   EXPECT_THAT(getQualifier("Description"),
               HasSubstr("TRANSLATABLE=\"true\"><SCOPE CLASS=\"true\" ASSOCIATION=\"true\" REFERENCE=\"true\" "
                         "PROPERTY=\"true\" METHOD=\"true\" PARAMETER=\"true\" INDICATION=\"true\">"));

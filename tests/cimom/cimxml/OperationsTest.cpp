@@ -377,6 +377,12 @@ TEST_F(OperationsTest, ParametersAreCheckedByNameAndKind) {
             "4: parameter DeepInheritance must be TRUE or FALSE");
   EXPECT_EQ(failed("EnumerateInstances", thing + parameter("PropertyList", value("x"))),
             "4: parameter PropertyList must be a list of names");
+  std::string names;
+  for (int i = 0; i < 4097; ++i) {
+    names += value("Name");
+  }
+  EXPECT_EQ(failed("EnumerateInstances", thing + parameter("PropertyList", "<VALUE.ARRAY>" + names + "</VALUE.ARRAY>")),
+            "4: parameter PropertyList must not have more than 4096 names");
   EXPECT_EQ(failed("GetInstance", ""), "4: parameter InstanceName is missing");
   EXPECT_EQ(failed("GetInstance", parameter("InstanceName", value("x"))),
             "4: parameter InstanceName must be an instance name");
@@ -396,6 +402,13 @@ TEST_F(OperationsTest, GetPropertyAndSetPropertyGoToTheBroker) {
                                       parameter("NewValue", "<INSTANCE CLASSNAME=\"TEST_Thing\"/>")),
             "13: parameter NewValue must be a value of the property's type");
   EXPECT_EQ(Probe::text(), "set");
+  const std::string nobodys =
+      instanceName("TEST_Nowhere", keyBinding("Number", "1", "VALUETYPE=\"numeric\" TYPE=\"uint16\"") +
+                                       "<KEYBINDING NAME=\"Part\"><VALUE.REFERENCE>" + thingName() +
+                                       "</VALUE.REFERENCE></KEYBINDING>");
+  EXPECT_EQ(failed("SetProperty", parameter("InstanceName", nobodys) + parameter("PropertyName", value("Text")) +
+                                      parameter("NewValue", value("set"))),
+            "5: unknown class \"TEST_Nowhere\"");
 }
 
 TEST_F(OperationsTest, MethodsOfAClassHaveStatusesOfTheirOwn) {

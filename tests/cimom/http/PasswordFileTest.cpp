@@ -46,6 +46,21 @@ TEST_F(PasswordFileTest, AcceptsAUsersPasswordOnly) {
   EXPECT_FALSE(passwords.accepts("", ""));
 }
 
+TEST_F(PasswordFileTest, TakesEveryMethodThatIsNotGuessedQuickly) {
+  for (const char* line :
+       {"$6$saltsalt$TVLlQcbpFVof5W3Yz4DTP6gRstiNuHwwTt6GLc1E5n0U0aDehy0S5knV8wiOQSpT0Y77vwPZN.Pq.H91p5hVO1",
+        "$y$j9T$saltsaltsaltsalt$.Zt5W26jjocuW0wIHGgB6AJelofw6GEpOypHGyow2y5",
+        "$gy$j9T$saltsaltsaltsalt$BBJRbPW2s14hnQwjOB5zpgb2NVqa6Gfb4kgKtS5Oda9",
+        "$7$CU..../....saltsalt$NUwJnl2EzU4ACwYC9BDHKGDt.PCVFKyF6Hlr/CUA09D",
+        "$2b$05$abcdefghijklmnopqrstuuOQiyCxlgf/oeuTqixKmWdcYUh4Hjl0a"}) {
+    const PasswordFile passwords(write("admin:" + std::string(line) + "\noperator:" + hash + "\n"));
+    EXPECT_TRUE(passwords.accepts("admin", "secret")) << line;
+    EXPECT_FALSE(passwords.accepts("admin", "wrong")) << line;
+    EXPECT_TRUE(passwords.accepts("operator", "secret")) << line;
+    EXPECT_FALSE(passwords.accepts("nobody", "secret")) << line;
+  }
+}
+
 TEST_F(PasswordFileTest, NamesAMalformedLine) {
   EXPECT_EQ(errorOf("# comment\nadmin\n"), "passwords:2: expected \"user:hash\" with a hash of crypt(5)");
   EXPECT_EQ(errorOf(":" + std::string(hash)), "passwords:1: expected \"user:hash\" with a hash of crypt(5)");

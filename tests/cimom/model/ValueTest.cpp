@@ -92,6 +92,21 @@ TEST(ValueTest, OfReferencesWithinReferencesStaysShort) {
   EXPECT_NE(path.toString().find("…"), std::string::npos);
 }
 
+TEST(ValueTest, OfALongReferenceIsCutBetweenCharacters) {
+  for (const std::size_t shift : {0, 1, 2}) {
+    ObjectPath path{"", "root/test", "C" + std::string(shift, 'x'), {}};
+    std::string text;
+    for (int i = 0; i < 2000; ++i) {
+      text += "€";
+    }
+    path.keys.set("K", Value::string(text));
+    const std::string cut = Value::reference(path).toString();
+    ASSERT_TRUE(cut.ends_with("…\""));
+    EXPECT_TRUE(cut.ends_with("€…\""));
+    EXPECT_LE(cut.size(), 4096U + std::string("…\"\"\\").size());
+  }
+}
+
 TEST(ValueTest, OfAReferenceIsItsTextInQuotes) {
   ObjectPath path{"", "root/test", "C", {}};
   path.keys.set("K", Value::string("a\"b"));

@@ -116,6 +116,8 @@ TEST_F(AssociationOperationsTest, WithoutChecksTheNamedAssociationIsAskedWhateve
   answerBothPeers();
   EXPECT_THAT(pathsOf(associatorNames(point(1), "TST_Peers", "CIM_System", "Left")), SizeIs(2));
   EXPECT_THAT(pathsOf(CBReferences(broker, request.context(), point(1), nullptr, "Left", nullptr, &status)), SizeIs(2));
+  EXPECT_EQ(associators(systemPath("one"), "TST_Nowhere"), nullptr);
+  EXPECT_EQ(status.rc, CMPI_RC_ERR_INVALID_PARAMETER);
 }
 
 TEST_F(AssociationOperationsTest, RolesTellTheTwoDirectionsOfAnAssociationApart) {

@@ -56,6 +56,32 @@ TEST_F(ProviderCallsTest, TheProviderGetsTheRequestsContext) {
   EXPECT_EQ(CMGetContextEntryCount(context(), nullptr), 1u) << "the caller's context stays its own";
 }
 
+TEST_F(ProviderCallsTest, AnInstanceWithoutANamespaceIsOfTheRequests) {
+  probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMPIInstance* instance = CMNewInstance(broker, systemPath("one"), nullptr);
+    CMPIObjectPath* nowhere = systemPath("one");
+    CMSetNameSpace(nowhere, "");
+    CMSetObjectPath(instance, nowhere);
+    CMReturnInstance(result, instance);
+    return ok;
+  };
+  EXPECT_THAT(pathsOf(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status)),
+              ElementsAre(HasSubstr(std::string(testNamespace) + ":TST_Processor")));
+}
+
+TEST_F(ProviderCallsTest, AResultTakesNoNullAndCannotBeCloned) {
+  probe->answer = [&](const CMPIContext*, const CMPIResult* result, const CMPIObjectPath*, const CMPIInstance*) {
+    CMPIValue none = {};
+    EXPECT_EQ(CMReturnData(result, &none, CMPI_string).rc, CMPI_RC_ERR_INVALID_PARAMETER);
+    CMPIStatus cloned = ok;
+    EXPECT_EQ(result->ft->clone(result, &cloned), nullptr);
+    EXPECT_EQ(cloned.rc, CMPI_RC_ERR_NOT_SUPPORTED);
+    return ok;
+  };
+  EXPECT_THAT(pathsOf(CBEnumInstances(broker, context(), path("TST_Processor"), nullptr, &status)), SizeIs(0));
+  EXPECT_THAT(probe->calls, SizeIs(1));
+}
+
 TEST_F(ProviderCallsTest, AProviderReachesAnotherThroughUpCalls) {
   std::shared_ptr<RecordingProvider> lower = std::make_shared<RecordingProvider>();
   lower->serve(manager, "TST_Other", "root/lower");
