@@ -341,7 +341,7 @@ TEST_P(InstanceOperationsTest, AnInstanceWithoutPathHasNoNameAndMatchesNothing) 
   add(1);
   const CMPIObjectPath* path = instancePath(1);
   for (CMPIObjectPath* unusable : {static_cast<CMPIObjectPath*>(nullptr), pathWithoutHandle()}) {
-    faults.onNewInstance = [this, unusable](const std::string& className, int, CMPIInstance* instance) {
+    faults.onNewInstance = [unusable](const std::string& className, int, CMPIInstance* instance) {
       if (className == GetParam().className) {
         withPath(instance, unusable);
       }
