@@ -37,6 +37,23 @@ std::string BmcipTest::lastLine(const std::string& text) {
   return lines.empty() ? "" : lines.back();
 }
 
+void BmcipTest::expectSchemaOf(const std::string& lines) const {
+  if (run({"python3", "-c", "import jsonschema"}).status != 0) {
+    GTEST_SKIP() << "python3-jsonschema is not there";
+  }
+  const std::string check =
+      "import json, sys, jsonschema\n"
+      "schema = json.load(open(sys.argv[1]))\n"
+      "jsonschema.Draft7Validator.check_schema(schema)\n"
+      "for line in open(sys.argv[2]): jsonschema.validate(json.loads(line), schema)\n"
+      "try: jsonschema.validate({'server': 'x', 'interfaces': 1}, schema)\n"
+      "except jsonschema.ValidationError: sys.exit(0)\n"
+      "sys.exit('takes anything')\n";
+  const auto file = directory_.write("lines", lines);
+  const Completed checked = run({"python3", "-c", check, SOURCE_DIR "/docs/bmcip.schema.json", file.string()});
+  EXPECT_EQ(checked.status, 0) << checked.errors;
+}
+
 BmcipStackTest::BmcipStackTest() { environment_["BMCIP_URL"] = url(); }
 
 std::string BmcipStackTest::url() const { return "http://127.0.0.1:" + std::to_string(stack_.port()); }

@@ -26,6 +26,9 @@ class BmcipTest : public testing::Test {
   // The last line of what it says on the standard error.
   static std::string lastLine(const std::string& text);
 
+  // That each line is an object of docs/bmcip.schema.json; the test is skipped where nothing can check that.
+  void expectSchemaOf(const std::string& lines) const;
+
   // Added to the test's own environment.
   Environment environment_;
   const TemporaryDirectory directory_;

@@ -55,26 +55,13 @@ TEST_F(BmcipShowTest, PrintsJson) {
 }
 
 TEST_F(BmcipShowTest, KeepsToItsSchema) {
-  if (run({"python3", "-c", "import jsonschema"}).status != 0) {
-    GTEST_SKIP() << "python3-jsonschema is not there";
-  }
   const std::string failed = bmcip({"show", "--json", "http://127.0.0.1:1"}).output;
   const std::string lines = bmcip({"show", "--json"}).output + failed +
                             bmcip({"set", "--json", "--dry-run", "eth0", "192.0.2.77/25"}).output +
                             bmcip({"set", "--json", "eth0", "192.0.2.77/25"}).output +
                             bmcip({"model", "--json"}).output;
   ASSERT_EQ(linesOf(lines).size(), 5U);
-  const auto file = directory_.write("lines", lines);
-  const std::string check =
-      "import json, sys, jsonschema\n"
-      "schema = json.load(open(sys.argv[1]))\n"
-      "jsonschema.Draft7Validator.check_schema(schema)\n"
-      "for line in open(sys.argv[2]): jsonschema.validate(json.loads(line), schema)\n"
-      "try: jsonschema.validate({'server': 'x', 'interfaces': 1}, schema)\n"
-      "except jsonschema.ValidationError: sys.exit(0)\n"
-      "sys.exit('takes anything')\n";
-  const Completed checked = run({"python3", "-c", check, SOURCE_DIR "/docs/bmcip.schema.json", file.string()});
-  EXPECT_EQ(checked.status, 0) << checked.errors;
+  expectSchemaOf(lines);
 }
 
 TEST_F(BmcipShowTest, IsColouredOnATerminalThatWantsIt) {

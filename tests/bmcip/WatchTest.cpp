@@ -113,6 +113,7 @@ TEST_F(BmcipWatchAnswersTest, EndsWhenNobodyReadsAnyMore) {
   EXPECT_EQ(watched.status, 1);
   EXPECT_THAT(watched.output, ContainsRegex(R"(^\{"time":"[-0-9]+T[0-9:]+[+-][0-9:]+","server":"http://[0-9.:]+",)"
                                             R"("what":"eth0 address","before":"192.0.2.10","after":"192.0.2.77"\})"));
+  expectSchemaOf(watched.output);
 }
 
 TEST_F(BmcipWatchTest, FailsWhereThereIsNothingToWatch) {
