@@ -56,9 +56,6 @@ bool IpmiProcessor::snapshotHolds(Clock::time_point now) {
 }
 
 std::optional<ChangeGeneration::Number> IpmiProcessor::generation() {
-  if (settings_.cache == std::chrono::milliseconds::zero()) {
-    return std::nullopt;
-  }
   try {
     const auto number = generation_.current();
     generationFailed_ = false;
@@ -105,15 +102,28 @@ std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
 }
 
 // A processor shows what another client writes, one value after the other or all at once, and that may come between two
-// round trips of a look. An address and mask that were not known to belong together do if they stay and nobody is at
-// work on them. Who has left a lock behind is waited for once, and not for long.
+// round trips of a look. An address and mask that were not known to belong together do if they stay, nobody is at work
+// on them, and no process of this machine has been: two changes in a row may write an address that was there before.
+// Who has left a lock behind, and with it values that stay, is waited for once, and not for long.
 NetworkInterface IpmiProcessor::look(Channel& channel) {
-  for (const Deadline end(settings_.operationTimeout / 2);; std::this_thread::sleep_for(betweenTries)) {
+  struct Seen {
+    AddressPair pair;
+    std::optional<ChangeGeneration::Number> generation;
+    bool operator==(const Seen&) const = default;
+  };
+  std::optional<Seen> earlier;
+  Deadline abandoned(settings_.operationTimeout / 2);
+  for (;; std::this_thread::sleep_for(betweenTries)) {
+    const auto number = generation();
     NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
-    const AddressPair pair(interface.ipv4Address, interface.ipv4SubnetMask);
-    if (channel.known == pair || end.passed() ||
-        (!isBeingSet(connection_, channel.number) && readAddressPair(connection_, channel.number) == pair)) {
-      channel.known = pair;
+    const Seen seen{{interface.ipv4Address, interface.ipv4SubnetMask}, number};
+    if (std::exchange(earlier, seen) != seen) {
+      abandoned = Deadline(settings_.operationTimeout / 2);
+    }
+    if (channel.known == seen.pair ||
+        ((abandoned.passed() || !isBeingSet(connection_, channel.number)) &&
+         readAddressPair(connection_, channel.number) == seen.pair && generation() == number)) {
+      channel.known = seen.pair;
       return interface;
     }
   }
@@ -133,7 +143,7 @@ ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   }
   trace("read " + std::to_string(processor.interfaces.size()) + " interfaces in " +
         std::to_string(connection_.roundTrips()) + " round trips");
-  if (generationBefore) {
+  if (generationBefore && settings_.cache > std::chrono::milliseconds::zero()) {
     snapshot_ = {processor, now, *generationBefore};
   }
   return processor;

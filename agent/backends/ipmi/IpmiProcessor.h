@@ -52,7 +52,7 @@ class IpmiProcessor {
   };
 
   bool snapshotHolds(Clock::time_point now);
-  // Nothing where no look may be kept: the settings want none, or the other processes' changes cannot be learned of.
+  // Nothing where the other processes' changes cannot be learned of.
   std::optional<ChangeGeneration::Number> generation();
   void announceChange();
   void reportGenerationFailure(const std::string& reason);

@@ -33,7 +33,6 @@ constexpr auto tolerance = 1000ms;
 
 BackEndSettings impatient(BackEndSettings settings) {
   settings["operation_timeout"] = "1";
-  settings["retransmission_timeout"] = "0.3";
   return settings;
 }
 
