@@ -12,66 +12,68 @@ namespace {
 
 constexpr std::chrono::milliseconds betweenLooks{100};
 
-// Whether the address is one that was neither there nor written by us: another client's, whose change must stand. A
-// processor that mangles what it applies shows none.
-bool isAnothers(const AddressSettings& present, const AddressSettings& earlier, const AddressSettings& wanted) {
-  return present.address && !present.address->isZero() && present.address != earlier.address &&
-         present.address != wanted.address;
-}
-
 }  // namespace
 
-void AddressChanger::apply(const AddressChange& change) {
+// Whether the address is one that was neither there nor written by us: another client's, whose change must stand. A
+// processor that mangles what it applies shows none.
+bool AddressChanger::isAnothers(const AddressSettings& present, const Plan& plan) {
+  return present.address && !present.address->isZero() && present.address != plan.earlier.address &&
+         present.address != plan.wanted.address;
+}
+
+AddressChanger::Plan AddressChanger::plan(const AddressChange& change) const {
   const AddressSettings earlier = readAddressSettings(transport_, channel_);
   if (earlier == AddressSettings{}) {
     throw noLanChannel(channel_);
   }
   const AddressSettings wanted = withChange(earlier, change);
-  const auto writes = planWrites(earlier, wanted);
-  if (writes.empty()) {
-    logProgress(interfaceName(channel_) + " has these values already: nothing is written");
-    return;
-  }
+  return {earlier, wanted, planWrites(earlier, wanted)};
+}
+
+void AddressChanger::apply(const AddressChange& change) {
+  Plan plan;
   std::string loss;
   try {
-    write(earlier, wanted);
+    // What is left as it is must not be what another client has half written: it is looked at with the lock.
+    ParameterTransaction transaction(transport_, channel_, held_, patience_);
+    plan = this->plan(change);
+    if (!plan.writes.empty()) {
+      begun_ = true;
+      onBegin_();
+      transaction.write(plan.writes);
+    }
+  } catch (const LockedByAnother&) {
+    plan = this->plan(change);
+    if (!plan.writes.empty()) {
+      throw;
+    }
   } catch (const ConnectionLost& lost) {
     if (!begun_) {
       throw;
     }
     loss = lost.what();
   }
-  const AddressSettings present = readBack(writes, wanted, loss);
-  const std::string difference = describeDifference(present, wanted);
-  if (difference.empty()) {
+  if (plan.writes.empty()) {
+    logProgress(interfaceName(channel_) + " has these values already: nothing is written");
     return;
   }
-  const std::string outcome = present == earlier ? "; the earlier values hold"
-                              : isAnothers(present, earlier, wanted)
-                                  ? "; another client has changed it meanwhile, and its values hold"
-                                  : putBack(present, earlier);
-  throw IpmiError("the BMC took the change of " + interfaceName(channel_) + " but does not show it: " + difference +
-                  outcome);
-}
-
-void AddressChanger::write(const AddressSettings& from, const AddressSettings& to) {
-  ParameterTransaction transaction(transport_, channel_, held_, patience_);
-  if (!std::exchange(begun_, true)) {
-    onBegin_();
+  const AddressSettings present = readBack(plan, loss);
+  const std::string difference = describeDifference(present, plan.wanted);
+  if (!difference.empty()) {
+    throw IpmiError("the BMC took the change of " + interfaceName(channel_) + " but does not show it: " + difference +
+                    (present == plan.earlier ? "; the earlier values hold" : putBack(plan)));
   }
-  transaction.write(planWrites(from, to));
 }
 
 // What was written is what must show. The rest is looked at only where that fails and has to be mended.
-AddressSettings AddressChanger::readBack(const std::vector<ParameterWrite>& written, const AddressSettings& wanted,
-                                         const std::string& loss) try {
+AddressSettings AddressChanger::readBack(const Plan& plan, const std::string& loss) try {
   for (const Deadline deadline(patience_);;) {
-    AddressSettings present = wanted;
+    AddressSettings present = plan.wanted;
     try {
-      for (const ParameterWrite& write : written) {
+      for (const ParameterWrite& write : plan.writes) {
         readInto(present, transport_, channel_, write.parameter);
       }
-      if (present == wanted) {
+      if (present == plan.wanted) {
         return present;
       }
     } catch (const Refused&) {  // it may be busy
@@ -88,9 +90,16 @@ AddressSettings AddressChanger::readBack(const std::vector<ParameterWrite>& writ
                   "). Where the agent reaches it at the address that was changed, set host to the new one");
 }
 
-std::string AddressChanger::putBack(const AddressSettings& present, const AddressSettings& earlier) try {
-  write(present, earlier);
-  const std::string difference = describeDifference(readAddressSettings(transport_, channel_), earlier);
+std::string AddressChanger::putBack(const Plan& plan) try {
+  {
+    ParameterTransaction transaction(transport_, channel_, held_, patience_);
+    const AddressSettings present = readAddressSettings(transport_, channel_);
+    if (isAnothers(present, plan)) {
+      return "; another client has changed it meanwhile, and its values hold";
+    }
+    transaction.write(planWrites(present, plan.earlier));
+  }
+  const std::string difference = describeDifference(readAddressSettings(transport_, channel_), plan.earlier);
   return difference.empty() ? "; the earlier values were put back"
                             : "; the earlier values could not be put back: " + difference;
 } catch (const IpmiError& error) {

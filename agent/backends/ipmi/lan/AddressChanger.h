@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
-// A change of an interface's address from the first look to the confirmation that it holds.
+// A change of an interface's address from the lock to the confirmation that it holds.
 #pragma once
 
 #include <chrono>
@@ -24,15 +24,23 @@ class AddressChanger {
                  std::chrono::milliseconds patience)
       : transport_(transport), channel_(channel), held_(held), onBegin_(std::move(onBegin)), patience_(patience) {}
 
-  // Returns once the processor shows the change, which is at once where it has the values already. Throws IpmiError
+  // Returns once the processor shows the change, which is at once where it has the values already, whoever holds the
+  // lock. Throws IpmiError
   // that says whether nothing was changed, the earlier values were put back, or the outcome is unknown.
   void apply(const AddressChange& change);
 
  private:
-  AddressSettings readBack(const std::vector<ParameterWrite>& written, const AddressSettings& wanted,
-                           const std::string& loss);
-  std::string putBack(const AddressSettings& present, const AddressSettings& earlier);
-  void write(const AddressSettings& from, const AddressSettings& to);
+  struct Plan {
+    AddressSettings earlier;
+    AddressSettings wanted;
+    std::vector<ParameterWrite> writes;
+  };
+
+  static bool isAnothers(const AddressSettings& present, const Plan& plan);
+
+  Plan plan(const AddressChange& change) const;
+  AddressSettings readBack(const Plan& plan, const std::string& loss);
+  std::string putBack(const Plan& plan);
 
   IpmiTransport& transport_;
   const std::uint8_t channel_;

@@ -114,7 +114,7 @@ void ParameterTransaction::take() {
   }
   held_.erase(channel_);
   if (response.completionCode == CompletionCode::setInProgress) {
-    throw IpmiError(busyText(channel_));
+    throw LockedByAnother(busyText(channel_));
   }
   if (!meansNoLock(response.completionCode)) {
     throw IpmiError(nameOf(channel_) + " cannot be changed: " + CompletionCode::describe(response.completionCode));

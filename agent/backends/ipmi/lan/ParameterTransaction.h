@@ -24,11 +24,17 @@ using HeldLocks = std::map<std::uint8_t, LockHolder>;
 // `patience` to end its change first. A failure is logged, and the lock stays in `held`.
 void releaseLock(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held, std::chrono::milliseconds patience);
 
+// Nothing was sent but the request for the lock.
+class LockedByAnother : public IpmiError {
+ public:
+  using IpmiError::IpmiError;
+};
+
 // Holds the lock from its construction to its destruction, whatever happens in between. A processor without the lock is
 // written to all the same.
 class ParameterTransaction {
  public:
-  // Throws IpmiError, and nothing has been written, if another client holds the lock or it cannot be taken. Where an
+  // Throws LockedByAnother, or IpmiError if the lock cannot be taken; nothing has been written then. Where an
   // answer that came late leaves open whose the lock is, it is ours if it does not go within `patience`.
   ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held,
                        std::chrono::milliseconds patience);

@@ -140,7 +140,7 @@ TEST(IpmiFailureTest, OfTheNetworkInMidChangeLeavesTheOutcomeOpenAndNoLockBehind
   IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings(wire.port()))));
   backEnd.read();
 
-  // Look (3), locked, source, and there it goes.
+  // Locked, looked (3), source, and there it goes.
   wire.cutAtRequest(6);
   EXPECT_THAT(inTime([&] { backEnd.change("lan1", bothValues); }), refusal("the outcome is unknown"));
   EXPECT_EQ(bmc.witness("Set in Progress"), "Set In Progress");

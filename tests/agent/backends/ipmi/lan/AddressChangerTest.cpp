@@ -30,8 +30,8 @@ const ParameterData oldAddress{192, 0, 2, 10}, newAddress{192, 0, 2, 77};
 const ParameterData oldMask{255, 255, 255, 0}, newMask{255, 255, 255, 128};
 const ParameterData fixed{1}, leased{2};
 
-// The requests of a change: three to look, the lock, then source, address and mask as they differ.
-constexpr unsigned lockRequest = 4, firstWrite = 5;
+// The requests of a change: the lock, three to look, then source, address and mask as they differ.
+constexpr unsigned lockRequest = 1, firstWrite = 5;
 
 class AddressChangerTest : public testing::Test {
  protected:
@@ -152,6 +152,28 @@ TEST_F(AddressChangerTest, IsRefusedWhileAnotherHoldsTheLock) {
 
   EXPECT_THAT(bmc.written, IsEmpty());
   EXPECT_THAT(held, IsEmpty()) << "another client's lock is not ours to give back";
+}
+
+TEST_F(AddressChangerTest, NeedsNoLockOfAnothersWhereTheValuesAreSoAlready) {
+  bmc.lockedByAnother = true;
+
+  change({QV::ipv4("192.0.2.10"), QV::mask("255.255.255.0")});
+
+  EXPECT_THAT(bmc.written, IsEmpty());
+}
+
+// Before the lock is granted another client has written the mask that is wanted; it ends with another one.
+TEST_F(AddressChangerTest, LeavesNothingOutThatAnotherClientHadHalfWritten) {
+  bmc.values[LanParameter::SubnetMask] = newMask;
+  bmc.beforeRequest = [&](unsigned) {
+    if (bmc.locked && bmc.written.empty()) {
+      bmc.values[LanParameter::SubnetMask] = oldMask;
+    }
+  };
+
+  change(bothValues);
+
+  expectNewValues();
 }
 
 TEST_F(AddressChangerTest, KnowsItsOwnLockWhereTheRequestForItWentOutTwice) {
