@@ -10,6 +10,41 @@ if(NOT CMAKE_BUILD_TYPE)
   set(CMAKE_BUILD_TYPE RelWithDebInfo)
 endif()
 
+# A 32-bit build must not take a file with a large inode number or size for a missing one.
+add_compile_definitions(_FILE_OFFSET_BITS=64)
+
+# What most sources of the product include is read by the compiler once, where several sources are compiled at a time
+# anyway: the packages compile each alone, and so prove that it includes what it uses.
+# For all libraries that there are yet.
+function(read_standard_headers_once)
+  if(NOT CMAKE_UNITY_BUILD)
+    return()
+  endif()
+  file(CONFIGURE OUTPUT standard_headers.cpp CONTENT "")
+  add_library(standard_headers OBJECT "${CMAKE_CURRENT_BINARY_DIR}/standard_headers.cpp")
+  target_precompile_headers(standard_headers PRIVATE <algorithm> <array> <charconv> <chrono> <filesystem> <functional>
+                            <map> <memory> <mutex> <optional> <set> <sstream> <string> <string_view> <thread>
+                            <unordered_map> <vector>)
+  get_property(directories DIRECTORY PROPERTY SUBDIRECTORIES)
+  foreach(directory IN LISTS directories)
+    use_standard_headers("${directory}")
+  endforeach()
+endfunction()
+
+function(use_standard_headers directory)
+  get_property(targets DIRECTORY "${directory}" PROPERTY BUILDSYSTEM_TARGETS)
+  foreach(target IN LISTS targets)
+    get_target_property(type ${target} TYPE)
+    if(type MATCHES "(STATIC|SHARED|MODULE|OBJECT)_LIBRARY")
+      target_precompile_headers(${target} REUSE_FROM standard_headers)
+    endif()
+  endforeach()
+  get_property(subdirectories DIRECTORY "${directory}" PROPERTY SUBDIRECTORIES)
+  foreach(subdirectory IN LISTS subdirectories)
+    use_standard_headers("${subdirectory}")
+  endforeach()
+endfunction()
+
 # The presets compile several sources at a time (CMAKE_UNITY_BUILD), the packages each alone. These cannot share a
 # compilation with others of their target: they name something as another does, or a class of a header has a member of a
 # type that only they know.
@@ -23,6 +58,11 @@ add_compile_options(-Wall -Wextra -Wpedantic -Wshadow -Wnon-virtual-dtor -Wold-s
 find_program(CCACHE ccache)
 if(CCACHE)
   set(CMAKE_CXX_COMPILER_LAUNCHER "${CCACHE}")
+endif()
+
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
+  # It finds copies of std::string out of bounds that are not: gcc's bug 105329 and its kin.
+  add_compile_options(-Wno-array-bounds -Wno-restrict -Wno-stringop-overflow -Wno-stringop-overread)
 endif()
 
 if(SANITIZE)

@@ -36,7 +36,7 @@
 namespace Cimom::Http {
 namespace {
 
-constexpr const char* realm = "cimom";
+constexpr const char* basicChallenge = "Basic realm=\"cimom\"";
 
 // Checking a password costs milliseconds on purpose.
 constexpr std::size_t loginThreads = 2;
@@ -125,7 +125,7 @@ MHD_Result collectHeader(void* headers, MHD_ValueKind, const char* name, const c
 Response challenge() {
   Response response{MHD_HTTP_UNAUTHORIZED, {}, "authentication is required\n"};
   response.headers.add("Content-Type", "text/plain; charset=\"utf-8\"");
-  response.headers.add("WWW-Authenticate", std::string("Basic realm=\"") + realm + "\"");
+  response.headers.add("WWW-Authenticate", basicChallenge);
   return response;
 }
 

@@ -30,7 +30,7 @@ void visitInteger(CMPIType type, Union& value, Operation operation) {
   });
 }
 
-std::string quoted(std::string_view text) {
+std::string inQuotes(std::string_view text) {
   std::string result;
   result.reserve(text.size() + 2);
   result += '"';
@@ -133,16 +133,16 @@ std::string Value::toString() const {
     return "NULL";
   }
   if (const auto* string = text()) {
-    return quoted(*string);
+    return inQuotes(*string);
   }
   if (const ObjectPath* reference = path()) {
-    return quoted(shortened(reference->toString()));
+    return inQuotes(shortened(reference->toString()));
   }
   if (const Instance* instance = embedded()) {
-    return quoted(shortened(instance->path()->toString()));
+    return inQuotes(shortened(instance->path()->toString()));
   }
   if (const DateTime* dateTime = time()) {
-    return quoted(dateTime->format());
+    return inQuotes(dateTime->format());
   }
   if (const Array* array = elements()) {
     std::string list = "{";
