@@ -12,6 +12,7 @@
 #include <functional>
 #include <iostream>
 #include <map>
+#include <numeric>
 #include <stdexcept>
 #include <string>
 
@@ -225,7 +226,9 @@ void request(int interfaces) {
     for (const auto& [name, value] : enumerationHeaders()) {
       message.headers.add(name, value);
     }
-    return instancesIn(endpoint.handle(message).body);
+    const Cimom::Http::Response response = endpoint.handle(message);
+    const auto inMore = [](int sum, const std::string& piece) { return sum + instancesIn(piece); };
+    return std::accumulate(response.more.begin(), response.more.end(), instancesIn(response.body), inMore);
   };
   // Warmed up by the one system, since ten thousand interfaces take a minute to count.
   expect(instancesOf("YRNx_MgmtHwComputerSystem"), 1, "the warming up");

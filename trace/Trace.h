@@ -9,8 +9,10 @@
 
 #include <TWLog/TWLog.h>
 
+#include <algorithm>
 #include <charconv>
 #include <cstring>
+#include <iterator>
 #include <limits>
 #include <string>
 #include <string_view>
@@ -28,71 +30,87 @@ namespace IPConfigComposite::TraceDetail {
 
 using Buffer = char[512];
 
-// Clears a buffer and writes texts into it, one after another, as far as they go before the null at its end.
-class Line {
+// A text that may be null, which is an empty one.
+inline std::string_view viewOf(const char* text) { return text ? text : ""; }
+
+// The digits of a line's number, signed as printf's %d shows it.
+class Number {
  public:
-  explicit Line(Buffer& buffer) : next_(buffer), end_(buffer + sizeof buffer - 1) {
-    // The C library's, which knows the processor: in place of a plain memset the compiler puts string instructions.
-    ::explicit_bzero(buffer, sizeof buffer);
-  }
+  explicit Number(unsigned int line)
+      : end_(std::to_chars(std::begin(characters_), std::end(characters_), static_cast<int>(line)).ptr) {}
+  Number(const Number&) = delete;
+  Number& operator=(const Number&) = delete;
 
-  Line& operator<<(std::string_view text) {
-    const auto room = static_cast<std::size_t>(end_ - next_);
-    if (text.size() <= room) {
-      std::memcpy(next_, text.data(), text.size());
-      next_ += text.size();
-    } else {
-      std::memcpy(next_, text.data(), room);
-      next_ = end_;
-    }
-    return *this;
-  }
-
-  // A null writes nothing.
-  Line& operator<<(const char* text) { return *this << std::string_view(text ? text : ""); }
-
-  Line& operator<<(unsigned int line) {
-    char digits[std::numeric_limits<int>::digits10 + 2];
-    const char* end = std::to_chars(std::begin(digits), std::end(digits), static_cast<int>(line)).ptr;
-    return *this << std::string_view(digits, static_cast<std::size_t>(end - digits));
-  }
+  operator std::string_view() const { return {characters_, static_cast<std::size_t>(end_ - characters_)}; }
 
  private:
-  char* next_;
-  char* const end_;
+  char characters_[std::numeric_limits<int>::digits10 + 2];
+  const char* end_;
 };
+
+// Clears a buffer and writes pieces into it, one after another, as far as they go before the null at its end. In line,
+// so that literals are copied by a length that is known.
+template <typename... Pieces>
+[[gnu::always_inline]] inline void write(Buffer& buffer, const Pieces&... pieces) {
+  // The C library's, which knows the processor: in place of a plain memset the compiler puts string instructions.
+  ::explicit_bzero(buffer, sizeof buffer);
+  char* next = buffer;
+  const auto copy = [&](std::string_view piece, std::size_t size) {
+    std::memcpy(next, piece.data(), size);
+    next += size;
+  };
+  if ((std::string_view(pieces).size() + ...) < sizeof buffer) {
+    (copy(pieces, std::string_view(pieces).size()), ...);
+  } else {
+    const auto room = [&] { return static_cast<std::size_t>(buffer + sizeof buffer - 1 - next); };
+    (copy(pieces, std::min(std::string_view(pieces).size(), room())), ...);
+  }
+}
 
 }  // namespace IPConfigComposite::TraceDetail
 
 // Formats a line about a function (`text` is its name) or, as FreeMessage, a message (`text` is the message). A type
 // that is none of the four yields the empty text; a line longer than 511 characters is cut. The result is valid until
 // the next call of this overload anywhere in the library.
-inline char* trace(const char* file, const char* text, unsigned int line, MessageType type) {
-  static IPConfigComposite::TraceDetail::Buffer messageBuffer;
-  IPConfigComposite::TraceDetail::Line message(messageBuffer);
+inline char* trace(std::string_view file, std::string_view text, unsigned int line, MessageType type) {
+  using namespace IPConfigComposite::TraceDetail;
+  static Buffer messageBuffer;
   switch (type) {
     case EntryMessage:
-      message << "ENTERING: " << text << "() in " << file << " [Line: " << line << "]";
+      write(messageBuffer, "ENTERING: ", text, "() in ", file, " [Line: ", Number(line), "]");
       break;
     case ExitMessage:
-      message << "EXITING: " << text << "() in " << file << " [Line: " << line << "]";
+      write(messageBuffer, "EXITING: ", text, "() in ", file, " [Line: ", Number(line), "]");
       break;
     case MethodInvokedMessage:
-      message << "METHOD: " << text << "() was invoked in " << file << " [Line: " << line << "]";
+      write(messageBuffer, "METHOD: ", text, "() was invoked in ", file, " [Line: ", Number(line), "]");
       break;
     case FreeMessage:
-      message << "MESSAGE [File: " << file << ", Line: " << line << "]: " << text;
+      write(messageBuffer, "MESSAGE [File: ", file, ", Line: ", Number(line), "]: ", text);
       break;
+    default:
+      write(messageBuffer, "");
   }
   return messageBuffer;
 }
 
+// The same of C strings; a null counts as empty.
+inline char* trace(const char* file, const char* text, unsigned int line, MessageType type) {
+  using IPConfigComposite::TraceDetail::viewOf;
+  return trace(viewOf(file), viewOf(text), line, type);
+}
+
 // Formats a line about a variable. The result is valid until the next call of this overload anywhere in the library.
-inline char* trace(const char* name, const char* file, unsigned int line, const char* value) {
-  static IPConfigComposite::TraceDetail::Buffer messageBuffer;
-  IPConfigComposite::TraceDetail::Line message(messageBuffer);
-  message << "VARIABLE: '" << name << "' has Value '" << value << "' at line " << line << " in " << file;
+inline char* trace(std::string_view name, std::string_view file, unsigned int line, std::string_view value) {
+  using namespace IPConfigComposite::TraceDetail;
+  static Buffer messageBuffer;
+  write(messageBuffer, "VARIABLE: '", name, "' has Value '", value, "' at line ", Number(line), " in ", file);
   return messageBuffer;
+}
+
+inline char* trace(const char* name, const char* file, unsigned int line, const char* value) {
+  using IPConfigComposite::TraceDetail::viewOf;
+  return trace(viewOf(name), viewOf(file), line, viewOf(value));
 }
 
 namespace IPConfigComposite {
@@ -147,38 +165,44 @@ inline void markProviderExit(const std::string& component, const char* file, con
 namespace IPConfigComposite {
 
 // What one function reports under: its unit's component and source file and its own name. The component must outlive
-// the frame. A line's number is the caller's unless given; numbers that are given are fixed (compatibility 3).
+// the frame, and so must the texts, each of which ends with a null. A line's number is the caller's unless given;
+// numbers that are given are fixed (compatibility 3).
 class Frame {
  public:
-  Frame(const std::string& component, const char* file, const char* function)
+  Frame(const std::string& component, std::string_view file, std::string_view function)
       : component_(component), file_(file), function_(function) {}
 
-  void markEntry(unsigned int line = __builtin_LINE()) const { markProviderEntry(component_, file_, function_, line); }
-  void markExit(unsigned int line = __builtin_LINE()) const { markProviderExit(component_, file_, function_, line); }
+  void markEntry(unsigned int line = __builtin_LINE()) const {
+    markProviderEntry(component_, file_.data(), function_.data(), line);
+  }
+  void markExit(unsigned int line = __builtin_LINE()) const {
+    markProviderExit(component_, file_.data(), function_.data(), line);
+  }
 
   void entering(unsigned int line = __builtin_LINE()) const { message(function_, line, EntryMessage, progressLevel); }
   void exiting(unsigned int line = __builtin_LINE()) const { message(function_, line, ExitMessage, progressLevel); }
 
-  void progress(const char* text, unsigned int line = __builtin_LINE()) const {
+  void progress(std::string_view text, unsigned int line = __builtin_LINE()) const {
     message(text, line, FreeMessage, progressLevel);
   }
-  void failure(const char* text, unsigned int line = __builtin_LINE()) const {
+  void failure(std::string_view text, unsigned int line = __builtin_LINE()) const {
     message(text, line, FreeMessage, failureLevel);
   }
 
-  void variable(const char* name, const char* value, unsigned int line = __builtin_LINE()) const {
-    TraceDetail::send(component_, progressLevel, function_, file_, line,
+  void variable(std::string_view name, std::string_view value, unsigned int line = __builtin_LINE()) const {
+    TraceDetail::send(component_, progressLevel, function_.data(), file_.data(), line,
                       [&] { return trace(name, file_, line, value); });
   }
 
  private:
-  void message(const char* text, unsigned int line, MessageType type, int level) const {
-    TraceDetail::send(component_, level, function_, file_, line, [&] { return trace(file_, text, line, type); });
+  void message(std::string_view text, unsigned int line, MessageType type, int level) const {
+    TraceDetail::send(component_, level, function_.data(), file_.data(), line,
+                      [&] { return trace(file_, text, line, type); });
   }
 
   const std::string& component_;
-  const char* file_;
-  const char* function_;
+  std::string_view file_;
+  std::string_view function_;
 };
 
 }  // namespace IPConfigComposite

@@ -54,10 +54,10 @@ int processId() {
 }  // namespace
 
 Channel::Channel(QV::ChannelSettings settings)
-    : settings_(std::move(settings)), least_(leastThreshold(settings_)), file_(settings_.file) {}
+    : settings_(std::move(settings)), floor_(leastThreshold(settings_)), file_(settings_.file) {}
 
 bool Channel::passes(const std::string& component, int level) const noexcept {
-  if (level < least_ || settings_.destination == Destination::Off) {
+  if (level < floor_ || settings_.destination == Destination::Off) {
     return false;
   }
   const auto named = settings_.componentThresholds.find(component);

@@ -19,6 +19,9 @@ class Channel {
   // an ordinary day ends here.
   bool passes(const std::string& component, int level) const noexcept;
 
+  // The least level that passes for any component.
+  int floor() const noexcept { return floor_; }
+
   // Sends a message that passed to its destination. One that the log file does not take goes to syslog, and the first
   // of them brings the reason with it.
   void send(const Message& message);
@@ -27,7 +30,7 @@ class Channel {
   void sendToFile(const Message& message);
 
   const QV::ChannelSettings settings_;
-  const int least_;  // no component's threshold lies below it
+  const int floor_;
   LogFile file_;
   std::atomic<bool> fileFailed_ = false;
 };

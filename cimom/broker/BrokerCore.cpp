@@ -29,8 +29,10 @@ BrokerCore::BrokerCore()
     : log(logToStandardError), broker{this, &upCallTable, &encapsulationTable, &extensionTable, &memoryTable} {}
 
 const ClassDefinition& BrokerCore::requireClass(std::string_view nameSpace, std::string_view className) const {
-  const ClassDefinition* definition =
-      classes.hasNamespace(nameSpace) ? classes.find(nameSpace, className) : classes.find(className);
+  const ClassDefinition* definition = classes.find(nameSpace, className);
+  if (!definition && !classes.hasNamespace(nameSpace)) {
+    definition = classes.find(className);
+  }
   if (!definition) {
     throw StatusError(CMPI_RC_ERR_INVALID_CLASS, "unknown class \"" + std::string(className) + "\"");
   }

@@ -97,7 +97,7 @@ inline CMPIData entryAt(const NamedValues& values, CMPICount index, CMPIString**
   const auto& entry = values[index];
   const CMPIData data = toCmpi(entry.value, state);
   if (name) {
-    *name = make(Text{entry.name});
+    *name = makeCopy(entry.name);
   }
   return data;
 }

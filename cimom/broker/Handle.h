@@ -4,6 +4,7 @@
 #include <cmpift.h>
 
 #include <string>
+#include <string_view>
 #include <type_traits>
 #include <utility>
 
@@ -66,7 +67,7 @@ struct Handle final : Object, Abi<Model>::Type {
   explicit Handle(typename Held<Model>::Type contents, bool ownedElsewhere = false) : model(std::move(contents)) {
     inScope = ownedElsewhere;
     if constexpr (std::is_same_v<Model, Text>) {
-      this->hdl = const_cast<char*>(model.characters->data());
+      this->hdl = const_cast<char*>(model.characters);
     } else {
       this->hdl = this;
     }
@@ -150,6 +151,14 @@ typename Abi<Model>::Type* make(Shared<Model> model) {
     return scope->make<Handle<Model>>(std::move(model));
   }
   return new Handle<Model>(std::move(model));
+}
+
+// Makes a string of a copy of the text.
+inline CMPIString* makeCopy(std::string_view text) {
+  if (RequestScope* scope = RequestScope::current()) {
+    return scope->make<Handle<Text>>(Text(Text::Kept{scope->keep(text)}));
+  }
+  return new Handle<Text>(Text(std::string(text)));
 }
 
 }  // namespace Cimom

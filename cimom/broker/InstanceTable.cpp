@@ -34,7 +34,7 @@ CMPIData getPropertyAt(const CMPIInstance* instance, CMPICount index, CMPIString
     const PropertyDeclaration& property = model.definition().properties[index];
     const CMPIData data = dataOf(property, model[index]);
     if (name) {
-      *name = make(Text{property.name});
+      *name = makeCopy(property.name);
     }
     return data;
   });

@@ -15,11 +15,18 @@
 
 namespace Cimom {
 
+// Characters, of its own or shared with a value, or in memory that lives as long as the text does.
 struct Text {
-  explicit Text(std::string text) : characters(std::move(text)) {}
-  explicit Text(Shared<std::string> text) : characters(std::move(text)) {}
+  struct Kept {
+    const char* characters;
+  };
 
-  Shared<std::string> characters;
+  explicit Text(std::string text) : Text(Shared<std::string>(std::move(text))) {}
+  explicit Text(Shared<std::string> text) : characters(text->data()), owner(std::move(text)) {}
+  explicit Text(Kept kept) : characters(kept.characters) {}
+
+  const char* characters;
+  std::optional<Shared<std::string>> owner;
 };
 
 struct Context {

@@ -15,7 +15,7 @@ CMPIStatus setText(CMPIObjectPath* path, const char* text) {
 template <Member member>
 CMPIString* getText(const CMPIObjectPath* path, CMPIStatus* status) {
   return guarded(status, static_cast<CMPIString*>(nullptr),
-                 [&] { return make(Text{modelOf<ObjectPath>(path).*member}); });
+                 [&] { return makeCopy(modelOf<ObjectPath>(path).*member); });
 }
 
 CMPIStatus addKey(CMPIObjectPath* path, const char* name, const CMPIValue* value, const CMPIType type) {

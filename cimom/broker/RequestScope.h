@@ -7,6 +7,7 @@
 #include <memory_resource>
 #include <new>
 #include <optional>
+#include <string_view>
 #include <utility>
 
 namespace Cimom {
@@ -56,6 +57,13 @@ class RequestScope {
     object->inScope = true;
     object->before = std::exchange(last_, object);
     return object;
+  }
+
+  // Copies a text into the scope's memory and ends it with a null.
+  const char* keep(std::string_view text) {
+    auto* kept = static_cast<char*>(memory_.allocate(text.size() + 1, 1));
+    kept[text.copy(kept, text.size())] = '\0';
+    return kept;
   }
 
   // Opens a scope on this thread that a later call of `close`, or the end of an outer scope, ends.

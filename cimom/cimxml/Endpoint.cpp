@@ -40,7 +40,7 @@ Http::Response refusedMethod(const std::string& method) {
 
 // CIM/MESSAGE/SIMPLERSP and the response in it, whose content the function writes.
 template <typename Content>
-std::string responseMessage(const Request& request, Content content) {
+std::vector<std::string> responseMessage(const Request& request, Content content) {
   XmlWriter xml;
   {
     const auto root = xml.element("CIM", "CIMVERSION", "2.0");
@@ -52,10 +52,10 @@ std::string responseMessage(const Request& request, Content content) {
         xml.element(request.isIntrinsic ? "IMETHODRESPONSE" : "METHODRESPONSE", "NAME", request.method);
     content(xml);
   }
-  return xml.take();
+  return xml.takePieces();
 }
 
-std::string errorMessage(const Request& request, int code, const char* description) {
+std::vector<std::string> errorMessage(const Request& request, int code, const char* description) {
   return responseMessage(request, [&](XmlWriter& xml) {
     const auto error = xml.element("ERROR", "CODE", std::to_string(code));
     xml.attribute("DESCRIPTION", shortened(description));
@@ -105,7 +105,9 @@ Http::Response Endpoint::handle(const Http::Request& request, const Answering& a
     headers.requireMatch(message);
     Http::Response response;
     Answer answered = answer(message);
-    response.body = std::move(answered.body);
+    response.body = std::move(answered.body.front());
+    answered.body.erase(answered.body.begin());
+    response.more = std::move(answered.body);
     response.subject = subjectOf(message) + " " + std::to_string(answered.status);
     response.headers.add("Content-Type", "application/xml; charset=\"utf-8\"");
     headers.addTo(response.headers);

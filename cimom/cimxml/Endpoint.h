@@ -6,6 +6,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "cimom/cimxml/OpenEnumerations.h"
 #include "cimom/cimxml/Request.h"
@@ -28,9 +29,9 @@ class Endpoint {
   Http::Response fail(const Http::Request& request, const std::string& why) const;
 
  private:
-  // The body of a response, and its CIM status.
+  // The body of a response, in pieces, and its CIM status.
   struct Answer {
-    std::string body;
+    std::vector<std::string> body;
     int status;
   };
   using Answering = std::function<Answer(const Request& request)>;

@@ -53,9 +53,48 @@ void ObjectWriter::instance(const Cimom::Instance& object) { instance(object, *o
 void ObjectWriter::instance(const Cimom::Instance& object, const ObjectPath& path) {
   const auto scope = xml_.element("INSTANCE", "CLASSNAME", path.className);
   const auto& properties = object.definition().properties;
+  if (class_ != &object.definition()) {
+    class_ = &object.definition();
+    frames_.clear();
+    for (std::size_t index = 0; index < properties.size(); ++index) {
+      if (filter_.includes(properties[index].name)) {
+        property(properties[index], object[index]);
+      }
+    }
+    return;
+  }
+  if (frames_.empty()) {
+    learn(object.definition());
+  }
+  for (const Frame& frame : frames_) {
+    const Cimom::Value& given = object[frame.index];
+    const std::string_view empty = frame.empty;
+    if (given.isNull()) {
+      xml_.written(empty);
+    } else if (given.type() != frame.type) {
+      property(properties[frame.index], given);
+    } else {
+      xml_.written(empty.substr(0, frame.middle));
+      value(given);
+      xml_.written(empty.substr(frame.middle));
+    }
+  }
+}
+
+// Nearly all that is written of a property is the same for each instance.
+void ObjectWriter::learn(const ClassDefinition& definition) {
+  XmlWriter xml(XmlWriter::Prolog::None);
+  ObjectWriter writer(xml, host_, nameSpace_);
+  const auto& properties = definition.properties;
+  frames_.reserve(properties.size());
   for (std::size_t index = 0; index < properties.size(); ++index) {
-    if (filter_.includes(properties[index].name)) {
-      property(properties[index], object[index]);
+    if (!filter_.includes(properties[index].name)) {
+      continue;
+    }
+    writer.property(properties[index], Cimom::Value());
+    std::string empty = xml.take();
+    if (const std::size_t middle = empty.rfind('<'); middle != std::string::npos) {
+      frames_.push_back({index, properties[index].valueType(), std::move(empty), middle});
     }
   }
 }
@@ -118,8 +157,9 @@ void ObjectWriter::value(const Cimom::Value& value) {
   } else if (const ObjectPath* path = value.path()) {
     reference(*path);
   } else {
-    const auto scope = xml_.element("VALUE");
+    xml_.written("<VALUE>");
     text(value);
+    xml_.written("</VALUE>");
   }
 }
 

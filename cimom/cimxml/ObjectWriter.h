@@ -72,15 +72,26 @@ class ObjectWriter {
   void instance(const Cimom::Instance& instance, const ObjectPath& path);
   void embedding(CMPIType type, const Qualifiers& qualifiers);
   void property(const PropertyDeclaration& declaration, const Cimom::Value& value);
+  void learn(const ClassDefinition& definition);
   void reference(const ObjectPath& path);
   void withPath(const char* element, const Cimom::Instance& instance);
   void array(const Array& array);
   void text(const Cimom::Value& value);
 
+  // A property as all instances of a class show it that have a value of the declared type.
+  struct Frame {
+    std::size_t index;  // of the property in its class
+    CMPIType type;
+    std::string empty;   // what is written of it without a value
+    std::size_t middle;  // where the value goes in that
+  };
+
   XmlWriter& xml_;
   const std::string& host_;
   const std::string& nameSpace_;
   PropertyFilter filter_;
+  const ClassDefinition* class_ = nullptr;  // of the last instance
+  std::vector<Frame> frames_;               // of the class's properties, once there is a second instance of it
 };
 
 // LOCALNAMESPACEPATH of "root/cimv2".

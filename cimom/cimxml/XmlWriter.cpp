@@ -45,33 +45,38 @@ std::string_view reference(char character, bool inAttributeValue) {
   }
 }
 
-struct Copied {
-  std::string_view::iterator read;
-  char* written;
-};
-
-// Copies a text up to its first character that is not plain.
-Copied copyPlain(std::string_view text, char* to) {
-  const auto* from = text.begin();
-  while (from != text.end() && plainBytes[static_cast<unsigned char>(*from)]) {
-    *to++ = *from++;
+// A text up to its first character that is not plain.
+std::string_view plainBeginning(std::string_view text) {
+  const auto* end = text.begin();
+  while (end != text.end() && plainBytes[static_cast<unsigned char>(*end)]) {
+    ++end;
   }
-  return {from, to};
+  return {text.begin(), end};
 }
 
 }  // namespace
 
-std::string XmlWriter::take() {
+std::vector<std::string> XmlWriter::takePieces() {
+  pieces_.emplace_back();
   xml_.resize(std::exchange(size_, 0));
-  return std::exchange(xml_, {});
+  pieces_.back() = std::exchange(xml_, {});
+  return std::exchange(pieces_, {});
+}
+
+std::string XmlWriter::take() {
+  std::string document;
+  for (const std::string& piece : std::exchange(pieces_, {})) {
+    document += piece;
+  }
+  xml_.resize(std::exchange(size_, 0));
+  return document.empty() ? std::exchange(xml_, {}) : document += std::exchange(xml_, {});
 }
 
 void XmlWriter::escape(std::string_view text, Place place) {
   while (!text.empty()) {
-    char* const begin = room(text.size());
-    const auto [special, end] = copyPlain(text, begin);
-    size_ += static_cast<std::size_t>(end - begin);
-    text.remove_prefix(static_cast<std::size_t>(special - text.begin()));
+    const std::string_view plain = plainBeginning(text);
+    put(plain);
+    text.remove_prefix(plain.size());
     if (text.empty()) {
       return;
     }
@@ -86,6 +91,18 @@ void XmlWriter::escape(std::string_view text, Place place) {
   }
 }
 
-void XmlWriter::grow(std::size_t bytes) { xml_.resize(std::max(size_ + reserved_ + bytes, 2 * xml_.size())); }
+// The first piece grows as it is needed. What a piece has no room for begins the next one, and the room for the ends of
+// the open elements goes with it.
+void XmlWriter::grow(std::size_t bytes) {
+  constexpr std::size_t pieceSize = 16 << 10;
+  if (xml_.size() < pieceSize) {
+    xml_.resize(std::max(size_ + reserved_ + bytes, std::min(2 * xml_.size(), pieceSize)));
+    return;
+  }
+  std::string next(std::max(reserved_ + bytes, pieceSize), '\0');
+  pieces_.emplace_back();
+  xml_.resize(std::exchange(size_, 0));
+  pieces_.back() = std::exchange(xml_, std::move(next));
+}
 
 }  // namespace Cimom::CimXml

@@ -6,6 +6,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace Cimom::CimXml {
 
@@ -70,7 +71,9 @@ class XmlWriter {
     put(xml);
   }
 
-  // The document so far; complete when every scope has ended.
+  // The document so far; complete when every scope has ended. In pieces, of which there is one at least: a large one
+  // need not be moved while it grows.
+  std::vector<std::string> takePieces();
   std::string take();
 
  private:
@@ -122,8 +125,9 @@ class XmlWriter {
 
   void grow(std::size_t bytes);
 
+  std::vector<std::string> pieces_;  // those that are full
   std::string xml_;
-  std::size_t size_ = 0;      // of what is written; the rest is room
+  std::size_t size_ = 0;      // of what is written in it; the rest is room
   std::size_t reserved_ = 0;  // of the room, for the ends of the elements that are open
   bool inStartTag_ = false;
 };

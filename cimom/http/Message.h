@@ -5,6 +5,7 @@
 #include <strings.h>
 
 #include <chrono>
+#include <cstddef>
 #include <functional>
 #include <string>
 #include <string_view>
@@ -52,7 +53,17 @@ struct Response {
   unsigned status = 200;
   Headers headers;
   std::string body;
-  std::string subject = {};  // for the request log: what was asked, and how it ended
+  std::string subject = {};            // for the request log: what was asked, and how it ended
+  std::vector<std::string> more = {};  // what follows the body, if it is so large that it comes in pieces
+
+  // Of the body, with what follows it.
+  std::size_t size() const {
+    std::size_t bytes = body.size();
+    for (const std::string& piece : more) {
+      bytes += piece.size();
+    }
+    return bytes;
+  }
 };
 
 // Answers one request; called from several threads at once. An exception becomes a 500.

@@ -8,6 +8,7 @@
 #include <memory>
 #include <string>
 #include <utility>
+#include <vector>
 
 namespace Cimom::Http {
 namespace {
@@ -15,24 +16,51 @@ namespace {
 constexpr std::size_t chunkedFrom = 64 << 10;
 constexpr std::size_t replyBlockSize = 16 << 10;
 
-void freeBody(void* body) { delete static_cast<std::string*>(body); }
+// A body that comes in pieces, and how far it has been read.
+struct Reading {
+  std::vector<std::string> pieces;
+  std::size_t piece = 0;
+  std::size_t position = 0;  // in the piece
+};
 
-ssize_t readBody(void* handle, std::uint64_t position, char* buffer, std::size_t size) {
-  const auto& body = *static_cast<const std::string*>(handle);
-  if (position >= body.size()) {
-    return MHD_CONTENT_READER_END_OF_STREAM;
+void freeReading(void* reading) { delete static_cast<Reading*>(reading); }
+
+// The HTTP library reads a body once, from its beginning to its end. What it has read is freed.
+ssize_t readPieces(void* handle, std::uint64_t, char* buffer, std::size_t size) {
+  auto& [pieces, piece, position] = *static_cast<Reading*>(handle);
+  std::size_t filled = 0;
+  while (filled < size && piece < pieces.size()) {
+    const std::size_t count = pieces[piece].copy(buffer + filled, size - filled, position);
+    filled += count;
+    position += count;
+    if (position == pieces[piece].size()) {
+      std::string().swap(pieces[piece++]);
+      position = 0;
+    }
   }
-  const std::size_t count = std::min(size, body.size() - static_cast<std::size_t>(position));
-  body.copy(buffer, count, static_cast<std::size_t>(position));
-  return static_cast<ssize_t>(count);
+  return filled > 0 ? static_cast<ssize_t>(filled) : MHD_CONTENT_READER_END_OF_STREAM;
 }
 
-MHD_Response* makeMessage(std::string text, bool isHttp11) {
-  auto body = std::make_unique<std::string>(std::move(text));
+void freeBody(void* body) { delete static_cast<std::string*>(body); }
+
+MHD_Response* makeChunked(Response& response) {
+  auto reading = std::make_unique<Reading>(Reading{std::move(response.more)});
+  reading->pieces.insert(reading->pieces.begin(), std::move(response.body));
   MHD_Response* message =
-      isHttp11 && body->size() >= chunkedFrom
-          ? MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, replyBlockSize, &readBody, body.get(), &freeBody)
-          : MHD_create_response_from_buffer_with_free_callback_cls(body->size(), body->data(), &freeBody, body.get());
+      MHD_create_response_from_callback(MHD_SIZE_UNKNOWN, replyBlockSize, &readPieces, reading.get(), &freeReading);
+  if (message) {
+    static_cast<void>(reading.release());
+  }
+  return message;
+}
+
+MHD_Response* makeWhole(Response& response) {
+  auto body = std::make_unique<std::string>(std::move(response.body));
+  for (std::string& piece : response.more) {
+    body->append(std::exchange(piece, {}));
+  }
+  MHD_Response* message =
+      MHD_create_response_from_buffer_with_free_callback_cls(body->size(), body->data(), &freeBody, body.get());
   if (message) {
     static_cast<void>(body.release());
   }
@@ -56,7 +84,7 @@ Response overload(const std::string& reason) {
 
 MHD_Result send(MHD_Connection* connection, Response response, bool isHttp11) {
   const std::unique_ptr<MHD_Response, decltype(&MHD_destroy_response)> message(
-      makeMessage(std::move(response.body), isHttp11), &MHD_destroy_response);
+      isHttp11 && response.size() >= chunkedFrom ? makeChunked(response) : makeWhole(response), &MHD_destroy_response);
   if (!message) {
     return MHD_NO;
   }

@@ -467,7 +467,7 @@ struct Server::State {
     exchange.phase = Exchange::Phase::Replied;
     exchange.status = response.status;
     exchange.subject = std::move(response.subject);
-    const auto bytes = static_cast<std::chrono::seconds::rep>(response.body.size() / leastBytesPerSecond);
+    const auto bytes = static_cast<std::chrono::seconds::rep>(response.size() / leastBytesPerSecond);
     connections.limit(record, options.requestTimeout + std::chrono::seconds(bytes));
     return send(connection, std::move(response), exchange.isHttp11);
   }
@@ -574,7 +574,7 @@ struct Server::State {
 
     ~Answering() {
       state.timers.cancel(exchange->timeLimit);
-      state.trimAfter(std::max(exchange->request.body.size(), response ? response->body.size() : 0));
+      state.trimAfter(std::max(exchange->request.body.size(), response ? response->size() : 0));
       if (response) {
         exchange->endHandling();
         state.suspensions.resume(exchange, std::move(response));

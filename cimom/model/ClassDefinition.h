@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "cimom/model/NamedList.h"
+#include "cimom/model/Shared.h"
 #include "cimom/model/Value.h"
 
 namespace Cimom {
@@ -71,7 +72,8 @@ struct ClassDefinition {
   const ClassDefinition* superclass = nullptr;
   Qualifiers qualifiers;
   NamedList<PropertyDeclaration> properties;
-  std::vector<std::size_t> keys;  // the indexes of those properties that are keys
+  std::vector<std::size_t> keys;                               // the indexes of those properties that are keys
+  Shared<NamedValues::Names> keyNames = NamedValues::Names();  // and their names, for the paths of the instances
   NamedList<MethodDeclaration> methods;
   std::string declaredAt;  // "FILE:LINE"
 

@@ -46,6 +46,16 @@ void Instance::setFilter(const std::vector<std::string>& properties) {
 }
 
 Shared<ObjectPath> Instance::path() const {
+  if (path_->keys.empty()) {
+    std::vector<Value> values;
+    values.reserve(definition_->keys.size());
+    for (const std::size_t index : definition_->keys) {
+      values.push_back((*this)[index]);
+    }
+    if (!values.empty() && std::ranges::none_of(values, &Value::isNull)) {
+      return ObjectPath{path_->host, path_->nameSpace, path_->className, {definition_->keyNames, std::move(values)}};
+    }
+  }
   Shared<ObjectPath> complete = path_;
   for (const std::size_t index : definition_->keys) {
     const std::string& name = definition_->properties[index].name;

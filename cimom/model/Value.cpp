@@ -166,19 +166,30 @@ std::string Value::toString() const {
 }
 
 const Value* NamedValues::find(std::string_view name) const {
-  const Entry* entry = findNamed(entries_, name);
-  return entry ? &entry->value : nullptr;
+  for (std::size_t index = 0; index < values_.size(); ++index) {
+    if (sameName(names()[index], name)) {
+      return &values_[index];
+    }
+  }
+  return nullptr;
 }
 
 void NamedValues::set(std::string_view name, Value value) {
-  if (Entry* entry = findNamed(entries_, name)) {
-    entry->value = std::move(value);
-  } else {
-    if (entries_.empty()) {
-      entries_.reserve(4);  // most paths have no more keys
-    }
-    entries_.push_back({std::string(name), std::move(value)});
+  if (const Value* present = find(name)) {
+    values_[static_cast<std::size_t>(present - values_.data())] = std::move(value);
+    return;
   }
+  constexpr std::size_t usual = 4;  // most paths have no more keys
+  if (values_.empty()) {
+    own_.reserve(usual);
+    values_.reserve(usual);
+  } else if (shared_) {
+    own_ = **shared_;
+  }
+  shared_.reset();
+  own_.resize(values_.size());  // there is one more if memory ran out for its value
+  own_.emplace_back(name);
+  values_.push_back(std::move(value));
 }
 
 }  // namespace Cimom

@@ -4,10 +4,13 @@
 
 #include <cmpidt.h>
 
+#include <cstddef>
+#include <iterator>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <type_traits>
+#include <utility>
 #include <variant>
 #include <vector>
 
@@ -118,22 +121,56 @@ struct Array {
 // context. Names are looked up without regard to case and keep the spelling that they were first given with.
 class NamedValues {
  public:
+  using Names = std::vector<std::string>;
+
   struct Entry {
-    std::string name;
-    Value value;
+    const std::string& name;
+    const Value& value;
   };
+
+  class Iterator {
+   public:
+    using value_type = Entry;
+    using reference = Entry;
+    using pointer = void;
+    using difference_type = std::ptrdiff_t;
+    using iterator_category = std::input_iterator_tag;
+
+    Iterator() = default;
+    Iterator(const NamedValues& values, std::size_t index) : values_(&values), index_(index) {}
+
+    Entry operator*() const { return (*values_)[index_]; }
+    Iterator& operator++() {
+      ++index_;
+      return *this;
+    }
+    Iterator operator++(int) { return {*values_, index_++}; }
+    bool operator==(const Iterator&) const = default;
+
+   private:
+    const NamedValues* values_ = nullptr;
+    std::size_t index_ = 0;
+  };
+
+  NamedValues() = default;
+  // One value for each of the names, which are shared with others that have the same: paths of one class.
+  NamedValues(Shared<Names> names, std::vector<Value> values) : shared_(std::move(names)), values_(std::move(values)) {}
 
   const Value* find(std::string_view name) const;
   void set(std::string_view name, Value value);
 
-  std::size_t size() const { return entries_.size(); }
-  bool empty() const { return entries_.empty(); }
-  const Entry& operator[](std::size_t index) const { return entries_[index]; }
-  auto begin() const { return entries_.begin(); }
-  auto end() const { return entries_.end(); }
+  std::size_t size() const { return values_.size(); }
+  bool empty() const { return values_.empty(); }
+  Entry operator[](std::size_t index) const { return {names()[index], values_[index]}; }
+  Iterator begin() const { return {*this, 0}; }
+  Iterator end() const { return {*this, size()}; }
 
  private:
-  std::vector<Entry> entries_;
+  const Names& names() const { return shared_ ? **shared_ : own_; }
+
+  Names own_;
+  std::optional<Shared<Names>> shared_;  // in their place
+  std::vector<Value> values_;
 };
 
 }  // namespace Cimom

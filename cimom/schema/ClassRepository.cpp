@@ -103,6 +103,7 @@ ClassDefinition resolve(const ClassDeclaration& declaration, const ClassDefiniti
   for (std::size_t index = 0; index < resolved.properties.size(); ++index) {
     if (resolved.properties[index].isKey()) {
       resolved.keys.push_back(index);
+      resolved.keyNames.own().push_back(resolved.properties[index].name);
     }
   }
   return resolved;

@@ -5,6 +5,7 @@
 
 #include <fstream>
 #include <iterator>
+#include <utility>
 
 #include "Paths.h"
 #include "cimom/cimxml/Document.h"
@@ -36,7 +37,11 @@ Http::Request EndpointTest::request(const std::string& method, const std::string
 }
 
 Http::Response EndpointTest::post(const std::string& method, const std::string& body) const {
-  return endpoint_.handle(request(method, body));
+  Http::Response response = endpoint_.handle(request(method, body));
+  for (const std::string& piece : std::exchange(response.more, {})) {
+    response.body += piece;
+  }
+  return response;
 }
 
 std::string EndpointTest::contentOf(const Http::Response& response, const std::string& method) {

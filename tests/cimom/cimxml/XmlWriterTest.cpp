@@ -47,6 +47,40 @@ TEST(XmlWriterTest, TakesWhatAnotherWriterWrote) {
   EXPECT_EQ(xml.take(), "<A><B>&lt;</B></A>");
 }
 
+TEST(XmlWriterTest, KeepsALargeDocumentInPieces) {
+  const auto write = [](XmlWriter& xml) {
+    const auto outer = xml.element("A");
+    for (std::size_t size = 0; size < 600; ++size) {
+      xml.textElement("B", std::string(size, 'x'));
+    }
+    xml.textElement("C", std::string(200'000, '<'));
+  };
+  std::string expected = "<A>";
+  for (std::size_t size = 0; size < 600; ++size) {
+    expected += "<B>" + std::string(size, 'x') + "</B>";
+  }
+  expected += "<C>";
+  for (int count = 0; count < 200'000; ++count) {
+    expected += "&lt;";
+  }
+  expected += "</C></A>";
+
+  XmlWriter whole(XmlWriter::Prolog::None);
+  write(whole);
+  EXPECT_EQ(whole.take(), expected);
+
+  XmlWriter parted(XmlWriter::Prolog::None);
+  write(parted);
+  std::string joined;
+  const auto pieces = parted.takePieces();
+  EXPECT_GT(pieces.size(), 4u);
+  for (const std::string& piece : pieces) {
+    joined += piece;
+  }
+  EXPECT_EQ(joined, expected);
+  EXPECT_EQ(parted.take(), "");
+}
+
 TEST(XmlWriterTest, StaysWellFormedWhateverTheText) {
   for (int byte = 0; byte < 256; ++byte) {
     const std::string text = std::string("a") + static_cast<char>(byte) + "b";

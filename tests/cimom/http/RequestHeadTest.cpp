@@ -114,4 +114,23 @@ TEST_F(RequestHeadTest, IsAnsweredInChunksWhereTheReplyIsLarge) {
   EXPECT_EQ(*old.headers.find("Content-Length"), std::to_string(1 << 20));
 }
 
+TEST_F(RequestHeadTest, IsAnsweredWithTheWholeOfAReplyInPieces) {
+  const std::vector<std::string> pieces = {std::string(70'000, 'b'), "", "c", std::string(100'000, 'd')};
+  const Server server({}, [&](const Request& request) {
+    return request.path == "/large" ? Response{200, {}, "a", {}, pieces} : Response{200, {}, "a", {}, {"b", "c"}};
+  });
+  const std::string whole = "a" + pieces[0] + pieces[1] + pieces[2] + pieces[3];
+  HttpClient client(server.port());
+  const Response large = client.post("/large", "");
+  EXPECT_EQ(*large.headers.find("Transfer-Encoding"), "chunked");
+  EXPECT_EQ(large.body, whole);
+  const Response small = client.post("/", "");
+  EXPECT_EQ(*small.headers.find("Content-Length"), "3");
+  EXPECT_EQ(small.body, "abc");
+  client.send("POST /large HTTP/1.0\r\nContent-Length: 0\r\n\r\n");
+  const Response old = client.receive();
+  EXPECT_EQ(*old.headers.find("Content-Length"), std::to_string(whole.size()));
+  EXPECT_EQ(old.body, whole);
+}
+
 }  // namespace

@@ -80,6 +80,30 @@ TEST(ValueTest, IsThatOfAnUntypedUri) {
   EXPECT_EQ(Value::arguments({}).toString(), "(arguments)");
 }
 
+TEST(NamedValuesTest, ShareTheirNamesUntilOneIsAdded) {
+  const Shared<NamedValues::Names> names = NamedValues::Names{"Name", "System"};
+  NamedValues shared(names, {Value::string("a"), Value::string("b")});
+  const NamedValues before = shared;
+  EXPECT_EQ(&before[0].name, &names->front());
+
+  shared.set("name", Value::string("c"));
+  EXPECT_EQ(&shared[0].name, &names->front());
+  shared.set("Unit", Value::string("d"));
+
+  const auto textsOf = [](const NamedValues& values) {
+    std::string texts;
+    for (const auto& [name, value] : values) {
+      texts += name + '=' + *value.text() + ' ';
+    }
+    return texts;
+  };
+  EXPECT_EQ(textsOf(shared), "Name=c System=b Unit=d ");
+  EXPECT_EQ(textsOf(before), "Name=a System=b ");
+  EXPECT_EQ(names->size(), 2u);
+  EXPECT_EQ(*shared.find("UNIT")->text(), "d");
+  EXPECT_EQ(before.find("Unit"), nullptr);
+}
+
 TEST(ValueTest, OfReferencesWithinReferencesStaysShort) {
   ObjectPath path{"", "root/test", "C", {}};
   path.keys.set("K", Value::string(std::string(100, '"')));
