@@ -21,7 +21,7 @@ bool AddressChanger::isAnothers(const AddressSettings& present, const Plan& plan
          present.address != plan.wanted.address;
 }
 
-AddressChanger::Plan AddressChanger::plan(const AddressChange& change) const {
+AddressChanger::Plan AddressChanger::planFor(const AddressChange& change) const {
   const AddressSettings earlier = readAddressSettings(transport_, channel_);
   if (earlier == AddressSettings{}) {
     throw noLanChannel(channel_);
@@ -36,14 +36,14 @@ void AddressChanger::apply(const AddressChange& change) {
   try {
     // What is left as it is must not be what another client has half written: it is looked at with the lock.
     ParameterTransaction transaction(transport_, channel_, held_, patience_);
-    plan = this->plan(change);
+    plan = planFor(change);
     if (!plan.writes.empty()) {
       begun_ = true;
       onBegin_();
       transaction.write(plan.writes);
     }
   } catch (const LockedByAnother&) {
-    plan = this->plan(change);
+    plan = planFor(change);
     if (!plan.writes.empty()) {
       throw;
     }

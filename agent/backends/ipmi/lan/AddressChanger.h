@@ -38,7 +38,7 @@ class AddressChanger {
 
   static bool isAnothers(const AddressSettings& present, const Plan& plan);
 
-  Plan plan(const AddressChange& change) const;
+  Plan planFor(const AddressChange& change) const;
   AddressSettings readBack(const Plan& plan, const std::string& loss);
   std::string putBack(const Plan& plan);
 
