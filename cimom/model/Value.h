@@ -5,7 +5,6 @@
 #include <cmpidt.h>
 
 #include <cstddef>
-#include <iterator>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -131,10 +130,7 @@ class NamedValues {
   class Iterator {
    public:
     using value_type = Entry;
-    using reference = Entry;
-    using pointer = void;
     using difference_type = std::ptrdiff_t;
-    using iterator_category = std::input_iterator_tag;
 
     Iterator() = default;
     Iterator(const NamedValues& values, std::size_t index) : values_(&values), index_(index) {}
