@@ -25,8 +25,8 @@ class AddressChanger {
       : transport_(transport), channel_(channel), held_(held), onBegin_(std::move(onBegin)), patience_(patience) {}
 
   // Returns once the processor shows the change, which is at once where it has the values already, whoever holds the
-  // lock. Throws IpmiError
-  // that says whether nothing was changed, the earlier values were put back, or the outcome is unknown.
+  // lock. Throws IpmiError that says whether nothing was changed, the earlier values were put back, or the outcome is
+  // unknown.
   void apply(const AddressChange& change);
 
  private:

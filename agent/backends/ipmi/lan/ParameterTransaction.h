@@ -34,8 +34,8 @@ class LockedByAnother : public IpmiError {
 // written to all the same.
 class ParameterTransaction {
  public:
-  // Throws LockedByAnother, or IpmiError if the lock cannot be taken; nothing has been written then. Where an
-  // answer that came late leaves open whose the lock is, it is ours if it does not go within `patience`.
+  // Throws LockedByAnother, or IpmiError if the lock cannot be taken; nothing has been written then. Where an answer
+  // that came late leaves open whose the lock is, it is ours if it does not go within `patience`.
   ParameterTransaction(IpmiTransport& transport, std::uint8_t channel, HeldLocks& held,
                        std::chrono::milliseconds patience);
   ~ParameterTransaction();
