@@ -577,6 +577,7 @@ struct Server::State {
       state.trimAfter(std::max(exchange->request.body.size(), response ? response->size() : 0));
       if (response) {
         exchange->endHandling();
+        state.workers.freePlace();
         state.suspensions.resume(exchange, std::move(response));
       } else {
         // The provider has ended the thread, which another replaces.

@@ -72,6 +72,14 @@ void Workers::giveUp(Token token) {
   }
 }
 
+void Workers::freePlace() {
+  const std::lock_guard lock(mutex_);
+  Thread& self = *current();
+  if (!self.givenUp && !std::exchange(self.freed, true)) {
+    ++idle_;
+  }
+}
+
 bool Workers::mayStart() const {
   const auto running =
       static_cast<std::size_t>(std::ranges::count_if(threads_, [](const Thread& thread) { return !thread.ended; }));
@@ -120,7 +128,9 @@ void Workers::work(Thread& self) {
     if (self.givenUp) {
       break;
     }
-    ++idle_;
+    if (!std::exchange(self.freed, false)) {
+      ++idle_;
+    }
   }
   // A thread that waits no longer is idle no longer.
   if (!self.givenUp) {

@@ -35,6 +35,7 @@ class Workers {
     std::thread thread;
     bool ended = false;
     bool givenUp = false;
+    bool freed = false;
   };
 
  public:
@@ -45,6 +46,10 @@ class Workers {
   // No longer waits for the job that this thread carries out: another thread may be started in its place. The job must
   // not have ended.
   void giveUp(Token token);
+
+  // The job that runs in this thread has only its last, short steps to do: another may be begun behind it. Whom these
+  // steps tell that it is done finds its place free.
+  void freePlace();
 
  private:
   struct Leaving;
