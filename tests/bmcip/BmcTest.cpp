@@ -19,7 +19,7 @@ class BmcipBmcTest : public BmcipTest {
   BmcipBmcTest() {
     std::string processor = "[processor]\nbackend = ipmi\n[ipmi]\n";
     auto settings = bmc_.settings();
-    settings["operation_timeout"] = "2";
+    settings["operation_timeout"] = "5";
     for (const auto& [key, value] : settings) {
       processor += key + " = " + value + '\n';
     }

@@ -35,7 +35,7 @@ TEST_F(DemonstrationTest, StopsAtOnceAndSaysSo) {
   const auto begin = std::chrono::steady_clock::now();
   process.signalGroup(SIGINT);
   EXPECT_EQ(process.wait(), 130);
-  EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::milliseconds(3500));
+  EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(15));
   EXPECT_THAT(process.errors(), HasSubstr("demonstrate: stopping\n"));
   expectNothingLeft();
 }

@@ -248,7 +248,7 @@ TEST_F(LoadTest, TwoManagersAndEightClientsShareAStateFile) {
 #ifdef SIMULATED_BMC
 TEST_F(LoadTest, TwoManagersAndEightClientsShareABmc) {
   const SimulatedBmc bmc;
-  std::string section = "[processor]\nbackend = ipmi\n[ipmi]\noperation_timeout = 20\n";
+  std::string section = "[processor]\nbackend = ipmi\n[ipmi]\n";
   for (const auto& [key, value] : bmc.settings()) {
     section += key + " = " + value + '\n';
   }

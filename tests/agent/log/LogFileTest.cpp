@@ -49,7 +49,7 @@ TEST(LogFileTest, FollowsARotationThatRenamesIt) {
     ++appended;
     return std::filesystem::exists(directory / "log");
   }));
-  EXPECT_LT(std::chrono::steady_clock::now() - start, LogFile::lookInterval + std::chrono::seconds(1));
+  EXPECT_LT(std::chrono::steady_clock::now() - start, LogFile::lookInterval + std::chrono::seconds(10));
 
   const std::string lines = readFile(directory / "log.1") + readFile(directory / "log");
   EXPECT_EQ(std::ranges::count(lines, '\n'), appended) << "no line is lost";

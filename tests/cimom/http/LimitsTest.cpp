@@ -128,8 +128,8 @@ TEST_F(LimitsTest, CutsAClientThatSendsItsRequestTooSlowly) {
 }
 
 TEST_F(LimitsTest, CutsAClientWhoseSecondRequestIsTooSlow) {
-  options_.requestTimeout = 1s;
-  options_.idleTimeout = 1s;
+  options_.requestTimeout = 3s;
+  options_.idleTimeout = 3s;
   start();
   HttpClient client(server_->port());
   EXPECT_EQ(client.post("/", "").status, 200u);
@@ -169,7 +169,7 @@ TEST_F(LimitsTest, RefusesRequestsBeyondThoseThatItAnswersAtOnce) {
 }
 
 TEST_F(LimitsTest, AnswersInThePlaceOfAHandlerThatDoesNot) {
-  options_.operationTimeout = 1s;
+  options_.operationTimeout = 3s;
   options_.maxRequests = 1;
   std::string asked;
   options_.failureHandler = [&](const Request& request, const std::string& why) {
@@ -179,7 +179,7 @@ TEST_F(LimitsTest, AnswersInThePlaceOfAHandlerThatDoesNot) {
   start(gate_.handler());
   HttpClient client(server_->port());
   const Response late = client.post("/slow", "body");
-  EXPECT_EQ(late.body, "the provider did not answer within 1 s");
+  EXPECT_EQ(late.body, "the provider did not answer within 3 s");
   EXPECT_EQ(asked, "body");
   // Another thread is in the place of the one that waits; one more such handler, and there is none.
   EXPECT_EQ(client.post("/", "").status, 200u);
@@ -192,7 +192,7 @@ TEST_F(LimitsTest, AnswersInThePlaceOfAHandlerThatDoesNot) {
 }
 
 TEST_F(LimitsTest, HoldsNoPlaceForAClientThatHasGone) {
-  options_.operationTimeout = 1s;
+  options_.operationTimeout = 3s;
   options_.maxRequests = 1;
   start(gate_.handler());
   {

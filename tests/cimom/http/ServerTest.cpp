@@ -167,12 +167,14 @@ TEST(ServerTest, RepliesWithoutWaitingForAnAcknowledgement) {
   Server server({}, [](const Request&) { return Response{200, {}, std::string(20000, 'x')}; });
   HttpClient client(server.port());
   client.post("/", "");
-  const auto start = std::chrono::steady_clock::now();
+  // A delayed acknowledgement costs 40 ms each time, a machine that stalls some of the times.
+  int prompt = 0;
   for (int i = 0; i < 20; ++i) {
+    const auto start = std::chrono::steady_clock::now();
     client.post("/", "body");
+    prompt += std::chrono::steady_clock::now() - start < 30ms ? 1 : 0;
   }
-  // A delayed acknowledgement costs 40 ms each time.
-  EXPECT_LT(std::chrono::steady_clock::now() - start, 400ms);
+  EXPECT_GE(prompt, 10);
 }
 
 TEST(ServerTest, WaitsForRequestsInProgressWhenShuttingDown) {

@@ -259,7 +259,7 @@ TEST_F(ProviderGuardTest, AThreadWaitsForTheFactoryOfAnother) {
 // What a manager logs while it cleans its one provider up.
 class CleanUpTest : public testing::Test {
  protected:
-  std::vector<std::string> cleanedUp(std::function<CMPIStatus()> cleanUp) {
+  std::vector<std::string> cleanedUp(std::function<CMPIStatus()> cleanUp, std::chrono::milliseconds limit = 60s) {
     std::vector<std::string> log;
     {
       ObjectManager manager;
@@ -267,7 +267,7 @@ class CleanUpTest : public testing::Test {
       manager.setLog([&](int, std::string_view component, std::string_view text) {
         log.push_back(std::string(component) + ": " + std::string(text));
       });
-      manager.setProviderLimit(50ms);
+      manager.setProviderLimit(limit);
       probe->cleanUp = std::move(cleanUp);
       probe->serve(manager, "TST_Processor", testNamespace);
       RequestScope scope(manager.broker());
@@ -309,18 +309,20 @@ TEST_F(CleanUpTest, NobodyWaitsLongForWhatHangsAndItMayStillUseTheBroker) {
   go = false;
   later = CMPI_RC_ERROR;
   const auto started = std::chrono::steady_clock::now();
-  EXPECT_THAT(cleanedUp([probe = probe.get()] {
-                while (!go) {
-                  std::this_thread::sleep_for(1ms);
-                }
-                CMPIStatus outcome = ok;
-                CMNewObjectPath(probe->broker, testNamespace, "TST_Processor", &outcome);
-                later = outcome.rc;
-                return ok;
-              }),
+  EXPECT_THAT(cleanedUp(
+                  [probe = probe.get()] {
+                    while (!go) {
+                      std::this_thread::sleep_for(1ms);
+                    }
+                    CMPIStatus outcome = ok;
+                    CMNewObjectPath(probe->broker, testNamespace, "TST_Processor", &outcome);
+                    later = outcome.rc;
+                    return ok;
+                  },
+                  50ms),
               ElementsAre("cimomd: the clean-up of provider TST_Processor has not ended after 50 ms; its library stays "
                           "loaded"));
-  EXPECT_LT(std::chrono::steady_clock::now() - started, 5s);
+  EXPECT_LT(std::chrono::steady_clock::now() - started, 30s);
   go = true;
   while (later == CMPI_RC_ERROR) {
     std::this_thread::sleep_for(1ms);

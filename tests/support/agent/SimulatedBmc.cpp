@@ -60,15 +60,11 @@ void SimulatedBmc::start() {
 }
 
 QV::BackEndSettings SimulatedBmc::settings(std::uint16_t port) const {
-  return {{"connection", "lan"},
-          {"host", "127.0.0.1"},
-          {"port", std::to_string(port != 0 ? port : port_)},
-          {"user", "admin"},
-          {"password_file", directory_ / "password"},
-          {"cipher_suite", "3"},
-          {"workarounds", "opensesspriv"},
-          {"cache", "0"},
-          {"generation_file", generationFile()}};
+  return {{"connection", "lan"}, {"operation_timeout", "30"},
+          {"host", "127.0.0.1"}, {"port", std::to_string(port != 0 ? port : port_)},
+          {"user", "admin"},     {"password_file", directory_ / "password"},
+          {"cipher_suite", "3"}, {"workarounds", "opensesspriv"},
+          {"cache", "0"},        {"generation_file", generationFile()}};
 }
 
 QV::BackEndSettings SimulatedBmc::patientSettings(std::uint16_t port) const {

@@ -25,7 +25,8 @@ class SimulatedBmc {
   // applies at once: then all is zero.
   std::uint16_t port() const { return port_; }
 
-  // A section of agent.ini that reaches it through the given port of this machine; 0 means its own. Nothing is cached.
+  // A section of agent.ini that reaches it through the given port of this machine; 0 means its own. Nothing is cached,
+  // and an operation has the time that it takes on a machine that stalls.
   QV::BackEndSettings settings(std::uint16_t port = 0) const;
 
   // The same with times that no busy machine takes: whoever counts what is sent must neither repeat a request nor give

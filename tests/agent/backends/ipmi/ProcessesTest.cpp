@@ -65,16 +65,16 @@ TEST_F(IpmiProcessesTest, AskTheBmcNoMoreThanOneDoesWhereNothingChanges) {
 // try when it ends.
 TEST_F(IpmiProcessesTest, GiveALockBackWhenTheyEndOrSayThatTheyCouldNot) {
   auto impatient = bmc.settings();
-  impatient["operation_timeout"] = "1";
+  impatient["operation_timeout"] = "3";
   impatient["session_timeout"] = "0.6";
   for (const bool recovers : {true, false}) {
     Process stalled(agentBehind(impatient, "stalled.ini"));
     bmc.hook("set", "kill -STOP $SIMULATOR");
     EXPECT_THAT(ask(stalled, recovers ? "change 192.0.2.77 255.255.255.128" : "change 192.0.2.78 255.255.255.0"),
-                testing::HasSubstr("outcome is unknown"));
+                testing::HasSubstr("unknown"));
     bmc.removeHook("set");
     const auto says = [&](const char* text) {
-      return poll([&] { return stalled.errors().find(text) != std::string::npos; }, std::chrono::seconds(10));
+      return poll([&] { return stalled.errors().find(text) != std::string::npos; });
     };
     EXPECT_TRUE(says("may stay set"));
 

@@ -272,7 +272,9 @@ class Bench {
     }
     if (!backEnd_) {
       auto settings = bmc_.settings(wire_.port());
-      settings.insert(timeouts.begin(), timeouts.end());
+      for (const auto& [key, value] : timeouts) {
+        settings[key] = value;
+      }
       backEnd_ = std::make_unique<IpmiBackEnd>(QV::Ipmi::parseSettings(settings));
     }
     if (held_) {
