@@ -14,7 +14,7 @@ endif()
 add_compile_definitions(_FILE_OFFSET_BITS=64)
 
 # What most sources of the product include is read by the compiler once, where several sources are compiled at a time
-# anyway: the packages compile each alone, and so prove that it includes what it uses.
+# anyway: the preset `coverage` compiles each alone, and so proves that it includes what it uses.
 # For all libraries that there are yet.
 function(read_standard_headers_once)
   if(NOT CMAKE_UNITY_BUILD)
@@ -45,7 +45,7 @@ function(use_standard_headers directory)
   endforeach()
 endfunction()
 
-# The presets compile several sources at a time (CMAKE_UNITY_BUILD), the packages each alone. These cannot share a
+# The presets compile several sources at a time (CMAKE_UNITY_BUILD), `coverage` each alone. These cannot share a
 # compilation with others of their target: they name something as another does, or a class of a header has a member of a
 # type that only they know.
 function(compile_alone)
