@@ -104,7 +104,8 @@ std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
 // A processor shows what another client writes, one value after the other or all at once, and that may come between two
 // round trips of a look. An address and mask that were not known to belong together do if they stay, nobody is at work
 // on them, and no process of this machine has been: two changes in a row may write an address that was there before.
-// Who has left a lock behind, and with it values that stay, is waited for once, and not for long.
+// Who has left a lock behind, and with it values that stay, is waited for once, and not for long. Where they never stay
+// the caller hears so while it still listens.
 NetworkInterface IpmiProcessor::look(Channel& channel) {
   struct Seen {
     AddressPair pair;
@@ -112,21 +113,24 @@ NetworkInterface IpmiProcessor::look(Channel& channel) {
     bool operator==(const Seen&) const = default;
   };
   std::optional<Seen> earlier;
+  const Deadline lastTry(settings_.operationTimeout * 9 / 10);
   Deadline abandoned(settings_.operationTimeout / 2);
-  for (;; std::this_thread::sleep_for(betweenTries)) {
-    const auto number = generation();
+  for (; !lastTry.passed(); std::this_thread::sleep_for(betweenTries)) {
+    Seen seen{{}, generation()};
     NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
-    const Seen seen{{interface.ipv4Address, interface.ipv4SubnetMask}, number};
+    seen.pair = {interface.ipv4Address, interface.ipv4SubnetMask};
     if (std::exchange(earlier, seen) != seen) {
       abandoned = Deadline(settings_.operationTimeout / 2);
     }
     if (channel.known == seen.pair ||
         ((abandoned.passed() || !isBeingSet(connection_, channel.number)) &&
-         readAddressPair(connection_, channel.number) == seen.pair && generation() == number)) {
+         readAddressPair(connection_, channel.number) == seen.pair && generation() == seen.generation)) {
       channel.known = seen.pair;
       return interface;
     }
   }
+  throw IpmiError("other clients of " + nameOf(settings_) + " change " + interfaceName(channel.number) +
+                  " again and again: no address and mask that belong together were seen within operation_timeout");
 }
 
 ManagementProcessor IpmiProcessor::read(Deadline deadline) {

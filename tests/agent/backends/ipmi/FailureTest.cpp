@@ -134,6 +134,19 @@ TEST(IpmiFailureTest, OfABmcThatDiesInMidChangeLeavesTheOutcomeOpen) {
   EXPECT_EQ(bmc.witness("IP Address"), "192.0.2.77");
 }
 
+TEST(IpmiFailureTest, OfABmcWhoseAddressNeverStaysIsSaidToBeThat) {
+  const SimulatedBmc bmc;
+  bmc.hook("get", R"sh([ "$1" = ip_addr ] || exit 0
+echo >> asked
+sed -i "s/^ip_addr=.*/ip_addr=198.51.100.$(($(wc -l < asked) % 250 + 1))/" lan.state)sh");
+  IpmiBackEnd backEnd(parseSettings(impatient(bmc.settings())));
+
+  EXPECT_THAT(inTime([&] { backEnd.read(); }), refusal("change lan1 again and again"));
+  bmc.removeHook("get");
+
+  EXPECT_TRUE(readsAgain(backEnd));
+}
+
 TEST(IpmiFailureTest, OfTheNetworkInMidChangeLeavesTheOutcomeOpenAndNoLockBehind) {
   const SimulatedBmc bmc;
   UdpRelay wire(bmc.port());

@@ -105,8 +105,7 @@ TEST(OperationThreadTest, ThatIsBlockedDoesNotHoldItsOwner) {
   const auto start = std::chrono::steady_clock::now();
   {
     OperationThread thread(never, [idle] { idle->set_value(); });
-    EXPECT_THROW(thread.run(Deadline(soon), [released = release->get_future().share()] { released.wait(); }),
-                 Overdue);
+    EXPECT_THROW(thread.run(Deadline(soon), [released = release->get_future().share()] { released.wait(); }), Overdue);
   }
   EXPECT_LT(std::chrono::steady_clock::now() - start, OperationThread::longestEnd + 20s);
   release->set_value();
