@@ -1,8 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/http/Exchange.h"
 
+#include <exception>
 #include <new>
 #include <utility>
+
+#include "cimom/http/Reply.h"
 
 namespace Cimom::Http {
 namespace {
@@ -104,7 +107,7 @@ bool Exchange::giveUpHandling(Workers& workers) {
   return true;
 }
 
-bool Suspensions::add(const std::shared_ptr<Exchange>& exchange, MHD_Connection* connection) {
+bool Suspensions::add(const ExchangePointer& exchange, MHD_Connection* connection) {
   const std::lock_guard lock(mutex_);
   if (ended_) {
     return false;
@@ -118,16 +121,24 @@ bool Suspensions::add(const std::shared_ptr<Exchange>& exchange, MHD_Connection*
   return true;
 }
 
-void Suspensions::resume(const std::shared_ptr<Exchange>& exchange, std::optional<Response> response) {
+void Suspensions::resume(const ExchangePointer& exchange, std::optional<Response> response) {
   const std::lock_guard lock(mutex_);
   suspended_.erase(exchange);
   exchange->resume(std::move(response));
 }
 
-void Suspensions::abandon(const std::shared_ptr<Exchange>& exchange) {
+void Suspensions::abandon(const ExchangePointer& exchange) {
   const std::lock_guard lock(mutex_);
   suspended_.erase(exchange);
   exchange->abandon();
+}
+
+void Suspensions::turnAway(const ExchangePointer& exchange, const char* reason) {
+  try {
+    resume(exchange, overload(reason));
+  } catch (const std::exception&) {
+    abandon(exchange);
+  }
 }
 
 void Suspensions::end() {

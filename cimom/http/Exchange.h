@@ -49,9 +49,10 @@ class Exchange {
   bool counted = false;  // among the replies that a drain waits for
   std::chrono::steady_clock::time_point begun = std::chrono::steady_clock::now();
   std::string group;     // of addresses, and
-  std::string password;  // while they are checked
-  unsigned status = 0;   // of the reply
-  std::string subject;   // of the request log
+  std::string password;  // while they are checked, which is
+  std::chrono::steady_clock::time_point notBefore;
+  unsigned status = 0;  // of the reply
+  std::string subject;  // of the request log
   Timers::Ticket timeLimit;
 
   // Takes a part of the body. Returns false for a client that goes on although its request is refused.
@@ -90,20 +91,24 @@ class Exchange {
   bool ended_ = false;
 };
 
+using ExchangePointer = std::shared_ptr<Exchange>;
+
 // The exchanges whose connections are suspended: the HTTP library must not be stopped while there is one.
 class Suspensions {
  public:
   // Suspends the connection of an exchange. Returns false if the server ends, or has no memory.
-  bool add(const std::shared_ptr<Exchange>& exchange, MHD_Connection* connection);
+  bool add(const ExchangePointer& exchange, MHD_Connection* connection);
   // Lets it go on, unless somebody has done so already: with a response, without one, or to its end.
-  void resume(const std::shared_ptr<Exchange>& exchange, std::optional<Response> response);
-  void abandon(const std::shared_ptr<Exchange>& exchange);
+  void resume(const ExchangePointer& exchange, std::optional<Response> response);
+  void abandon(const ExchangePointer& exchange);
+  // With the answer that there is no room for it now; to its end where there is no memory for that.
+  void turnAway(const ExchangePointer& exchange, const char* reason);
   // Lets all connections go on without an answer, and takes no more.
   void end();
 
  private:
   std::mutex mutex_;
-  std::set<std::shared_ptr<Exchange>> suspended_;
+  std::set<ExchangePointer> suspended_;
   bool ended_ = false;
 };
 

@@ -72,4 +72,7 @@ using Handler = std::function<Response(const Request&)>;
 // Answers in the place of a handler that has not, and perhaps still is at work on the same request: why.
 using FailureHandler = std::function<Response(const Request&, const std::string& why)>;
 
+// Whether the password is that user's; called from several threads at once.
+using Authenticator = std::function<bool(const std::string& user, const std::string& password)>;
+
 }  // namespace Cimom::Http

@@ -1,21 +1,16 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "cimom/http/Server.h"
 
-#include <cxxabi.h>
 #include <gnutls/gnutls.h>
-#include <malloc.h>
 #include <microhttpd.h>
 #include <sys/resource.h>
 #include <sys/socket.h>
 
 #include <algorithm>
-#include <atomic>
 #include <charconv>
-#include <condition_variable>
 #include <exception>
 #include <memory>
 #include <mutex>
-#include <new>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -23,29 +18,22 @@
 #include <vector>
 
 #include "cimom/http/Acceptor.h"
+#include "cimom/http/Authentication.h"
 #include "cimom/http/Certificate.h"
 #include "cimom/http/Connections.h"
+#include "cimom/http/Dispatcher.h"
 #include "cimom/http/Exchange.h"
-#include "cimom/http/LoginDelay.h"
+#include "cimom/http/HostNames.h"
+#include "cimom/http/InFlight.h"
 #include "cimom/http/Reply.h"
 #include "cimom/http/RequestHead.h"
 #include "cimom/http/Timers.h"
-#include "cimom/http/Workers.h"
-#include "ground/Printable.h"
 
 namespace Cimom::Http {
 namespace {
 
-constexpr const char* basicChallenge = "Basic realm=\"cimom\"";
-
-// Checking a password costs milliseconds on purpose.
-constexpr std::size_t loginThreads = 2;
-
 // A client that takes its reply more slowly holds it for too long.
 constexpr std::size_t leastBytesPerSecond = 64 << 10;
-
-// How long clients have to take their replies when the server ends.
-constexpr std::chrono::milliseconds farewell{1000};
 
 // libmicrohttpd 0.9.75 locks itself up when a connection that is handed to it exceeds its own limit (it returns with
 // its mutex held): the limits are those of Connections.
@@ -54,64 +42,8 @@ constexpr std::intptr_t beyondAllLimits = 1 << 30;
 // TLS 1.2 at least, and no key exchange whose traffic can be read later with the server's key.
 constexpr const char* priorities = "NORMAL:-VERS-ALL:+VERS-TLS1.3:+VERS-TLS1.2:-RSA:%SERVER_PRECEDENCE";
 
-// What a request of this size, or one with a reply of this size, has taken goes back to the system after a while: the
-// allocator keeps what it was in small blocks for the thread that it served. Once for all that come meanwhile.
-constexpr std::size_t largeBytes = 1 << 20;
-constexpr std::chrono::seconds untilTrim{1};
-
 // Descriptors for what is no connection: files, providers, their sessions.
 constexpr rlim_t otherDescriptors = 64;
-
-// Counts the handlers at work and the replies to be sent.
-class InFlight {
- public:
-  // False once the server drains.
-  bool enter() {
-    const std::lock_guard lock(mutex_);
-    if (draining_) {
-      return false;
-    }
-    ++handlers_;
-    ++replies_;
-    return true;
-  }
-
-  void handled() {
-    const std::lock_guard lock(mutex_);
-    --handlers_;
-    changed_.notify_all();
-  }
-
-  void replied() {
-    const std::lock_guard lock(mutex_);
-    --replies_;
-    changed_.notify_all();
-  }
-
-  bool isDraining() {
-    const std::lock_guard lock(mutex_);
-    return draining_;
-  }
-
-  bool drain(std::chrono::milliseconds grace) {
-    const auto deadline = std::chrono::steady_clock::now() + grace;
-    std::unique_lock lock(mutex_);
-    draining_ = true;
-    if (!changed_.wait_until(lock, deadline, [this] { return handlers_ == 0; })) {
-      return false;
-    }
-    changed_.wait_until(lock, std::min(deadline, std::chrono::steady_clock::now() + farewell),
-                        [this] { return replies_ == 0; });
-    return true;
-  }
-
- private:
-  std::mutex mutex_;
-  std::condition_variable changed_;
-  std::size_t handlers_ = 0;
-  std::size_t replies_ = 0;
-  bool draining_ = false;
-};
 
 MHD_Result collectHeader(void* headers, MHD_ValueKind, const char* name, const char* value) {
   try {
@@ -122,46 +54,13 @@ MHD_Result collectHeader(void* headers, MHD_ValueKind, const char* name, const c
   }
 }
 
-Response challenge() {
-  Response response{MHD_HTTP_UNAUTHORIZED, {}, "authentication is required\n"};
-  response.headers.add("Content-Type", "text/plain; charset=\"utf-8\"");
-  response.headers.add("WWW-Authenticate", basicChallenge);
-  return response;
-}
-
-// What the function answers, or why it does not. The end of the thread passes through.
-template <typename Answer>
-Response guarded(Answer answer) {
-  try {
-    try {
-      return answer();
-    } catch (const abi::__forced_unwind&) {
-      throw;
-    } catch (const std::bad_alloc&) {
-      return overload("the server is out of memory");
-    } catch (const std::exception& error) {
-      return refusal(MHD_HTTP_INTERNAL_SERVER_ERROR, error.what());
-    } catch (...) {
-      return refusal(MHD_HTTP_INTERNAL_SERVER_ERROR, "the request failed");
-    }
-  } catch (const std::bad_alloc&) {
-    return Response{MHD_HTTP_SERVICE_UNAVAILABLE, {}, {}};  // there is no memory even for the reason
-  }
-}
-
 using ConnectionPointer = std::shared_ptr<Connection>;
-using ExchangePointer = std::shared_ptr<Exchange>;
 
 // The connection's own record; null if there was no memory for it.
 const ConnectionPointer* recordOf(MHD_Connection* connection) {
   const auto* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_SOCKET_CONTEXT);
   return info ? static_cast<const ConnectionPointer*>(info->socket_context) : nullptr;
 }
-
-struct Credentials {
-  std::string user;
-  std::string password;
-};
 
 // The certificate for a handshake, as the connection holds it.
 int retrieveCertificate(gnutls_session_t session, const gnutls_datum_t*, int, const gnutls_pk_algorithm_t*, int,
@@ -176,51 +75,38 @@ int retrieveCertificate(gnutls_session_t session, const gnutls_datum_t*, int, co
   return 0;
 }
 
-void freeText(char* text) { MHD_free(text); }
-
-std::optional<Credentials> credentialsOf(MHD_Connection* connection) {
-  using Text = std::unique_ptr<char, decltype(&freeText)>;
-  char* password = nullptr;
-  const Text user(MHD_basic_auth_get_username_password(connection, &password), &freeText);
-  const Text secret(password, &freeText);
-  return user && secret ? std::optional(Credentials{user.get(), secret.get()}) : std::nullopt;
-}
-
 }  // namespace
 
 struct Server::State {
   ServerOptions options;
-  Handler handler;
-  const std::string noAnswer =
-      "the provider did not answer within " + std::to_string(options.operationTimeout.count()) + " s";
-  const std::string threadEnded = "a provider ended the thread of its request";
   HostNames hostNames;
   MemoryBudget budget;
   InFlight inFlight;
   Suspensions suspensions;
   Timers timers;
   Connections connections;
-  LoginDelay loginDelay;
-  std::atomic<bool> willTrim = false;
+  Authentication authentication;
+  Dispatcher dispatcher;
   std::mutex certificateMutex;
   std::shared_ptr<Certificate> certificate;  // none: plain HTTP
-  Workers workers;
-  Workers logins;
-  Workers failures;
   std::string endpoint;
   std::uint16_t port = 0;
   MHD_Daemon* daemon = nullptr;
   std::unique_ptr<Acceptor> acceptor;
 
-  State(ServerOptions given, Handler answer)
+  State(ServerOptions given, Handler handler)
       : options(std::move(given)),
-        handler(std::move(answer)),
         hostNames(options.hostNames),
         budget(options.maxRequestMemory),
         connections(options.maxConnections, options.maxConnectionsPerAddress, timers),
-        workers(options.maxRequests, 0),
-        logins(loginThreads, options.maxConnections),
-        failures(1, options.maxConnections) {}
+        authentication(options.authenticator, options.log, options.maxConnections, timers, suspensions),
+        dispatcher({.handler = std::move(handler),
+                    .failureHandler = options.failureHandler,
+                    .threadEnd = options.threadEnd,
+                    .timeLimit = options.operationTimeout,
+                    .handlers = options.maxRequests,
+                    .failures = options.maxConnections},
+                   timers, suspensions, inFlight) {}
 
   ~State() {
     acceptor.reset();
@@ -255,7 +141,7 @@ struct Server::State {
 
   // Whoever reaches the server may change what the providers let be changed.
   void requireProtection(const Listener& listener) const {
-    if (listener.address().isLoopback() || (isTls() && options.authenticator)) {
+    if (listener.address().isLoopback() || (isTls() && authentication.isRequired())) {
       return;
     }
     throw ServerError("cannot listen on " + options.address + " port " + std::to_string(listener.port()) +
@@ -370,34 +256,21 @@ struct Server::State {
     if (inFlight.isDraining()) {
       return reply(connection, record, *exchange, overload("the server is shutting down"));
     }
-    if (options.authenticator) {
+    if (authentication.isRequired()) {
       return login(connection, record, exchange);
     }
     return expectBody(connection, record, *exchange);
   }
 
   MHD_Result login(MHD_Connection* connection, const ConnectionPointer& record, const ExchangePointer& exchange) {
-    auto credentials = credentialsOf(connection);
-    if (!credentials) {
-      return reply(connection, record, *exchange, challenge());
+    if (auto answer = authentication.begin(connection, *exchange, record->group)) {
+      return reply(connection, record, *exchange, std::move(*answer));
     }
-    const auto now = std::chrono::steady_clock::now();
-    const auto delay = loginDelay.admit(record->group, credentials->user, now);
-    if (!delay) {
-      Response response = refusal(MHD_HTTP_TOO_MANY_REQUESTS, "too many failed logins");
-      response.headers.add("Retry-After", "10");
-      return reply(connection, record, *exchange, std::move(response));
-    }
-    exchange->phase = Exchange::Phase::Login;
-    exchange->group = record->group;
-    exchange->request.user = std::move(credentials->user);
-    exchange->password = std::move(credentials->password);
     if (!suspensions.add(exchange, connection)) {
       return MHD_NO;
     }
-    // Who has to wait costs no thread meanwhile.
     connections.unlimit(*record);
-    delayLogin(exchange, now + *delay, *delay == delay->zero());
+    authentication.check(exchange);
     return MHD_YES;
   }
 
@@ -459,7 +332,7 @@ struct Server::State {
       inFlight.handled();
       return MHD_NO;
     }
-    dispatch(exchange);
+    dispatcher.dispatch(exchange);
     return MHD_YES;
   }
 
@@ -505,141 +378,6 @@ struct Server::State {
            exchange.subject.empty() ? request.method + " " + request.path : exchange.subject, exchange.status});
     } catch (const std::exception&) {
       // a line is lost, and nothing else
-    }
-  }
-
-  // --- In other threads.
-
-  void turnAway(const ExchangePointer& exchange, const char* reason) {
-    try {
-      suspensions.resume(exchange, overload(reason));
-    } catch (const std::exception&) {
-      suspensions.abandon(exchange);
-    }
-  }
-
-  void delayLogin(const ExchangePointer& exchange, std::chrono::steady_clock::time_point time, bool now) {
-    try {
-      if (now) {
-        startLogin(exchange);
-      } else {
-        timers.at(time, [this, exchange] { startLogin(exchange); });
-      }
-    } catch (const std::exception&) {
-      turnAway(exchange, "the server is out of memory");
-    }
-  }
-
-  void startLogin(const ExchangePointer& exchange) {
-    try {
-      if (logins.run([this, exchange] { check(exchange); })) {
-        return;
-      }
-    } catch (const std::exception&) {
-      // no memory: there is no room, then
-    }
-    turnAway(exchange, "too many logins at once");
-  }
-
-  void check(const ExchangePointer& exchange) {
-    std::optional<Response> response = guarded([&] {
-      const std::string& user = exchange->request.user;
-      if (options.authenticator(user, exchange->password)) {
-        loginDelay.succeeded(exchange->group, user);
-        return Response{0, {}, {}};
-      }
-      loginDelay.failed(exchange->group, user, std::chrono::steady_clock::now());
-      if (options.log) {
-        options.log("login failed: user \"" + Ground::printable(user) + "\" from " + exchange->request.client);
-      }
-      return challenge();
-    });
-    if (response->status == 0) {
-      response.reset();
-    }
-    suspensions.resume(exchange, std::move(response));
-  }
-
-  // Who has ended the thread that this is called on.
-  const std::string& whyEnded() const {
-    const std::string& reason = options.threadEnd ? options.threadEnd() : threadEnded;
-    return reason.empty() ? threadEnded : reason;
-  }
-
-  // Answers the request however its handler ends.
-  struct Answering {
-    State& state;
-    ExchangePointer exchange;
-    std::optional<Response> response = {};
-
-    ~Answering() {
-      state.timers.cancel(exchange->timeLimit);
-      state.trimAfter(std::max(exchange->request.body.size(), response ? response->size() : 0));
-      if (response) {
-        exchange->endHandling();
-        state.workers.freePlace();
-        state.suspensions.resume(exchange, std::move(response));
-      } else {
-        // The provider has ended the thread, which another replaces.
-        exchange->giveUpHandling(state.workers);
-        exchange->endHandling();
-        state.fail(exchange, state.whyEnded());
-      }
-      state.inFlight.handled();
-    }
-  };
-
-  void trimAfter(std::size_t bytes) {
-    if (bytes < largeBytes || willTrim.exchange(true)) {
-      return;
-    }
-    try {
-      timers.at(std::chrono::steady_clock::now() + untilTrim, [this] {
-        willTrim = false;
-        malloc_trim(0);
-      });
-    } catch (const std::bad_alloc&) {
-      willTrim = false;  // the next large request will do
-    }
-  }
-
-  void dispatch(const ExchangePointer& exchange) {
-    try {
-      exchange->timeLimit = timers.at(exchange->request.deadline, [this, weak = std::weak_ptr(exchange)] {
-        if (const auto late = weak.lock(); late && late->giveUpHandling(workers)) {
-          fail(late, noAnswer);
-        }
-      });
-      if (workers.run([this, exchange] {
-            exchange->beginHandling(Workers::current());
-            Answering answering{*this, exchange};
-            answering.response = guarded([&] { return handler(exchange->request); });
-          })) {
-        return;
-      }
-    } catch (const std::exception&) {
-      // no memory: there is no room, then
-    }
-    timers.cancel(exchange->timeLimit);
-    inFlight.handled();
-    turnAway(exchange, "too many requests at once");
-  }
-
-  // Answers in the place of a handler that has not. It takes no exception from the threads that call it.
-  void fail(const ExchangePointer& exchange, const std::string& why) {
-    try {
-      if (options.failureHandler && failures.run([this, exchange, why] {
-            suspensions.resume(exchange, guarded([&] { return options.failureHandler(exchange->request, why); }));
-          })) {
-        return;
-      }
-    } catch (const std::exception&) {
-      // answered without the handler
-    }
-    try {
-      suspensions.resume(exchange, refusal(MHD_HTTP_INTERNAL_SERVER_ERROR, why));
-    } catch (const std::exception&) {
-      suspensions.abandon(exchange);
     }
   }
 };

@@ -18,9 +18,6 @@
 
 namespace Cimom::Http {
 
-// Whether the password is that user's; called from several threads at once.
-using Authenticator = std::function<bool(const std::string& user, const std::string& password)>;
-
 // What a request log says of a request.
 struct RequestRecord {
   std::chrono::milliseconds duration;
