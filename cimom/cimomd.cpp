@@ -21,9 +21,9 @@
 #include "cimom/daemon/RequestLog.h"
 #include "cimom/daemon/Signals.h"
 #include "cimom/http/PasswordFile.h"
-#include "cimom/http/SecretFile.h"
 #include "cimom/http/Server.h"
 #include "cimom/interop/InteropProvider.h"
+#include "ground/FileContent.h"
 #include "ground/HostName.h"
 #include "ground/Names.h"
 #include "ground/Printable.h"
@@ -100,8 +100,8 @@ class Files {
 
   void use(Http::ServerOptions& options) {
     if (!configuration_.tlsCertificate.empty()) {
-      options.tlsCertificate = Http::readFile(configuration_.tlsCertificate);
-      options.tlsKey = Http::readSecretFile(configuration_.tlsKey);
+      options.tlsCertificate = Ground::readFile(configuration_.tlsCertificate);
+      options.tlsKey = Ground::readSecretFile(configuration_.tlsKey);
     }
     if (passwords_) {
       options.authenticator = [this](const std::string& user, const std::string& password) {
@@ -123,8 +123,8 @@ class Files {
     }
     if (!configuration_.tlsCertificate.empty()) {
       attempt([&] {
-        server.useCertificate(Http::readFile(configuration_.tlsCertificate),
-                              Http::readSecretFile(configuration_.tlsKey));
+        server.useCertificate(Ground::readFile(configuration_.tlsCertificate),
+                              Ground::readSecretFile(configuration_.tlsKey));
       });
     }
     if (requestLog_) {

@@ -1,23 +1,19 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "bmcip/commands/Configuration.h"
 
-#include <sys/stat.h>
-
 #include <cerrno>
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
 
-#include "ground/Descriptor.h"
+#include "ground/FileContent.h"
 #include "ground/IniFile.h"
 
 namespace Bmcip {
 namespace {
 
 namespace fs = std::filesystem;
-
-constexpr std::size_t maxCredentials = 4096;
 
 std::chrono::milliseconds parseTimeout(const std::string& value) {
   return Ground::parseSeconds(value, std::chrono::milliseconds(10), std::chrono::hours(1));
@@ -31,28 +27,9 @@ std::string readable(const std::string& value) {
   return value;
 }
 
-// A file that holds a password, which nobody else may read.
-Ground::Descriptor openPrivate(const std::string& path) {
-  Ground::Descriptor file(path, O_RDONLY);
-  struct stat status {};
-  if (!file.isOpen() || fstat(file.number(), &status) != 0) {
-    throw std::invalid_argument(path + " cannot be read: " + std::strerror(errno));
-  }
-  if (!S_ISREG(status.st_mode)) {
-    throw std::invalid_argument(path + " is no file");
-  }
-  if ((status.st_mode & 077) != 0) {
-    throw std::invalid_argument(path + " holds a password, and others may read it: chmod 600 " + path);
-  }
-  return file;
-}
-
 // "user:password", on the one line of the file.
 void readCredentials(Options& options, const std::string& path) {
-  const Ground::Descriptor file = openPrivate(path);
-  std::string text(maxCredentials, '\0');
-  const ssize_t size = ::read(file.number(), text.data(), text.size());
-  text.resize(size > 0 ? static_cast<std::size_t>(size) : 0);
+  const std::string text = Ground::readSecretFile(path);
   const auto end = text.find('\n');
   const std::string line = text.substr(0, end);
   const auto colon = line.find(':');
@@ -66,7 +43,7 @@ void readCredentials(Options& options, const std::string& path) {
 void apply(Options& options, const Setting& setting, const std::string& value, const std::string& origin) {
   try {
     setting.apply(options, value);
-  } catch (const std::invalid_argument& refusal) {
+  } catch (const std::exception& refusal) {
     throw UsageError(origin + ": " + refusal.what());
   }
 }
@@ -139,7 +116,7 @@ const std::vector<Setting>& settings() {
          options.access.netrc = Ground::parseBoolean(value);
          const char* home = std::getenv("HOME");
          if (options.access.netrc) {
-           openPrivate(std::string(home ? home : "") + "/.netrc");
+           Ground::requireSecretFile(std::string(home ? home : "") + "/.netrc");
          }
        }},
       {"connect-timeout", "SECONDS", "give a server up that takes no connection in that time (5)", false,

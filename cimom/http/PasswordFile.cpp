@@ -10,7 +10,7 @@
 #include <string_view>
 
 #include "cimom/http/Listener.h"
-#include "cimom/http/SecretFile.h"
+#include "ground/FileContent.h"
 
 namespace Cimom::Http {
 namespace {
@@ -51,7 +51,7 @@ std::string costOf(const std::string& hash) {
 }  // namespace
 
 PasswordFile::PasswordFile(const std::filesystem::path& file) {
-  std::istringstream stream(readSecretFile(file));
+  std::istringstream stream(Ground::readSecretFile(file));
   std::string line;
   for (unsigned number = 1; std::getline(stream, line); ++number) {
     if (line.empty() || line[0] == '#') {

@@ -11,8 +11,8 @@ namespace Cimom::Http {
 // `mkpasswd` make them. Empty lines and lines that begin with `#` mean nothing.
 class PasswordFile {
  public:
-  // Throws ServerError "FILE:LINE: what is wrong", or "FILE: …" for a file that cannot be read or that others than its
-  // owner can. A password that stands there as it is, and hashes that are guessed too quickly, are refused.
+  // Throws std::runtime_error "FILE:LINE: what is wrong", or "FILE: …" for a file that cannot be read or that others
+  // than its owner can. A password that stands there as it is, and hashes that are guessed too quickly, are refused.
   explicit PasswordFile(const std::filesystem::path& file);
 
   // Whether the password is that user's. Takes as long for every user, also for one that is not there.

@@ -65,7 +65,7 @@ TEST_F(BmcipConnectionTest, LooksForItsFileInTheHomeThatThereIs) {
   EXPECT_EQ(bmcip({"show"}).status, 0);
   environment_["XDG_CONFIG_HOME"] = environment_["HOME"] = "";
   EXPECT_EQ(bmcip({"show", "--url", server.url()}).status, 0);
-  expectFailure({"--netrc"}, 2, "/.netrc cannot be read");
+  expectFailure({"--netrc"}, 2, "/.netrc: cannot be read");
 }
 
 TEST_F(BmcipConnectionTest, SaysWhatAnHttpStatusMeans) {
@@ -158,12 +158,12 @@ TEST_F(BmcipLoginTest, TakesCredentialsFromAPrivateFile) {
   EXPECT_EQ(bmcip({"show", "--cacert", trusted(), "--credentials", directory_ / "login"}).status, 0);
   writePrivateFile(directory_ / "login", "admin:wrong\n");
   expectFailure({"--cacert", trusted(), "--credentials", directory_ / "login"}, 13, "does not accept this login");
-  for (const char* text : {"admin\n", ":secret\n", "", "admin:secret\noperator:secret\n"}) {
+  for (const char* text : {"admin\n", ":secret\n", "admin:secret\noperator:secret\n"}) {
     writePrivateFile(directory_ / "login", text);
     expectFailure({"--credentials", directory_ / "login"}, 2, "must be one line, USER:PASSWORD");
   }
-  expectFailure({"--credentials", directory_ / "nothing"}, 2, "nothing cannot be read");
-  expectFailure({"--credentials", directory_.path().string()}, 2, "is no file");
+  expectFailure({"--credentials", directory_ / "nothing"}, 2, "nothing: cannot be read: No such file");
+  expectFailure({"--credentials", directory_.path().string()}, 2, "is a directory");
   std::filesystem::permissions(directory_ / "login", std::filesystem::perms(0640));
   expectFailure({"--credentials", directory_ / "login"}, 2, "chmod 600");
 }
@@ -173,7 +173,7 @@ TEST_F(BmcipLoginTest, TakesCredentialsFromNetrc) {
   EXPECT_EQ(bmcip({"show", "--cacert", trusted(), "--netrc"}).status, 0);
   expectFailure({"--cacert", trusted()}, 13, "asks for a login");
   std::filesystem::permissions(directory_ / ".netrc", std::filesystem::perms(0644));
-  expectFailure({"--cacert", trusted(), "--netrc"}, 2, ".netrc holds a password, and others may read it");
+  expectFailure({"--cacert", trusted(), "--netrc"}, 2, ".netrc: is open to others than its owner: chmod 600 it");
 }
 
 TEST_F(BmcipLoginTest, AsksForThePasswordAtTheTerminal) {

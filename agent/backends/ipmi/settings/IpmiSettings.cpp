@@ -10,7 +10,7 @@
 #include <set>
 #include <stdexcept>
 
-#include "agent/backends/ipmi/settings/SecretFile.h"
+#include "ground/FileContent.h"
 #include "ground/Settings.h"
 
 namespace QV::Ipmi {
@@ -114,14 +114,15 @@ void readTimes(const Settings& section, IpmiSettings& settings) {
   Settings(place, {}).refuse(key, path, reason);
 }
 
-std::string readShortSecret(const std::string& key, const std::string& path) {
-  std::string secret;
-  try {
-    secret = readSecretFile(path);
-  } catch (const std::runtime_error& error) {
-    refuseSecret(key, path, error.what());
+std::string readSecret(const std::string& key, const std::string& path) try {
+  const std::string content = Ground::readSecretFile(path);
+  const std::string line = content.substr(0, content.find_first_of("\r\n"));
+  if (line.empty()) {
+    throw std::runtime_error("its first line must hold the secret");
   }
-  return secret;
+  return line;
+} catch (const std::runtime_error& error) {
+  refuseSecret(key, path, error.what());
 }
 
 // The bytes that pairs of hexadecimal digits stand for; nothing if the text is of another form or empty.
@@ -167,7 +168,7 @@ IpmiSettings parseSettings(const BackEndSettings& section) {
 }
 
 std::string readPassword(const IpmiSettings& settings) {
-  const std::string password = readShortSecret("password_file", settings.passwordFile);
+  const std::string password = readSecret("password_file", settings.passwordFile);
   if (password.size() > longestSecret) {
     refuseSecret("password_file", settings.passwordFile, "IPMI allows a password of at most 20 bytes");
   }
@@ -178,7 +179,7 @@ std::string readKey(const IpmiSettings& settings) {
   if (settings.keyFile.empty()) {
     return {};
   }
-  std::string key = readShortSecret("k_g_file", settings.keyFile);
+  std::string key = readSecret("k_g_file", settings.keyFile);
   if (key.starts_with("0x")) {
     const auto bytes = parseHexadecimal(key.substr(2));
     if (!bytes) {

@@ -59,8 +59,9 @@ struct IpmiSettings {
 // that is missing, a password file that others can read.
 IpmiSettings parseSettings(const BackEndSettings& section);
 
-// The secrets of a session, from their files. Throw std::runtime_error as readSecretFile does, and if the content is
-// longer than IPMI allows (20 bytes each). The key may be given as text or, after 0x, as hexadecimal digits.
+// The secrets of a session: the first lines of their files. Throw std::runtime_error as Ground::readSecretFile does,
+// and if a line is empty or longer than IPMI allows (20 bytes each). The key may be given as text or, after 0x, as
+// hexadecimal digits.
 std::string readPassword(const IpmiSettings& settings);
 std::string readKey(const IpmiSettings& settings);
 

@@ -3,7 +3,6 @@
 #include <gmock/gmock.h>
 
 #include "agent/backends/ipmi/settings/IpmiSettings.h"
-#include "agent/backends/ipmi/settings/SecretFile.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
@@ -18,7 +17,6 @@ using QV::Ipmi::Ipv6Choice;
 using QV::Ipmi::parseSettings;
 using QV::Ipmi::readKey;
 using QV::Ipmi::readPassword;
-using QV::Ipmi::readSecretFile;
 using testing::AllOf;
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -188,13 +186,12 @@ TEST_F(IpmiSettingsTest, RefuseASecretThatOthersMayTouch) {
 
 TEST_F(IpmiSettingsTest, TakeTheFirstLineOfASecretFileAsItIs) {
   writePrivateFile(password, " with blanks \r\nsecond line");
-  EXPECT_EQ(readSecretFile(password), " with blanks ");
+  EXPECT_EQ(readPassword(parseSettings(lan())), " with blanks ");
 }
 
-TEST_F(IpmiSettingsTest, RefuseWhatIsNoSecretFile) {
-  EXPECT_THAT([&] { readSecretFile(directory.path()); }, ThrowsMessage<std::runtime_error>(HasSubstr("regular file")));
-  writePrivateFile(password, "\n");
-  EXPECT_THAT([&] { readSecretFile(password); }, ThrowsMessage<std::runtime_error>(HasSubstr("is empty")));
+TEST_F(IpmiSettingsTest, RefuseASecretFileWithoutASecret) {
+  writePrivateFile(password, "\nsecret\n");
+  EXPECT_THAT([&] { parseSettings(lan()); }, refusal("password_file", "its first line must hold the secret"));
 }
 
 }  // namespace

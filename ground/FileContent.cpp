@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
-#include "cimom/http/SecretFile.h"
+#include "ground/FileContent.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -7,25 +7,31 @@
 
 #include <array>
 #include <cerrno>
-#include <cstring>
+#include <stdexcept>
+#include <system_error>
 
-#include "cimom/http/Listener.h"
 #include "ground/Descriptor.h"
 
-namespace Cimom::Http {
+namespace Ground {
 namespace {
 
 constexpr std::size_t blockSize = 4096;
+constexpr mode_t others = S_IRWXG | S_IRWXO;
 
 [[noreturn]] void fail(const std::filesystem::path& file, const std::string& reason) {
-  throw ServerError(file.string() + ": " + reason);
+  throw std::runtime_error(file.string() + ": " + reason);
 }
 
-std::string read(const std::filesystem::path& file, mode_t refused) {
-  const Ground::Descriptor descriptor(file, O_RDONLY | O_NONBLOCK);
+[[noreturn]] void failWithErrno(const std::filesystem::path& file) {
+  fail(file, "cannot be read: " + std::generic_category().message(errno));
+}
+
+// A file whose reader would have to wait for its writer is not waited for.
+Descriptor open(const std::filesystem::path& file, mode_t refused) {
+  Descriptor descriptor(file, O_RDONLY | O_NONBLOCK);
   struct stat status {};
   if (!descriptor.isOpen() || ::fstat(descriptor.number(), &status) != 0) {
-    fail(file, std::strerror(errno));
+    failWithErrno(file);
   }
   if (!S_ISREG(status.st_mode)) {
     fail(file, S_ISDIR(status.st_mode) ? "is a directory" : "must be a regular file");
@@ -33,6 +39,11 @@ std::string read(const std::filesystem::path& file, mode_t refused) {
   if ((status.st_mode & refused) != 0) {
     fail(file, "is open to others than its owner: chmod 600 it");
   }
+  return descriptor;
+}
+
+std::string read(const std::filesystem::path& file, mode_t refused) {
+  const Descriptor descriptor = open(file, refused);
   std::string content;
   std::array<char, blockSize> block{};
   ssize_t size = 0;
@@ -40,7 +51,7 @@ std::string read(const std::filesystem::path& file, mode_t refused) {
     content.append(block.data(), static_cast<std::size_t>(size));
   }
   if (size < 0) {
-    fail(file, std::strerror(errno));
+    failWithErrno(file);
   }
   if (content.empty()) {
     fail(file, "is empty");
@@ -52,6 +63,8 @@ std::string read(const std::filesystem::path& file, mode_t refused) {
 
 std::string readFile(const std::filesystem::path& file) { return read(file, 0); }
 
-std::string readSecretFile(const std::filesystem::path& file) { return read(file, S_IRWXG | S_IRWXO); }
+std::string readSecretFile(const std::filesystem::path& file) { return read(file, others); }
 
-}  // namespace Cimom::Http
+void requireSecretFile(const std::filesystem::path& file) { open(file, others); }
+
+}  // namespace Ground
