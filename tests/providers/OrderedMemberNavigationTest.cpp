@@ -8,13 +8,13 @@ using namespace Testing;
 
 namespace Classes = Classes;
 
-struct Parameter {
+struct OrderedMember {
   const char* className;
   Navigation navigation;
   std::string kindWord;
 };
 
-class OrderedMemberNavigationTest : public AssociationTest, public ::testing::WithParamInterface<Parameter> {
+class OrderedMemberNavigationTest : public AssociationTest, public ::testing::WithParamInterface<OrderedMember> {
  protected:
   OrderedMemberNavigationTest() { attach(modelOf(GetParam().className)); }
 
@@ -115,14 +115,14 @@ TEST_P(OrderedMemberNavigationTest, AFarInstanceWithoutReadableIdentifierIsSkipp
 // The word that each operation looks for. Of the eight, one asks for the other kind's word.
 INSTANTIATE_TEST_SUITE_P(
     Eight, OrderedMemberNavigationTest,
-    ::testing::Values(Parameter{Classes::staticOrderedMember, Navigation::Associators, "static"},
-                      Parameter{Classes::staticOrderedMember, Navigation::AssociatorNames, "static"},
-                      Parameter{Classes::staticOrderedMember, Navigation::References, "static"},
-                      Parameter{Classes::staticOrderedMember, Navigation::ReferenceNames, "static"},
-                      Parameter{Classes::dhcpOrderedMember, Navigation::Associators, "dhcp"},
-                      Parameter{Classes::dhcpOrderedMember, Navigation::AssociatorNames, "dhcp"},
-                      Parameter{Classes::dhcpOrderedMember, Navigation::References, "dhcp"},
-                      Parameter{Classes::dhcpOrderedMember, Navigation::ReferenceNames, "static"}),
+    ::testing::Values(OrderedMember{Classes::staticOrderedMember, Navigation::Associators, "static"},
+                      OrderedMember{Classes::staticOrderedMember, Navigation::AssociatorNames, "static"},
+                      OrderedMember{Classes::staticOrderedMember, Navigation::References, "static"},
+                      OrderedMember{Classes::staticOrderedMember, Navigation::ReferenceNames, "static"},
+                      OrderedMember{Classes::dhcpOrderedMember, Navigation::Associators, "dhcp"},
+                      OrderedMember{Classes::dhcpOrderedMember, Navigation::AssociatorNames, "dhcp"},
+                      OrderedMember{Classes::dhcpOrderedMember, Navigation::References, "dhcp"},
+                      OrderedMember{Classes::dhcpOrderedMember, Navigation::ReferenceNames, "static"}),
     [](const auto& parameter) { return parameter.param.className + ("_" + nameOf(parameter.param.navigation)); });
 
 }  // namespace
