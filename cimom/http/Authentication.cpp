@@ -15,7 +15,7 @@ namespace {
 
 constexpr const char* basicChallenge = "Basic realm=\"cimom\"";
 
-constexpr std::size_t threads = 2;
+constexpr std::size_t checkers = 2;
 
 Response challenge() {
   Response response{MHD_HTTP_UNAUTHORIZED, {}, "authentication is required\n"};
@@ -53,7 +53,7 @@ Authentication::Authentication(Authenticator authenticator, std::function<void(c
       log_(std::move(log)),
       timers_(timers),
       suspensions_(suspensions),
-      workers_(threads, waiting) {}
+      workers_(checkers, waiting) {}
 
 std::optional<Response> Authentication::begin(MHD_Connection* connection, Exchange& exchange,
                                               const std::string& group) {
