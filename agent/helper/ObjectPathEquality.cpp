@@ -13,16 +13,16 @@ namespace QV {
 namespace {
 
 // A key as the broker holds it; its name lives as long as the request.
-struct Key {
+struct PathKey {
   const char* name;
   CMPIData value;
 };
 
-using Keys = std::vector<Key>;
+using PathKeys = std::vector<PathKey>;
 
 // Nothing if it cannot be read or has no name: a path with such a key names no instance that can be told. Some object
 // managers look a key up by its exact spelling only, so keys are taken by index.
-std::optional<Key> keyAt(const CMPIObjectPath* path, CMPICount index) {
+std::optional<PathKey> keyAt(const CMPIObjectPath* path, CMPICount index) {
   CMPIStatus status{CMPI_RC_OK, nullptr};
   CMPIString* string = nullptr;
   const CMPIData value = CMGetKeyAt(path, index, &string, &status);
@@ -30,7 +30,7 @@ std::optional<Key> keyAt(const CMPIObjectPath* path, CMPICount index) {
   if (status.rc != CMPI_RC_OK || !name) {
     return std::nullopt;
   }
-  return Key{name, value};
+  return PathKey{name, value};
 }
 
 std::optional<CMPICount> keyCountOf(const CMPIObjectPath* path) {
@@ -39,8 +39,8 @@ std::optional<CMPICount> keyCountOf(const CMPIObjectPath* path) {
   return status.rc == CMPI_RC_OK ? std::optional(count) : std::nullopt;
 }
 
-std::optional<Keys> keysOf(const CMPIObjectPath* path, CMPICount count) {
-  Keys keys;
+std::optional<PathKeys> keysOf(const CMPIObjectPath* path, CMPICount count) {
+  PathKeys keys;
   keys.reserve(count);
   for (CMPICount index = 0; index < count; ++index) {
     const auto key = keyAt(path, index);
@@ -98,17 +98,17 @@ bool sameValue(const CMPIData& a, const CMPIData& b) {
   }
 }
 
-bool hasEqualKey(const Keys& keys, const Key& wanted) {
-  return std::any_of(keys.begin(), keys.end(), [&](const Key& key) {
+bool hasEqualKey(const PathKeys& keys, const PathKey& wanted) {
+  return std::any_of(keys.begin(), keys.end(), [&](const PathKey& key) {
     return textEqual(key.name, wanted.name) && sameValue(key.value, wanted.value);
   });
 }
 
-bool holdsAll(const Keys& keys, const Keys& wanted) {
-  return std::all_of(wanted.begin(), wanted.end(), [&](const Key& key) { return hasEqualKey(keys, key); });
+bool holdsAll(const PathKeys& keys, const PathKeys& wanted) {
+  return std::all_of(wanted.begin(), wanted.end(), [&](const PathKey& key) { return hasEqualKey(keys, key); });
 }
 
-bool sameKeysInAnyOrder(const std::optional<Keys>& a, const std::optional<Keys>& b) {
+bool sameKeysInAnyOrder(const std::optional<PathKeys>& a, const std::optional<PathKeys>& b) {
   return a && b && holdsAll(*a, *b) && holdsAll(*b, *a);
 }
 
