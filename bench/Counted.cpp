@@ -6,11 +6,11 @@
 #include <cstdlib>
 #include <stdexcept>
 
-#include "Paths.h"
 #include "bench/Measurements.h"
 #include "bench/Rounds.h"
 #include "tests/agent/log/FrameLines.h"
 #include "tests/support/client/Enumeration.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Callgrind.h"
 #include "tests/support/system/SystemCalls.h"
 #include "tests/support/system/TemporaryDirectory.h"
@@ -37,7 +37,7 @@ class Processor {
 };
 
 std::vector<std::string> command(const char* part, int interfaces) {
-  return {BINARY_DIR "/bin/workload", part, std::to_string(interfaces)};
+  return {Testing::built("bin/workload"), part, std::to_string(interfaces)};
 }
 
 // What the steps of a part of the program `workload` cost.
@@ -72,7 +72,7 @@ void measureLogLines(Results& results) {
   const std::string ini = directory.write(
       "agent.ini", "[log]\ndestination = off\n[trace]\ndestination = file\nfile = " + (directory / "trace") + "\n");
   const auto costs =
-      Testing::costsOf({BINARY_DIR "/bin/log_cost", std::to_string(roundsOfAStep)}, {{"QV_AGENT_INI", ini}});
+      Testing::costsOf({Testing::built("bin/log_cost"), std::to_string(roundsOfAStep)}, {{"QV_AGENT_INI", ini}});
   results.figures["log line"] = costs.at("lines").instructions / roundsOfAStep;
 
   // A process reads its agent.ini with its first line: the traced one is a child, and this one sends none before.

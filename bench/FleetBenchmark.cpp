@@ -12,12 +12,12 @@
 #include <iostream>
 #include <memory>
 
-#include "Paths.h"
 #include "cimom/ObjectManager.h"
 #include "cimom/cimxml/Endpoint.h"
 #include "cimom/http/Acceptor.h"
 #include "cimom/http/Server.h"
 #include "tests/bmcip/RawServer.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -50,7 +50,7 @@ Answer askFleet(const TemporaryDirectory& directory) {
   const auto begin = Clock::now();
   const pid_t process = fork();
   if (process == 0) {
-    const std::string command = "exec " BINARY_DIR "/bin/bmcip show --json --timeout 1 --hosts " +
+    const std::string command = "exec " + built("bin/bmcip") + " show --json --timeout 1 --hosts " +
                                 (directory / "hosts") + " >" + output + " 2>" + (directory / "errors");
     execl("/bin/sh", "sh", "-c", command.c_str(), nullptr);
     _exit(127);
@@ -87,10 +87,10 @@ int measure() {
       "agent.ini", "[processor]\nbackend = simulated\n[simulated]\nstate = " + (directory / "processor.json") + "\n");
   setenv("QV_AGENT_INI", ini.c_str(), 1);
   Cimom::ObjectManager manager;
-  manager.loadSchema(BINARY_DIR "/share/cimomd");
-  manager.loadRegistration(BINARY_DIR "/share/cimomd/CompositeIPConfig.reg");
-  manager.loadRegistration(BINARY_DIR "/share/cimomd/UnderlyingIPConfig.reg");
-  manager.addProviderDirectory(BINARY_DIR "/lib");
+  manager.loadSchema(built("share/cimomd"));
+  manager.loadRegistration(built("share/cimomd/CompositeIPConfig.reg"));
+  manager.loadRegistration(built("share/cimomd/UnderlyingIPConfig.reg"));
+  manager.addProviderDirectory(built("lib"));
   manager.checkProviders();
   const Cimom::CimXml::Endpoint endpoint(manager.broker(), manager.classes(), "fleet.example");
   Cimom::Http::ServerOptions options;

@@ -4,8 +4,8 @@
 #include <sstream>
 #include <stdexcept>
 
-#include "Paths.h"
 #include "bench/Measurements.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 
 namespace Benchmark {
@@ -39,9 +39,9 @@ void takeMedians(Results& results, const Peer& peer, const std::string& output) 
 void measurePeers(Results& results) {
   for (const Peer& peer : peers) {
     // An object manager reads the agent.ini that it is installed with, not that of what is measured in this process.
-    const auto completed = Testing::run(
-        {"env", "-u", "QV_AGENT_INI", BINARY_DIR "/bin/hosts_test", peer.name, "--gtest_filter=EnumerationTimesTest.*"},
-        {}, std::chrono::minutes(5));
+    const auto completed = Testing::run({"env", "-u", "QV_AGENT_INI", Testing::built("bin/hosts_test"), peer.name,
+                                         "--gtest_filter=EnumerationTimesTest.*"},
+                                        {}, std::chrono::minutes(5));
     if (completed.status == skipped) {
       results.notes.push_back(std::string(peer.title) +
                               ": there is none on the machine that measured, or none was named");

@@ -10,13 +10,13 @@
 #include <stdexcept>
 #include <thread>
 
-#include "Paths.h"
 #include "bench/Measurements.h"
 #include "tests/cimom/cimxml/CostlyRequests.h"
 #include "tests/load/Footprint.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/client/Enumeration.h"
 #include "tests/support/client/HttpClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace Benchmark {
@@ -103,7 +103,7 @@ class Served {
 class Echo {
  public:
   explicit Echo(const std::string& answer)
-      : process_({BINARY_DIR "/bin/http_echo", directory_.write("answer", answer)}),
+      : process_({built("bin/http_echo"), directory_.write("answer", answer)}),
         asked_(static_cast<std::uint16_t>(std::stoul(process_.readLine())), process_.id()) {}
 
   Asked& asked() { return asked_; }

@@ -16,7 +16,6 @@
 #include <stdexcept>
 #include <string>
 
-#include "Paths.h"
 #include "bench/MinimalProvider.h"
 #include "bench/Rounds.h"
 #include "cimom/ObjectManager.h"
@@ -24,6 +23,7 @@
 #include "cimom/cimxml/Endpoint.h"
 #include "tests/load/Footprint.h"
 #include "tests/support/client/Enumeration.h"
+#include "tests/support/system/Build.h"
 #include "trace/Trace.h"
 
 namespace {
@@ -54,10 +54,10 @@ constexpr const char* endpointClass = "YRNx_MgmtHwIPProtocolEndPoint";
 class Product {
  public:
   Product() {
-    manager_.loadSchema(BINARY_DIR "/share/cimomd");
-    manager_.loadRegistration(BINARY_DIR "/share/cimomd/CompositeIPConfig.reg");
-    manager_.loadRegistration(BINARY_DIR "/share/cimomd/UnderlyingIPConfig.reg");
-    manager_.addProviderDirectory(BINARY_DIR "/lib");
+    manager_.loadSchema(built("share/cimomd"));
+    manager_.loadRegistration(built("share/cimomd/CompositeIPConfig.reg"));
+    manager_.loadRegistration(built("share/cimomd/UnderlyingIPConfig.reg"));
+    manager_.addProviderDirectory(built("lib"));
     Cimom::ProviderRegistration minimal;
     minimal.className = endpointClass;
     minimal.provider = "MinimalProvider";

@@ -8,6 +8,7 @@
 #include <sstream>
 #include <string>
 
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 
 namespace {
@@ -27,7 +28,7 @@ std::set<std::string> exportsOf(const std::string& library) {
 }
 
 TEST(ExportsTest, OfTheLogAreItsContract) {
-  EXPECT_THAT(exportsOf(TWLOG),
+  EXPECT_THAT(exportsOf(built("lib/libtwlog.so")),
               testing::UnorderedElementsAre("TWLog::TWMessageBuffer::TWMessageBuffer",
                                             "TWLog::TWMessageBuffer::~TWMessageBuffer",
                                             "TWLog::TWMessageBuffer::operator<<", "TWLog::str",
@@ -35,13 +36,14 @@ TEST(ExportsTest, OfTheLogAreItsContract) {
 }
 
 TEST(ExportsTest, OfTheHelpersAreTheirContract) {
-  EXPECT_THAT(exportsOf(QVHELPER), testing::UnorderedElementsAre("QV::mapProperty", "QV::getSystemName",
-                                                                 "QV::isObjPathsEqual", "QV::textEqual"));
+  EXPECT_THAT(
+      exportsOf(built("lib/libqvhelper.so")),
+      testing::UnorderedElementsAre("QV::mapProperty", "QV::getSystemName", "QV::isObjPathsEqual", "QV::textEqual"));
 }
 
 TEST(ExportsTest, OfTheInstrumentationAreItsContractAndTheSharedBackEnd) {
   EXPECT_THAT(
-      exportsOf(QVINSTRUMENTATION),
+      exportsOf(built("lib/libqvinstrumentation.so")),
       testing::UnorderedElementsAre("QV::Instrumentation::Instrumentation", "QV::Instrumentation::~Instrumentation",
                                     "QV::Instrumentation::selectNode", "QV::Instrumentation::operator bool",
                                     "QV::Instrumentation::getProperty", "QV::Instrumentation::operator++",
@@ -49,7 +51,8 @@ TEST(ExportsTest, OfTheInstrumentationAreItsContractAndTheSharedBackEnd) {
 }
 
 TEST(ExportsTest, OfTheUnderlyingProviderAreItsFactory) {
-  EXPECT_THAT(exportsOf(UNDERLYING), testing::UnorderedElementsAre("UnderlyingIPConfigProvider_Create_InstanceMI"));
+  EXPECT_THAT(exportsOf(built("lib/libunderlyingipconfigprovider.so")),
+              testing::UnorderedElementsAre("UnderlyingIPConfigProvider_Create_InstanceMI"));
 }
 
 }  // namespace

@@ -2,11 +2,12 @@
 #include "tests/bmcip/BmcipTest.h"
 
 #include "Paths.h"
+#include "tests/support/system/Build.h"
 
 namespace Testing {
 namespace {
 
-constexpr const char* program = BINARY_DIR "/bin/bmcip";
+const std::string program = built("bin/bmcip");
 
 std::vector<std::string> commandOf(const std::vector<std::string>& arguments) {
   std::vector<std::string> command = {program};

@@ -6,6 +6,7 @@
 
 #include "tests/bmcip/BmcipTest.h"
 #include "tests/bmcip/RawServer.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -177,11 +178,11 @@ TEST_F(BmcipLoginTest, TakesCredentialsFromNetrc) {
 }
 
 TEST_F(BmcipLoginTest, AsksForThePasswordAtTheTerminal) {
-  const std::string command = BINARY_DIR "/bin/bmcip show --user admin --cacert " + trusted();
+  const std::string command = built("bin/bmcip") + " show --user admin --cacert " + trusted();
   const Completed asked =
       run({"sh", "-c", "(sleep 1; echo secret) | script -qec '" + command + "' /dev/null"}, environment_);
   EXPECT_THAT(asked.output, AllOf(HasSubstr("Password of admin: "), HasSubstr("eth0")));
-  const Completed alone = run({"setsid", "-w", BINARY_DIR "/bin/bmcip", "show", "--user", "admin"}, environment_);
+  const Completed alone = run({"setsid", "-w", built("bin/bmcip"), "show", "--user", "admin"}, environment_);
   EXPECT_EQ(alone.status, 2);
   EXPECT_THAT(alone.errors, HasSubstr("can only be asked for at a terminal"));
 }

@@ -6,6 +6,7 @@
 
 #include "tests/bmcip/BmcipTest.h"
 #include "tests/bmcip/RawServer.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -40,7 +41,7 @@ TEST_F(BmcipFleetTest, PrintsALineAServerInTheirOrder) {
 TEST_F(BmcipFleetTest, ReadsServersFromAFileOrTheStandardInput) {
   const auto file = directory_.write("hosts", "# the fleet\n\n  " + url() + "  # first\n" + url() + "\r\n");
   EXPECT_THAT(linesOf(bmcip({"show", "--json", "--hosts", file.string()}).output), SizeIs(2));
-  const Completed piped = run({"sh", "-c", BINARY_DIR "/bin/bmcip show --json --hosts - <" + file.string()});
+  const Completed piped = run({"sh", "-c", built("bin/bmcip") + " show --json --hosts - <" + file.string()});
   EXPECT_THAT(linesOf(piped.output), SizeIs(2));
   const Completed broken = bmcip({"show", "--hosts", directory_.write("broken", "web1\nweb 2\n").string()});
   EXPECT_EQ(broken.status, 2);
@@ -90,15 +91,15 @@ TEST_F(BmcipFleetTest, AsksMoreAtOnceThanTheUsualLimitOfDescriptors) {
     servers += url() + "\n";
   }
   const auto file = directory_.write("hosts", servers);
-  const Completed shown =
-      run({"sh", "-c",
-           "ulimit -Sn 24; '" BINARY_DIR "/bin/bmcip' show --config /dev/null --parallel 40 --hosts " + file.string()});
+  const Completed shown = run(
+      {"sh", "-c",
+       "ulimit -Sn 24; '" + built("bin/bmcip") + "' show --config /dev/null --parallel 40 --hosts " + file.string()});
   EXPECT_EQ(shown.status, 0) << shown.errors;
   EXPECT_THAT(linesOf(shown.output), SizeIs(41));
 }
 
 TEST_F(BmcipFleetTest, ShowsHowFarItIsOnATerminalOnly) {
-  const std::string command = BINARY_DIR "/bin/bmcip show " + url() + " " + url();
+  const std::string command = built("bin/bmcip") + " show " + url() + " " + url();
   const auto onTerminal = [](const std::string& shown) {
     return run({"script", "-qec", shown, "/dev/null"}, {{"TERM", "xterm"}}).output;
   };

@@ -6,6 +6,7 @@
 
 #include "tests/bmcip/BmcipTest.h"
 #include "tests/support/client/CompositeObjects.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -195,7 +196,7 @@ TEST_F(BmcipSetAnswersTest, AsksBeforeItCutsItsOwnConnection) {
   EXPECT_EQ(unasked.status, 7);
   EXPECT_THAT(unasked.errors, AllOf(HasSubstr("127.0.0.1, the address of eth0"), HasSubstr("--yes")));
   EXPECT_EQ(server_.requests().size(), 3U);
-  const std::string command = BINARY_DIR "/bin/bmcip set eth0 192.0.2.77/25 --wait 0 --connect-timeout 0.2 --url ";
+  const std::string command = built("bin/bmcip") + " set eth0 192.0.2.77/25 --wait 0 --connect-timeout 0.2 --url ";
   const auto answering = [&](const std::string& answer) {
     return run({"sh", "-c", "echo " + answer + " | script -qec '" + command + server_.url() + "' /dev/null"}).output;
   };

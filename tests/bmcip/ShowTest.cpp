@@ -2,6 +2,7 @@
 #include <gmock/gmock.h>
 
 #include "tests/bmcip/BmcipTest.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -65,7 +66,7 @@ TEST_F(BmcipShowTest, KeepsToItsSchema) {
 }
 
 TEST_F(BmcipShowTest, IsColouredOnATerminalThatWantsIt) {
-  const std::string command = BINARY_DIR "/bin/bmcip show --url " + url();
+  const std::string command = built("bin/bmcip") + " show --url " + url();
   const auto onTerminal = [&](const std::string& noColour) {
     return run({"script", "-qec", command, "/dev/null"}, {{"TERM", "xterm"}, {"NO_COLOR", noColour}}).output;
   };

@@ -4,9 +4,9 @@
 #include <csignal>
 #include <regex>
 
-#include "Paths.h"
 #include "tests/bmcip/BmcipTest.h"
 #include "tests/support/client/CompositeObjects.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -53,7 +53,7 @@ class BmcipWatchAnswersTest : public BmcipTest {
   // changes something, so that the next line fails.
   Completed watchedBy(const std::string& reader, const std::string& options = "") {
     return run({"bash", "-c",
-                "set -o pipefail; '" BINARY_DIR "/bin/bmcip' watch --config /dev/null --url " + server_.url() +
+                "set -o pipefail; '" + built("bin/bmcip") + "' watch --config /dev/null --url " + server_.url() +
                     " --interval 0.1 " + options + " | " + reader});
   }
 

@@ -10,6 +10,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -39,7 +40,7 @@ class ConfigurationTest : public testing::Test {
   std::string agent() const {
     fs::create_directories(directory_.path() / "agent");
     fs::create_directory_symlink(SOURCE_DIR "/agent/include", directory_.path() / "agent/include");
-    fs::create_directory_symlink(BINARY_DIR "/lib", directory_.path() / "agent/lib");
+    fs::create_directory_symlink(built("lib"), directory_.path() / "agent/lib");
     return directory_ / "agent";
   }
 

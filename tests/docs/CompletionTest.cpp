@@ -5,6 +5,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/WbemClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -31,13 +32,8 @@ printf '%s\n' "${COMPREPLY[@]}"
 // What is offered for the last of the words.
 std::vector<std::string> offered(const std::string& program, const std::vector<std::string>& words,
                                  const std::string& directory = SOURCE_DIR) {
-  std::vector<std::string> command = {"bash",
-                                      "-euc",
-                                      complete,
-                                      "bash",
-                                      directory,
-                                      SOURCE_DIR "/docs/completion/" + program,
-                                      BINARY_DIR "/bin/" + program};
+  std::vector<std::string> command = {
+      "bash", "-euc", complete, "bash", directory, SOURCE_DIR "/docs/completion/" + program, built("bin/") + program};
   command.insert(command.end(), words.begin(), words.end());
   const Completed completed = run(command);
   EXPECT_EQ(completed.status, 0) << completed.errors;

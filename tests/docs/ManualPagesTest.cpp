@@ -9,6 +9,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/WbemClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -79,7 +80,7 @@ Names sampleKeysOf(const std::string& text) {
 
 Names programOptions(const std::string& program) {
   Names options;
-  const Completed help = run({BINARY_DIR "/bin/" + program, "--help"});
+  const Completed help = run({built("bin/") + program, "--help"});
   for (const std::string& line : namesOf(help, "^(?:  |    )(-[a-z-]+(?:, ?--[a-z-]+)?)")) {
     options.merge(matches(line, "(-[a-z-]+)"));
   }

@@ -5,6 +5,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/Cimomd.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -17,7 +18,7 @@ using testing::StartsWith;
 class CommandLineTest : public testing::Test {
  protected:
   static Completed cimomd(std::vector<std::string> arguments) {
-    arguments.insert(arguments.begin(), BINARY_DIR "/bin/cimomd");
+    arguments.insert(arguments.begin(), built("bin/cimomd"));
     return run(arguments);
   }
 
@@ -137,7 +138,8 @@ TEST_F(CommandLineTest, TakesItsOptionsFromTheFileRelativeToIt) {
   const Cimomd cimomd(
       {"--config", file("schema = probe.mof\nregistration = " SOURCE_DIR "/tests/support/probe/Probe.reg\n"
                         "schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\n"
-                        "provider-dir = " BINARY_DIR "/lib ; where the build puts it\n")});
+                        "provider-dir = " +
+                        built("lib") + " ; where the build puts it\n")});
   const std::string classes = cimomd.wbemcli({"ecn"}, "").output;
   EXPECT_THAT(classes, AllOf(HasSubstr("TEST_Local"), HasSubstr("TEST_Thing")));
 }
@@ -146,7 +148,8 @@ TEST_F(CommandLineTest, TakesADirectoryOfRegistrations) {
   directory_.write("all/first.reg", readFile(SOURCE_DIR "/tests/support/probe/Probe.reg"));
   directory_.write("all/first.peg.mof", "what another object manager takes");
   const Cimomd cimomd({"--config", file("schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\nregistration = all\n"
-                                        "provider-dir = " BINARY_DIR "/lib\n")});
+                                        "provider-dir = " +
+                                        built("lib") + "\n")});
   EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
 }
 
@@ -156,7 +159,8 @@ TEST_F(CommandLineTest, TakesIndentedKeysOfTheFile) {
   expectRefused({"--config", file("port = 0\n  nonsense = 1\n")}, 2, "cimomd.ini:2: unknown key \"nonsense\"");
   const Cimomd cimomd({"--config", file("  schema = " SOURCE_DIR "/tests/support/probe/Probe.mof\n"
                                         "\tregistration = " SOURCE_DIR "/tests/support/probe/Probe.reg\n"
-                                        "  provider-dir = " BINARY_DIR "/lib\n")});
+                                        "  provider-dir = " +
+                                        built("lib") + "\n")});
   EXPECT_EQ(cimomd.wbemcli({"ein"}, "TEST_Thing").status, 0);
 }
 

@@ -5,9 +5,9 @@
 
 #include <regex>
 
-#include "Paths.h"
 #include "cimom/schema/ClassRepository.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -59,7 +59,7 @@ TEST_F(CompositeSchemaTest, ShowsEveryClassInItsOwnNamespaceOnly) {
 // Whatever a client sees either stands in our class, with its meaning, or is what the schema gives by default.
 TEST_F(CompositeSchemaTest, DeclaresEveryValueThatAnInstanceShows) {
   Cimom::ClassRepository repository;
-  repository.add(Cimom::MofReader().readPath(BINARY_DIR "/share/cimomd"));
+  repository.add(Cimom::MofReader().readPath(built("share/cimomd")));
   for (const Cimom::ClassDefinition* definition : repository.all()) {
     if (!definition->name.starts_with("YRN")) {
       continue;

@@ -6,10 +6,10 @@
 #include <filesystem>
 #include <future>
 
-#include "Paths.h"
 #include "tests/support/client/CompositeObjects.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/client/HttpClient.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -189,7 +189,7 @@ TEST_F(CompositeServerTest, ServesTheOthersWithoutTheLibraryOfAProvider) {
     const TemporaryDirectory providers;
     for (const char* present : {"libcompositeipconfigprovider.so", "libunderlyingipconfigprovider.so"}) {
       if (std::string(present) != missing) {
-        std::filesystem::create_symlink(std::string(BINARY_DIR "/lib/") + present, providers.path() / present);
+        std::filesystem::create_symlink(built("lib/") + present, providers.path() / present);
       }
     }
     std::vector<std::string> options = CompositeStack::options();
@@ -205,8 +205,8 @@ TEST_F(CompositeServerTest, ServesTheOthersWithoutTheLibraryOfAProvider) {
 }
 
 TEST_F(CompositeServerTest, AnswersAnErrorWhereNoUnderlyingProviderIsRegistered) {
-  const Cimomd cimomd({"--schema", BINARY_DIR "/share/cimomd", "--registration",
-                       BINARY_DIR "/share/cimomd/CompositeIPConfig.reg", "--provider-dir", BINARY_DIR "/lib"},
+  const Cimomd cimomd({"--schema", built("share/cimomd"), "--registration", built("share/cimomd/CompositeIPConfig.reg"),
+                       "--provider-dir", built("lib")},
                       {{"QV_AGENT_INI", directory_.write("agent.ini", "[log]\ndestination = off\n").string()}});
   const Completed completed = run({"wbemcli", "ei", cimomd.url("YRNx_MgmtHwIPProtocolEndPoint", "root/cimv2")});
   EXPECT_NE(completed.status, 0);

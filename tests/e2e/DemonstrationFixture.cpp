@@ -3,6 +3,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace Testing {
@@ -29,7 +30,7 @@ std::vector<std::string> processesOf(const fs::path& directory) {
 
 DemonstrationTest::DemonstrationTest() {
   for (const char* part : {"bin", "lib", "share"}) {
-    fs::create_directory_symlink(fs::path(BINARY_DIR) / part, build() / part);
+    fs::create_directory_symlink(built(part), build() / part);
   }
   fs::create_directory(temporary());
 }

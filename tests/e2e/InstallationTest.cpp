@@ -7,6 +7,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -37,14 +38,14 @@ class KeptManifest {
   KeptManifest& operator=(const KeptManifest&) = delete;
 
  private:
-  static constexpr const char* file = BINARY_DIR "/install_manifest.txt";
+  inline static const std::string file = built("install_manifest.txt");
   const std::string content_;
 };
 
 class InstallationTest : public testing::Test {
  protected:
   void install(const fs::path& prefix, const Environment& environment = {}) {
-    const Completed completed = run({"cmake", "--install", BINARY_DIR, "--prefix", prefix}, environment);
+    const Completed completed = run({"cmake", "--install", buildDirectory(), "--prefix", prefix}, environment);
     ASSERT_EQ(completed.status, 0) << completed.errors;
   }
 
@@ -86,7 +87,7 @@ class InstallationTest : public testing::Test {
   }
 
   static Completed uninstall(const Environment& environment = {}) {
-    return run({SOURCE_DIR "/tools/uninstall", BINARY_DIR}, environment);
+    return run({SOURCE_DIR "/tools/uninstall", buildDirectory()}, environment);
   }
 
   const KeptManifest manifest_;
@@ -105,7 +106,7 @@ TEST_F(InstallationTest, FindsItsLibrariesWithinTheMovedTree) {
   const fs::path tree = installAndMove();
   for (const char* library : {"libcompositeipconfigprovider.so.1", "libunderlyingipconfigprovider.so.1"}) {
     const std::string needed = run({"ldd", onlyFile(tree, library)}).output;
-    EXPECT_THAT(needed, AllOf(HasSubstr(tree.string()), Not(HasSubstr("not found")), Not(HasSubstr(BINARY_DIR)),
+    EXPECT_THAT(needed, AllOf(HasSubstr(tree.string()), Not(HasSubstr("not found")), Not(HasSubstr(buildDirectory())),
                               Not(HasSubstr("/usr/local"))))
         << library;
   }
@@ -113,7 +114,7 @@ TEST_F(InstallationTest, FindsItsLibrariesWithinTheMovedTree) {
 
 TEST_F(InstallationTest, LoadsABackEndOfTheMovedTree) {
   const fs::path tree = installAndMove();
-  if (!fs::exists(BINARY_DIR "/lib/libqvbmc-ipmi.so")) {
+  if (!fs::exists(built("lib/libqvbmc-ipmi.so"))) {
     GTEST_SKIP() << "this build has no IPMI back end";
   }
   const auto askFor = [&](const std::string& why) {
@@ -141,7 +142,7 @@ TEST_F(InstallationTest, IsTakenAwayWithoutARest) {
   const fs::path prefix = directory_.path() / "a prefix";
   install(prefix);
   directory_.write("a prefix/share/compositeipconfig/site.reg", "# of the administrator\n");
-  ASSERT_EQ(run({"cmake", "--build", BINARY_DIR, "--target", "uninstall"}).status, 0);
+  ASSERT_EQ(run({"cmake", "--build", buildDirectory(), "--target", "uninstall"}).status, 0);
   EXPECT_THAT(filesBelow(prefix), ElementsAre("share/compositeipconfig/site.reg"));
   EXPECT_FALSE(fs::exists(prefix / "share/compositeipconfig/cimomd"));
   EXPECT_FALSE(fs::exists(prefix / "share/doc/compositeipconfig"));
@@ -150,7 +151,7 @@ TEST_F(InstallationTest, IsTakenAwayWithoutARest) {
   const Completed again = uninstall();
   EXPECT_EQ(again.status, 1);
   EXPECT_THAT(again.errors,
-              AllOf(StartsWith("uninstall: " BINARY_DIR), HasSubstr("nothing was installed"), EndsWith("\n")));
+              AllOf(StartsWith("uninstall: " + buildDirectory()), HasSubstr("nothing was installed"), EndsWith("\n")));
 }
 
 TEST_F(InstallationTest, IsTakenAwayFromBelowDestdir) {

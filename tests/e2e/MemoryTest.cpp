@@ -6,6 +6,7 @@
 
 #include "tests/support/client/Cimomd.h"
 #include "tests/support/client/HttpClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -24,9 +25,9 @@ class MemoryTest : public testing::Test {
 };
 
 TEST_F(MemoryTest, OutlivesBodiesThatItHasNoMemoryFor) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "a sanitizer ends the program where memory runs out";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "a sanitizer ends the program where memory runs out";
+  }
   Cimomd cimomd(options());
   ASSERT_TRUE(answers(cimomd));
   const std::string id = std::to_string(cimomd.process().id());

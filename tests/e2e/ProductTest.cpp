@@ -9,6 +9,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -20,7 +21,7 @@ using testing::Not;
 using testing::SizeIs;
 using testing::StartsWith;
 
-constexpr const char* library = BINARY_DIR "/lib/libcompositeipconfigprovider.so.1";
+const std::string library = built("lib/libcompositeipconfigprovider.so.1");
 
 TEST(CompositeLibraryTest, ExportsExactlyItsEighteenFactories) {
   std::set<std::string> found;
@@ -48,7 +49,7 @@ TEST(CompositeLibraryTest, ExportsExactlyItsEighteenFactories) {
 
 TEST(CompositeLibraryTest, IsNamedAsObjectManagersAndLoadersFindIt) {
   EXPECT_THAT(run({"readelf", "-d", library}).output, HasSubstr("Library soname: [libcompositeipconfigprovider.so.1]"));
-  EXPECT_EQ(std::filesystem::canonical(BINARY_DIR "/lib/libcompositeipconfigprovider.so"),
+  EXPECT_EQ(std::filesystem::canonical(built("lib/libcompositeipconfigprovider.so")),
             std::filesystem::canonical(library));
 }
 

@@ -11,6 +11,7 @@
 #include "tests/support/client/Cimomd.h"
 #include "tests/support/client/HttpClient.h"
 #include "tests/support/client/WbemClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -53,7 +54,7 @@ class SecurityTest : public testing::Test {
 
   static Completed start(const std::vector<std::string>& more) {
     std::vector<std::string> command = options(more);
-    command.insert(command.begin(), {BINARY_DIR "/bin/cimomd", "--config", "/dev/null", "--port", "0"});
+    command.insert(command.begin(), {built("bin/cimomd"), "--config", "/dev/null", "--port", "0"});
     return run(command);
   }
 
@@ -217,7 +218,7 @@ TEST_F(SecurityTest, WarnsOfRunningAsRoot) {
     GTEST_SKIP() << "needs root";
   }
   std::vector<std::string> command = options({"--config", "/dev/null", "--port", "0"});
-  command.insert(command.begin(), BINARY_DIR "/bin/cimomd");
+  command.insert(command.begin(), built("bin/cimomd"));
   Process cimomd(command);
   EXPECT_TRUE(cimomd.readLine().starts_with("listening on "));
   EXPECT_THAT(cimomd.errors(), HasSubstr("runs as root: user = NAME"));
@@ -230,8 +231,9 @@ TEST_F(SecurityTest, BecomesTheUserThatItIsToRunAs) {
   // What it serves is there for that user to read.
   std::filesystem::permissions(directory_.path(), std::filesystem::perms::others_all,
                                std::filesystem::perm_options::add);
-  for (const char* file : {SOURCE_DIR "/tests/support/probe/Probe.mof", SOURCE_DIR "/tests/support/probe/Probe.reg",
-                           BINARY_DIR "/lib/libcimomprobe.so", BINARY_DIR "/lib/libinstanceonly.so"}) {
+  const std::string probe = SOURCE_DIR "/tests/support/probe/Probe";
+  for (const std::string& file :
+       {probe + ".mof", probe + ".reg", built("lib/libcimomprobe.so"), built("lib/libinstanceonly.so")}) {
     std::filesystem::copy(file, directory_.path());
   }
   Cimomd cimomd({"--schema", directory_ / "Probe.mof", "--registration", directory_ / "Probe.reg", "--provider-dir",

@@ -7,6 +7,7 @@
 #include <filesystem>
 
 #include "tests/support/client/Cimomd.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -74,8 +75,8 @@ TEST_F(ShutdownTest, HearsSigtermWhileItStarts) {
   // Nobody ever writes the schema that it reads.
   const std::string schema = directory_ / "never.mof";
   ASSERT_EQ(mkfifo(schema.c_str(), 0600), 0);
-  Process cimomd({BINARY_DIR "/bin/cimomd", "--config", "/dev/null", "--port", "0", "--schema", schema,
-                  "--registration", SOURCE_DIR "/tests/support/probe/Probe.reg", "--provider-dir", BINARY_DIR "/lib"});
+  Process cimomd({built("bin/cimomd"), "--config", "/dev/null", "--port", "0", "--schema", schema, "--registration",
+                  SOURCE_DIR "/tests/support/probe/Probe.reg", "--provider-dir", built("lib")});
   // It waits there with its signals blocked: "SigBlk: 0000000000004003" of SIGHUP, SIGINT and SIGTERM.
   const std::string status = "/proc/" + std::to_string(cimomd.id()) + "/status";
   ASSERT_TRUE(poll([&] { return readFile(status).find("SigBlk:\t0000000000004003") != std::string::npos; }));
@@ -114,9 +115,9 @@ TEST_F(ShutdownTest, SaysThatAProviderDidNotAnswerInTime) {
 }
 
 TEST_F(ShutdownTest, OutlivesAProviderThatEndsTheThreadOfItsRequest) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
+  }
   Cimomd cimomd(Cimomd::probeOptions(), environment());
   for (int i = 0; i < 3; ++i) {
     const Completed ended = cimomd.wbemcli({"cm"}, "TEST_Machine.Name=\"one\"", {"Exit"});

@@ -8,16 +8,13 @@
 #include <set>
 
 #include "tests/faults/Campaign.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
 using namespace Testing;
 
-#ifdef SANITIZED
-constexpr std::size_t shareOfPoints = 151;
-#else
-constexpr std::size_t shareOfPoints = 29;
-#endif
+const std::size_t shareOfPoints = sanitized() ? 401 : 29;
 
 // Of all tests that ran, printed at their end.
 class Sum : public ::testing::Environment {

@@ -10,7 +10,7 @@
 namespace Testing {
 namespace {
 
-constexpr const char* file = SOURCE_DIR "/docs/object-managers.md";
+constexpr const char* guide = SOURCE_DIR "/docs/object-managers.md";
 
 // A message as the document words it, as a pattern for what is said in fact.
 std::regex patternOf(const std::string& wording) {
@@ -22,13 +22,13 @@ std::regex patternOf(const std::string& wording) {
 
 }  // namespace
 
-Guide::Guide() : text_(readFile(file)) {}
+Guide::Guide() : text_(readFile(guide)) {}
 
 std::string Guide::commands(const std::string& step) const {
   const std::string opening = "\n```sh " + step + "\n";
   const auto begin = text_.find(opening);
   if (begin == std::string::npos) {
-    throw std::runtime_error(std::string(file) + " has no step \"" + step + '"');
+    throw std::runtime_error(std::string(guide) + " has no step \"" + step + '"');
   }
   const auto first = begin + opening.size();
   return text_.substr(first, text_.find("```", first) - first);

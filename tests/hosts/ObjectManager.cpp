@@ -16,6 +16,7 @@
 #include "tests/hosts/OpenPegasus.h"
 #include "tests/hosts/Sfcb.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -101,8 +102,8 @@ std::string ObjectManager::missing() const {
   }
   for (const char* file : {"cmake_install.cmake", "lib/libcompositeipconfigprovider.so.1",
                            "lib/libunderlyingipconfigprovider.so.1", "lib/libqvinstrumentation.so.1"}) {
-    if (!fs::exists(fs::path(BINARY_DIR) / file)) {
-      return std::string(BINARY_DIR "/") + file + " is not there: build the project first";
+    if (!fs::exists(built(file))) {
+      return built(file) + " is not there: build the project first";
     }
   }
   return {};
@@ -114,7 +115,7 @@ Environment ObjectManager::environment() const {
 }
 
 std::map<std::string, std::string> ObjectManager::differences() const {
-  return {{"build/default", BINARY_DIR},
+  return {{"build/default", buildDirectory()},
           {"/etc/compositeipconfig", CONFIGURATION_DIR},
           {"/usr/local", INSTALL_PREFIX},
           {":5988", ":" + std::to_string(port_)}};

@@ -9,6 +9,7 @@
 #include "tests/hosts/Guide.h"
 #include "tests/hosts/HostProcesses.h"
 #include "tests/support/client/WbemClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
@@ -21,7 +22,7 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::StartsWith;
 
-constexpr const char* program = BINARY_DIR "/bin/hosts_test";
+const std::string program = built("bin/hosts_test");
 constexpr const char* privateMachine = SOURCE_DIR "/tests/hosts/private-machine";
 
 TEST(HostsProgramTest, IsSkippedWithALineWhereNoObjectManagerIsGiven) {

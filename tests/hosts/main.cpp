@@ -12,6 +12,7 @@
 
 #include "Paths.h"
 #include "tests/hosts/HostTest.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -28,8 +29,8 @@ int fail(const std::string& reason) {
 // Runs the program once more, on a private machine. Comes back only if that cannot be.
 int enterPrivateMachine(char** argv, const std::string& prefix) {
   setenv(insideVariable, "1", 1);
-  std::vector<std::string> command = {SOURCE_DIR "/tests/hosts/private-machine", prefix, INSTALL_PREFIX, BINARY_DIR,
-                                      "--"};
+  std::vector<std::string> command = {SOURCE_DIR "/tests/hosts/private-machine", prefix, INSTALL_PREFIX,
+                                      buildDirectory(), "--"};
   for (char** argument = argv; *argument; ++argument) {
     command.emplace_back(*argument);
   }

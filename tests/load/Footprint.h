@@ -8,6 +8,8 @@
 #include <string>
 #include <vector>
 
+#include "tests/support/system/Build.h"
+
 namespace Testing {
 
 // What it has in memory, in KiB, and the most that it ever had.
@@ -16,11 +18,7 @@ long peakResidentKib(pid_t process);
 
 // How much more it may have at the end: an allocator grows in steps, and the sanitizers keep what has been freed and
 // where it came from.
-#ifdef SANITIZED
-inline constexpr long toleratedKib = 256 << 10;
-#else
-inline constexpr long toleratedKib = 2 << 10;
-#endif
+inline const long toleratedKib = sanitized() ? 256 << 10 : 2 << 10;
 
 // What its descriptors lead to, sorted: "socket", "/var/log/agent.log" and the like.
 std::vector<std::string> descriptorsOf(pid_t process);

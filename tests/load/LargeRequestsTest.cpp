@@ -13,21 +13,17 @@
 #include "tests/load/CimClient.h"
 #include "tests/load/Footprint.h"
 #include "tests/support/client/Cimomd.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
 
 using namespace Testing;
 
-constexpr std::size_t clients = 60;
+const std::size_t clients = sanitized() ? 12 : 60;
 constexpr std::size_t bytes = 3U << 20U;
-#ifdef SANITIZED
-constexpr long mostKib = 4L << 20U;
-constexpr long mostKibLeft = mostKib;
-#else
-constexpr long mostKib = 300L << 10U;
-constexpr long mostKibLeft = 30L << 10U;
-#endif
+const long mostKib = sanitized() ? 4L << 20U : 300L << 10U;
+const long mostKibLeft = sanitized() ? mostKib : 30L << 10U;
 
 class LargeRequestsTest : public testing::TestWithParam<const char*> {};
 

@@ -10,12 +10,12 @@ namespace {
 using namespace Testing;
 
 // The model, and whether what is unusable is a null pointer or an object without a handle.
-using Parameter = std::tuple<AssociationModel, bool>;
+using Parameter = std::tuple<AssociationParameter, bool>;
 
 class AssociationBuilderFailureTest : public AssociationTest, public ::testing::WithParamInterface<Parameter> {
  protected:
   AssociationBuilderFailureTest() {
-    attach(std::get<0>(GetParam()));
+    attach(*std::get<0>(GetParam()).model);
     addEnds(model().outerNames, model().innerNames);  // three of each
   }
 
@@ -96,9 +96,9 @@ TEST_P(AssociationBuilderFailureTest, AnInstanceOfTheAssociationCannotBeMade) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderFailureTest,
-                         ::testing::Combine(::testing::ValuesIn(associationModels()), ::testing::Bool()),
+                         ::testing::Combine(::testing::ValuesIn(associationParameters()), ::testing::Bool()),
                          [](const auto& parameter) {
-                           return std::get<0>(parameter.param).className +
+                           return std::get<0>(parameter.param).model->className +
                                   (std::get<1>(parameter.param) ? "_null" : "_withoutHandle");
                          });
 

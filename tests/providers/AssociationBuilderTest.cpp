@@ -6,9 +6,9 @@ namespace {
 
 using namespace Testing;
 
-class AssociationBuilderTest : public AssociationTest, public ::testing::WithParamInterface<AssociationModel> {
+class AssociationBuilderTest : public AssociationTest, public ::testing::WithParamInterface<AssociationParameter> {
  protected:
-  AssociationBuilderTest() { attach(GetParam()); }
+  AssociationBuilderTest() { attach(*GetParam().model); }
 
   // "outer -> inner" of every instance.
   Strings pairs() const {
@@ -167,7 +167,7 @@ TEST_P(AssociationBuilderTest, EndsWithoutPathAreSkipped) {
   EXPECT_EQ(unitLines(), framed(model().builderName));
 }
 
-INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderTest, ::testing::ValuesIn(associationModels()),
-                         [](const auto& parameter) { return parameter.param.className; });
+INSTANTIATE_TEST_SUITE_P(Six, AssociationBuilderTest, ::testing::ValuesIn(associationParameters()),
+                         [](const auto& parameter) { return parameter.param.model->className; });
 
 }  // namespace

@@ -4,7 +4,7 @@
 namespace Testing {
 
 AssociationDirectionTest::AssociationDirectionTest() {
-  attach(std::get<0>(GetParam()));
+  attach(*std::get<0>(GetParam()).model);
   if (!model().pairsByIdentifier) {
     farNames = {"BMC:one:far", "BMC:two:far", "BMC:three:far"};
   } else if (farIsA()) {

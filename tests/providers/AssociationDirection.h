@@ -10,7 +10,7 @@
 namespace Testing {
 
 // The association, and whether the far end is end A.
-using Direction = std::tuple<AssociationModel, bool>;
+using Direction = std::tuple<AssociationParameter, bool>;
 
 class AssociationDirectionTest : public AssociationTest, public ::testing::WithParamInterface<Direction> {
  protected:
@@ -37,9 +37,9 @@ class AssociationDirectionTest : public AssociationTest, public ::testing::WithP
 
 }  // namespace Testing
 
-#define INSTANTIATE_DIRECTIONS(test)                                                                            \
-  INSTANTIATE_TEST_SUITE_P(                                                                                     \
-      Twelve, test, ::testing::Combine(::testing::ValuesIn(Testing::associationModels()), ::testing::Bool()),   \
-      [](const auto& parameter) {                                                                               \
-        return std::get<0>(parameter.param).className + (std::get<1>(parameter.param) ? "_toEndA" : "_toEndB"); \
+#define INSTANTIATE_DIRECTIONS(test)                                                                                   \
+  INSTANTIATE_TEST_SUITE_P(                                                                                            \
+      Twelve, test, ::testing::Combine(::testing::ValuesIn(Testing::associationParameters()), ::testing::Bool()),      \
+      [](const auto& parameter) {                                                                                      \
+        return std::get<0>(parameter.param).model->className + (std::get<1>(parameter.param) ? "_toEndA" : "_toEndB"); \
       })

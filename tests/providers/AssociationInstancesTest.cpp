@@ -8,9 +8,9 @@ namespace {
 
 using namespace Testing;
 
-class AssociationInstancesTest : public AssociationTest, public ::testing::WithParamInterface<AssociationModel> {
+class AssociationInstancesTest : public AssociationTest, public ::testing::WithParamInterface<AssociationParameter> {
  protected:
-  AssociationInstancesTest() { attach(GetParam()); }
+  AssociationInstancesTest() { attach(*GetParam().model); }
 
   void addThreeOfEach() { addEnds(model().outerNames, model().innerNames); }
   CMPIObjectPath* classPath() { return makePath(model().className); }
@@ -264,7 +264,7 @@ TEST_P(AssociationInstancesTest, AnEnumerationThatTheBrokerRefusesAnswersNothing
   }
 }
 
-INSTANTIATE_TEST_SUITE_P(Six, AssociationInstancesTest, ::testing::ValuesIn(associationModels()),
-                         [](const auto& parameter) { return parameter.param.className; });
+INSTANTIATE_TEST_SUITE_P(Six, AssociationInstancesTest, ::testing::ValuesIn(associationParameters()),
+                         [](const auto& parameter) { return parameter.param.model->className; });
 
 }  // namespace

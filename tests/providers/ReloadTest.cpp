@@ -13,13 +13,14 @@
 #include "tests/support/broker/Faults.h"
 #include "tests/support/broker/Personality.h"
 #include "tests/support/composite/Units.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
 
 using namespace Testing;
 
-constexpr const char* library = COMPOSITE_LIBRARY;
+const std::string library = built("lib/libcompositeipconfigprovider.so.1");
 
 struct Registered {
   std::string className;
@@ -78,7 +79,7 @@ class ReloadTest : public ::testing::Test {
 TEST_F(ReloadTest, ServesAfterEveryLoadingAndLeavesTheProcessWhenItIsUnloaded) {
   for (int loading = 1; loading <= 3; ++loading) {
     SCOPED_TRACE(loading);
-    void* handle = ::dlopen(library, personality().loadFlags);
+    void* handle = ::dlopen(library.c_str(), personality().loadFlags);
     ASSERT_NE(handle, nullptr) << ::dlerror();
     for (const Registered& registered : registrations()) {
       SCOPED_TRACE(registered.className);
@@ -98,7 +99,7 @@ TEST_F(ReloadTest, ServesAfterEveryLoadingAndLeavesTheProcessWhenItIsUnloaded) {
       }
     }
     ASSERT_EQ(::dlclose(handle), 0);
-    EXPECT_EQ(::dlopen(library, RTLD_LAZY | RTLD_NOLOAD), nullptr) << "still loaded";
+    EXPECT_EQ(::dlopen(library.c_str(), RTLD_LAZY | RTLD_NOLOAD), nullptr) << "still loaded";
   }
 }
 

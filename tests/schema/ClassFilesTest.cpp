@@ -12,6 +12,7 @@
 #include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 #include "tests/schema/ClassText.h"
+#include "tests/support/system/Build.h"
 
 namespace Testing {
 
@@ -31,7 +32,7 @@ constexpr const char* objectManagers[] = {"cimomd", "sfcb", "pegasus"};
 constexpr const char* sets[] = {"CompositeIPConfig", "UnderlyingIPConfig"};
 
 std::filesystem::path fileOf(const std::string& objectManager, const std::string& name) {
-  return std::filesystem::path(BINARY_DIR "/share") / objectManager / name;
+  return std::filesystem::path(built("share")) / objectManager / name;
 }
 
 // A MOF file, read with the DMTF's qualifiers known.

@@ -8,6 +8,7 @@
 
 #include "Paths.h"
 #include "tests/support/client/WbemClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -32,10 +33,10 @@ class RegisterTest : public testing::Test {
     fs::create_directories(programs());
     fs::create_directories((programs() / CLASSES_FROM_PROGRAM).lexically_normal().parent_path());
     fs::create_directories((programs() / PROVIDERS_FROM_PROGRAM).lexically_normal().parent_path());
-    fs::copy_file(BINARY_DIR "/bin/compositeipconfig-register", program());
-    fs::create_symlink(BINARY_DIR "/bin/cimomd", programs() / "cimomd");
-    fs::create_directory_symlink(BINARY_DIR "/share", programs() / CLASSES_FROM_PROGRAM);
-    fs::create_directory_symlink(BINARY_DIR "/lib", programs() / PROVIDERS_FROM_PROGRAM);
+    fs::copy_file(built("bin/compositeipconfig-register"), program());
+    fs::create_symlink(built("bin/cimomd"), programs() / "cimomd");
+    fs::create_directory_symlink(built("share"), programs() / CLASSES_FROM_PROGRAM);
+    fs::create_directory_symlink(built("lib"), programs() / PROVIDERS_FROM_PROGRAM);
     tree_.write("agent.ini", "[processor]\nbackend = simulated\n[simulated]\nstate = " + (tree_ / "processor.json"));
   }
 
@@ -127,7 +128,7 @@ TEST_F(RegisterAsRootTest, FindsTheProvidersOfTheArchitectureThatIsThere) {
   fs::remove(programs() / PROVIDERS_FROM_PROGRAM);
   const fs::path others = programs().parent_path() / "lib/another-architecture/cmpi";
   fs::create_directories(others.parent_path());
-  fs::create_directory_symlink(BINARY_DIR "/lib", others);
+  fs::create_directory_symlink(built("lib"), others);
   EXPECT_THAT(enter("register -t cimomd; cat $ini").output, HasSubstr("provider-dir = " + others.string() + '\n'));
 }
 

@@ -11,6 +11,7 @@
 #include <memory>
 
 #include "agent/processor/BackEnd.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
@@ -22,7 +23,7 @@ using SharedBackEnd = std::shared_ptr<BackEnd>();
 class BackEndChoiceTest : public testing::Test {
  protected:
   BackEndChoiceTest() {
-    std::filesystem::copy_file(INSTRUMENTATION, library_);
+    std::filesystem::copy_file(built("lib/libqvinstrumentation.so"), library_);
     ::setenv("QV_AGENT_INI", ini_.c_str(), 1);
   }
   ~BackEndChoiceTest() override { ::unsetenv("QV_AGENT_INI"); }
@@ -95,7 +96,7 @@ TEST_F(BackEndChoiceTest, IsLoggedOnceWhereItIsTheSimulatedProcessor) {
 }
 
 TEST_F(BackEndChoiceTest, GivesTheProcessorItsConfiguredNames) {
-  std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
+  std::filesystem::copy_file(built("lib/libstand_in_back_end.so"), ipmi_);
   choose("[processor]\nbackend = ipmi\nname = a\ndescription = b\n[ipmi]\nname = loaded\n");
   expect(describe, "^a: b$");
 }
@@ -108,13 +109,13 @@ TEST_F(BackEndChoiceTest, SaysOfASimulatedProcessorWhatItIsUnderAnyDescription) 
 }
 
 TEST_F(BackEndChoiceTest, LoadsTheIpmiBackEndFromBesideTheLibraryAndPassesItItsSettings) {
-  std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
+  std::filesystem::copy_file(built("lib/libstand_in_back_end.so"), ipmi_);
   choose("[processor]\nbackend = ipmi\n[ipmi]\nname = loaded\n");
   expect(describe, "^loaded: a stand-in$");
 }
 
 TEST_F(BackEndChoiceTest, PassesOnWhyTheIpmiBackEndRefusesItsSettings) {
-  std::filesystem::copy_file(STAND_IN_BACK_END, ipmi_);
+  std::filesystem::copy_file(built("lib/libstand_in_back_end.so"), ipmi_);
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^/.*/agent.ini: .ipmi. name = : the key is missing and has no default$");
   choose("[processor]\nbackend = ipmi\n[ipmi]\nname = loaded\ncolour = red\n");
@@ -128,7 +129,7 @@ TEST_F(BackEndChoiceTest, TellsWhyTheIpmiBackEndCannotBeLoaded) {
 }
 
 TEST_F(BackEndChoiceTest, TellsThatALibraryIsNoBackEnd) {
-  std::filesystem::copy_file(INSTRUMENTATION, ipmi_);
+  std::filesystem::copy_file(built("lib/libqvinstrumentation.so"), ipmi_);
   choose("[processor]\nbackend = ipmi\n");
   expect(describe, "^the back end ipmi cannot be used: .*qvCreateBackEnd");
 }

@@ -10,6 +10,7 @@
 #include <string>
 
 #include "tests/agent/log/FrameLines.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Callgrind.h"
 #include "tests/support/system/SystemCalls.h"
 #include "tests/support/system/TemporaryDirectory.h"
@@ -33,7 +34,8 @@ class LogCostTest : public testing::Test {
 
 TEST_F(LogCostTest, OfALineIsFewInstructions) {
   constexpr int lines = 2000;
-  const double perLine = costsOf({LOG_COST, std::to_string(lines)}, environment_).at("lines").instructions / lines;
+  const double perLine =
+      costsOf({built("bin/log_cost"), std::to_string(lines)}, environment_).at("lines").instructions / lines;
   std::cout << perLine << " instructions a line\n";
   EXPECT_GT(perLine, 0);
   EXPECT_LT(perLine, mostInstructions);

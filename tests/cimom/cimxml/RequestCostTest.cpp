@@ -8,6 +8,7 @@
 #include <string>
 
 #include "tests/cimom/cimxml/CostlyRequests.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Callgrind.h"
 
 namespace {
@@ -33,7 +34,7 @@ constexpr double mostAllocationsOfInstance = 25;
 
 // By how much one request raises the memory of a process of its own.
 long peakKib(const std::string& name, std::size_t bytes) {
-  const Completed completed = run({REQUEST_COST, std::to_string(bytes), name});
+  const Completed completed = run({built("bin/request_cost"), std::to_string(bytes), name});
   EXPECT_EQ(completed.status, 0) << completed.errors;
   std::istringstream words(completed.output);
   int status = 0;
@@ -43,8 +44,8 @@ long peakKib(const std::string& name, std::size_t bytes) {
 }
 
 TEST(RequestCostTest, ProcessorTimeIsBoundedAndGrowsWithTheSize) {
-  const auto ofSmallest = costsOf({REQUEST_COST, std::to_string(smallest)});
-  const auto ofSmall = costsOf({REQUEST_COST, std::to_string(small)});
+  const auto ofSmallest = costsOf({built("bin/request_cost"), std::to_string(smallest)});
+  const auto ofSmall = costsOf({built("bin/request_cost"), std::to_string(small)});
   for (const CostlyRequest& request : costlyRequests()) {
     SCOPED_TRACE(request.name);
     ASSERT_TRUE(ofSmallest.contains(request.name) && ofSmall.contains(request.name));
@@ -68,7 +69,9 @@ TEST(RequestCostTest, MemoryIsBounded) {
   }
 }
 
-Cost enumerationOf(int instances) { return costsOf({ENUMERATION_COST, std::to_string(instances)}).at("answer"); }
+Cost enumerationOf(int instances) {
+  return costsOf({built("bin/enumeration_cost"), std::to_string(instances)}).at("answer");
+}
 
 TEST(RequestCostTest, AnInstanceTakesFewInstructionsAndAllocations) {
   const Cost few = enumerationOf(34);

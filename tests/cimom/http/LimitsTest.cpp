@@ -13,6 +13,7 @@
 #include "cimom/http/Server.h"
 #include "ground/Descriptor.h"
 #include "tests/support/client/HttpClient.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -217,9 +218,9 @@ TEST_F(LimitsTest, PassesTheTimeOfItsAnswerToTheHandler) {
 }
 
 TEST_F(LimitsTest, OutlivesAHandlerThatEndsItsThread) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
+  }
   options_.maxRequests = 1;
   start([](const Request& request) {
     if (request.path == "/exit") {
@@ -240,9 +241,9 @@ TEST_F(LimitsTest, OutlivesAHandlerThatEndsItsThread) {
 thread_local std::string culprit;
 
 TEST_F(LimitsTest, SaysWhoEndedTheThreadOfTheRequest) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "the sanitizers do not follow the unwinding of a thread";
+  }
   options_.threadEnd = []() -> const std::string& { return culprit; };
   start([](const Request& request) -> Response {
     culprit = request.path == "/unknown" ? "" : "provider TST_Other did";
@@ -309,9 +310,9 @@ class DescriptorLimitTest : public LimitsTest {
 };
 
 TEST_F(DescriptorLimitTest, ShedsClientsWithoutSpinningWhereThereAreNoDescriptors) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "the sanitizers look at memory through descriptors of their own";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "the sanitizers look at memory through descriptors of their own";
+  }
   start();
   // The clients share the process, so that the descriptors are gone before the server has its own.
   const Ground::Descriptor last("/dev/null", O_RDONLY);

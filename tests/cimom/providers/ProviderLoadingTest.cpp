@@ -2,6 +2,7 @@
 #include "Paths.h"
 #include "tests/support/broker/ManagedElements.h"
 #include "tests/support/broker/RecordingProvider.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
@@ -16,9 +17,9 @@ class ProviderLoadingTest : public testing::Test {
  protected:
   ProviderLoadingTest() {
     manager.loadSchemaText(testSchema, testNamespace);
+    directory.write("libgarbage.so", "not a library\n");
     manager.addProviderDirectory(directory.path());
-    manager.addProviderDirectory(GARBAGE_DIRECTORY);
-    manager.addProviderDirectory(PROVIDER_DIRECTORY);
+    manager.addProviderDirectory(built("lib"));
   }
 
   void registerProvider(const std::string& provider, const std::string& location,

@@ -8,6 +8,7 @@
 #include "cimom/broker/ProviderFrame.h"
 #include "tests/support/broker/ManagedElements.h"
 #include "tests/support/broker/RecordingProvider.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -83,9 +84,9 @@ TEST_F(ProviderGuardTest, ExitThreadOfALowerProviderFailsTheUpCallOnly) {
 }
 
 TEST_F(ProviderGuardTest, AThreadThatAProviderEndsPastTheBrokerIsUnwoundAsAWhole) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
+  }
   // Given a provider whose lower provider ends the thread, two up-calls below the request
   answer([&](const CMPIContext* given, const CMPIResult*) {
     CMPIStatus lower = ok;
@@ -292,17 +293,17 @@ TEST_F(CleanUpTest, AProviderThatMustStayLoadedIsNoFailure) {
 }
 
 TEST_F(CleanUpTest, AThreadThatItEndsIsLogged) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "the address sanitizer does not follow the unwinding of a thread";
+  }
   EXPECT_THAT(cleanedUp([]() -> CMPIStatus { pthread_exit(nullptr); }),
               ElementsAre("cimomd: the clean-up of provider TST_Processor ended its thread"));
 }
 
 TEST_F(CleanUpTest, NobodyWaitsLongForWhatHangsAndItMayStillUseTheBroker) {
-#ifdef SANITIZED
-  GTEST_SKIP() << "what is left to a clean-up that hangs is a leak";
-#endif
+  if (sanitized()) {
+    GTEST_SKIP() << "what is left to a clean-up that hangs is a leak";
+  }
   // Given a clean-up that goes on until it is let go, and uses the broker then
   static std::atomic<bool> go;
   static std::atomic<CMPIrc> later;

@@ -9,6 +9,7 @@
 #include <stdexcept>
 
 #include "Paths.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 
 namespace Testing {
@@ -58,7 +59,7 @@ Cimomd::~Cimomd() {
 std::vector<std::string> Cimomd::probeOptions() {
   return {"--schema",       SOURCE_DIR "/tests/support/probe/Probe.mof",
           "--registration", SOURCE_DIR "/tests/support/probe/Probe.reg",
-          "--provider-dir", BINARY_DIR "/lib"};
+          "--provider-dir", built("lib")};
 }
 
 std::string Cimomd::url(const std::string& object, const std::string& nameSpace) const {

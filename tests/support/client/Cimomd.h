@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "Paths.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 
 namespace Testing {
@@ -17,7 +17,7 @@ class Cimomd {
   // Waits until it listens. Throws std::runtime_error with what it wrote to the standard error where it ends instead.
   // @param options further options; --port is given already
   explicit Cimomd(const std::vector<std::string>& options, const Environment& environment = {},
-                  const std::string& program = BINARY_DIR "/bin/cimomd");
+                  const std::string& program = built("bin/cimomd"));
   ~Cimomd();
 
   // Options with which it serves the probe provider and its classes, in root/test.

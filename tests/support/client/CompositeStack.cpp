@@ -4,7 +4,7 @@
 #include <fstream>
 #include <iterator>
 
-#include "Paths.h"
+#include "tests/support/system/Build.h"
 
 namespace Testing {
 std::string contentOf(const std::filesystem::path& file) {
@@ -22,10 +22,10 @@ CompositeStack::CompositeStack(const std::string& processor, int logThreshold, c
 }
 
 std::vector<std::string> CompositeStack::options() {
-  return {"--schema",       BINARY_DIR "/share/cimomd",
-          "--registration", BINARY_DIR "/share/cimomd/CompositeIPConfig.reg",
-          "--registration", BINARY_DIR "/share/cimomd/UnderlyingIPConfig.reg",
-          "--provider-dir", BINARY_DIR "/lib"};
+  return {"--schema",       built("share/cimomd"),
+          "--registration", built("share/cimomd/CompositeIPConfig.reg"),
+          "--registration", built("share/cimomd/UnderlyingIPConfig.reg"),
+          "--provider-dir", built("lib")};
 }
 
 std::string CompositeStack::log() const { return contentOf(directory_.path() / "agent.log"); }

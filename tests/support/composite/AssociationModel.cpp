@@ -216,6 +216,16 @@ const AssociationModel& modelOf(const std::string& className) {
   throw std::invalid_argument("no association is called " + className);
 }
 
-std::ostream& operator<<(std::ostream& stream, const AssociationModel& model) { return stream << model.className; }
+std::vector<AssociationParameter> associationParameters() {
+  std::vector<AssociationParameter> parameters;
+  for (const AssociationModel& model : associationModels()) {
+    parameters.push_back({&model});
+  }
+  return parameters;
+}
+
+std::ostream& operator<<(std::ostream& stream, const AssociationParameter& parameter) {
+  return stream << parameter.model->className;
+}
 
 }  // namespace Testing

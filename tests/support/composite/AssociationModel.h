@@ -63,6 +63,11 @@ struct AssociationModel {
 const std::vector<AssociationModel>& associationModels();
 const AssociationModel& modelOf(const std::string& className);
 
-std::ostream& operator<<(std::ostream& stream, const AssociationModel& model);
+// One of them as a test's parameter, which is copied for every case.
+struct AssociationParameter {
+  const AssociationModel* model;
+};
+std::vector<AssociationParameter> associationParameters();
+std::ostream& operator<<(std::ostream& stream, const AssociationParameter& parameter);
 
 }  // namespace Testing

@@ -5,8 +5,8 @@
 
 #include <cstdlib>
 
-#include "Paths.h"
 #include "tests/support/agent/SimulatedBmc.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -69,12 +69,12 @@ TEST_F(IpmiAgentTest, ShowsAndChangesTheBmcsInterface) {
 }
 
 TEST(IpmiBackEndLibraryTest, ExportsItsFactoryAlone) {
-  const std::string symbols = run({"nm", "-D", "--defined-only", IPMI_BACK_END}).output;
+  const std::string symbols = run({"nm", "-D", "--defined-only", built("lib/libqvbmc-ipmi.so")}).output;
   EXPECT_THAT(symbols, testing::MatchesRegex("[0-9a-f]+ T qvCreateBackEnd\n"));
 }
 
 TEST(IpmiBackEndLibraryTest, IsNotLinkedByTheInstrumentation) {
-  const std::string symbols = run({"readelf", "-d", BINARY_DIR "/lib/libqvinstrumentation.so"}).output;
+  const std::string symbols = run({"readelf", "-d", built("lib/libqvinstrumentation.so")}).output;
   EXPECT_THAT(symbols, testing::AllOf(testing::HasSubstr("NEEDED"), testing::Not(testing::HasSubstr("freeipmi"))));
 }
 

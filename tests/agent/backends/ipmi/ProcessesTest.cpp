@@ -5,6 +5,7 @@
 
 #include "tests/support/agent/SimulatedBmc.h"
 #include "tests/support/agent/UdpRelay.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Poll.h"
 #include "tests/support/system/Process.h"
 
@@ -22,7 +23,7 @@ class IpmiProcessesTest : public testing::Test {
       text += key + " = " + value + '\n';
     }
     writeFile(directory / ini, text);
-    return {"env", "QV_AGENT_INI=" + (directory / ini), AGENT_CLIENT};
+    return {"env", "QV_AGENT_INI=" + (directory / ini), built("bin/agent_client")};
   }
 
   static std::string ask(Process& process, const std::string& line) {

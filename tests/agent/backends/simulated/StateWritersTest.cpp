@@ -10,6 +10,7 @@
 
 #include "agent/backends/simulated/SimulatedBackEnd.h"
 #include "tests/support/agent/Addresses.h"
+#include "tests/support/system/Build.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -20,7 +21,7 @@ using namespace Testing;
 
 std::vector<std::string> writer(const std::string& state, const std::string& interface, const std::string& network,
                                 int changes) {
-  return {STATE_WRITER, state, interface, network, std::to_string(changes)};
+  return {built("bin/state_writer"), state, interface, network, std::to_string(changes)};
 }
 
 TEST(StateWritersTest, ThatAreKilledAtAnyMomentLeaveTheOldStateOrTheNewOne) {

@@ -20,6 +20,7 @@
 #include "tests/support/agent/RecordingLog.h"
 #include "tests/support/agent/SimulatedBmc.h"
 #include "tests/support/agent/UdpRelay.h"
+#include "tests/support/system/Build.h"
 
 namespace {
 
@@ -50,11 +51,7 @@ constexpr int attempts = 3;
 constexpr auto patience = 30s;
 
 // Of all points, one in so many.
-#ifdef SANITIZED
-constexpr unsigned share = 53;
-#else
-constexpr unsigned share = 11;
-#endif
+const unsigned share = sanitized() ? 53 : 11;
 
 const std::string& chosen() {
   static const std::string choice = [] {
