@@ -4,16 +4,17 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <regex>
 #include <set>
 
 #include "bench/Page.h"
+#include "tests/support/system/Pattern.h"
 
 namespace {
 
 using namespace Benchmark;
 using testing::HasSubstr;
 using testing::Not;
+using Testing::Pattern;
 
 Results measured() {
   Results results;
@@ -85,16 +86,14 @@ TEST(PageTest, ShowsWhatAnInstanceCostsAtEachSize) {
 
 TEST(PlotTest, ShowsEachSeriesGrowingWithinThePicture) {
   const std::string plot = plotOf(measured());
-  const std::regex polyline("<polyline points=\"([^\"]*)\"");
   int series = 0;
-  for (std::sregex_iterator found(plot.begin(), plot.end(), polyline), end; found != end; ++found, ++series) {
-    const std::string points = (*found)[1];
-    const std::regex point(R"((\d+),(\d+))");
+  for (const Pattern::Match& polyline : Pattern("<polyline points=\"([^\"]*)\"").all(plot)) {
+    ++series;
     std::vector<int> across;
     std::vector<int> down;
-    for (std::sregex_iterator one(points.begin(), points.end(), point); one != end; ++one) {
-      across.push_back(std::stoi((*one)[1]));
-      down.push_back(std::stoi((*one)[2]));
+    for (const Pattern::Match& point : Pattern(R"((\d+),(\d+))").all(polyline[1])) {
+      across.push_back(std::stoi(point[1]));
+      down.push_back(std::stoi(point[2]));
     }
     ASSERT_EQ(across.size(), 3u);
     EXPECT_TRUE(std::ranges::is_sorted(across));

@@ -3,9 +3,9 @@
 
 #include <filesystem>
 #include <functional>
-#include <regex>
 
 #include "tests/bmcip/BmcipTest.h"
+#include "tests/support/system/Pattern.h"
 
 namespace {
 
@@ -50,9 +50,8 @@ TEST_F(BmcipModelTest, DrawsAPicture) {
   EXPECT_EQ(count(svg, "class=\"edge\""), 23U + 0U);
   EXPECT_EQ(bmcip({"model", "--svg", "-"}).output, svg);
   const auto ordinateOf = [&](const std::string& name) {
-    std::smatch found;
-    const std::regex text("y=\"(-?[0-9.]+)\"[^>]*>" + name + "</text>");
-    return std::regex_search(svg, found, text) ? std::stod(found[1]) : 0;
+    const Pattern::Match found = Pattern("y=\"(-?[0-9.]+)\"[^>]*>" + name + "</text>").first(svg);
+    return found.empty() ? 0 : std::stod(found[1]);
   };
   EXPECT_LT(ordinateOf("eth0"), ordinateOf("eth1"));
 }

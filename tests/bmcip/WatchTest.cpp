@@ -2,11 +2,11 @@
 #include <gmock/gmock.h>
 
 #include <csignal>
-#include <regex>
 
 #include "tests/bmcip/BmcipTest.h"
 #include "tests/support/client/CompositeObjects.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Pattern.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -95,7 +95,7 @@ class BmcipWatchAnswersTest : public BmcipTest {
 TEST_F(BmcipWatchAnswersTest, PrintsWhatChangesComesGoesAndFails) {
   const Completed watched = watchedBy("head -n 21");
   EXPECT_THAT(
-      linesOf(std::regex_replace(watched.output, std::regex("(^|\n)[-0-9]+T[0-9:]+[+-][0-9:]+  "), "$1")),
+      linesOf(Pattern("(^|\n)[-0-9]+T[0-9:]+[+-][0-9:]+  ").replaced(watched.output, "$1")),
       ElementsAre("eth0 address: 192.0.2.10 -> 192.0.2.77", "eth0 address: 192.0.2.77 -> 192.0.2.10",
                   "eth2 address: - -> 198.51.100.23", "eth2 mask: - -> 255.255.255.0", "eth2 origin: - -> DHCP",
                   "eth2 state: - -> enabled", "eth1 address: 198.51.100.23 -> -", "eth1 mask: 255.255.255.0 -> -",

@@ -4,12 +4,12 @@
 #include <gtest/gtest.h>
 
 #include <map>
-#include <regex>
 #include <set>
 
 #include "Paths.h"
 #include "tests/support/client/WbemClient.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Pattern.h"
 #include "tests/support/system/Process.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -26,10 +26,9 @@ std::string pathOf(const std::string& page) { return SOURCE_DIR "/docs/man/" + p
 
 // The first groups of all matches.
 Names matches(const std::string& text, const std::string& pattern) {
-  const std::regex expression(pattern, std::regex::multiline);
   Names found;
-  for (std::sregex_iterator match(text.begin(), text.end(), expression), end; match != end; ++match) {
-    found.insert((*match)[1]);
+  for (const Pattern::Match& match : Pattern(pattern).all(text)) {
+    found.insert(match[1]);
   }
   return found;
 }
@@ -59,9 +58,9 @@ Names namesOf(const Completed& help, const std::string& pattern) {
 std::map<std::string, std::string> sectionsOf(const std::string& text, const std::string& heading) {
   std::map<std::string, std::string> sections;
   std::string name;
+  const Pattern pattern(heading);
   for (const std::string& line : linesOf(text)) {
-    std::smatch found;
-    if (std::regex_match(line, found, std::regex(heading))) {
+    if (const Pattern::Match found = pattern.whole(line); !found.empty()) {
       name = found[1];
     }
     sections[name] += line + '\n';

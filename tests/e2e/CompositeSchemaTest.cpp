@@ -3,11 +3,10 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
-#include <regex>
-
 #include "cimom/schema/ClassRepository.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Pattern.h"
 
 namespace {
 
@@ -25,10 +24,10 @@ class CompositeSchemaTest : public testing::Test {
   std::vector<std::string> writable(const std::string& className) const {
     const std::string shown = stack_.wbemcli("-dx gc", className).errors;
     std::vector<std::string> names;
-    const std::regex property("<PROPERTY[^ ]* NAME=\"(\\w+)\".*?</PROPERTY");
-    for (std::sregex_iterator found(shown.begin(), shown.end(), property), end; found != end; ++found) {
-      if (std::regex_search(found->str(), std::regex("NAME=\"Write\"[^>]*><VALUE>TRUE"))) {
-        names.push_back((*found)[1]);
+    const Pattern write("NAME=\"Write\"[^>]*><VALUE>TRUE");
+    for (const Pattern::Match& property : Pattern("<PROPERTY[^ ]* NAME=\"(\\w+)\".*?</PROPERTY").all(shown)) {
+      if (!write.first(property[0]).empty()) {
+        names.push_back(property[1]);
       }
     }
     return names;

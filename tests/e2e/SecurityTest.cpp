@@ -5,13 +5,12 @@
 #include <gtest/gtest.h>
 #include <signal.h>
 
-#include <regex>
-
 #include "Paths.h"
 #include "tests/support/client/Cimomd.h"
 #include "tests/support/client/HttpClient.h"
 #include "tests/support/client/WbemClient.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Pattern.h"
 #include "tests/support/system/Poll.h"
 
 namespace {
@@ -185,8 +184,10 @@ TEST_F(SecurityTest, WritesALineForEachRequestWhereItIsAskedTo) {
   ASSERT_TRUE(poll([&] { return readFile(file).find("EnumerateInstanceNames") != std::string::npos; }))
       << readFile(file);
   const std::string line = linesOf(readFile(file)).back();
-  EXPECT_TRUE(std::regex_match(line, std::regex(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\.\d{3}Z 127\.0\.0\.1 admin 200 \d+ )"
-                                                R"(EnumerateInstanceNames root/test:TEST_Thing 0)")))
+  EXPECT_THAT(Pattern(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\.\d{3}Z 127\.0\.0\.1 admin 200 \d+ )"
+                      R"(EnumerateInstanceNames root/test:TEST_Thing 0)")
+                  .whole(line),
+              SizeIs(1))
       << line;
   EXPECT_EQ(std::filesystem::status(file).permissions() & std::filesystem::perms::others_all,
             std::filesystem::perms::none);
@@ -209,8 +210,8 @@ TEST_F(SecurityTest, WritesTheLineOfARequestWithoutALoginToTheStandardOutput) {
   EXPECT_EQ(ask("web.example"), 421u);
   ASSERT_TRUE(poll([&] { return linesOf(cimomd.process().output()).size() == 3; })) << cimomd.process().output();
   const std::vector<std::string> lines = linesOf(cimomd.process().output());
-  EXPECT_TRUE(std::regex_match(lines[1], std::regex(R"(\S+Z 127\.0\.0\.1 - 400 \d+ POST /cimom)"))) << lines[1];
-  EXPECT_TRUE(std::regex_match(lines[2], std::regex(R"(\S+Z 127\.0\.0\.1 - 421 \d+ POST /cimom)"))) << lines[2];
+  EXPECT_THAT(Pattern(R"(\S+Z 127\.0\.0\.1 - 400 \d+ POST /cimom)").whole(lines[1]), SizeIs(1)) << lines[1];
+  EXPECT_THAT(Pattern(R"(\S+Z 127\.0\.0\.1 - 421 \d+ POST /cimom)").whole(lines[2]), SizeIs(1)) << lines[2];
 }
 
 TEST_F(SecurityTest, WarnsOfRunningAsRoot) {

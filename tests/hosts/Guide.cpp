@@ -1,10 +1,11 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "tests/hosts/Guide.h"
 
-#include <regex>
+#include <algorithm>
 #include <stdexcept>
 
 #include "Paths.h"
+#include "tests/support/system/Pattern.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
@@ -13,11 +14,10 @@ namespace {
 constexpr const char* guide = SOURCE_DIR "/docs/object-managers.md";
 
 // A message as the document words it, as a pattern for what is said in fact.
-std::regex patternOf(const std::string& wording) {
-  static const std::regex special(R"([.^$|()\[\]{}*+?\\])");
-  static const std::regex variable("…");
-  const std::string literal = std::regex_replace(wording, special, R"(\$&)");
-  return std::regex(std::regex_replace(literal, variable, ".+"));
+Pattern patternOf(const std::string& wording) {
+  static const Pattern special(R"([.^$|()\[\]{}*+?\\])");
+  static const Pattern variable("…");
+  return Pattern(variable.replaced(special.replaced(wording, R"(\$&)"), ".+"));
 }
 
 }  // namespace
@@ -36,13 +36,9 @@ std::string Guide::commands(const std::string& step) const {
 
 bool Guide::explains(const std::string& message) const {
   // The first column of the tables: a line "| `wording` | …".
-  static const std::regex row("\n\\| `([^`]+)` \\|");
-  for (std::sregex_iterator found(text_.begin(), text_.end(), row), end; found != end; ++found) {
-    if (std::regex_search(message, patternOf((*found)[1]))) {
-      return true;
-    }
-  }
-  return false;
+  const std::vector<Pattern::Match> rows = Pattern("\n\\| `([^`]+)` \\|").all(text_);
+  return std::ranges::any_of(rows,
+                             [&](const Pattern::Match& row) { return !patternOf(row[1]).first(message).empty(); });
 }
 
 }  // namespace Testing

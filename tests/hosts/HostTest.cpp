@@ -3,7 +3,8 @@
 
 #include <algorithm>
 #include <filesystem>
-#include <regex>
+
+#include "tests/support/system/Pattern.h"
 
 namespace Testing {
 namespace {
@@ -14,12 +15,12 @@ std::string served;
 
 // "b="2",a="1"" as "a="1",b="2"".
 std::string sorted(const std::string& keys) {
-  static const std::regex key(R"(\w+="[^"]*")");
-  std::vector<std::string> found(std::sregex_token_iterator(keys.begin(), keys.end(), key), {});
+  static const Pattern key(R"(\w+="[^"]*")");
+  std::vector<Pattern::Match> found = key.all(keys);
   std::sort(found.begin(), found.end());
   std::string text;
-  for (const std::string& one : found) {
-    text += (text.empty() ? "" : ",") + one;
+  for (const Pattern::Match& one : found) {
+    text += (text.empty() ? "" : ",") + one[0];
   }
   return text;
 }
@@ -44,16 +45,9 @@ void HostTest::serve(const std::string& processor) {
 }
 
 std::string HostTest::canonical(const std::string& text) {
-  static const std::regex nameSpace(R"re(([\w.:-]+/)?root/(cimv2|yrnse):?)re");
-  static const std::regex keys(R"re(\w+="[^"]*"(,\w+="[^"]*")*)re");
-  const std::string local = std::regex_replace(text, nameSpace, "");
-  std::string result;
-  auto rest = local.cbegin();
-  for (std::sregex_iterator found(local.begin(), local.end(), keys), end; found != end; ++found) {
-    result.append(rest, (*found)[0].first).append(sorted((*found)[0]));
-    rest = (*found)[0].second;
-  }
-  return result.append(rest, local.cend());
+  static const Pattern nameSpace(R"re(([\w.:-]+/)?root/(cimv2|yrnse):?)re");
+  static const Pattern keys(R"re(\w+="[^"]*"(,\w+="[^"]*")*)re");
+  return keys.replaced(nameSpace.replaced(text, ""), sorted);
 }
 
 std::vector<std::string> HostTest::canonical(std::vector<std::string> texts) {

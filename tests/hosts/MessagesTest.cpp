@@ -5,11 +5,11 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <regex>
 #include <sstream>
 #include <stdexcept>
 
 #include "tests/hosts/HostTest.h"
+#include "tests/support/system/Pattern.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace {
@@ -95,10 +95,8 @@ class HostMessagesTest : public HostTest {
 
   // The commands with the program started by another.
   static Edit startedBy(const std::string& starter) {
-    const std::regex start("(^|\n)(" + host().program() + "\\b)");
-    return [starter, start](const std::string& commands) {
-      return std::regex_replace(commands, start, "$1" + starter + " $2");
-    };
+    const Pattern start("(^|\n)(" + host().program() + "\\b)");
+    return [starter, start](const std::string& commands) { return start.replaced(commands, "$1" + starter + " $2"); };
   }
 
   static std::string ipmi(const std::string& keys) { return "[processor]\nbackend = ipmi\n[ipmi]\n" + keys; }

@@ -1,8 +1,9 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "tests/providers/AssociationTest.h"
 
-#include <regex>
 #include <stdexcept>
+
+#include "tests/support/system/Pattern.h"
 
 namespace Testing {
 
@@ -123,11 +124,11 @@ int AssociationTest::build(std::vector<CMPIInstance*>& out, const char** propert
 }
 
 Strings AssociationTest::unitLines() const {
-  static const std::regex lineNumber("(\\[|, )Line: [0-9]+");
+  static const Pattern lineNumber("(\\[|, )Line: [0-9]+");
   Strings lines;
   for (const LogLine& line : logLines()) {
     if (line.channel == Channel::Log && line.component == unit().component) {
-      lines.push_back(std::regex_replace(line.message, lineNumber, "$1Line: N"));
+      lines.push_back(lineNumber.replaced(line.message, "$1Line: N"));
     }
   }
   return lines;

@@ -6,11 +6,11 @@
 #include <cstdlib>
 #include <filesystem>
 #include <map>
-#include <regex>
 #include <set>
 
 #include "Paths.h"
 #include "tests/schema/ClassText.h"
+#include "tests/support/system/Pattern.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
@@ -31,12 +31,10 @@ bool isForReaders(const std::string& qualifier) {
 
 // The declarations of qualifiers by name, each with single blanks; the MOF reader does not keep their scopes.
 std::map<std::string, std::string> qualifierDeclarations(const std::filesystem::path& file) {
-  std::string text = std::regex_replace(readFile(file), std::regex("//[^\n]*"), "");
-  text = std::regex_replace(text, std::regex("\\s+"), " ");
+  const std::string text = Pattern("\\s+").replaced(Pattern("//[^\n]*").replaced(readFile(file), ""), " ");
   std::map<std::string, std::string> declarations;
-  const std::regex declaration("Qualifier (\\w+) : [^;]*;");
-  for (std::sregex_iterator found(text.begin(), text.end(), declaration), end; found != end; ++found) {
-    declarations[(*found)[1]] = found->str();
+  for (const Pattern::Match& declaration : Pattern("Qualifier (\\w+) : [^;]*;").all(text)) {
+    declarations[declaration[1]] = declaration[0];
   }
   return declarations;
 }

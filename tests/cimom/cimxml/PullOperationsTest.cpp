@@ -1,8 +1,8 @@
 // SPDX-License-Identifier: Apache-2.0
 // Enumerations that a client reads in pieces (DSP0200, 5.3.2.24), against the probe provider with its three things.
-#include <regex>
 
 #include "tests/cimom/cimxml/EndpointTest.h"
+#include "tests/support/system/Pattern.h"
 
 namespace {
 
@@ -16,10 +16,10 @@ std::string text(const std::string& name, const std::string& value) { return par
 
 // The value of an output parameter; empty if it is null or not there.
 std::string output(const std::string& reply, const std::string& name) {
-  std::smatch match;
-  const std::regex pattern("<PARAMVALUE NAME=\"" + name +
-                           "\" PARAMTYPE=\"[a-z]+\"><VALUE>([^<]*)</VALUE></PARAMVALUE>");
-  return std::regex_search(reply, match, pattern) ? match[1].str() : std::string();
+  const Pattern::Match match =
+      Pattern("<PARAMVALUE NAME=\"" + name + "\" PARAMTYPE=\"[a-z]+\"><VALUE>([^<]*)</VALUE></PARAMVALUE>")
+          .first(reply);
+  return match.empty() ? std::string() : match[1];
 }
 
 bool isEnd(const std::string& reply) { return output(reply, "EndOfSequence") == "TRUE"; }
@@ -61,9 +61,12 @@ TEST_F(PullOperationsTest, PullsWhatIsLeftInTheOrderOfTheEnumeration) {
     pieces += reply;
   }
   EXPECT_EQ(pulls, 2);
-  const std::regex number("NAME=\"Number\"><KEYVALUE[^>]*>([0-9]+)<");
-  const auto numbers = [&number](const std::string& xml) {
-    return std::vector<std::string>(std::sregex_token_iterator(xml.begin(), xml.end(), number, 1), {});
+  const auto numbers = [](const std::string& xml) {
+    std::vector<std::string> found;
+    for (const Pattern::Match& number : Pattern("NAME=\"Number\"><KEYVALUE[^>]*>([0-9]+)<").all(xml)) {
+      found.push_back(number[1]);
+    }
+    return found;
   };
   EXPECT_EQ(numbers(pieces), numbers(all));
   EXPECT_THAT(failed("PullInstancesWithPath", text("EnumerationContext", context) + text("MaxObjectCount", "1")),
@@ -114,8 +117,7 @@ TEST_F(PullOperationsTest, OpensTraversalsOfAssociations) {
     const std::string opened =
         returned(row.opened, parameter("InstanceName", thingName()) + text("MaxObjectCount", "100"));
     EXPECT_THAT(whole, HasSubstr("<INSTANCEPATH>"));
-    EXPECT_EQ(opened.substr(0, opened.find("<PARAMVALUE")),
-              std::regex_replace(whole, std::regex(row.element), row.pulledElement));
+    EXPECT_EQ(opened.substr(0, opened.find("<PARAMVALUE")), Pattern(row.element).replaced(whole, row.pulledElement));
     EXPECT_TRUE(isEnd(opened));
   }
   EXPECT_THAT(failed("OpenAssociatorInstances", parameter("ObjectName", thingName())), StartsWith("4: "));
