@@ -12,11 +12,11 @@
 
 #include "bench/Measurements.h"
 #include "tests/cimom/cimxml/CostlyRequests.h"
-#include "tests/load/Footprint.h"
 #include "tests/support/client/CompositeStack.h"
 #include "tests/support/client/Enumeration.h"
 #include "tests/support/client/HttpClient.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Footprint.h"
 #include "tests/support/system/Poll.h"
 
 namespace Benchmark {

@@ -21,9 +21,9 @@
 #include "cimom/ObjectManager.h"
 #include "cimom/broker/RequestScope.h"
 #include "cimom/cimxml/Endpoint.h"
-#include "tests/load/Footprint.h"
 #include "tests/support/client/Enumeration.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Footprint.h"
 #include "trace/Trace.h"
 
 namespace {

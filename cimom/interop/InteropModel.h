@@ -8,7 +8,7 @@
 #include <utility>
 #include <vector>
 
-#include "cimom/interop/InteropProvider.h"
+#include "cimom/interop/Profiles.h"
 #include "cimom/model/Instance.h"
 #include "cimom/model/ObjectPath.h"
 #include "cimom/schema/ClassRepository.h"
@@ -16,6 +16,13 @@
 namespace Cimom {
 
 inline constexpr const char* interopNamespace = "root/interop";
+
+// What the model says of the program that it stands in.
+struct InteropFacts {
+  std::string host;
+  std::string version;
+  std::vector<Profile> profiles;
+};
 
 class InteropModel {
  public:

@@ -8,7 +8,6 @@
 
 #include "cimom/broker/Guard.h"
 #include "cimom/broker/Handle.h"
-#include "cimom/interop/InteropModel.h"
 #include "cimom/routing/SameObject.h"
 
 namespace Cimom {

@@ -1,20 +1,13 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
-#include <string>
 #include <vector>
 
-#include "cimom/interop/Profiles.h"
+#include "cimom/interop/InteropModel.h"
 #include "cimom/providers/ProviderRegistration.h"
 #include "cimom/schema/ClassRepository.h"
 
 namespace Cimom {
-
-struct InteropFacts {
-  std::string host;
-  std::string version;
-  std::vector<Profile> profiles;
-};
 
 // A provider that is linked into the program, and what it serves.
 struct LinkedProvider {

@@ -14,6 +14,7 @@
 #include "tests/support/client/CompositeObjects.h"
 #include "tests/support/client/FactoryState.h"
 #include "tests/support/client/HttpClient.h"
+#include "tests/support/system/Footprint.h"
 
 namespace {
 

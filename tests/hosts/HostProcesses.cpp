@@ -4,7 +4,6 @@
 #include <algorithm>
 #include <filesystem>
 #include <functional>
-#include <sstream>
 
 #include "tests/support/system/TemporaryDirectory.h"
 
@@ -42,17 +41,6 @@ std::vector<pid_t> processesRunning(const std::vector<std::string>& programs) {
     const std::string program = fs::read_symlink(directory / "exe", ended).string();
     return std::find(programs.begin(), programs.end(), program) != programs.end();
   });
-}
-
-long residentKib(pid_t process) {
-  std::istringstream status(readFile("/proc/" + std::to_string(process) + "/status"));
-  for (std::string word; status >> word;) {
-    long size = 0;
-    if (word == "VmRSS:" && status >> size) {
-      return size;
-    }
-  }
-  return 0;
 }
 
 }  // namespace Testing

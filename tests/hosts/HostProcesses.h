@@ -15,7 +15,4 @@ std::vector<pid_t> processesMapping(const std::string& part);
 // Those that run one of the programs, given by their paths.
 std::vector<pid_t> processesRunning(const std::vector<std::string>& programs);
 
-// What a process has in memory, in KiB; 0 if it has ended.
-long residentKib(pid_t process);
-
 }  // namespace Testing

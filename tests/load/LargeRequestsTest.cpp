@@ -11,9 +11,9 @@
 
 #include "tests/cimom/cimxml/CostlyRequests.h"
 #include "tests/load/CimClient.h"
-#include "tests/load/Footprint.h"
 #include "tests/support/client/Cimomd.h"
 #include "tests/support/system/Build.h"
+#include "tests/support/system/Footprint.h"
 #include "tests/support/system/Poll.h"
 
 namespace {

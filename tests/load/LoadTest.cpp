@@ -15,8 +15,8 @@
 #include "tests/cimom/cimxml/Messages.h"
 #include "tests/load/CimClient.h"
 #include "tests/load/Endpoints.h"
-#include "tests/load/Footprint.h"
 #include "tests/support/client/CompositeStack.h"
+#include "tests/support/system/Footprint.h"
 #include "tests/support/system/Poll.h"
 #ifdef SIMULATED_BMC
 #include "tests/support/agent/SimulatedBmc.h"

@@ -1,5 +1,5 @@
 // SPDX-License-Identifier: Apache-2.0
-#include "tests/load/Footprint.h"
+#include "tests/support/system/Footprint.h"
 
 #include <algorithm>
 #include <cstdlib>

@@ -12,7 +12,7 @@
 
 namespace Testing {
 
-// What it has in memory, in KiB, and the most that it ever had.
+// What it has in memory, in KiB, and the most that it ever had; 0 if it has ended.
 long residentKib(pid_t process);
 long peakResidentKib(pid_t process);
 
