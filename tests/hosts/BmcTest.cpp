@@ -13,15 +13,15 @@ namespace {
 
 using namespace Testing;
 using testing::AllOf;
-
 using testing::HasSubstr;
 
 class HostBmcTest : public HostTest {
  protected:
   void SetUp() override {
     QV::BackEndSettings settings = bmc_.settings();
-    // As an administrator has it, who leaves the key out.
+    // As an administrator has it, who leaves these keys out: an object manager has little patience with a provider.
     settings.erase("cache");
+    settings.erase("operation_timeout");
     std::string processor = "[processor]\nbackend = ipmi\n[ipmi]\n";
     for (const auto& [key, value] : settings) {
       processor += key + " = " + value + '\n';
