@@ -14,7 +14,7 @@ namespace {
 
 using namespace Testing;
 
-const std::size_t shareOfPoints = sanitized() ? 401 : 29;
+const std::size_t shareOfPoints = sanitized() ? 151 : 29;
 
 // Of all tests that ran, printed at their end.
 class Sum : public ::testing::Environment {

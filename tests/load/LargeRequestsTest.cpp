@@ -20,7 +20,7 @@ namespace {
 
 using namespace Testing;
 
-const std::size_t clients = sanitized() ? 12 : 60;
+constexpr std::size_t clients = 60;
 constexpr std::size_t bytes = 3U << 20U;
 const long mostKib = sanitized() ? 4L << 20U : 300L << 10U;
 const long mostKibLeft = sanitized() ? mostKib : 30L << 10U;
