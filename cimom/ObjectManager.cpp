@@ -44,6 +44,8 @@ void ObjectManager::loadSchemaText(std::string_view mof, std::string_view nameSp
   }
 }
 
+void ObjectManager::showSchema(std::string_view nameSpace) { parts_->core.classes.showSchema(nameSpace); }
+
 void ObjectManager::loadRegistration(const std::filesystem::path& fileOrDirectory) {
   for (const ProviderRegistration& registration : readRegistration(fileOrDirectory)) {
     parts_->router.providers().add(registration);

@@ -30,6 +30,8 @@ class ObjectManager {
   void loadSchema(const std::filesystem::path& fileOrDirectory);
   // Reads MOF from a text and shows its classes in the namespace; those under a `#pragma namespace` in theirs.
   void loadSchemaText(std::string_view mof, std::string_view nameSpace, std::string_view origin = "text");
+  // Shows in the namespace what has been read so far without a `#pragma namespace`.
+  void showSchema(std::string_view nameSpace);
 
   // Reads a registration file, or every *.reg of a directory (ProviderRegistration.h), and shows the classes in the
   // namespaces.

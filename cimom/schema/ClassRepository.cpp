@@ -242,6 +242,17 @@ void ClassRepository::show(std::string_view nameSpace, std::string_view classNam
   }
 }
 
+void ClassRepository::showSchema(std::string_view nameSpace) {
+  addNamespace(nameSpace);
+  const auto place = namespaces_.find(bareNamespace(nameSpace));
+  if (place != namespaces_.end()) {
+    for (const auto& [name, definition] : schema_) {
+      place->second.asked.insert(name);
+    }
+    revealAsked(place->second, schema_);
+  }
+}
+
 void ClassRepository::reveal(Namespace& nameSpace, const ClassDefinition& definition, const Classes& schema) {
   if (!nameSpace.shown.emplace(definition.name, &definition).second) {
     return;

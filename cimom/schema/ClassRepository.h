@@ -54,6 +54,8 @@ class ClassRepository {
 
   // Makes the namespace known and has it show a class and what that is made from; one that is added later counts too.
   void show(std::string_view nameSpace, std::string_view className);
+  // The same with every class of the one schema that is there so far.
+  void showSchema(std::string_view nameSpace);
 
  private:
   using Classes = std::map<std::string, ClassDefinition, NameLess>;

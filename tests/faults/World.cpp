@@ -3,11 +3,11 @@
 
 #include <cmpimacs.h>
 
-#include "Paths.h"
 #include "cimom/broker/Guard.h"
 #include "tests/faults/Interposed.h"
 #include "tests/faults/Recording.h"
 #include "tests/support/broker/Personality.h"
+#include "tests/support/composite/ProductSchema.h"
 
 namespace Testing {
 
@@ -18,14 +18,6 @@ using Cimom::ObjectPath;
 using Cimom::Value;
 
 constexpr const char* underlyingNameSpace = "root/yrnse";
-
-std::string everyClassIn(const std::string& nameSpace) {
-  std::string mof = "#pragma namespace(\"" + nameSpace + "\")\n";
-  for (const char* file : {"CIM_Subset", "CompositeIPConfig", "UnderlyingIPConfig"}) {
-    mof += "#pragma include(\"" SOURCE_DIR "/schema/" + std::string(file) + ".mof\")\n";
-  }
-  return mof;
-}
 
 void setNumber(Instance& instance, const char* name, CMPIUint16 number) {
   CMPIValue value = {};
@@ -48,9 +40,7 @@ World& world() {
 World::World()
     : broker_(interposedBroker(personal_.broker(), {enumerateInstances, recordTrace, recordFilter})),
       result_(recordingResult()) {
-  for (const char* nameSpace : {"root/cimv2", underlyingNameSpace}) {
-    manager_.loadSchemaText(everyClassIn(nameSpace), nameSpace);
-  }
+  loadProductSchema(manager_, {"root/cimv2", underlyingNameSpace});
   interpose(result_);
   addSystems();
   addEndpoints();

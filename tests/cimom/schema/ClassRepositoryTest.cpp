@@ -168,6 +168,19 @@ TEST_F(ClassRepositoryTest, ANamespaceShowsWhatIsAskedForAndWhatThatIsMadeFrom) 
   EXPECT_EQ(repository.find("root/none", "TST_Made"), nullptr);
 }
 
+TEST_F(ClassRepositoryTest, ANamespaceShowsTheWholeSchemaAndNothingOfAnothers) {
+  load(repository,
+       "class A_One { [Key] string K; };\nclass A_Two { [Key] string K; };\n"
+       "#pragma namespace(\"root/b\")\nclass B_Own { [Key] string K; };");
+  for (const char* nameSpace : {"root/a", "/root/c"}) {
+    repository.showSchema(nameSpace);
+  }
+  for (const char* nameSpace : {"root/a", "root/c"}) {
+    EXPECT_THAT(namesOf(repository.subclasses(nameSpace, "", true)), ElementsAre("A_One", "A_Two")) << nameSpace;
+  }
+  EXPECT_THAT(namesOf(repository.subclasses("root/b", "", true)), ElementsAre("B_Own"));
+}
+
 TEST_F(ClassRepositoryTest, WhatIsAskedForMayBeDeclaredLater) {
   repository.show("root/a", "A");
   EXPECT_EQ(repository.find("root/a", "A"), nullptr);

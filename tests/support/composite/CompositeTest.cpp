@@ -5,7 +5,7 @@
 
 #include <algorithm>
 
-#include "Paths.h"
+#include "tests/support/composite/ProductSchema.h"
 
 namespace Testing {
 
@@ -13,22 +13,11 @@ namespace {
 
 constexpr const char* none = "(none)";
 
-// Providers are held against whatever classes an object manager may show them.
-std::string everyClassIn(const std::string& nameSpace) {
-  std::string mof = "#pragma namespace(\"" + nameSpace + "\")\n";
-  for (const char* file : {"CIM_Subset", "CompositeIPConfig", "UnderlyingIPConfig"}) {
-    mof += "#pragma include(\"" SOURCE_DIR "/schema/" + std::string(file) + ".mof\")\n";
-  }
-  return mof;
-}
-
 // Read once: the schema does not change between tests.
 Cimom::ObjectManager& manager() {
   static Cimom::ObjectManager* loaded = [] {
     auto* fresh = new Cimom::ObjectManager;
-    for (const std::string nameSpace : {requestNameSpace, "root/yrnse", "root/other"}) {
-      fresh->loadSchemaText(everyClassIn(nameSpace), nameSpace);
-    }
+    loadProductSchema(*fresh, {requestNameSpace, "root/yrnse", "root/other"});
     return fresh;
   }();
   return *loaded;
