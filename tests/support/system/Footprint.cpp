@@ -2,10 +2,13 @@
 #include "tests/support/system/Footprint.h"
 
 #include <algorithm>
+#include <chrono>
 #include <cstdlib>
 #include <filesystem>
 #include <sstream>
+#include <utility>
 
+#include "tests/support/system/Poll.h"
 #include "tests/support/system/TemporaryDirectory.h"
 
 namespace Testing {
@@ -24,13 +27,7 @@ long kibOf(pid_t process, const char* row) {
   return 0;
 }
 
-}  // namespace
-
-long residentKib(pid_t process) { return kibOf(process, "VmRSS:"); }
-
-long peakResidentKib(pid_t process) { return kibOf(process, "VmHWM:"); }
-
-std::vector<std::string> descriptorsOf(pid_t process) {
+std::vector<std::string> openNow(pid_t process) {
   std::vector<std::string> targets;
   std::error_code gone;  // one that is closed while this looks
   for (const auto& entry : std::filesystem::directory_iterator(entryOf(process, "fd"), gone)) {
@@ -40,6 +37,29 @@ std::vector<std::string> descriptorsOf(pid_t process) {
   }
   std::ranges::sort(targets);
   return targets;
+}
+
+}  // namespace
+
+long residentKib(pid_t process) { return kibOf(process, "VmRSS:"); }
+
+long peakResidentKib(pid_t process) { return kibOf(process, "VmHWM:"); }
+
+std::vector<std::string> descriptorsOf(pid_t process) {
+  // UndefinedBehaviorSanitizer opens a pipe for a moment, to see whether memory can be read: what holds still is meant.
+  using Clock = std::chrono::steady_clock;
+  std::vector<std::string> open = openNow(process);
+  Clock::time_point since = Clock::now();
+  poll(
+      [&] {
+        if (std::vector<std::string> now = openNow(process); now != open) {
+          open = std::move(now);
+          since = Clock::now();
+        }
+        return Clock::now() - since > std::chrono::milliseconds(200);
+      },
+      std::chrono::seconds(10));
+  return open;
 }
 
 std::size_t configured(const char* variable, std::size_t otherwise) {

@@ -20,7 +20,7 @@ long peakResidentKib(pid_t process);
 // where it came from.
 inline const long toleratedKib = sanitized() ? 256 << 10 : 2 << 10;
 
-// What its descriptors lead to, sorted: "socket", "/var/log/agent.log" and the like.
+// What its descriptors lead to, sorted: "socket", "/var/log/agent.log" and the like. Without what is open for a moment.
 std::vector<std::string> descriptorsOf(pid_t process);
 
 // A number that the environment gives to a long run; else the one of the short run, which the suite has.
