@@ -78,7 +78,7 @@ std::string SimulatedBmc::ipmitool(const std::vector<std::string>& command) cons
   std::vector<std::string> full = {"ipmitool", "-I",    "lanplus", "-H",   "127.0.0.1", "-p", std::to_string(port_),
                                    "-U",       "admin", "-P",      "test", "-C",        "3"};
   full.insert(full.end(), command.begin(), command.end());
-  return run(full).output;
+  return run(full, {{"HOME", directory_ / "home"}}).output;
 }
 
 std::string SimulatedBmc::witness(const std::string& label) const {
