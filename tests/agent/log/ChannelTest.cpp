@@ -25,16 +25,28 @@ using namespace TWLog;
 using namespace Testing;
 
 std::vector<std::pair<int, std::string>> sentToSyslog;
+
+[[gnu::format(printf, 2, 0)]] void recordSyslog(int priority, const char* format, va_list arguments) {
+  std::array<char, 1024> text{};
+  std::vsnprintf(text.data(), text.size(), format, arguments);
+  sentToSyslog.emplace_back(priority, text.data());
+}
+
 }  // namespace
 
-// In place of the C library's: what would go to the machine's syslog, which a test must neither need nor fill.
+// In place of the C library's: what would go to the machine's syslog, which a test must neither need nor fill. Where
+// the product is hardened (_FORTIFY_SOURCE) it calls the second.
 extern "C" void syslog(int priority, const char* format, ...) {
-  std::array<char, 1024> text{};
   va_list arguments;
   va_start(arguments, format);
-  std::vsnprintf(text.data(), text.size(), format, arguments);
+  recordSyslog(priority, format, arguments);
   va_end(arguments);
-  sentToSyslog.emplace_back(priority, text.data());
+}
+extern "C" [[gnu::format(printf, 3, 4)]] void __syslog_chk(int priority, int /*flag*/, const char* format, ...) {
+  va_list arguments;
+  va_start(arguments, format);
+  recordSyslog(priority, format, arguments);
+  va_end(arguments);
 }
 
 namespace {
