@@ -1,7 +1,9 @@
-# 32-bit x86 on an x86-64 Debian: g++-multilib's compiler with the i386 architecture's libraries.
+# 32-bit x86 on an x86-64 Debian: g++-multilib's compiler, unless another is named, with the i386 architecture's libraries.
 set(CMAKE_SYSTEM_NAME Linux)
 set(CMAKE_SYSTEM_PROCESSOR i686)
-set(CMAKE_CXX_COMPILER g++)
+if(NOT CMAKE_CXX_COMPILER)
+  set(CMAKE_CXX_COMPILER g++)
+endif()
 set(CMAKE_CXX_FLAGS_INIT "-m32")
 set(CMAKE_LIBRARY_ARCHITECTURE i386-linux-gnu)
 set(ENV{PKG_CONFIG_LIBDIR} /usr/lib/i386-linux-gnu/pkgconfig:/usr/share/pkgconfig)
