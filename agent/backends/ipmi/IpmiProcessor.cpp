@@ -105,17 +105,19 @@ std::vector<IpmiProcessor::Channel>& IpmiProcessor::channels() {
 // round trips of a look. An address and mask that were not known to belong together do if they stay, nobody is at work
 // on them, and no process of this machine has been: two changes in a row may write an address that was there before.
 // Who has left a lock behind, and with it values that stay, is waited for once, and not for long. Where they never stay
-// the caller hears so while it still listens.
-NetworkInterface IpmiProcessor::look(Channel& channel) {
+// the caller hears so while it still listens: no try is begun that may not end by then, going by the longest one, since
+// a slow processor or a busy machine takes a good part of the time for each.
+NetworkInterface IpmiProcessor::look(Deadline deadline, Channel& channel) {
   struct Seen {
     AddressPair pair;
     std::optional<ChangeGeneration::Number> generation;
     bool operator==(const Seen&) const = default;
   };
   std::optional<Seen> earlier;
-  const Deadline lastTry(settings_.operationTimeout * 9 / 10);
   Deadline abandoned(settings_.operationTimeout / 2);
-  for (; !lastTry.passed(); std::this_thread::sleep_for(betweenTries)) {
+  Clock::duration longest = settings_.operationTimeout / 15;
+  do {
+    const auto begunAt = Clock::now();
     Seen seen{{}, generation()};
     NetworkInterface interface = readInterface(connection_, channel.number, channel.ipv6);
     seen.pair = {interface.ipv4Address, interface.ipv4SubnetMask};
@@ -128,7 +130,9 @@ NetworkInterface IpmiProcessor::look(Channel& channel) {
       channel.known = seen.pair;
       return interface;
     }
-  }
+    std::this_thread::sleep_for(betweenTries);
+    longest = std::max(longest, Clock::now() - begunAt);
+  } while (deadline.leaves(longest * 3 / 2));
   throw IpmiError("other clients of " + nameOf(settings_) + " change " + interfaceName(channel.number) +
                   " again and again: no address and mask that belong together were seen within operation_timeout");
 }
@@ -143,7 +147,7 @@ ManagementProcessor IpmiProcessor::read(Deadline deadline) {
   const auto generationBefore = generation();
   ManagementProcessor processor{"BMC", "Management processor reached over IPMI", {}, {}};
   for (Channel& channel : channels()) {
-    processor.interfaces.push_back(look(channel));
+    processor.interfaces.push_back(look(deadline, channel));
   }
   trace("read " + std::to_string(processor.interfaces.size()) + " interfaces in " +
         std::to_string(connection_.roundTrips()) + " round trips");

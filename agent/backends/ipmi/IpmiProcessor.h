@@ -67,7 +67,7 @@ class IpmiProcessor {
 
   void startOperation(Deadline deadline);
   std::vector<Channel>& channels();
-  NetworkInterface look(Channel& channel);
+  NetworkInterface look(Deadline deadline, Channel& channel);
 
   const IpmiSettings settings_;
   IpmiConnection connection_;

@@ -15,6 +15,8 @@ class Deadline {
 
   Clock::time_point time() const { return time_; }
   bool passed() const { return Clock::now() >= time_; }
+  // Whether what takes this long would end before it.
+  bool leaves(Clock::duration needed) const { return Clock::now() + needed < time_; }
   auto operator<=>(const Deadline&) const = default;
 
  private:
