@@ -32,6 +32,7 @@ constexpr std::size_t managers = 2;
 constexpr std::size_t loadClients = 8;  // the first two write
 constexpr std::size_t shortLoad = 5;
 constexpr auto loadWarmUp = 2s;
+constexpr auto loadPatience = 60s;  // beyond its time, with a machine that stalls
 
 struct Pair {
   std::string address;
@@ -103,8 +104,7 @@ class LoadTest : public testing::Test {
     }
     std::cout << duration.count() << " s: " << tally_.summary() << "; changes: " << changes_
               << "; pairs seen: " << pairsSeen_ << '\n';
-    EXPECT_GT(pairsSeen_, loadClients);
-    EXPECT_GT(changes_, managers);
+    EXPECT_TRUE(wasBusy());
     EXPECT_THAT(tally_.untold(), testing::IsEmpty());
     EXPECT_THAT(wrong_, testing::IsEmpty());
     for (std::size_t number = 0; number < managers; ++number) {
@@ -124,13 +124,21 @@ class LoadTest : public testing::Test {
   }
 
  private:
+  // Whether there was a load to speak of.
+  bool wasBusy() const { return pairsSeen_ > loadClients && changes_ > managers; }
+
+  bool isOver() const {
+    const auto now = Clock::now();
+    return now >= end_ && (wasBusy() || now >= end_ + loadPatience);
+  }
+
   void write(const Scene& scene, std::size_t number) {
     CimClient client(stacks_[number]->port());
     CimClient other(stacks_[1 - number]->port());
     const std::string& interface = scene.interfaces[number];
     std::size_t logged = 0;
     Tally tally;
-    for (std::size_t round = number; Clock::now() < end_; ++round) {
+    for (std::size_t round = number; !isOver(); ++round) {
       const Pair& pair = knownPairs()[firstWritten + round % (knownPairs().size() - firstWritten)];
       const Answer answer = change(client, interface, pair);
       tally.add("ModifyInstance", answer);
@@ -160,7 +168,7 @@ class LoadTest : public testing::Test {
         {"GetInstance", parameter("InstanceName", endpointName("eth9"))},
     };
     Tally tally;
-    for (std::size_t round = number; Clock::now() < end_; ++round) {
+    for (std::size_t round = number; !isOver(); ++round) {
       const auto& [method, parameters] = requests[round % requests.size()];
       const Answer answer = client.ask(method, parameters);
       tally.add(method, answer);
