@@ -102,8 +102,8 @@ class LoadTest : public testing::Test {
     for (std::thread& thread : threads) {
       thread.join();
     }
-    std::cout << duration.count() << " s: " << tally_.summary() << "; changes: " << changes_
-              << "; pairs seen: " << pairsSeen_ << '\n';
+    std::cout << std::chrono::duration_cast<std::chrono::seconds>(Clock::now() - begin).count()
+              << " s: " << tally_.summary() << "; changes: " << changes_ << "; pairs seen: " << pairsSeen_ << '\n';
     EXPECT_TRUE(wasBusy());
     EXPECT_THAT(tally_.untold(), testing::IsEmpty());
     EXPECT_THAT(wrong_, testing::IsEmpty());
